@@ -1,0 +1,3 @@
+#include "app/folder_upgrade_app.h"
+
+wxIMPLEMENT_APP(FolderUpgradeApp);

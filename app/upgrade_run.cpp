@@ -1,0 +1,63 @@
+// The body of the run: the switch, and the fixed order of the steps.
+#include "app/folder_upgrade_app.h"
+#include "app/hot_folder_list.h"
+#include "app/run_log.h"
+#include "migrate/hot_folder_impose_path.h"
+#include "migrate/job_preset_impose_path.h"
+
+#include <wx/arrstr.h>
+#include <wx/debug.h>
+
+namespace
+{
+
+// Reads and announces the switch; false when it is neither of the two.
+bool ReadSwitch(const wxString& text, bool& isUpgrade)
+{
+    isUpgrade = text.CmpNoCase("I") == 0;
+    if (isUpgrade)
+        RunLog("Installation : Upgrade call with switch: I", NoCount);
+    else if (text.CmpNoCase("U") == 0)
+        RunLog("Un-installation : Downgrade call with switch: U", NoCount);
+    else
+    {
+        RunLog("Invalid call check calling parameter: exiting....", NoCount);
+        return false;
+    }
+    return true;
+}
+
+void UpdateHotFolder(FolderUpgradeApp& app, const wxString& folder, int position)
+{
+    RunLog("Updated icon for hf" + folder, position);
+    UpdateHotFolderImposePath(app, folder);
+    RunLog("updated Impose path for hf" + folder, position);
+}
+
+} // namespace
+
+bool FolderUpgradeApp::OnInit()
+{
+    wxTheAssertHandler = nullptr;
+    if (argc < 2)
+        return false;
+    if (argc == 3 && argv[2].CmpNoCase("V") == 0)
+        RunLogEnabled = false;
+    if (!ReadSwitch(argv[1], m_isUpgrade))
+        return false;
+
+    wxArrayString folders;
+    ReadHotFolderList(folders);
+    if (folders.empty())
+        RunLog("No Hotfolder listed", NoCount);
+
+    RunLog("Start: HF updation", NoCount);
+    for (size_t i = 0; i < folders.size(); ++i)
+        UpdateHotFolder(*this, folders[i], static_cast<int>(i + 1));
+    RunLog("End: HF updation", NoCount);
+
+    RunLog("Start: Updating Impose path for JP Presets", NoCount);
+    UpdateJobPresetImposePath(*this);
+    RunLog("End: Updating Impose path for JP Presets", NoCount);
+    return false;
+}

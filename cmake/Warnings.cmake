@@ -1,0 +1,7 @@
+# For our own code: every warning, and each an error.
+add_library(warnings INTERFACE)
+if(MSVC)
+    target_compile_options(warnings INTERFACE /W4 /WX)
+else()
+    target_compile_options(warnings INTERFACE -Wall -Wextra -Wpedantic -Wconversion -Wshadow -Werror)
+endif()

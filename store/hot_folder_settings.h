@@ -1,0 +1,91 @@
+// The settings of one hot folder in memory: six plain values, one for each part of Folder.cfg.
+//
+// All of them are their owner's own and copy deeply. FilterSetting, the sixth, is a wxXmlNode whose
+// name is "FilterSetting", or a default-constructed one for a file without that element.
+#pragma once
+
+#include <wx/string.h>
+#include <wx/thread.h>
+
+#include <cstdint>
+#include <map>
+#include <vector>
+
+/// One entry of the input format list.
+struct InputFormat
+{
+    wxString DisplayName;
+    wxString ShortName;
+};
+
+/// The attributes of the root element and the input formats; each field bears the name of the
+/// attribute or element that stores it. The tool gives a meaning to Enable alone.
+struct HotFolderSettings
+{
+    wxString name;
+    wxString description;
+    wxString server_ip;
+    wxString server_name;
+    std::int32_t server_version = -1; // -1: not known
+    wxString BaseVirtualPrinter;
+    wxString BaseVirtualPrinterName;
+    wxString BaseVirtualPrinterDisplayName;
+    bool Enable = false;
+    std::vector<InputFormat> InputFormatsSummary;
+    bool Centralized = false;
+    bool Isjobpresetattached = false;
+    bool IsCustomInterval = false;
+    wxString TimeInterval;
+    wxString HFPresetName;
+    wxString PPDVersion;
+    wxString ServerTypeAndJPDefaultKeyInfo;
+    wxString server_textversion;
+    wxString server_type;
+    bool Quickset_Supported = false;
+    bool Quickset_Enabled = false;
+    wxString Quickset;
+    bool IsWidthBased = false;
+};
+
+/// The four folder paths of the "Paths" element, only carried.
+struct HotFolderPaths
+{
+    wxString Failfolder;
+    wxString Workfolder;
+    wxString Movefolder;
+    wxString Hotfolder;
+};
+
+struct JobSettingEntry
+{
+    wxString KeyDisplayValue;
+    wxString Value;
+    wxString LocDisplayValue;
+};
+
+struct ImposeSettingEntry
+{
+    wxString KeyDisplayValue;
+    wxString Value;
+};
+
+/// Both tables are ordered by key, as wxString::Cmp compares.
+using JobSettingTable = std::map<wxString, JobSettingEntry>;
+using ImposeSettingTable = std::map<wxString, ImposeSettingEntry>;
+
+struct PreflightSetting
+{
+    wxString Key;
+    wxString Value;
+};
+
+/// In the order of the file, repeated keys included.
+using PreflightSettingList = std::vector<PreflightSetting>;
+
+/// Sets both fields of the key's entry, which is added when the table has none.
+void SetImposeSetting(ImposeSettingTable& table, const wxString& key, const wxString& value,
+                      const wxString& keyDisplayValue);
+
+/// Guards Folder.cfg: held around the load of the settings and for the whole of a rewrite, only
+/// through wxCriticalSectionLocker scopes.
+extern wxCriticalSection FolderCfgLock;

@@ -1,0 +1,25 @@
+// Lookups on the tree of a loaded XML document. They neither load, change nor write a document, and
+// compare names exactly.
+#pragma once
+
+#include <wx/string.h>
+#include <wx/xml/xml.h>
+
+#include <map>
+
+/// One element's attributes by name, in code unit order; a copy that does not refer to the document.
+using AttributeMap = std::map<wxString, wxString>;
+
+/// The first element of that name below the node, or none. The node's direct children come before
+/// any subtree; with recursive set, the subtrees are then searched one after another in document
+/// order. The node itself never matches. Works at any depth of nesting.
+const wxXmlNode* FindElement(const wxXmlNode* node, const wxString& name, bool recursive);
+
+/// The first element of that name among the node and the siblings behind it, or none.
+const wxXmlNode* FirstNamed(const wxXmlNode* node, const wxString& name);
+
+/// Adds every attribute of the element to the map; of a repeated name the first value stays.
+void CollectAttributes(const wxXmlNode& element, AttributeMap& attributes);
+
+/// True, and the value set, when the name is in the map; else the value stays as it was.
+bool GetAttribute(const AttributeMap& attributes, const wxString& name, wxString& value);

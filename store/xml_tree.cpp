@@ -1,0 +1,119 @@
+#include "store/xml_tree.h"
+
+#include "platform/unicode_text.h"
+
+#include <algorithm>
+#include <memory>
+
+namespace
+{
+
+// The node that follows in document order below root, or none; level follows it.
+template <typename Node>
+Node* NextNode(Node* node, const wxXmlNode& root, int& level)
+{
+    if (node->GetChildren())
+    {
+        ++level;
+        return node->GetChildren();
+    }
+    for (; node != &root; node = node->GetParent(), --level)
+    {
+        if (node->GetNext())
+            return node->GetNext();
+    }
+    return nullptr;
+}
+
+void CopyAttributes(const wxXmlNode& source, wxXmlNode& target)
+{
+    wxXmlAttribute* last = nullptr;
+    for (const wxXmlAttribute* attribute = source.GetAttributes(); attribute;
+         attribute = attribute->GetNext())
+    {
+        // The node owns its first attribute, and each attribute the next.
+        auto* copy = new wxXmlAttribute(attribute->GetName(), attribute->GetValue());
+        if (last)
+            last->SetNext(copy);
+        else
+            target.SetAttributes(copy);
+        last = copy;
+    }
+}
+
+void CopyNode(const wxXmlNode& source, wxXmlNode& target)
+{
+    target.SetType(source.GetType());
+    target.SetName(source.GetName());
+    target.SetContent(source.GetContent());
+    target.SetNoConversion(source.GetNoConversion());
+    CopyAttributes(source, target);
+}
+
+// Appends a copy of the source behind the parent's last child so far.
+wxXmlNode* AppendCopy(const wxXmlNode& source, wxXmlNode& parent, wxXmlNode* last)
+{
+    auto copy = std::make_unique<wxXmlNode>(source.GetType(), source.GetName());
+    CopyNode(source, *copy);
+    parent.InsertChildAfter(copy.get(), last);
+    return copy.release(); // the parent's from here on
+}
+
+} // namespace
+
+void CopyTree(const wxXmlNode& source, wxXmlNode& target)
+{
+    CopyNode(source, target);
+    const wxXmlNode* from = &source;
+    wxXmlNode* to = &target;
+    while (true)
+    {
+        if (from->GetChildren())
+        {
+            from = from->GetChildren();
+            to = AppendCopy(*from, *to, nullptr);
+            continue;
+        }
+        for (; from != &source && !from->GetNext(); to = to->GetParent())
+            from = from->GetParent();
+        if (from == &source)
+            return;
+        from = from->GetNext();
+        to = AppendCopy(*from, *to->GetParent(), to);
+    }
+}
+
+int CountLevels(const wxXmlNode& root)
+{
+    int deepest = 0;
+    int level = 0;
+    for (const wxXmlNode* node = &root; node; node = NextNode(node, root, level))
+        deepest = std::max(deepest, level);
+    return deepest;
+}
+
+void RemoveSavedIndentation(wxXmlNode& root, int level)
+{
+    for (wxXmlNode* node = &root; node; node = NextNode(node, root, level))
+    {
+        const wxXmlNode* next = node->GetNext();
+        if (node == &root || node->GetType() != wxXML_TEXT_NODE || !next ||
+            next->GetType() == wxXML_TEXT_NODE)
+            continue;
+        const wxString indentation = "\n" + wxString(' ', static_cast<size_t>(2 * level));
+        if (node->GetContent().EndsWith(indentation))
+            node->SetContent(
+                node->GetContent().Left(node->GetContent().length() - indentation.length()));
+    }
+}
+
+bool IsXmlText(const wxString& text)
+{
+    if (!IsUnicodeText(text))
+        return false;
+    return std::none_of(text.begin(), text.end(), [](wxUniChar character) {
+        const auto code = character.GetValue();
+        return (code < 0x20 && code != '\t' && code != '\n' && code != '\r') || code == 0xFFFE ||
+               code == 0xFFFF;
+    });
+}

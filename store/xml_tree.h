@@ -1,0 +1,21 @@
+// Whole trees of XML nodes, at any depth and width: the library's own copy takes a time that grows
+// with the square of the number of children, and a stack that grows with the depth.
+#pragma once
+
+#include <wx/xml/xml.h>
+
+/// Makes the target a deep copy of the source, with its attributes, content and subtree. The target
+/// has no children before; where it hangs stays as it is.
+void CopyTree(const wxXmlNode& source, wxXmlNode& target);
+
+/// The number of levels below the node: 0 for one without children.
+int CountLevels(const wxXmlNode& root);
+
+/// Takes from every text that stands before another kind of node what wxXmlDocument::Save put
+/// between the two, a line feed and two blanks a level; level is the root's own in the saved
+/// document. So text beside elements, comments or CDATA comes out of a file as it went in.
+void RemoveSavedIndentation(wxXmlNode& root, int level);
+
+/// Whether an XML document can hold the text: no control characters but tab, line feed and carriage
+/// return, no lone surrogate, neither U+FFFE nor U+FFFF, nothing above U+10FFFF.
+bool IsXmlText(const wxString& text);
