@@ -2,6 +2,7 @@
 #include "app/folder_upgrade_app.h"
 #include "app/hot_folder_list.h"
 #include "app/run_log.h"
+#include "appearance/folder_icon.h"
 #include "migrate/hot_folder_impose_path.h"
 #include "migrate/job_preset_impose_path.h"
 
@@ -29,6 +30,7 @@ bool ReadSwitch(const wxString& text, bool& isUpgrade)
 
 void UpdateHotFolder(FolderUpgradeApp& app, const wxString& folder, int position)
 {
+    UpdateFolderIcon(app, folder);
     RunLog("Updated icon for hf" + folder, position);
     UpdateHotFolderImposePath(app, folder);
     RunLog("updated Impose path for hf" + folder, position);

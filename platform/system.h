@@ -50,4 +50,94 @@ LSTATUS RegQueryValueExW(HKEY key, LPCWSTR name, DWORD* reserved, DWORD* type, B
                          DWORD* size);
 LSTATUS RegCloseKey(HKEY key);
 
+// File attributes ----------------------------------------------------------------------------
+
+constexpr DWORD FILE_ATTRIBUTE_READONLY = 0x1;
+constexpr DWORD FILE_ATTRIBUTE_SYSTEM = 0x4;
+constexpr DWORD FILE_ATTRIBUTE_DIRECTORY = 0x10;
+constexpr DWORD FILE_ATTRIBUTE_NORMAL = 0x80;
+constexpr DWORD INVALID_FILE_ATTRIBUTES = 0xFFFFFFFF;
+
+DWORD GetFileAttributesW(LPCWSTR path);
+BOOL SetFileAttributesW(LPCWSTR path, DWORD attributes);
+
+// Profile files ------------------------------------------------------------------------------
+
+BOOL WritePrivateProfileStringW(LPCWSTR section, LPCWSTR key, LPCWSTR value, LPCWSTR path);
+DWORD GetPrivateProfileStringW(LPCWSTR section, LPCWSTR key, LPCWSTR defaultValue, LPWSTR buffer,
+                               DWORD capacity, LPCWSTR path);
+
+// Shell --------------------------------------------------------------------------------------
+
+constexpr int MAX_PATH = 260; // characters, the terminating NUL included
+
+using HMODULE = struct Module*;
+using FARPROC = std::intptr_t (*)();
+
+HMODULE LoadLibraryW(LPCWSTR name);
+FARPROC GetProcAddress(HMODULE module, const char* name);
+BOOL FreeLibrary(HMODULE module);
+
+using HRESULT = LONG;
+constexpr bool SUCCEEDED(HRESULT result)
+{
+    return result >= 0;
+}
+
+struct DLLVERSIONINFO
+{
+    DWORD cbSize;
+    DWORD dwMajorVersion;
+    DWORD dwMinorVersion;
+    DWORD dwBuildNumber;
+    DWORD dwPlatformID;
+};
+using DLLGETVERSIONPROC = HRESULT (*)(DLLVERSIONINFO*);
+
+struct SHFILEINFOW
+{
+    void* hIcon;
+    int iIcon;
+    DWORD dwAttributes;
+    wchar_t szDisplayName[MAX_PATH];
+    wchar_t szTypeName[80];
+};
+
+struct SHFOLDERCUSTOMSETTINGS
+{
+    DWORD dwSize;
+    DWORD dwMask;
+    void* pvid;
+    LPWSTR pszWebViewTemplate;
+    DWORD cchWebViewTemplate;
+    LPWSTR pszWebViewTemplateVersion;
+    LPWSTR pszInfoTip;
+    DWORD cchInfoTip;
+    void* pclsid;
+    DWORD dwFlags;
+    LPWSTR pszIconFile;
+    DWORD cchIconFile;
+    int iIconIndex;
+    LPWSTR pszLogo;
+    DWORD cchLogo;
+};
+
+constexpr LONG SHCNE_MKDIR = 0x00000008;
+constexpr LONG SHCNE_ATTRIBUTES = 0x00000800;
+constexpr LONG SHCNE_UPDATEIMAGE = 0x00008000;
+constexpr LONG SHCNE_ASSOCCHANGED = 0x08000000;
+constexpr UINT SHCNF_IDLIST = 0x0000;
+constexpr UINT SHCNF_DWORD = 0x0003;
+constexpr UINT SHCNF_PATHW = 0x0005;
+constexpr UINT SHCNF_FLUSH = 0x1000;
+constexpr UINT SHGFI_SYSICONINDEX = 0x4000;
+constexpr DWORD FCSM_ICONFILE = 0x10;
+constexpr DWORD FCS_FORCEWRITE = 0x2;
+
+void SHChangeNotify(LONG event, UINT flags, const void* item1, const void* item2);
+std::uintptr_t SHGetFileInfoW(LPCWSTR path, DWORD attributes, SHFILEINFOW* info, UINT size,
+                              UINT flags);
+HRESULT SHGetSetFolderCustomSettings(SHFOLDERCUSTOMSETTINGS* settings, LPCWSTR path,
+                                     DWORD readOrWrite);
+
 #endif

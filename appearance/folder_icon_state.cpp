@@ -1,0 +1,60 @@
+#include "appearance/folder_icon_state.h"
+
+#include "store/folder_cfg_reader.h"
+
+#include <wx/dir.h>
+#include <wx/filename.h>
+
+namespace
+{
+
+const char* const ErrorFileName = "Error.er";
+const char* const IconExtension = ".ico";
+
+bool IsEnabled(const wxString& hotFolder)
+{
+    HotFolderSettings settings;
+    const wxString cfgPath = FolderCfgPath(hotFolder);
+    const wxCriticalSectionLocker lock(FolderCfgLock);
+    if (wxFileExists(cfgPath))
+        LoadHotFolderSettings(cfgPath, settings);
+    return settings.Enable;
+}
+
+// The library logs a directory that it cannot open, so that is asked first.
+bool HasError(const wxString& hotFolder)
+{
+    const wxString path = PrivateDirPath(hotFolder);
+    if (!wxFileName::DirExists(path) || !wxFileName::IsDirReadable(path))
+        return false;
+    const wxDir directory(path);
+    return directory.IsOpened() && directory.HasFiles(ErrorFileName);
+}
+
+const char* IconBaseName(FolderIconState state)
+{
+    switch (state)
+    {
+    case FolderIconState::Active:
+        return "hf_folder";
+    case FolderIconState::Inactive:
+        return "hf_folder_disabled";
+    case FolderIconState::ErrorActive:
+        return "hf_error_active";
+    case FolderIconState::ErrorInactive:
+        break;
+    }
+    return "hf_error_inactive";
+}
+
+} // namespace
+
+bool GetFolderIconName(const wxString& hotFolder, wxString& iconName)
+{
+    const bool isEnabled = IsEnabled(hotFolder);
+    FolderIconState state = isEnabled ? FolderIconState::Active : FolderIconState::Inactive;
+    if (HasError(hotFolder))
+        state = isEnabled ? FolderIconState::ErrorActive : FolderIconState::ErrorInactive;
+    iconName = wxString(IconBaseName(state)) + IconExtension;
+    return true;
+}

@@ -1,0 +1,18 @@
+// The choice of the icon that shows a hot folder's state in Explorer.
+#pragma once
+
+#include <wx/string.h>
+
+enum class FolderIconState
+{
+    Active = 1,
+    Inactive = 2,
+    ErrorActive = 3,
+    ErrorInactive = 4
+};
+
+/// Gives the file name, without a directory, of the icon for the folder's present state: whether
+/// its Folder.cfg enables it, and whether its private directory holds a file "Error.er". A folder
+/// whose Folder.cfg cannot be read is not enabled; one whose private directory is missing or cannot
+/// be listed is not in error. Changes and logs nothing; returns true.
+bool GetFolderIconName(const wxString& hotFolder, wxString& iconName);

@@ -1,0 +1,29 @@
+#!/usr/bin/env bash
+# Renders the SVG drawings beside this script and packs each into an .ico.
+# Size 16 comes from <name>.16.svg, all other sizes from <name>.svg.
+set -euo pipefail
+
+cd -- "$(dirname -- "${BASH_SOURCE[0]}")"
+
+need() {
+  command -v "$1" >/dev/null || { echo "make_icons.sh: $1 not found, install package $2" >&2; missing=1; }
+}
+missing=0
+need rsvg-convert librsvg2-bin
+need icotool icoutils
+[ "$missing" -eq 0 ] || exit 1
+
+tmp=$(mktemp -d)
+trap 'rm -rf -- "$tmp"' EXIT
+
+for name in hf_folder hf_folder_disabled hf_error_active hf_error_inactive; do
+  for size in 16 32 48 256; do
+    src=$name.svg
+    [ "$size" -ne 16 ] || src=$name.16.svg
+    rsvg-convert -w "$size" -h "$size" -o "$tmp/$size.png" "$src"
+  done
+  # Force 32 bit, icotool would pick a palette for few colours; 256 stays PNG.
+  icotool -c -b 32 -o "$tmp/$name.ico" \
+    "$tmp/16.png" "$tmp/32.png" "$tmp/48.png" -r "$tmp/256.png"
+  mv -- "$tmp/$name.ico" "$name.ico"
+done

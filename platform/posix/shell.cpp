@@ -1,0 +1,57 @@
+// The shell of a machine without one: every call is accepted, and there is nobody to tell.
+#include "platform/system.h"
+
+#include <wx/string.h>
+
+#include <cstring>
+
+struct Module
+{
+};
+
+namespace
+{
+
+Module shell32;
+
+HRESULT GetShellVersion(DLLVERSIONINFO* version)
+{
+    version->dwMajorVersion = 6;
+    version->dwMinorVersion = 0;
+    return 0;
+}
+
+} // namespace
+
+HMODULE LoadLibraryW(LPCWSTR name)
+{
+    return wxString(name).CmpNoCase("shell32.dll") == 0 ? &shell32 : nullptr;
+}
+
+FARPROC GetProcAddress(HMODULE /*module*/, const char* name)
+{
+    if (std::strcmp(name, "DllGetVersion") != 0)
+        return nullptr;
+    return reinterpret_cast<FARPROC>(reinterpret_cast<void*>(GetShellVersion));
+}
+
+BOOL FreeLibrary(HMODULE /*module*/)
+{
+    return 1;
+}
+
+void SHChangeNotify(LONG /*event*/, UINT /*flags*/, const void* /*item1*/, const void* /*item2*/)
+{
+}
+
+std::uintptr_t SHGetFileInfoW(LPCWSTR /*path*/, DWORD /*attributes*/, SHFILEINFOW* /*info*/,
+                              UINT /*size*/, UINT /*flags*/)
+{
+    return 0;
+}
+
+HRESULT SHGetSetFolderCustomSettings(SHFOLDERCUSTOMSETTINGS* /*settings*/, LPCWSTR /*path*/,
+                                     DWORD /*readOrWrite*/)
+{
+    return 0;
+}
