@@ -1,0 +1,73 @@
+#!/usr/bin/env bash
+# Builds and runs the tests and closes with their count.
+#
+#     ./test.sh             every test of this machine's program, with the sanitizers
+#     ./test.sh windows     the same table of scenarios against the Windows program, under Wine
+set -euo pipefail
+cd "$(dirname "$0")"
+
+passed=0
+failed=0
+
+say() {
+    printf '== %s (%d s)\n' "$1" "$SECONDS"
+}
+
+quietly() {
+    local log
+    log=$(mktemp)
+    if "$@" >"$log" 2>&1; then
+        rm -f "$log"
+    else
+        cat "$log"
+        rm -f "$log"
+        echo "failed: $*" >&2
+        return 1
+    fi
+}
+
+# Runs a part of the tests whose output closes with a line 'N passed, N failed'.
+part() {
+    say "$1"
+    shift
+    local log counts
+    log=$(mktemp)
+    if ! "$@" >"$log" 2>&1; then
+        cat "$log"
+    fi
+    counts=$(grep -oE '^[0-9]+ passed, [0-9]+ failed' "$log" | tail -n 1) || counts="0 passed, 1 failed"
+    tail -n 3 "$log"
+    rm -f "$log"
+    passed=$((passed + ${counts%% *}))
+    counts=${counts#*, }
+    failed=$((failed + ${counts%% *}))
+}
+
+# Turns CTest's closing words into the one line that part() reads.
+run_ctest() {
+    local out=0 total failures
+    ctest --preset "$1" --parallel "$(nproc)" --no-tests=error >"build/$1/ctest.txt" 2>&1 || out=$?
+    total=$(sed -n 's/.* tests failed out of \([0-9]*\)$/\1/p' "build/$1/ctest.txt")
+    failures=$(sed -n 's/.*, \([0-9]*\) tests failed out of .*/\1/p' "build/$1/ctest.txt")
+    [ "$out" = 0 ] || grep -vE ' Passed | Start ' "build/$1/ctest.txt" || true
+    echo "$((${total:-0} - ${failures:-1})) passed, ${failures:-1} failed"
+    return "$out"
+}
+
+native() {
+    cmake/install_packages.sh g++ cmake ninja-build libwxgtk3.2-dev libgtest-dev
+    say "Building with the sanitizers"
+    quietly cmake --preset sanitize
+    quietly cmake --build --preset sanitize
+    part "Scenarios and unit tests" run_ctest sanitize
+}
+
+case ${1:-} in
+"") native ;;
+*)
+    sed -n '2,5s/^# \{0,1\}//p' "$0" >&2
+    exit 2
+    ;;
+esac
+echo "$passed passed, $failed failed"
+[ "$failed" = 0 ]

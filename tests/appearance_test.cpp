@@ -1,0 +1,147 @@
+// What the shell is told, which leaves no trace on the workstation, and the profile files' bytes.
+#include "appearance/folder_icon.h"
+#include "tests/recording_shell.h"
+
+#include <gtest/gtest.h>
+#include <wx/ffile.h>
+#include <wx/filename.h>
+
+namespace
+{
+
+class Appearance : public testing::Test
+{
+  protected:
+    Appearance() : m_folder(wxFileName::CreateTempFileName("hot folder ü"))
+    {
+        wxRemoveFile(m_folder);
+        wxMkdir(m_folder);
+        ShellCalls.clear();
+        ShellMajorVersion = 6;
+        ShellVersionResult = 0;
+    }
+
+    ~Appearance() override
+    {
+        wxFileName::Rmdir(m_folder, wxPATH_RMDIR_RECURSIVE);
+    }
+
+    wxString Ini() const
+    {
+        return m_folder + "/Desktop.ini";
+    }
+
+    void WriteIni(const wxString& text) const
+    {
+        wxFFile(Ini(), "wb").Write(text);
+    }
+
+    wxString Text() const
+    {
+        wxString text;
+        wxFFile(Ini(), "rb").ReadAll(&text);
+        return text;
+    }
+
+    static std::vector<std::string> Version()
+    {
+        return {"load shell32.dll", "find DllGetVersion", "free"};
+    }
+
+    std::vector<std::string> Calls(bool isForced, const std::string& iconFile) const
+    {
+        const std::string folder = m_folder.utf8_string();
+        const std::string ini = folder + "/Desktop.ini";
+        std::vector<std::string> calls = Version();
+        if (isForced)
+            calls.push_back("force " + folder + " 10 " + iconFile + " 0 0 2");
+        for (const std::string& call : {"notify 800 1005 " + ini, "info " + ini + " 0 1 4000",
+                                        std::string("notify 8000 1003 -7"), "notify 8 1005 " + ini,
+                                        std::string("notify 8000000 1000 0")})
+            calls.push_back(call);
+        return calls;
+    }
+
+    const wxString m_folder;
+};
+
+TEST_F(Appearance, ANewDesktopIniIsToldButNotForced)
+{
+    EXPECT_TRUE(ApplyFolderIcon(m_folder, "i.ico"));
+    EXPECT_EQ(Calls(false, ""), ShellCalls);
+}
+
+TEST_F(Appearance, AnExistingOneIsForcedWithTheValueReadBack)
+{
+    const wxString name = wxString('n', 300) + ".ico";
+    WriteIni("");
+    EXPECT_TRUE(ApplyFolderIcon(m_folder, name));
+    EXPECT_EQ(Calls(true, (".\\[_ORX_HotFolder_]\\" + name).Left(199).utf8_string()), ShellCalls);
+}
+
+TEST_F(Appearance, AnOldOrUnknownShellGetsNothingButTheAttributes)
+{
+    const std::vector<std::tuple<DWORD, DWORD, HRESULT, bool>> versions = {{4, 72, 0, true},
+                                                                           {4, 71, 0, false},
+                                                                           {0x8004, 72, 0, true},
+                                                                           {0x10004, 71, 0, false},
+                                                                           {6, 0, -1, false}};
+    for (const auto& [major, minor, result, isCustomised] : versions)
+    {
+        WriteIni("");
+        ShellMajorVersion = major;
+        ShellMinorVersion = minor;
+        ShellVersionResult = result;
+        ShellCalls.clear();
+        EXPECT_TRUE(ApplyFolderIcon(m_folder, "i.ico"));
+        EXPECT_EQ(isCustomised, ShellCalls != Version()) << major << "." << minor;
+        EXPECT_EQ(isCustomised, !Text().empty());
+        EXPECT_EQ(FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_SYSTEM,
+                  GetFileAttributesW(Ini().wc_str()));
+        wxRemoveFile(Ini());
+    }
+    EXPECT_FALSE(ApplyFolderIcon(m_folder + "/missing", "i.ico"));
+}
+
+TEST_F(Appearance, APathBeyondTheShellsBuffersIsNotForced)
+{
+    wxString folder = m_folder;
+    while (folder.length() < MAX_PATH)
+        folder += "/" + wxString('d', 100);
+    wxFileName::Mkdir(folder, wxS_DIR_DEFAULT, wxPATH_MKDIR_FULL);
+    wxFFile(folder + "/Desktop.ini", "wb");
+    EXPECT_TRUE(ApplyFolderIcon(folder, "i.ico"));
+    EXPECT_EQ(Calls(false, "").size(), ShellCalls.size());
+}
+
+TEST_F(Appearance, AProfileWriteChangesOneLine)
+{
+    struct Change
+    {
+        wxString before;
+        wxString after;
+    };
+    for (const Change& change :
+         {Change{"[s]\nK = a\nk=b", "[s]\nK =v\r\nk=b"},
+          Change{"k=a\n[ S ]\n[s] ; c\nk", "k=a\n[ S ]\n[s] ; c\nk=v\r\n"},
+          Change{"[s]\n;k=a\n\n\n[t]\nk=a", "[s]\n;k=a\nk=v\r\n\n\n[t]\nk=a"},
+          Change{"[s]\nx", "[s]\nx\r\nk=v\r\n"}, Change{"[s\nk=a", "[s\nk=a\r\n[s]\r\nk=v\r\n"},
+          Change{"[s]\r\nk=v\r\n", "[s]\r\nk=v\r\n"},
+          Change{wxString::FromUTF8("ü\xEF\xBB\xBF[s]\nk=ä"),
+                 wxString::FromUTF8("ü\xEF\xBB\xBF[s]\nk=ä\r\n[s]\r\nk=v\r\n")}})
+    {
+        WriteIni(change.before);
+        EXPECT_NE(0, WritePrivateProfileStringW(L"s", L"k", L"v", Ini().wc_str()));
+        EXPECT_EQ(change.after, Text());
+        wchar_t value[8] = {};
+        EXPECT_EQ(1U, GetPrivateProfileStringW(L"S", L"K", L"default", value, 8, Ini().wc_str()));
+        EXPECT_EQ(wxString("v"), value);
+    }
+    SetFileAttributesW(Ini().wc_str(), FILE_ATTRIBUTE_READONLY);
+    EXPECT_EQ(0, WritePrivateProfileStringW(L"s", L"k", L"other", Ini().wc_str()));
+    wchar_t cut[4] = {};
+    EXPECT_EQ(3U, GetPrivateProfileStringW(L"none", L"k", L"default", cut, 4, Ini().wc_str()));
+    EXPECT_EQ(wxString("def"), cut);
+}
+
+} // namespace

@@ -1,0 +1,236 @@
+// What no run shows: the readers' results and defaults, the lookups, and the writer's rarer forms.
+#include "store/folder_cfg_reader.h"
+#include "store/folder_cfg_writer.h"
+#include "store/xml_lookup.h"
+#include "store/xml_tree.h"
+
+#include <gtest/gtest.h>
+#include <wx/ffile.h>
+#include <wx/filename.h>
+#include <wx/log.h>
+#include <wx/sstream.h>
+
+#include <chrono>
+
+namespace
+{
+
+class Store : public testing::Test
+{
+  protected:
+    Store() : m_path(wxFileName::CreateTempFileName("store"))
+    {
+    }
+
+    ~Store() override
+    {
+        wxRemoveFile(m_path);
+    }
+
+    const wxString& File(const wxString& text)
+    {
+        wxFFile(m_path, "wb").Write(text);
+        return m_path;
+    }
+
+    wxString Text() const
+    {
+        wxString text;
+        wxFFile(m_path, "rb").ReadAll(&text);
+        return text;
+    }
+
+    int Load(const wxString& text, HotFolderSettings& settings)
+    {
+        const wxLogNull quiet;
+        return LoadHotFolderSettings(File(text), settings);
+    }
+
+    const wxXmlNode* Root(const wxString& text)
+    {
+        m_document.Load(File(text));
+        return m_document.GetRoot();
+    }
+
+    const wxString m_path;
+    wxXmlDocument m_document;
+};
+
+TEST_F(Store, TheChainOfAttributesEndsAtTheFirstGap)
+{
+    // The chain in the order in which it is read; server_version stands outside it.
+    const std::vector<wxString> chain = {"name",
+                                         "description",
+                                         "server_ip",
+                                         "server_name",
+                                         "Enable",
+                                         "BaseVirtualPrinter",
+                                         "BaseVirtualPrinterName",
+                                         "BaseVirtualPrinterDisplayName",
+                                         "HFPresetName",
+                                         "Centralized",
+                                         "Isjobpresetattached",
+                                         "IsCustomInterval",
+                                         "TimeInterval",
+                                         "PPDVersion",
+                                         "ServerTypeAndJPDefaultKeyInfo",
+                                         "server_textversion",
+                                         "server_type",
+                                         "Quickset",
+                                         "Quickset_Supported",
+                                         "Quickset_Enabled",
+                                         "IsWidthBased"};
+    for (size_t gap = 0; gap <= chain.size(); ++gap)
+    {
+        wxString attributes;
+        for (size_t i = 0; i < chain.size(); ++i)
+            attributes += i == gap ? wxString() : " " + chain[i] + "='1'";
+        HotFolderSettings read;
+        EXPECT_EQ(gap < 4 ? -1 : 1, Load("<r" + attributes + " server_version='12'/>", read))
+            << gap;
+        size_t count = 0; // of the fields that were set
+        for (const wxString& text :
+             {read.name, read.description, read.server_ip, read.server_name,
+              read.BaseVirtualPrinter, read.BaseVirtualPrinterName,
+              read.BaseVirtualPrinterDisplayName, read.HFPresetName, read.TimeInterval,
+              read.PPDVersion, read.ServerTypeAndJPDefaultKeyInfo, read.server_textversion,
+              read.server_type, read.Quickset})
+            count += text == "1" ? 1 : 0;
+        for (const bool flag :
+             {read.Enable, read.Centralized, read.Isjobpresetattached, read.IsCustomInterval,
+              read.Quickset_Supported, read.Quickset_Enabled, read.IsWidthBased})
+            count += flag ? 1 : 0;
+        EXPECT_EQ(gap, count) << "without " << (gap < chain.size() ? chain[gap] : wxString("none"));
+        EXPECT_EQ(gap > 14 ? 12 : -1, read.server_version) << gap;
+    }
+}
+
+TEST_F(Store, ValuesHaveTheirForms)
+{
+    struct Form
+    {
+        const char* value;
+        bool isNumericFlag;
+        bool isTextFlag;
+        int number;
+    };
+    for (const Form& form :
+         {Form{"1", true, true, 1}, Form{"1 \t", true, true, 1}, Form{" 1", true, false, 1},
+          Form{"01", true, false, 1}, Form{"-1", true, false, -1}, Form{"0", false, false, 0},
+          Form{"", false, false, 0}, Form{"true", false, false, 0}, Form{"12x", true, false, 12},
+          Form{"x1", false, false, 0}, Form{"2147483648", false, false, 0},
+          Form{"99999999999999999999", false, false, 0}})
+    {
+        HotFolderSettings read;
+        Load(wxString::Format(
+                 "<r name='' description='' server_ip='' server_name='' Enable='%s' "
+                 "BaseVirtualPrinter='' BaseVirtualPrinterName='' BaseVirtualPrinterDisplayName='' "
+                 "HFPresetName='' Centralized='' Isjobpresetattached='' IsCustomInterval='' "
+                 "TimeInterval='' PPDVersion='' ServerTypeAndJPDefaultKeyInfo='' "
+                 "server_version='%s' "
+                 "server_textversion='' server_type='' Quickset='' Quickset_Supported='%s'/>",
+                 form.value, form.value, form.value),
+             read);
+        EXPECT_EQ(form.isTextFlag, read.Enable) << form.value;
+        EXPECT_EQ(form.isNumericFlag, read.Quickset_Supported) << form.value;
+        EXPECT_EQ(form.number, read.server_version) << form.value;
+    }
+}
+
+TEST_F(Store, WhatCannotBeLoadedLeavesTheValues)
+{
+    const wxLogNull quiet;
+    HotFolderSettings settings;
+    settings.InputFormatsSummary.resize(1);
+    wxXmlNode filter(wxXML_ELEMENT_NODE, "kept");
+    bool loaded = true;
+    EXPECT_EQ(-1, LoadHotFolderSettings(File("<r name='x'>"), settings, &loaded));
+    EXPECT_FALSE(loaded);
+    EXPECT_EQ(0, ReadFilterSetting(m_path, filter, &loaded));
+    EXPECT_EQ(0, LoadHotFolderSettings(m_path + "missing", settings, &loaded));
+    EXPECT_EQ("", settings.name);
+    EXPECT_EQ(1U, settings.InputFormatsSummary.size());
+    EXPECT_EQ("kept", filter.GetName());
+    EXPECT_EQ(-1, LoadHotFolderSettings(File("<r/>"), settings, &loaded));
+    EXPECT_TRUE(loaded);
+    EXPECT_TRUE(settings.InputFormatsSummary.empty());
+}
+
+TEST_F(Store, SectionsThatAreMissingLeaveTheirValues)
+{
+    HotFolderPaths paths;
+    paths.Workfolder = "kept";
+    JobSettingTable jobs = {{"kept", {}}};
+    PreflightSettingList preflight(1);
+    const wxXmlNode* root = Root("<r><jobsetting/><Paths><Workfolder/></Paths></r>");
+    ReadJobSettings(root, jobs);
+    ReadPreflightSettings(nullptr, preflight);
+    EXPECT_EQ(1, ReadPaths(nullptr, paths));
+    EXPECT_EQ(0, ReadPaths(root, paths));
+    EXPECT_EQ("kept", paths.Workfolder);
+    EXPECT_EQ(1U, jobs.size());
+    EXPECT_EQ(1U, preflight.size());
+    ReadJobSettings(Root("<r><x><JobSetting/></x></r>"), jobs);
+    EXPECT_TRUE(jobs.empty());
+}
+
+TEST_F(Store, AnEntryWithoutAShortNameHasNoNames)
+{
+    std::vector<InputFormat> formats;
+    ReadInputFormats(
+        Root("<r><InputFormatsSummary><x/>text<x DisplayName='d'/></InputFormatsSummary></r>"),
+        formats);
+    ASSERT_EQ(1U, formats.size());
+    EXPECT_EQ("", formats[0].DisplayName);
+}
+
+TEST_F(Store, DirectChildrenComeBeforeSubtrees)
+{
+    const wxXmlNode* root =
+        Root("<r><a><b><x n='3'/></b><x n='2'/></a><!--c--><c><x n='4'/></c><d/></r>");
+    wxString value;
+    EXPECT_TRUE(FindElement(root, "x", true)->GetAttribute("n", &value));
+    EXPECT_EQ("2", value);
+    EXPECT_EQ(nullptr, FindElement(root, "x", false));
+    EXPECT_EQ(nullptr, FindElement(root, "X", true));
+    EXPECT_EQ(nullptr, FindElement(root, "r", true));
+    EXPECT_NE(nullptr, FindElement(root, "d", false));
+}
+
+TEST_F(Store, DefaultsAreWrittenAndAFilterOfAnotherNameIsNot)
+{
+    SaveHotFolderSettings(m_path, {}, {}, {}, wxXmlNode(wxXML_ELEMENT_NODE, "filtersetting"), {},
+                          {});
+    EXPECT_TRUE(Text().EndsWith(
+        "Enable=\"0\" Centralized=\"0\" Isjobpresetattached=\"0\" "
+        "IsCustomInterval=\"0\" TimeInterval=\"\">\n  <InputFormatsSummary/>\n"
+        "  <Paths>\n    <Failfolder path=\"\"/>\n    <Workfolder path=\"\"/>\n"
+        "    <Movefolder path=\"\"/>\n    <Hotfolder path=\"\"/>\n  </Paths>\n"
+        "  <JobSetting/>\n  <ImposeSetting/>\n  <PreflightSettings/>\n</HotFolder>\n"));
+    EXPECT_TRUE(Text().Contains("server_version=\"-1\""));
+}
+
+TEST_F(Store, SizeCostsTimeInProportion)
+{
+    // A second or two is what it may take; the square of the number would take half a minute.
+    constexpr int Entries = 100000;
+    wxString text = "<r><FilterSetting>";
+    for (int i = 0; i < Entries; ++i)
+        text += "<x/>";
+    text += "</FilterSetting><JobSetting>";
+    for (int i = 0; i < Entries; ++i)
+        text += wxString::Format("<K k='%d' v=''/>", i);
+    const wxString path = File(text + "</JobSetting></r>");
+    const auto start = std::chrono::steady_clock::now();
+    JobSettingTable jobs;
+    wxXmlNode filter;
+    ReadFilterSetting(path, filter);
+    m_document.Load(path);
+    ReadJobSettings(m_document.GetRoot(), jobs);
+    SaveHotFolderSettings(path, {}, jobs, {}, filter, {}, {});
+    EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(10));
+    EXPECT_EQ(static_cast<size_t>(Entries), jobs.size());
+    EXPECT_EQ(Entries, Text().Freq('\n') - Entries - 16);
+}
+
+} // namespace
