@@ -62,8 +62,22 @@ native() {
     part "Scenarios and unit tests" run_ctest sanitize
 }
 
+windows() {
+    cmake/install_packages.sh g++ cmake ninja-build libwxgtk3.2-dev libgtest-dev googletest \
+        g++-mingw-w64-x86-64-posix wine64 xvfb xauth xdotool
+    say "Building wxWidgets for Windows, unless it is there"
+    cmake/windows/build_wxwidgets.sh
+    say "Building the Windows program and this machine's"
+    quietly cmake --preset windows
+    quietly cmake --build --preset windows
+    quietly cmake --preset native
+    quietly cmake --build --preset native
+    part "Scenarios and unit tests under Wine" tests/under_wine.sh build/windows build/native
+}
+
 case ${1:-} in
 "") native ;;
+windows) windows ;;
 *)
     sed -n '2,5s/^# \{0,1\}//p' "$0" >&2
     exit 2

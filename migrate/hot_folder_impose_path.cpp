@@ -66,6 +66,14 @@ wxFileName FolderOf(const wxFileName& templateFile)
     return wxFileName(templateFile.GetPath(wxPATH_GET_VOLUME, wxPATH_NATIVE), wxPATH_NATIVE);
 }
 
+// Two names of one folder are the same, but not with a final separator and without: off Windows
+// wxFileName::SameAs would take that too, for a folder that is there.
+bool IsSameFolder(const wxFileName& left, const wxFileName& right)
+{
+    return left.GetFullName().empty() == right.GetFullName().empty() &&
+           left.SameAs(right, wxPATH_NATIVE);
+}
+
 // Everything in Folder.cfg but the imposition settings.
 struct OtherSettings
 {
@@ -114,7 +122,7 @@ void MoveTemplate(const wxString& cfgPath, const wxString& encoding, const Direc
     if (!LookUp(direction.from, direction.fromMessage, from))
         return;
     const wxFileName templateFile(stored.Value, wxPATH_NATIVE);
-    if (!from.SameAs(FolderOf(templateFile), wxPATH_NATIVE))
+    if (!IsSameFolder(from, FolderOf(templateFile)))
         return;
     wxFileName to;
     if (!LookUp(direction.to, direction.toMessage, to))

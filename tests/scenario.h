@@ -20,6 +20,5 @@ struct Scenario
 
 /// Stands for the log of an earlier run, which every workstation has.
 extern const std::string OldLog;
-extern const char* const LogPlace;
 
 std::vector<Scenario> Scenarios();

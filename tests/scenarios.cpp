@@ -1,7 +1,6 @@
 #include "tests/scenario.h"
 
 const std::string OldLog = "The log of an earlier run\r\n";
-const char* const LogPlace = "user/ORX_Installers/UpgradeDowngrade.log";
 
 namespace
 {
@@ -9,8 +8,6 @@ namespace
 using Text = std::string;
 
 const char* const ListPlace = "machine/hotfolder/HotFolderList.cfg";
-const char* const MachineHive = "machine/registry/HKEY_LOCAL_MACHINE.reg";
-const char* const UserHive = "user/registry/HKEY_CURRENT_USER.reg";
 const char* const CfgA = "hot/A/[P]/Folder.cfg";
 const char* const PresetP = "user/ORX/JPData/P/Presets/presets.xml";
 const Text Removed = "(not there)";

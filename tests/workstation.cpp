@@ -1,13 +1,14 @@
 #include "tests/workstation.h"
 
+#include "tests/process.h"
+#include "tests/text_files.h"
+#include "tests/wine.h"
+
 #include <array>
 #include <cctype>
-#include <csignal>
+#include <cstdio>
 #include <cstdlib>
 #include <fcntl.h>
-#include <fstream>
-#include <grp.h>
-#include <sstream>
 #include <stdexcept>
 #include <sys/stat.h>
 #include <sys/wait.h>
@@ -19,52 +20,13 @@ namespace fs = std::filesystem;
 namespace
 {
 
-constexpr uid_t OtherUser = 65534;
-constexpr int TimeLimitSeconds = 120;
 const char* const AttributeName = "user.DOSATTRIB";
-
-std::string ReadFile(const fs::path& path)
-{
-    std::ifstream file(path, std::ios::binary);
-    std::ostringstream text;
-    text << file.rdbuf();
-    return text.str();
-}
-
-void WriteFile(const fs::path& path, const std::string& text)
-{
-    fs::create_directories(path.parent_path());
-    std::ofstream(path, std::ios::binary) << text;
-}
-
-void ReplaceAll(std::string& text, const std::string& from, const std::string& to)
-{
-    for (size_t at = text.find(from); at != std::string::npos; at = text.find(from, at + to.size()))
-        text.replace(at, from.size(), to);
-}
 
 std::string WithDoubled(const std::string& text, char character)
 {
     std::string result;
     for (const char each : text)
         result += std::string(each == character ? 2 : 1, each);
-    return result;
-}
-
-// UTF-8 as UTF-16LE with a byte-order mark; of characters beyond U+FFFF there are none.
-std::string ToUtf16(const std::string& text)
-{
-    std::string result = "\xFF\xFE";
-    for (size_t i = 0; i < text.size();)
-    {
-        const auto lead = static_cast<unsigned char>(text[i]);
-        const size_t length = lead < 0x80 ? 1 : lead < 0xE0 ? 2 : 3;
-        unsigned code = length == 1 ? lead : lead & (length == 2 ? 0x1FU : 0x0FU);
-        for (size_t k = 1; k < length; ++k)
-            code = code << 6 | (static_cast<unsigned char>(text[i + k]) & 0x3FU);
-        result += {static_cast<char>(code & 0xFF), static_cast<char>(code >> 8)};
-        i += length;
-    }
     return result;
 }
 
@@ -85,30 +47,37 @@ std::string Letters(const fs::path& path)
     return std::string(isReadOnly ? "R" : "") + ((stored & 4) != 0 ? "S" : "");
 }
 
-[[noreturn]] void Become(const fs::path& program, const std::vector<std::string>& arguments,
-                         int errorFile, bool asOtherUser)
+// Whether a path in an application data folder, which others use too, belongs to a scenario.
+bool IsOurs(const std::string& path)
 {
-    dup2(errorFile, STDERR_FILENO);
-    if (asOtherUser && geteuid() == 0 &&
-        (setgroups(0, nullptr) != 0 || setgid(OtherUser) != 0 || setuid(OtherUser) != 0))
-        _exit(126);
-    alarm(TimeLimitSeconds);
-    std::vector<char*> argv{const_cast<char*>(program.c_str())};
-    for (const std::string& argument : arguments)
-        argv.push_back(const_cast<char*>(argument.c_str()));
-    argv.push_back(nullptr);
-    execv(program.c_str(), argv.data());
-    _exit(127);
+    const std::string top = path.substr(0, path.find('/'));
+    return top == "ORX" || top == "ORX_Installers" || top == "hotfolder" || top == "registry";
+}
+
+void GiveAway(const fs::path& path)
+{
+    if (lchown(path.c_str(), OtherUser, OtherUser) != 0 && fs::exists(path))
+        throw std::runtime_error("only root can give files away");
+}
+
+std::string ExpandedAt(const Workstation& workstation, const Files& files, const char* place)
+{
+    const auto found = files.find(place);
+    return found == files.end() ? std::string() : workstation.Expand(found->second);
 }
 
 } // namespace
 
+const char* const LogPlace = "user/ORX_Installers/UpgradeDowngrade.log";
+const char* const MachineHive = "machine/registry/HKEY_LOCAL_MACHINE.reg";
+const char* const UserHive = "user/registry/HKEY_CURRENT_USER.reg";
+
 bool IsWindowsProgram()
 {
-    return false;
+    return !WindowsProgram().empty();
 }
 
-Workstation::Workstation()
+Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser)
 {
     std::string pattern = (fs::temp_directory_path() / "work station XXXXXX").string();
     if (!mkdtemp(pattern.data()))
@@ -119,12 +88,22 @@ Workstation::Workstation()
                   {"user", m_root / "user data"},
                   {"machine", m_root / "machine data"},
                   {"tool", m_root / "Tool Größe"}};
-    for (const auto& [name, directory] : m_hostDirs)
-        m_tokens["{" + name + "}"] = directory.string();
-    m_tokens["{app}"] = (m_root / "Apps ä").string();
-    m_tokens["{previous}"] = (m_root / "Vorige 版").string();
-    m_tokens["{default}"] = m_tokens["{app}"] + "/template";
-    m_tokens["{/}"] = "/";
+    if (IsWindowsProgram())
+    {
+        m_wine = std::make_unique<Wine>(asOtherUser, m_root);
+        m_hostDirs["user"] = m_wine->UserDataDir();
+        m_hostDirs["machine"] = m_wine->MachineDataDir();
+    }
+    const std::string separator = IsWindowsProgram() ? "\\" : "/";
+    const std::string root = (IsWindowsProgram() ? "H:" : m_root.string()) + separator;
+    m_tokens = {
+        {"{hot}", root + "Hot Folders"},
+        {"{tool}", root + "Tool Größe"},
+        {"{app}", root + "Apps ä"},
+        {"{previous}", root + "Vorige 版"},
+        {"{user}", IsWindowsProgram() ? m_wine->UserDataPath() : m_hostDirs["user"].string()},
+        {"{/}", separator}};
+    m_tokens["{default}"] = m_tokens["{app}"] + separator + "template";
     // In capitals as the registry editor's text has them.
     for (const auto& [token, value] : Files(m_tokens))
     {
@@ -136,7 +115,8 @@ Workstation::Workstation()
 
     const fs::path built = TOOL_DIR;
     fs::create_directories(m_hostDirs["tool"]);
-    fs::copy(built / "FolderUpgrade", m_hostDirs["tool"]);
+    fs::create_directories(m_root / "Vorige 版");
+    fs::copy(IsWindowsProgram() ? WindowsProgram() : built / "FolderUpgrade", m_hostDirs["tool"]);
     fs::copy(built / "BundleIcons", m_hostDirs["tool"] / "BundleIcons");
     for (const auto& icon : fs::directory_iterator(built / "BundleIcons"))
         fs::copy(icon, m_hostDirs["tool"]);
@@ -195,6 +175,24 @@ void Workstation::SetAttributes(const std::string& place, const std::string& let
         fs::permissions(path, fs::perms::none);
 }
 
+template <typename Visit>
+void Workstation::ForEachEntry(Visit visit) const
+{
+    for (const auto& [name, directory] : m_hostDirs)
+    {
+        if (!fs::exists(directory))
+            continue;
+        for (const auto& entry : fs::recursive_directory_iterator(directory))
+        {
+            const std::string path = fs::relative(entry.path(), directory).string();
+            std::string place = name + "/" + path;
+            ReplaceAll(place, "[_ORX_HotFolder_]", "[P]");
+            if (name == "hot" || name == "tool" || IsOurs(path))
+                visit(place, entry);
+        }
+    }
+}
+
 void Workstation::LayOut(const Files& files)
 {
     for (const auto& [place, text] : files)
@@ -204,11 +202,16 @@ void Workstation::LayOut(const Files& files)
         else if (place.back() != '#')
             WriteFile(HostPath(place), Expand(text));
     }
-    if (geteuid() == 0)
+    if (geteuid() == 0 && m_asOtherUser)
     {
-        for (const auto& entry : fs::recursive_directory_iterator(m_root))
-            lchown(entry.path().c_str(), OtherUser, OtherUser);
+        for (const auto& [name, directory] : m_hostDirs)
+            GiveAway(directory);
+        ForEachEntry([](const std::string&, const fs::directory_entry& entry)
+                     { GiveAway(entry.path()); });
     }
+    if (m_wine)
+        m_wine->ImportHives(ExpandedAt(*this, files, MachineHive),
+                            ExpandedAt(*this, files, UserHive));
     for (const auto& [place, text] : files)
     {
         if (place.back() == '#')
@@ -216,21 +219,34 @@ void Workstation::LayOut(const Files& files)
     }
 }
 
-RunResult Workstation::Start(const std::vector<std::string>& arguments, bool asOtherUser)
+RunResult Workstation::Start(const std::vector<std::string>& arguments)
 {
+    RunResult run;
+    if (m_wine)
+    {
+        std::vector<std::string> commandLine = {m_tokens["{tool}"] + "\\FolderUpgrade.exe"};
+        commandLine.insert(commandLine.end(), arguments.begin(), arguments.end());
+        std::vector<std::string> boxes;
+        run.exitStatus = m_wine->Start(commandLine, HostPath(LogPlace), boxes);
+        for (const std::string& logAtBox : boxes)
+            run.libraryLog += "A message box, with the run log\n" + logAtBox;
+        return run;
+    }
     const fs::path errors = m_root / "errors";
-    const int errorFile =
-        open(errors.c_str(), O_RDWR | O_CREAT | O_TRUNC | O_CLOEXEC, S_IRUSR | S_IWUSR);
-    setenv("XDG_CONFIG_HOME", m_hostDirs["user"].c_str(), 1);
-    setenv("XDG_CONFIG_DIRS", (m_hostDirs["machine"].string() + ":/nowhere").c_str(), 1);
-    setenv("LC_ALL", "C", 1);
+    std::vector<std::string> commandLine = {m_hostDirs["tool"] / "FolderUpgrade"};
+    commandLine.insert(commandLine.end(), arguments.begin(), arguments.end());
     const pid_t child = fork();
     if (child == 0)
-        Become(m_hostDirs["tool"] / "FolderUpgrade", arguments, errorFile, asOtherUser);
+    {
+        setenv("XDG_CONFIG_HOME", m_hostDirs["user"].c_str(), 1);
+        setenv("XDG_CONFIG_DIRS", (m_hostDirs["machine"].string() + ":/nowhere").c_str(), 1);
+        setenv("LC_ALL", "C", 1);
+        if (!std::freopen(errors.c_str(), "w", stderr))
+            _exit(125);
+        Become(commandLine, m_asOtherUser);
+    }
     int status = 0;
     waitpid(child, &status, 0);
-    close(errorFile);
-    RunResult run;
     run.exitStatus = WIFEXITED(status) ? WEXITSTATUS(status) : -WTERMSIG(status);
     run.libraryLog = ReadFile(errors);
     return run;
@@ -239,14 +255,9 @@ RunResult Workstation::Start(const std::vector<std::string>& arguments, bool asO
 Files Workstation::Snapshot() const
 {
     Files files;
-    for (const auto& [name, directory] : m_hostDirs)
-    {
-        if (!fs::exists(directory))
-            continue;
-        for (const auto& entry : fs::recursive_directory_iterator(directory))
+    ForEachEntry(
+        [&](const std::string& place, const fs::directory_entry& entry)
         {
-            std::string place = name + "/" + fs::relative(entry.path(), directory).string();
-            ReplaceAll(place, "[_ORX_HotFolder_]", "[P]");
             const std::string letters = Letters(entry.path());
             if (!letters.empty())
                 files[place + "#"] = letters;
@@ -254,7 +265,6 @@ Files Workstation::Snapshot() const
                 files[place + "/"];
             else
                 files[place] = ReadFile(entry.path());
-        }
-    }
+        });
     return files;
 }

@@ -13,6 +13,7 @@
 
 #include <filesystem>
 #include <map>
+#include <memory>
 #include <string>
 #include <vector>
 
@@ -21,20 +22,26 @@ using Files = std::map<std::string, std::string>; // place -> text
 struct RunResult
 {
     int exitStatus = 0;     // as a shell sees it
-    std::string libraryLog; // what the library reported by itself
+    std::string libraryLog; // what the library reported by itself, on Windows in message boxes
 };
+
+class Wine;
+
+extern const char* const LogPlace;
+extern const char* const MachineHive;
+extern const char* const UserHive;
 
 class Workstation
 {
   public:
-    Workstation();
+    /// With refusals in view, everything belongs to a user who is not root, and so does the run.
+    explicit Workstation(bool asOtherUser);
     ~Workstation();
     Workstation(const Workstation&) = delete;
     Workstation& operator=(const Workstation&) = delete;
 
     void LayOut(const Files& files);
-    /// Starts the executable, as a user who is not root where asked to.
-    RunResult Start(const std::vector<std::string>& arguments, bool asOtherUser);
+    RunResult Start(const std::vector<std::string>& arguments);
     /// Every file with its text, every directory and every attribute that is set.
     Files Snapshot() const;
     /// The text with everything in braces replaced; {icon:NAME} by the bytes of a shipped icon.
@@ -44,6 +51,11 @@ class Workstation
     std::filesystem::path HostPath(const std::string& place) const;
     void SetAttributes(const std::string& place, const std::string& letters) const;
 
+    template <typename Visit>
+    void ForEachEntry(Visit visit) const;
+
+    bool m_asOtherUser;
+    std::unique_ptr<Wine> m_wine;
     std::filesystem::path m_root;
     std::map<std::string, std::filesystem::path> m_hostDirs; // first part of a place -> directory
     Files m_tokens;

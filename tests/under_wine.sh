@@ -1,0 +1,57 @@
+#!/usr/bin/env bash
+# Runs the scenarios and the unit tests of the Windows program under Wine.
+#
+#     tests/under_wine.sh PROGRAM_DIR TEST_DIR
+#
+# PROGRAM_DIR holds FolderUpgrade.exe and tests/unit_test.exe, TEST_DIR this machine's
+# tests/scenario_test. Makes two prefixes, root's and another user's, and a display of its own.
+set -euo pipefail
+program_dir=$(realpath "$1")
+test_dir=$(realpath "$2")
+wine=/usr/lib/wine/wine64
+server=/usr/lib/wine/wineserver64
+
+if [ -z "${UNDER_WINE_DISPLAY:-}" ]; then
+    # Without access control, since the other user has no cookie.
+    UNDER_WINE_DISPLAY=1 exec xvfb-run -a -s "-ac -screen 0 1024x768x24" "$0" "$@"
+fi
+
+prefixes=$(mktemp -d)
+chmod 755 "$prefixes"
+export FOLDER_UPGRADE_WINDOWS_PROGRAM=$program_dir/FolderUpgrade.exe
+export FOLDER_UPGRADE_WINE_PREFIX=$prefixes/root FOLDER_UPGRADE_WINE_PREFIX_OTHER=$prefixes/other
+export WINEDEBUG=-all WINEDLLOVERRIDES="mscoree=;mshtml=" LC_ALL=C.UTF-8
+as_other() {
+    setpriv --reuid=65534 --regid=65534 --clear-groups env HOME="$prefixes/other" USER=nobody \
+        WINEPREFIX="$prefixes/other" XAUTHORITY=/dev/null "$@"
+}
+clean() {
+    WINEPREFIX=$prefixes/root "$server" -k || true
+    as_other "$server" -k || true
+    rm -rf "$prefixes"
+}
+trap clean EXIT
+
+mkdir "$prefixes/root" "$prefixes/other"
+chown 65534:65534 "$prefixes/other"
+cd "$prefixes" # where the other user may be
+WINEPREFIX=$prefixes/root timeout 120 "$wine" wineboot --init 2>/dev/null &
+as_other timeout 120 "$wine" wineboot --init 2>/dev/null &
+wait
+# The servers stay between the runs; each says no when wineboot's is still there, which does as well.
+WINEPREFIX=$prefixes/root "$server" -p || true
+as_other "$server" -p || true
+
+log=$prefixes/log
+WINEPREFIX=$prefixes/root timeout 300 "$wine" "$program_dir/tests/unit_test.exe" >"$log" 2>&1 || true
+timeout 1200 "$test_dir/tests/scenario_test" >>"$log" 2>&1 || true
+grep -vE '^\[( RUN|       OK)|^\[---' "$log" || true
+
+count() {
+    sed -n "s/^\[  $1 \] \([0-9]*\) tests\{0,1\}[.,].*/\1/p" "$log" | awk '{ sum += $1 } END { print sum + 0 }'
+}
+ran=$(sed -n 's/^\[==========\] \([0-9]*\) tests\{0,1\} from .* ran\..*/\1/p' "$log" | wc -l)
+failed=$(count 'FAILED ')
+[ "$ran" = 2 ] || failed=$((failed + 1)) # one of the two did not come to its end
+echo "$(count 'PASSED ') passed, $failed failed, $(count SKIPPED) skipped"
+[ "$failed" = 0 ]
