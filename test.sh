@@ -64,7 +64,7 @@ native() {
 
 windows() {
     cmake/install_packages.sh g++ cmake ninja-build libwxgtk3.2-dev libgtest-dev googletest \
-        g++-mingw-w64-x86-64-posix wine64 xvfb xauth xdotool
+        g++-mingw-w64-x86-64-posix wine64 xvfb xauth xdotool zip
     say "Building wxWidgets for Windows, unless it is there"
     cmake/windows/build_wxwidgets.sh
     say "Building the Windows program and this machine's"

@@ -40,7 +40,7 @@ void UpdateHotFolder(FolderUpgradeApp& app, const wxString& folder, int position
 
 bool FolderUpgradeApp::OnInit()
 {
-    wxTheAssertHandler = nullptr;
+    wxDisableAsserts();
     if (argc < 2)
         return false;
     if (argc == 3 && argv[2].CmpNoCase("V") == 0)

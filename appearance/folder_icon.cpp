@@ -49,8 +49,7 @@ std::uint32_t GetPackedShellVersion()
         DLLVERSIONINFO version = {};
         version.cbSize = sizeof version;
         // By way of void*, since the two types of function have nothing in common.
-        const auto getVersion =
-            reinterpret_cast<DLLGETVERSIONPROC>(reinterpret_cast<void*>(entry));
+        const auto getVersion = reinterpret_cast<DLLGETVERSIONPROC>(reinterpret_cast<void*>(entry));
         if (SUCCEEDED(getVersion(&version)))
             packed = (version.dwMajorVersion & 0xFFFF) << 16 | (version.dwMinorVersion & 0xFFFF);
     }

@@ -1,7 +1,8 @@
 # For our own code: every warning, and each an error.
 add_library(warnings INTERFACE)
 if(MSVC)
-    target_compile_options(warnings INTERFACE /W4 /WX)
+    target_compile_options(warnings INTERFACE "$<$<COMPILE_LANGUAGE:CXX>:/W4;/WX>")
 else()
-    target_compile_options(warnings INTERFACE -Wall -Wextra -Wpedantic -Wconversion -Wshadow -Werror)
+    target_compile_options(warnings INTERFACE
+        "$<$<COMPILE_LANGUAGE:CXX>:-Wall;-Wextra;-Wpedantic;-Wconversion;-Wshadow;-Werror>")
 endif()

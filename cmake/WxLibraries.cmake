@@ -10,7 +10,8 @@ find_package(wxWidgets 3.1 REQUIRED COMPONENTS ${wx_components})
 add_library(wx_libraries INTERFACE)
 # As system headers: they do not stand our warnings.
 target_include_directories(wx_libraries SYSTEM INTERFACE ${wxWidgets_INCLUDE_DIRS})
-target_compile_options(wx_libraries INTERFACE ${wxWidgets_CXX_FLAGS})
+target_compile_options(wx_libraries INTERFACE
+    "$<$<COMPILE_LANGUAGE:CXX>:${wxWidgets_CXX_FLAGS}>") # the resource compiler knows none of them
 target_compile_definitions(wx_libraries INTERFACE ${wxWidgets_DEFINITIONS} NDEBUG)
 target_link_directories(wx_libraries INTERFACE ${wxWidgets_LIBRARY_DIRS})
 target_link_libraries(wx_libraries INTERFACE ${wxWidgets_LIBRARIES})

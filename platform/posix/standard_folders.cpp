@@ -1,24 +1,16 @@
 #include "platform/standard_folders.h"
 
+#include "platform/posix/start_up.h"
+
 #include <wx/filename.h>
 #include <wx/utils.h>
 
-#include <clocale>
 #include <cstdlib>
 
 namespace
 {
 
-// File names are UTF-8 whatever the environment says. The library never sets a locale for a console
-// application, and in the "C" locale it loses names that are not ASCII: those of the standard
-// folders, of the executable and of the command line, so this has to happen before main().
-const struct FileNamesAreUtf8
-{
-    FileNamesAreUtf8()
-    {
-        std::setlocale(LC_CTYPE, "C.UTF-8");
-    }
-} fileNamesAreUtf8;
+const StartUp startUp;
 
 wxString FromEnvironment(const char* name)
 {

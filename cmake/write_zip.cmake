@@ -1,0 +1,29 @@
+# Packs the staged files the same to the byte whenever, wherever and by whom the same commit is
+# packed. CPack's own zip files tell the order of the files on the disk and the user's number.
+execute_process(
+    COMMAND git -C ${CMAKE_CURRENT_LIST_DIR} log -1 --format=%ct
+    OUTPUT_VARIABLE date OUTPUT_STRIP_TRAILING_WHITESPACE ERROR_QUIET RESULT_VARIABLE failed)
+if(failed OR NOT date)
+    set(date 315619200) # no commit known: 2 January 1980, the first day a zip file tells anywhere
+endif()
+set(ENV{SOURCE_DATE_EPOCH} ${date})
+set(ENV{TZ} UTC0)
+
+file(GLOB_RECURSE files LIST_DIRECTORIES false RELATIVE ${CPACK_TEMPORARY_DIRECTORY}
+     ${CPACK_TEMPORARY_DIRECTORY}/*)
+set(package ${CPACK_TOPLEVEL_DIRECTORY}/${CPACK_PACKAGE_FILE_NAME}.zip)
+file(REMOVE ${package})
+find_program(zip zip)
+find_program(touch touch)
+function(run)
+    execute_process(COMMAND ${ARGV} WORKING_DIRECTORY ${CPACK_TEMPORARY_DIRECTORY}
+                    COMMAND_ERROR_IS_FATAL ANY)
+endfunction()
+if(zip AND touch)
+    run(${touch} --date=@${date} ${files})
+    run(${zip} -X -q ${package} ${files})
+else()
+    message(STATUS "Without zip and touch the package depends on who packs it")
+    run(${CMAKE_COMMAND} -E tar cf ${package} --format=zip ${files})
+endif()
+set(CPACK_EXTERNAL_BUILT_PACKAGES ${package})

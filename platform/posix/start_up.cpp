@@ -1,0 +1,29 @@
+// What has to be so before the library starts.
+#include "platform/posix/start_up.h"
+
+#include <algorithm>
+#include <clocale>
+#include <sys/resource.h>
+
+namespace
+{
+
+// As much as the Windows program reserves: the library destroys documents by recursion.
+constexpr rlim_t StackBytes = 64UL * 1024 * 1024;
+
+void RaiseStackLimit()
+{
+    rlimit limit = {};
+    if (getrlimit(RLIMIT_STACK, &limit) != 0 || limit.rlim_cur >= StackBytes)
+        return;
+    limit.rlim_cur = std::min(StackBytes, limit.rlim_max);
+    setrlimit(RLIMIT_STACK, &limit);
+}
+
+} // namespace
+
+StartUp::StartUp()
+{
+    std::setlocale(LC_CTYPE, "C.UTF-8");
+    RaiseStackLimit();
+}
