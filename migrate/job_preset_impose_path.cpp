@@ -80,12 +80,19 @@ const char* ReadPreset(wxFFile& file, wxString& text)
         return "cannot be read";
     if (IsEmptyText(bytes))
         return nullptr;
-    text = wxString(bytes, wxConvAuto());
+    wxString(bytes, wxConvAuto()).swap(text); // to assign it would copy it
     if (text.empty())
         return "cannot be decoded";
     if (wxTextBuffer::typeDefault == wxTextFileType_Dos)
         text.Replace("\r\n", "\n");
     return IsUnicodeText(text) ? nullptr : "cannot be encoded again";
+}
+
+// A file that did not close well counts as open for the library, which then closes it once more.
+void CloseOnce(wxFFile& file)
+{
+    if (!file.Close())
+        file.Detach();
 }
 
 void UpdatePreset(const wxString& path, const wxString& from, const wxString& to)
@@ -95,15 +102,14 @@ void UpdatePreset(const wxString& path, const wxString& from, const wxString& to
         return RunLog("Unable to open preset.xml for read : " + path, NoCount);
     wxString text;
     if (const char* reason = ReadPreset(file, text))
-        return RunLog(wxString::Format("preset.xml left as it is (%s): %s", reason, path),
-                      NoCount);
+        return RunLog(wxString::Format("preset.xml left as it is (%s): %s", reason, path), NoCount);
     MovePresetPaths(text, from, to);
-    file.Close();
+    CloseOnce(file);
 
     if (!file.Open(path, "w"))
         return RunLog("Unable to open preset.xml for write : " + path, NoCount);
     file.Write(text, wxConvAuto());
-    file.Close();
+    CloseOnce(file);
     RunLog("Updated preset.xml  : " + path, NoCount);
 }
 

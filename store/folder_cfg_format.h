@@ -3,27 +3,29 @@
 // An XML 1.0 document in UTF-8. The root element carries the attributes of HotFolderSettings; below
 // it stand the sections, in the order of their names here. Inside JobSetting, ImposeSetting and
 // PreflightSettings attributes are told apart by their position.
+//
+// The names are wide, as the library's strings are: converting them took as long as half a load.
 #pragma once
 
 namespace FolderCfg
 {
 
-constexpr const char* Root = "HotFolder";
+constexpr const wchar_t* Root = L"HotFolder";
 
-constexpr const char* InputFormatsSection = "InputFormatsSummary";
-constexpr const char* PathsSection = "Paths";
-constexpr const char* JobSettingSection = "JobSetting";
-constexpr const char* ImposeSettingSection = "ImposeSetting";
-constexpr const char* FilterSettingSection = "FilterSetting";
-constexpr const char* PreflightSection = "PreflightSettings";
+constexpr const wchar_t* InputFormatsSection = L"InputFormatsSummary";
+constexpr const wchar_t* PathsSection = L"Paths";
+constexpr const wchar_t* JobSettingSection = L"JobSetting";
+constexpr const wchar_t* ImposeSettingSection = L"ImposeSetting";
+constexpr const wchar_t* FilterSettingSection = L"FilterSetting";
+constexpr const wchar_t* PreflightSection = L"PreflightSettings";
 
-constexpr const char* Failfolder = "Failfolder";
-constexpr const char* Workfolder = "Workfolder";
-constexpr const char* Movefolder = "Movefolder";
-constexpr const char* Hotfolder = "Hotfolder";
+constexpr const wchar_t* Failfolder = L"Failfolder";
+constexpr const wchar_t* Workfolder = L"Workfolder";
+constexpr const wchar_t* Movefolder = L"Movefolder";
+constexpr const wchar_t* Hotfolder = L"Hotfolder";
 
-constexpr const char* ShortName = "ShortName";
-constexpr const char* DisplayName = "DisplayName";
+constexpr const wchar_t* ShortName = L"ShortName";
+constexpr const wchar_t* DisplayName = L"DisplayName";
 
 /// The level of the filter setting in the document; the root's is 0.
 constexpr int FilterSettingLevel = 1;

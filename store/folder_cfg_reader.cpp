@@ -5,6 +5,7 @@
 #include "store/xml_tree.h"
 
 #include <wx/filename.h>
+#include <wx/wfstream.h>
 
 #include <array>
 #include <limits>
@@ -12,8 +13,8 @@
 namespace
 {
 
-const char* const PrivateDirName = "[_ORX_HotFolder_]";
-const char* const FolderCfgName = "Folder.cfg";
+const wchar_t* const PrivateDirName = L"[_ORX_HotFolder_]";
+const wchar_t* const FolderCfgName = L"Folder.cfg";
 
 // The base-10 number at the front of the text; 0 without one and for one beyond 32 bits, which is
 // what a 32-bit long makes of it everywhere.
@@ -22,8 +23,7 @@ std::int32_t ReadNumber(const wxString& text)
     using Limits = std::numeric_limits<std::int32_t>;
     long number = 0;
     text.ToLong(&number);
-    return number < Limits::min() || number > Limits::max() ? 0
-                                                            : static_cast<std::int32_t>(number);
+    return number < Limits::min() || number > Limits::max() ? 0 : static_cast<std::int32_t>(number);
 }
 
 bool ReadNumericFlag(const wxString& text)
@@ -33,7 +33,7 @@ bool ReadNumericFlag(const wxString& text)
 
 bool ReadTextFlag(const wxString& text)
 {
-    return wxString(text).Trim() == "1";
+    return wxString(text).Trim() == L"1";
 }
 
 // Looks attributes up one after another until the first that is absent.
@@ -44,13 +44,13 @@ class AttributeChain
     {
     }
 
-    AttributeChain& Text(const char* name, wxString& field)
+    AttributeChain& Text(const wchar_t* name, wxString& field)
     {
         m_isWhole = m_isWhole && GetAttribute(m_attributes, name, field);
         return *this;
     }
 
-    AttributeChain& Flag(const char* name, bool& field, bool (*read)(const wxString&))
+    AttributeChain& Flag(const wchar_t* name, bool& field, bool (*read)(const wxString&))
     {
         wxString value;
         if (Text(name, value).m_isWhole)
@@ -71,65 +71,75 @@ class AttributeChain
 int ReadRootAttributes(const AttributeMap& attributes, HotFolderSettings& settings)
 {
     AttributeChain chain(attributes);
-    chain.Text("name", settings.name)
-        .Text("description", settings.description)
-        .Text("server_ip", settings.server_ip)
-        .Text("server_name", settings.server_name);
+    chain.Text(L"name", settings.name)
+        .Text(L"description", settings.description)
+        .Text(L"server_ip", settings.server_ip)
+        .Text(L"server_name", settings.server_name);
     const int result = chain.IsWhole() ? 1 : -1;
 
-    chain.Flag("Enable", settings.Enable, ReadTextFlag)
-        .Text("BaseVirtualPrinter", settings.BaseVirtualPrinter)
-        .Text("BaseVirtualPrinterName", settings.BaseVirtualPrinterName)
-        .Text("BaseVirtualPrinterDisplayName", settings.BaseVirtualPrinterDisplayName)
-        .Text("HFPresetName", settings.HFPresetName)
-        .Flag("Centralized", settings.Centralized, ReadTextFlag)
-        .Flag("Isjobpresetattached", settings.Isjobpresetattached, ReadTextFlag)
-        .Flag("IsCustomInterval", settings.IsCustomInterval, ReadTextFlag)
-        .Text("TimeInterval", settings.TimeInterval)
-        .Text("PPDVersion", settings.PPDVersion)
-        .Text("ServerTypeAndJPDefaultKeyInfo", settings.ServerTypeAndJPDefaultKeyInfo);
+    chain.Flag(L"Enable", settings.Enable, ReadTextFlag)
+        .Text(L"BaseVirtualPrinter", settings.BaseVirtualPrinter)
+        .Text(L"BaseVirtualPrinterName", settings.BaseVirtualPrinterName)
+        .Text(L"BaseVirtualPrinterDisplayName", settings.BaseVirtualPrinterDisplayName)
+        .Text(L"HFPresetName", settings.HFPresetName)
+        .Flag(L"Centralized", settings.Centralized, ReadTextFlag)
+        .Flag(L"Isjobpresetattached", settings.Isjobpresetattached, ReadTextFlag)
+        .Flag(L"IsCustomInterval", settings.IsCustomInterval, ReadTextFlag)
+        .Text(L"TimeInterval", settings.TimeInterval)
+        .Text(L"PPDVersion", settings.PPDVersion)
+        .Text(L"ServerTypeAndJPDefaultKeyInfo", settings.ServerTypeAndJPDefaultKeyInfo);
     if (chain.IsWhole())
     {
         wxString version;
-        const bool found = GetAttribute(attributes, "server_version", version);
+        const bool found = GetAttribute(attributes, L"server_version", version);
         settings.server_version = found ? ReadNumber(version) : -1;
     }
-    chain.Text("server_textversion", settings.server_textversion)
-        .Text("server_type", settings.server_type)
-        .Text("Quickset", settings.Quickset)
-        .Flag("Quickset_Supported", settings.Quickset_Supported, ReadNumericFlag)
-        .Flag("Quickset_Enabled", settings.Quickset_Enabled, ReadNumericFlag)
-        .Flag("IsWidthBased", settings.IsWidthBased, ReadNumericFlag);
+    chain.Text(L"server_textversion", settings.server_textversion)
+        .Text(L"server_type", settings.server_type)
+        .Text(L"Quickset", settings.Quickset)
+        .Flag(L"Quickset_Supported", settings.Quickset_Supported, ReadNumericFlag)
+        .Flag(L"Quickset_Enabled", settings.Quickset_Enabled, ReadNumericFlag)
+        .Flag(L"IsWidthBased", settings.IsWidthBased, ReadNumericFlag);
     return result;
 }
 
-const wxXmlNode* FindSection(const wxXmlNode* root, const char* name)
+const wxXmlNode* FindSection(const wxXmlNode* root, const wchar_t* name)
 {
     return root ? FindElement(root, name, true) : nullptr;
 }
 
-// The values of a node's first four attributes, and how many of them it has.
+// The values of a node's first four attributes, which stay the node's, and how many of them it has.
 struct Positional
 {
     explicit Positional(const wxXmlNode& node)
     {
         for (const wxXmlAttribute* attribute = node.GetAttributes();
              attribute && count < values.size(); attribute = attribute->GetNext())
-            values[count++] = attribute->GetValue();
+            values[count++] = &attribute->GetValue();
     }
 
-    std::array<wxString, 4> values;
+    // Copies the value at that position, where there is one.
+    void Get(size_t position, wxString& value) const
+    {
+        if (position < count)
+            value = *values[position];
+    }
+
+    std::array<const wxString*, 4> values{};
     size_t count = 0;
 };
 
-JobSettingEntry MakeEntry(const Positional& attributes, const JobSettingTable& /*table*/)
+void FillEntry(const Positional& attributes, JobSettingEntry& entry)
 {
-    return {attributes.values[2], attributes.values[1], attributes.values[3]};
+    attributes.Get(1, entry.Value);
+    attributes.Get(2, entry.KeyDisplayValue);
+    attributes.Get(3, entry.LocDisplayValue);
 }
 
-ImposeSettingEntry MakeEntry(const Positional& attributes, const ImposeSettingTable& /*table*/)
+void FillEntry(const Positional& attributes, ImposeSettingEntry& entry)
 {
-    return {attributes.values[2], attributes.values[1]};
+    attributes.Get(1, entry.Value);
+    attributes.Get(2, entry.KeyDisplayValue);
 }
 
 template <typename Table>
@@ -141,13 +151,16 @@ void ReadKeyValues(const wxXmlNode* section, Table& table)
     for (const wxXmlNode* child = section->GetChildren(); child; child = child->GetNext())
     {
         const Positional attributes(*child);
-        if (attributes.count >= 2)
-            read.emplace(attributes.values[0], MakeEntry(attributes, table));
+        if (attributes.count < 2)
+            continue;
+        const auto [place, isNew] = read.try_emplace(*attributes.values[0]);
+        if (isNew)
+            FillEntry(attributes, place->second);
     }
     table.swap(read);
 }
 
-void ReadPath(const wxXmlNode& section, const char* name, wxString& path)
+void ReadPath(const wxXmlNode& section, const wchar_t* name, wxString& path)
 {
     const wxXmlNode* element = FirstNamed(section.GetChildren(), name);
     if (element && element->GetAttributes())
@@ -172,15 +185,14 @@ wxString PrivateDirPath(const wxString& hotFolder)
 
 wxString FolderCfgPath(const wxString& hotFolder)
 {
-    wxFileName file;
-    file.AssignDir(PrivateDirPath(hotFolder));
-    file.SetName(FolderCfgName);
-    return file.GetFullPath();
+    return PrivateDirPath(hotFolder) + FolderCfgName;
 }
 
-bool LoadFolderCfg(const wxString& path, wxXmlDocument& document)
+bool LoadFolderCfg(const wxString& path, wxXmlDocument& document, int flags)
 {
-    return document.Load(path, "UTF-8") && document.GetRoot();
+    // By name it would come in reads of a kilobyte.
+    wxFFileInputStream file(path, L"rb");
+    return file.IsOk() && document.Load(file, L"UTF-8", flags) && document.GetRoot();
 }
 
 int LoadHotFolderSettings(const wxString& path, HotFolderSettings& settings, bool* loaded)
@@ -207,7 +219,7 @@ int ReadFilterSetting(const wxString& path, wxXmlNode& node, bool* loaded)
 {
     Report(loaded, false);
     wxXmlDocument document;
-    if (!wxFileExists(path) || !LoadFolderCfg(path, document))
+    if (!wxFileExists(path) || !LoadFolderCfg(path, document, wxXMLDOC_KEEP_WHITESPACE_NODES))
         return 0;
     Report(loaded, true);
     const wxXmlNode* section = FindSection(document.GetRoot(), FolderCfg::FilterSettingSection);
@@ -215,6 +227,7 @@ int ReadFilterSetting(const wxString& path, wxXmlNode& node, bool* loaded)
     {
         node = wxXmlNode();
         CopyTree(*section, node);
+        RemoveIgnoredBlanks(node);
         RemoveSavedIndentation(node, FolderCfg::FilterSettingLevel);
     }
     return 0;
@@ -270,8 +283,11 @@ void ReadPreflightSettings(const wxXmlNode* root, PreflightSettingList& list)
     for (const wxXmlNode* child = section->GetChildren(); child; child = child->GetNext())
     {
         const Positional attributes(*child);
-        if (attributes.count >= 1)
-            read.push_back({attributes.values[0], attributes.values[1]});
+        if (attributes.count == 0)
+            continue;
+        PreflightSetting& setting = read.emplace_back();
+        attributes.Get(0, setting.Key);
+        attributes.Get(1, setting.Value);
     }
     list.swap(read);
 }

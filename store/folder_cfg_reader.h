@@ -15,8 +15,8 @@ wxString PrivateDirPath(const wxString& hotFolder);
 wxString FolderCfgPath(const wxString& hotFolder);
 
 /// Loads the document with wxXmlDocument::Load; false when it does not load or has no root.
-/// The library logs what it cannot open or parse.
-bool LoadFolderCfg(const wxString& path, wxXmlDocument& document);
+/// The library logs what it cannot open or parse. flags are those of wxXmlDocument::Load.
+bool LoadFolderCfg(const wxString& path, wxXmlDocument& document, int flags = wxXMLDOC_NONE);
 
 /// Reads the root attributes and the input formats.
 ///

@@ -5,7 +5,7 @@
 
 #include <wx/wfstream.h>
 
-#include <memory>
+#include <string>
 
 namespace
 {
@@ -13,41 +13,35 @@ namespace
 constexpr int IndentationStep = 2;
 constexpr size_t WriteBufferBytes = 64 * 1024;
 
-wxString FormatNumericFlag(bool flag)
+const wchar_t* FormatFlag(bool flag)
 {
-    return wxString::Format("%d", flag ? 1 : 0);
-}
-
-wxString FormatTextFlag(bool flag)
-{
-    return flag ? "1" : "0";
+    return flag ? L"1" : L"0";
 }
 
 void AddRootAttributes(wxXmlNode& root, const HotFolderSettings& settings)
 {
-    root.AddAttribute("name", settings.name);
-    root.AddAttribute("description", settings.description);
-    root.AddAttribute("server_ip", settings.server_ip);
-    root.AddAttribute("server_name", settings.server_name);
-    root.AddAttribute("server_version",
-                      wxString::Format("%ld", static_cast<long>(settings.server_version)));
-    root.AddAttribute("server_textversion", settings.server_textversion);
-    root.AddAttribute("server_type", settings.server_type);
-    root.AddAttribute("BaseVirtualPrinter", settings.BaseVirtualPrinter);
-    root.AddAttribute("BaseVirtualPrinterName", settings.BaseVirtualPrinterName);
-    root.AddAttribute("BaseVirtualPrinterDisplayName", settings.BaseVirtualPrinterDisplayName);
-    root.AddAttribute("HFPresetName", settings.HFPresetName);
-    root.AddAttribute("PPDVersion", settings.PPDVersion);
-    root.AddAttribute("ServerTypeAndJPDefaultKeyInfo", settings.ServerTypeAndJPDefaultKeyInfo);
-    root.AddAttribute("Quickset_Supported", FormatNumericFlag(settings.Quickset_Supported));
-    root.AddAttribute("Quickset_Enabled", FormatNumericFlag(settings.Quickset_Enabled));
-    root.AddAttribute("Quickset", settings.Quickset);
-    root.AddAttribute("IsWidthBased", FormatNumericFlag(settings.IsWidthBased));
-    root.AddAttribute("Enable", FormatTextFlag(settings.Enable));
-    root.AddAttribute("Centralized", FormatTextFlag(settings.Centralized));
-    root.AddAttribute("Isjobpresetattached", FormatTextFlag(settings.Isjobpresetattached));
-    root.AddAttribute("IsCustomInterval", FormatTextFlag(settings.IsCustomInterval));
-    root.AddAttribute("TimeInterval", settings.TimeInterval);
+    root.AddAttribute(L"name", settings.name);
+    root.AddAttribute(L"description", settings.description);
+    root.AddAttribute(L"server_ip", settings.server_ip);
+    root.AddAttribute(L"server_name", settings.server_name);
+    root.AddAttribute(L"server_version", std::to_wstring(settings.server_version));
+    root.AddAttribute(L"server_textversion", settings.server_textversion);
+    root.AddAttribute(L"server_type", settings.server_type);
+    root.AddAttribute(L"BaseVirtualPrinter", settings.BaseVirtualPrinter);
+    root.AddAttribute(L"BaseVirtualPrinterName", settings.BaseVirtualPrinterName);
+    root.AddAttribute(L"BaseVirtualPrinterDisplayName", settings.BaseVirtualPrinterDisplayName);
+    root.AddAttribute(L"HFPresetName", settings.HFPresetName);
+    root.AddAttribute(L"PPDVersion", settings.PPDVersion);
+    root.AddAttribute(L"ServerTypeAndJPDefaultKeyInfo", settings.ServerTypeAndJPDefaultKeyInfo);
+    root.AddAttribute(L"Quickset_Supported", FormatFlag(settings.Quickset_Supported));
+    root.AddAttribute(L"Quickset_Enabled", FormatFlag(settings.Quickset_Enabled));
+    root.AddAttribute(L"Quickset", settings.Quickset);
+    root.AddAttribute(L"IsWidthBased", FormatFlag(settings.IsWidthBased));
+    root.AddAttribute(L"Enable", FormatFlag(settings.Enable));
+    root.AddAttribute(L"Centralized", FormatFlag(settings.Centralized));
+    root.AddAttribute(L"Isjobpresetattached", FormatFlag(settings.Isjobpresetattached));
+    root.AddAttribute(L"IsCustomInterval", FormatFlag(settings.IsCustomInterval));
+    root.AddAttribute(L"TimeInterval", settings.TimeInterval);
 }
 
 // One section under construction. Each child goes behind the one before it, which the section
@@ -55,18 +49,18 @@ void AddRootAttributes(wxXmlNode& root, const HotFolderSettings& settings)
 class Section
 {
   public:
-    Section(wxXmlNode& root, const char* name) : m_node(Append(root, name, nullptr))
+    Section(wxXmlNode& root, const wxString& name) : m_node(Append(root, name, nullptr))
     {
     }
 
-    wxXmlNode& Add(const char* name)
+    wxXmlNode& Add(const wxString& name)
     {
         m_last = Append(*m_node, name, m_last);
         return *m_last;
     }
 
   private:
-    static wxXmlNode* Append(wxXmlNode& parent, const char* name, wxXmlNode* last)
+    static wxXmlNode* Append(wxXmlNode& parent, const wxString& name, wxXmlNode* last)
     {
         auto* node = new wxXmlNode(wxXML_ELEMENT_NODE, name); // the parent's from here on
         if (last || !parent.GetChildren())
@@ -78,6 +72,16 @@ class Section
 
     wxXmlNode* m_node;
     wxXmlNode* m_last = nullptr;
+};
+
+// Made once a section and not once an entry.
+struct KeyValueNames
+{
+    wxString element = L"KEYVALUE";
+    wxString key = L"Key";
+    wxString value = L"Value";
+    wxString keyDisplayValue = L"KeyDisplayValue";
+    wxString locDisplayValue = L"LocDisplayValue";
 };
 
 void WriteFilterSetting(wxXmlNode& root, const wxXmlNode& filterSetting)
@@ -98,7 +102,7 @@ void WriteInputFormats(wxXmlNode* root, const std::vector<InputFormat>& formats)
     Section section(*root, FolderCfg::InputFormatsSection);
     for (const InputFormat& format : formats)
     {
-        wxXmlNode& child = section.Add("InputFormat");
+        wxXmlNode& child = section.Add(L"InputFormat");
         child.AddAttribute(FolderCfg::ShortName, format.ShortName);
         child.AddAttribute(FolderCfg::DisplayName, format.DisplayName);
     }
@@ -109,10 +113,10 @@ void WritePaths(wxXmlNode* root, const HotFolderPaths& paths)
     if (!root)
         return;
     Section section(*root, FolderCfg::PathsSection);
-    section.Add(FolderCfg::Failfolder).AddAttribute("path", paths.Failfolder);
-    section.Add(FolderCfg::Workfolder).AddAttribute("path", paths.Workfolder);
-    section.Add(FolderCfg::Movefolder).AddAttribute("path", paths.Movefolder);
-    section.Add(FolderCfg::Hotfolder).AddAttribute("path", paths.Hotfolder);
+    section.Add(FolderCfg::Failfolder).AddAttribute(L"path", paths.Failfolder);
+    section.Add(FolderCfg::Workfolder).AddAttribute(L"path", paths.Workfolder);
+    section.Add(FolderCfg::Movefolder).AddAttribute(L"path", paths.Movefolder);
+    section.Add(FolderCfg::Hotfolder).AddAttribute(L"path", paths.Hotfolder);
 }
 
 void WriteJobSettings(wxXmlNode* root, const JobSettingTable& table)
@@ -120,13 +124,14 @@ void WriteJobSettings(wxXmlNode* root, const JobSettingTable& table)
     if (!root)
         return;
     Section section(*root, FolderCfg::JobSettingSection);
+    const KeyValueNames names;
     for (const auto& [key, entry] : table)
     {
-        wxXmlNode& child = section.Add("KEYVALUE");
-        child.AddAttribute("Key", key);
-        child.AddAttribute("Value", entry.Value);
-        child.AddAttribute("KeyDisplayValue", entry.KeyDisplayValue);
-        child.AddAttribute("LocDisplayValue", entry.LocDisplayValue);
+        wxXmlNode& child = section.Add(names.element);
+        child.AddAttribute(names.key, key);
+        child.AddAttribute(names.value, entry.Value);
+        child.AddAttribute(names.keyDisplayValue, entry.KeyDisplayValue);
+        child.AddAttribute(names.locDisplayValue, entry.LocDisplayValue);
     }
 }
 
@@ -135,12 +140,13 @@ void WriteImposeSettings(wxXmlNode* root, const ImposeSettingTable& table)
     if (!root)
         return;
     Section section(*root, FolderCfg::ImposeSettingSection);
+    const KeyValueNames names;
     for (const auto& [key, entry] : table)
     {
-        wxXmlNode& child = section.Add("KEYVALUE");
-        child.AddAttribute("Key", key);
-        child.AddAttribute("Value", entry.Value);
-        child.AddAttribute("KeyDisplayValue", entry.KeyDisplayValue);
+        wxXmlNode& child = section.Add(names.element);
+        child.AddAttribute(names.key, key);
+        child.AddAttribute(names.value, entry.Value);
+        child.AddAttribute(names.keyDisplayValue, entry.KeyDisplayValue);
     }
 }
 
@@ -151,9 +157,9 @@ void WritePreflightSettings(wxXmlNode* root, const PreflightSettingList& list)
     Section section(*root, FolderCfg::PreflightSection);
     for (const PreflightSetting& setting : list)
     {
-        wxXmlNode& child = section.Add("Preflight");
-        child.AddAttribute("Key", setting.Key);
-        child.AddAttribute("Value", setting.Value);
+        wxXmlNode& child = section.Add(L"Preflight");
+        child.AddAttribute(L"Key", setting.Key);
+        child.AddAttribute(L"Value", setting.Value);
     }
 }
 
@@ -174,13 +180,14 @@ int SaveHotFolderSettings(const wxString& path, const HotFolderSettings& setting
     WriteFilterSetting(*root, filterSetting);
     WritePreflightSettings(root, preflightSettings);
 
-    // Saving by name would give the same bytes in a write call for each token.
-    wxFileOutputStream file(path);
+    // Saving by name would give the same bytes in a write call for each token. Not through a
+    // wxFileOutputStream, which the buffer's end would make wait for the disk.
+    wxFFileOutputStream file(path, "wb");
     if (!file.IsOk())
         return 0;
     wxBufferedOutputStream buffered(file, WriteBufferBytes);
     document.Save(buffered, IndentationStep);
     buffered.Close();
-    file.Close();
+    // The end of the scope closes the file: the library closes what did not close well once more.
     return 0;
 }

@@ -7,7 +7,8 @@
 
 #include <map>
 
-/// One element's attributes by name, in code unit order; a copy that does not refer to the document.
+/// One element's attributes by name, in code unit order; a copy that does not refer to the
+/// document.
 using AttributeMap = std::map<wxString, wxString>;
 
 /// The first element of that name below the node, or none. The node's direct children come before

@@ -59,6 +59,34 @@ wxXmlNode* AppendCopy(const wxXmlNode& source, wxXmlNode& parent, wxXmlNode* las
     return copy.release(); // the parent's from here on
 }
 
+const char* const WhiteSpace = " \t\r\n";
+
+bool IsBlankText(const wxXmlNode& node)
+{
+    return node.GetType() == wxXML_TEXT_NODE &&
+           node.GetContent().find_first_not_of(WhiteSpace) == wxString::npos;
+}
+
+void RemoveBlankTexts(wxXmlNode& parent)
+{
+    wxXmlNode* last = nullptr; // of those that stay
+    wxXmlNode* next = nullptr;
+    for (wxXmlNode* child = parent.GetChildren(); child; child = next)
+    {
+        next = child->GetNext();
+        if (!IsBlankText(*child))
+        {
+            last = child;
+            continue;
+        }
+        if (last)
+            last->SetNext(next);
+        else
+            parent.SetChildren(next);
+        delete child;
+    }
+}
+
 } // namespace
 
 void CopyTree(const wxXmlNode& source, wxXmlNode& target)
@@ -92,6 +120,21 @@ int CountLevels(const wxXmlNode& root)
     return deepest;
 }
 
+void RemoveIgnoredBlanks(wxXmlNode& root)
+{
+    int level = 0;
+    for (wxXmlNode* node = &root; node; node = NextNode(node, root, level))
+    {
+        RemoveBlankTexts(*node);
+        if (node->GetType() != wxXML_TEXT_NODE)
+            continue;
+        const wxString& text = node->GetContent();
+        const size_t lineFeed = text.rfind('\n', text.find_first_not_of(WhiteSpace));
+        if (lineFeed != wxString::npos)
+            node->SetContent(text.Mid(lineFeed + 1));
+    }
+}
+
 void RemoveSavedIndentation(wxXmlNode& root, int level)
 {
     for (wxXmlNode* node = &root; node; node = NextNode(node, root, level))
@@ -111,9 +154,11 @@ bool IsXmlText(const wxString& text)
 {
     if (!IsUnicodeText(text))
         return false;
-    return std::none_of(text.begin(), text.end(), [](wxUniChar character) {
-        const auto code = character.GetValue();
-        return (code < 0x20 && code != '\t' && code != '\n' && code != '\r') || code == 0xFFFE ||
-               code == 0xFFFF;
-    });
+    return std::none_of(text.begin(), text.end(),
+                        [](wxUniChar character)
+                        {
+                            const auto code = character.GetValue();
+                            return (code < 0x20 && code != '\t' && code != '\n' && code != '\r') ||
+                                   code == 0xFFFE || code == 0xFFFF;
+                        });
 }

@@ -40,7 +40,8 @@ bool WriteStored(const std::string& path, DWORD attributes)
 
 mode_t FileModeMask()
 {
-    static const mode_t mask = []() {
+    static const mode_t mask = []()
+    {
         const mode_t current = umask(0);
         umask(current);
         return current;

@@ -2,6 +2,7 @@
 //
 // The text is handled in units, a byte each or, behind a UTF-16LE byte-order mark, two, so that
 // bytes of any encoding come out as they went in. Of a repeated section or key the first counts.
+#include "platform/posix/file_bytes.h"
 #include "platform/posix/native_path.h"
 #include "platform/system.h"
 
@@ -28,37 +29,21 @@ struct Text
     std::string rest; // half a unit at the end, if any
 };
 
-bool IsReadOnly(const std::string& path)
+// The bytes of a file that can be written; none of one that is not there. False for a read-only file,
+// whoever asks, and for what cannot be read.
+bool ReadForWriting(const std::string& path, std::string& bytes)
 {
     struct stat status = {};
-    return stat(path.c_str(), &status) == 0 &&
-           (status.st_mode & (S_IWUSR | S_IWGRP | S_IWOTH)) == 0;
-}
-
-bool Exists(const std::string& path)
-{
-    struct stat status = {};
-    return stat(path.c_str(), &status) == 0;
-}
-
-bool ReadBytes(const std::string& path, std::string& bytes)
-{
-    struct stat status = {};
-    if (stat(path.c_str(), &status) != 0 || !S_ISREG(status.st_mode))
-        return false;
-    wxFFile file(wxString::FromUTF8(path), "rb");
-    if (!file.IsOpened())
-        return false;
-    bytes.resize(static_cast<size_t>(status.st_size));
-    bytes.resize(file.Read(bytes.data(), bytes.size()));
-    return !file.Error() && bytes.size() == static_cast<size_t>(status.st_size);
+    if (stat(path.c_str(), &status) != 0)
+        return true;
+    return (status.st_mode & (S_IWUSR | S_IWGRP | S_IWOTH)) != 0 && ReadFileBytes(path, bytes);
 }
 
 bool WriteBytes(const std::string& path, const std::string& bytes)
 {
     wxFFile file(wxString::FromUTF8(path), "wb");
     return file.IsOpened() && file.Write(bytes.data(), bytes.size()) == bytes.size() &&
-           file.Close();
+           file.Flush();
 }
 
 Text Decode(const std::string& bytes)
@@ -66,7 +51,10 @@ Text Decode(const std::string& bytes)
     Text text;
     text.isUtf16 = bytes.compare(0, 2, "\xFF\xFE") == 0;
     text.hasUtf8Mark = bytes.compare(0, 3, "\xEF\xBB\xBF") == 0;
-    const auto byteAt = [&](size_t i) { return static_cast<unsigned char>(bytes[i]); };
+    const auto byteAt = [&](size_t i)
+    {
+        return static_cast<unsigned char>(bytes[i]);
+    };
     if (!text.isUtf16)
     {
         for (size_t i = text.hasUtf8Mark ? 3 : 0; i < bytes.size(); ++i)
@@ -224,7 +212,7 @@ BOOL WritePrivateProfileStringW(LPCWSTR section, LPCWSTR key, LPCWSTR value, LPC
 {
     const std::string native = NativePath(path);
     std::string bytes;
-    if (IsReadOnly(native) || (Exists(native) && !ReadBytes(native, bytes)))
+    if (!ReadForWriting(native, bytes))
         return 0;
     Text text = Decode(bytes);
     const Units newValue = ToUnits(value, text.isUtf16);
@@ -251,11 +239,10 @@ DWORD GetPrivateProfileStringW(LPCWSTR section, LPCWSTR key, LPCWSTR defaultValu
 {
     std::string bytes;
     wxString value = defaultValue;
-    if (ReadBytes(NativePath(path), bytes))
+    if (ReadFileBytes(NativePath(path), bytes))
     {
         const Text text = Decode(bytes);
-        Place place =
-            Find(text.units, ToUnits(section, text.isUtf16), ToUnits(key, text.isUtf16));
+        Place place = Find(text.units, ToUnits(section, text.isUtf16), ToUnits(key, text.isUtf16));
         SkipBlanks(text.units, place.valueBegin, place.valueEnd);
         if (place.hasKey)
             value = FromUnits(text, place.valueBegin, place.valueEnd);

@@ -1,17 +1,18 @@
 // The registry of a machine without one: a hive is a file in the registry editor's own text form,
 // "Windows Registry Editor Version 5.00", read afresh each time a key is opened.
+#include "platform/posix/file_bytes.h"
 #include "platform/standard_folders.h"
 #include "platform/system.h"
 
 #include <wx/convauto.h>
-#include <wx/ffile.h>
-#include <wx/filename.h>
 #include <wx/string.h>
 #include <wx/tokenzr.h>
 
 #include <algorithm>
-#include <map>
+#include <cwctype>
 #include <memory>
+#include <optional>
+#include <string>
 #include <vector>
 
 namespace
@@ -22,7 +23,8 @@ constexpr DWORD TypeExpandableText = 2;
 constexpr DWORD TypeBinary = 3;
 constexpr DWORD TypeNumber = 4;
 
-const char* const HiveFormat = "Windows Registry Editor Version 5.00";
+const wchar_t* const Blanks = L" \t\n\v\f\r";
+const wchar_t* const HiveFormat = L"Windows Registry Editor Version 5.00";
 
 struct Value
 {
@@ -34,7 +36,7 @@ struct Value
 
 struct RegistryKey
 {
-    std::map<wxString, Value> values; // by lower-case name
+    std::vector<std::wstring> lines; // parsed when a value is asked for
 };
 
 namespace
@@ -43,22 +45,19 @@ namespace
 wxString HiveName(HKEY hive)
 {
     if (hive == HKEY_LOCAL_MACHINE)
-        return "HKEY_LOCAL_MACHINE";
-    return hive == HKEY_CURRENT_USER ? wxString("HKEY_CURRENT_USER") : wxString();
+        return L"HKEY_LOCAL_MACHINE";
+    return hive == HKEY_CURRENT_USER ? wxString(L"HKEY_CURRENT_USER") : wxString();
 }
 
 wxString ReadHive(HKEY hive)
 {
     const wxString folder =
         hive == HKEY_LOCAL_MACHINE ? GetMachineDataFolder() : GetUserDataFolder();
-    const wxString path = folder + "/registry/" + HiveName(hive) + ".reg";
-    wxString text;
-    if (!wxFileName::IsFileReadable(path) || !wxFileExists(path))
-        return text;
-    wxFFile file(path, "rb");
-    if (file.IsOpened())
-        file.ReadAll(&text, wxConvAuto());
-    return text;
+    const wxString path = folder + L"/registry/" + HiveName(hive) + L".reg";
+    std::string bytes;
+    return ReadFileBytes(path.utf8_string(), bytes)
+               ? wxString(bytes.data(), wxConvAuto(), bytes.size())
+               : wxString();
 }
 
 void AppendUnit(std::vector<BYTE>& data, unsigned unit)
@@ -68,12 +67,12 @@ void AppendUnit(std::vector<BYTE>& data, unsigned unit)
 }
 
 // UTF-16LE, as the registry stores text, with its terminating NUL.
-std::vector<BYTE> StoredText(const wxString& text)
+std::vector<BYTE> StoredText(const std::wstring& text)
 {
     std::vector<BYTE> data;
-    for (const wxUniChar character : text)
+    for (const wchar_t character : text)
     {
-        const unsigned code = character.GetValue();
+        const auto code = static_cast<unsigned>(character);
         if (code < 0x10000)
         {
             AppendUnit(data, code);
@@ -132,83 +131,148 @@ bool ParseNumber(const wxString& text, Value& value)
 }
 
 // Takes a quoted text with its escapes from the front of rest; false when there is none.
-bool TakeQuoted(wxString& rest, wxString& text)
+bool TakeQuoted(std::wstring& rest, std::wstring& text)
 {
-    if (!rest.StartsWith("\""))
+    if (rest.empty() || rest.front() != L'"')
         return false;
     for (size_t i = 1; i < rest.length(); ++i)
     {
-        if (rest[i] == '"')
+        if (rest[i] == L'"')
         {
-            rest = rest.Mid(i + 1);
+            rest.erase(0, i + 1);
             return true;
         }
-        if (rest[i] == '\\' && i + 1 < rest.length())
+        if (rest[i] == L'\\' && i + 1 < rest.length())
             ++i;
         text += rest[i];
     }
     return false;
 }
 
-// One line of the form "Name"=data or @=data; lines that are not of it change nothing.
-void ParseValue(wxString line, RegistryKey& key)
+// Splits a line of the form "Name"=data or @=data; false when it is not of it.
+bool SplitLine(std::wstring line, std::wstring& name, std::wstring& data)
 {
-    wxString name;
-    if (line.StartsWith("@"))
-        line = line.Mid(1);
+    name.clear();
+    if (!line.empty() && line.front() == L'@')
+        line.erase(0, 1);
     else if (!TakeQuoted(line, name))
-        return;
-    line.Trim(false);
-    if (!line.StartsWith("="))
-        return;
-    line = line.Mid(1).Trim(false).Trim();
-    name.MakeLower();
-
-    Value value{TypeText, {}};
-    wxString text;
-    if (line == "-")
-        key.values.erase(name);
-    else if (line.StartsWith("\"") && TakeQuoted(line, text))
-        key.values[name] = Value{TypeText, StoredText(text)};
-    else if (line.StartsWith("hex") && ParseBytes(line, value))
-        key.values[name] = value;
-    else if (line.StartsWith("dword:") && ParseNumber(line, value))
-        key.values[name] = value;
+        return false;
+    const size_t sign = std::min(line.find_first_not_of(Blanks), line.length());
+    if (sign == line.length() || line[sign] != L'=')
+        return false;
+    const size_t begin = std::min(line.find_first_not_of(Blanks, sign + 1), line.length());
+    data.assign(line, begin, line.find_last_not_of(Blanks) + 1 - begin);
+    return true;
 }
 
-// The next line without its end; a line of bytes that ends in a backslash goes on in the next one.
-wxString NextLine(wxStringTokenizer& lines)
+// Sets the value from its data in a line, or removes it; data of another form changes nothing.
+void ParseData(std::wstring data, std::optional<Value>& value)
 {
-    wxString line = lines.GetNextToken().Trim().Trim(false);
-    while (line.EndsWith("\\") && line.Contains("=hex") && lines.HasMoreTokens())
-        line = line.RemoveLast() + lines.GetNextToken().Trim().Trim(false);
-    return line;
+    Value parsed{TypeText, {}};
+    std::wstring text;
+    if (data == L"-")
+        value.reset();
+    else if (TakeQuoted(data, text))
+        value = Value{TypeText, StoredText(text)};
+    else if (data.compare(0, 3, L"hex") == 0 && ParseBytes(data, parsed))
+        value = parsed;
+    else if (data.compare(0, 6, L"dword:") == 0 && ParseNumber(data, parsed))
+        value = parsed;
 }
 
-// The key of that full path (hive name first) in the hive's text, or none.
-std::unique_ptr<RegistryKey> FindKey(const wxString& hive, const wxString& wanted)
+// The lines of a hive without the blanks around them; empty ones are left out. Most lines are passed
+// over, so one costs no more than a look at its characters.
+class Lines
 {
-    wxStringTokenizer lines(hive, "\n");
-    if (!lines.HasMoreTokens() || NextLine(lines) != HiveFormat)
+  public:
+    explicit Lines(const wxString& text) : m_text(text.ToStdWstring())
+    {
+        SkipLineEnds();
+    }
+
+    // A line of bytes that ends in a backslash goes on in the next one.
+    bool Next(std::wstring& line)
+    {
+        line.clear();
+        if (!HasMore())
+            return false;
+        Append(line);
+        while (HasMore() && !line.empty() && line.back() == L'\\' &&
+               line.find(L"=hex") != std::wstring::npos)
+        {
+            line.pop_back();
+            Append(line);
+        }
+        return true;
+    }
+
+  private:
+    bool HasMore() const
+    {
+        return m_next < m_text.length();
+    }
+
+    void SkipLineEnds()
+    {
+        m_next = std::min(m_text.find_first_not_of(L'\n', m_next), m_text.length());
+    }
+
+    void Append(std::wstring& line)
+    {
+        const size_t end = std::min(m_text.find(L'\n', m_next), m_text.length());
+        const size_t first = std::min(m_text.find_first_not_of(Blanks, m_next), end);
+        if (first < end)
+            line.append(m_text, first, m_text.find_last_not_of(Blanks, end - 1) - first + 1);
+        m_next = end;
+        SkipLineEnds();
+    }
+
+    std::wstring m_text;
+    size_t m_next = 0;
+};
+
+std::wstring Lower(std::wstring text)
+{
+    std::transform(text.begin(), text.end(), text.begin(),
+                   [](wchar_t character)
+                   {
+                       return static_cast<wchar_t>(std::towlower(static_cast<wint_t>(character)));
+                   });
+    return text;
+}
+
+bool StartsWith(const std::wstring& text, const std::wstring& start)
+{
+    return text.compare(0, start.length(), start) == 0;
+}
+
+// The key of that full path (hive name first, all in lower case) in the hive's text, or none.
+std::unique_ptr<RegistryKey> FindKey(const wxString& hive, const std::wstring& wanted)
+{
+    Lines lines(hive);
+    std::wstring line;
+    if (!lines.Next(line) || line != HiveFormat)
         return nullptr;
     std::unique_ptr<RegistryKey> key;
-    const wxString wantedParent = wanted + "\\";
+    const std::wstring wantedParent = wanted + L"\\";
     bool isInKey = false;
-    while (lines.HasMoreTokens())
+    while (lines.Next(line))
     {
-        const wxString line = NextLine(lines);
-        if (!line.StartsWith("["))
+        if (!StartsWith(line, L"["))
         {
             if (isInKey)
-                ParseValue(line, *key);
+                key->lines.push_back(line);
             continue;
         }
-        const bool isRemoval = line.StartsWith("[-");
-        const wxString path = line.Mid(isRemoval ? 2 : 1).BeforeLast(']').Lower();
+        const bool isRemoval = StartsWith(line, L"[-");
+        const size_t bracket = line.rfind(L']');
+        const size_t begin = isRemoval ? 2 : 1;
+        const std::wstring path =
+            bracket == std::wstring::npos ? L"" : Lower(line.substr(begin, bracket - begin));
         isInKey = path == wanted && !isRemoval;
-        if (isRemoval && (wanted == path || wanted.StartsWith(path + "\\")))
+        if (isRemoval && (wanted == path || StartsWith(wanted, path + L"\\")))
             key.reset();
-        else if (!isRemoval && !key && (isInKey || path.StartsWith(wantedParent)))
+        else if (!isRemoval && !key && (isInKey || StartsWith(path, wantedParent)))
             key = std::make_unique<RegistryKey>();
     }
     return key;
@@ -221,7 +285,7 @@ LSTATUS RegOpenKeyExW(HKEY hive, LPCWSTR path, DWORD /*options*/, REGSAM /*acces
     const wxString name = HiveName(hive);
     if (name.empty())
         return ERROR_INVALID_HANDLE;
-    std::unique_ptr<RegistryKey> found = FindKey(ReadHive(hive), (name + "\\" + path).Lower());
+    std::unique_ptr<RegistryKey> found = FindKey(ReadHive(hive), Lower((name + L"\\" + path).ToStdWstring()));
     if (!found)
         return ERROR_FILE_NOT_FOUND;
     *key = found.release(); // the caller's until RegCloseKey
@@ -231,10 +295,18 @@ LSTATUS RegOpenKeyExW(HKEY hive, LPCWSTR path, DWORD /*options*/, REGSAM /*acces
 LSTATUS RegQueryValueExW(HKEY key, LPCWSTR name, DWORD* /*reserved*/, DWORD* type, BYTE* data,
                          DWORD* size)
 {
-    const auto found = key->values.find(wxString(name).Lower());
-    if (found == key->values.end())
+    const std::wstring wanted = Lower(name);
+    std::optional<Value> found;
+    std::wstring lineName;
+    std::wstring lineData;
+    for (const std::wstring& line : key->lines)
+    {
+        if (SplitLine(line, lineName, lineData) && Lower(lineName) == wanted)
+            ParseData(lineData, found);
+    }
+    if (!found)
         return ERROR_FILE_NOT_FOUND;
-    const Value& value = found->second;
+    const Value& value = *found;
     *type = value.type;
     const DWORD capacity = *size;
     *size = static_cast<DWORD>(value.data.size());
