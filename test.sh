@@ -62,6 +62,7 @@ native() {
     quietly cmake --preset sanitize
     quietly cmake --build --preset sanitize
     part "Scenarios and unit tests" run_ctest sanitize
+    checks
 }
 
 windows() {

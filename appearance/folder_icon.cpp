@@ -70,7 +70,7 @@ void TellShell(const wxString& iniPath)
     // Cleared, so that a failed call leaves the index of an icon and not chance.
     SHFILEINFOW info = {};
     SHGetFileInfoW(iniPath.wc_str(), 0, &info, sizeof info, SHGFI_SYSICONINDEX);
-    const auto image = reinterpret_cast<const void*>(static_cast<std::intptr_t>(info.iIcon));
+    const auto* const image = reinterpret_cast<const void*>(static_cast<std::intptr_t>(info.iIcon));
     SHChangeNotify(SHCNE_UPDATEIMAGE, SHCNF_DWORD | SHCNF_FLUSH, image, nullptr);
     SHChangeNotify(SHCNE_MKDIR, SHCNF_PATHW | SHCNF_FLUSH, iniPath.wc_str(), nullptr);
     SHChangeNotify(SHCNE_ASSOCCHANGED, SHCNF_IDLIST | SHCNF_FLUSH, nullptr, nullptr);

@@ -114,8 +114,7 @@ void RewriteFolderCfg(const wxString& cfgPath, const ImposeSettingTable& imposeS
 }
 
 // Moves the stored path when its template lies in the folder being left.
-void MoveTemplate(const wxString& cfgPath, const wxString& encoding, const Direction& direction,
-                  ImposeSettingTable& table)
+void MoveTemplate(const wxString& cfgPath, const Direction& direction, ImposeSettingTable& table)
 {
     const ImposeSettingEntry stored = table[ImposeTemplateKey];
     wxFileName from;
@@ -133,7 +132,7 @@ void MoveTemplate(const wxString& cfgPath, const wxString& encoding, const Direc
                              templateFile.GetFullName();
     if (!IsXmlText(newPath))
         return LogUntouched(cfgPath, "new path holds a character that XML cannot store");
-    if (!IsReadFaithfully(cfgPath, encoding))
+    if (!IsReadFaithfully(cfgPath))
         return LogUntouched(cfgPath, "unknown encoding");
     SetImposeSetting(table, ImposeTemplateKey, newPath, stored.KeyDisplayValue);
     RewriteFolderCfg(cfgPath, table);
@@ -150,13 +149,11 @@ void UpdateHotFolderImposePath(const FolderUpgradeApp& app, const wxString& hotF
         return;
     }
 
-    wxString encoding;
     {
         wxXmlDocument document;
         if (!LoadFolderCfg(cfgPath, document) ||
             !FindElement(document.GetRoot(), FolderCfg::ImposeSettingSection, true))
             return;
-        encoding = document.GetFileEncoding();
     }
 
     ImposeSettingTable table;
@@ -166,5 +163,5 @@ void UpdateHotFolderImposePath(const FolderUpgradeApp& app, const wxString& hotF
     const wxString storedPath = isPresent ? entry->second.Value : wxString();
     RunLog("Imposepath:" + hotFolder + "is: " + storedPath, NoCount);
     if (isPresent)
-        MoveTemplate(cfgPath, encoding, app.m_isUpgrade ? Upgrade : Downgrade, table);
+        MoveTemplate(cfgPath, app.m_isUpgrade ? Upgrade : Downgrade, table);
 }

@@ -11,7 +11,7 @@ namespace
 {
 
 constexpr int IndentationStep = 2;
-constexpr size_t WriteBufferBytes = 64 * 1024;
+constexpr size_t WriteBufferBytes = size_t{64} * 1024;
 
 const wchar_t* FormatFlag(bool flag)
 {
@@ -62,12 +62,12 @@ class Section
   private:
     static wxXmlNode* Append(wxXmlNode& parent, const wxString& name, wxXmlNode* last)
     {
-        auto* node = new wxXmlNode(wxXML_ELEMENT_NODE, name); // the parent's from here on
+        auto* child = new wxXmlNode(wxXML_ELEMENT_NODE, name); // the parent's from here on
         if (last || !parent.GetChildren())
-            parent.InsertChildAfter(node, last);
+            parent.InsertChildAfter(child, last);
         else
-            parent.AddChild(node);
-        return node;
+            parent.AddChild(child);
+        return child;
     }
 
     wxXmlNode* m_node;

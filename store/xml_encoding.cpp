@@ -28,10 +28,29 @@ bool IsSingleByte(const wxString& encoding)
            (code >= wxFONTENCODING_CP1250 && code <= wxFONTENCODING_CP1258);
 }
 
+// The encoding that the file declares: UTF-8 without a declaration (as in UTF-16, which the parser
+// tells by itself), none when it cannot be read. The library's answer is no use where blanks stand
+// around the equals sign: it is UTF-8 or nonsense then, while its parser knows better.
+wxString DeclaredEncoding(const wxString& path)
+{
+    wxFFile file(path, "rb");
+    std::array<char, 256> start{};
+    const size_t length = file.IsOpened() ? file.Read(start.data(), start.size()) : 0;
+    wxString declaration = wxString::From8BitData(start.data(), length).BeforeFirst('>');
+    if (declaration.StartsWith(L"\u00EF\u00BB\u00BF"))
+        declaration.Remove(0, 3);
+    const size_t name = declaration.find("encoding");
+    if (!declaration.StartsWith("<?xml") || name == wxString::npos)
+        return length > 0 ? "UTF-8" : "";
+    const wxString value = declaration.Mid(name).AfterFirst('=').Trim(false);
+    return value.Mid(1).BeforeFirst(value[0]);
+}
+
 } // namespace
 
-bool IsReadFaithfully(const wxString& path, const wxString& encoding)
+bool IsReadFaithfully(const wxString& path)
 {
+    const wxString encoding = DeclaredEncoding(path);
     if (IsBuiltIn(encoding))
         return true;
     if (!IsSingleByte(encoding))

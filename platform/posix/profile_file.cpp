@@ -29,8 +29,8 @@ struct Text
     std::string rest; // half a unit at the end, if any
 };
 
-// The bytes of a file that can be written; none of one that is not there. False for a read-only file,
-// whoever asks, and for what cannot be read.
+// The bytes of a file that can be written; none of one that is not there. False for a read-only
+// file, whoever asks, and for what cannot be read.
 bool ReadForWriting(const std::string& path, std::string& bytes)
 {
     struct stat status = {};

@@ -180,8 +180,8 @@ void ParseData(std::wstring data, std::optional<Value>& value)
         value = parsed;
 }
 
-// The lines of a hive without the blanks around them; empty ones are left out. Most lines are passed
-// over, so one costs no more than a look at its characters.
+// The lines of a hive without the blanks around them; empty ones are left out. Most lines are
+// passed over, so one costs no more than a look at its characters.
 class Lines
 {
   public:
@@ -235,9 +235,7 @@ std::wstring Lower(std::wstring text)
 {
     std::transform(text.begin(), text.end(), text.begin(),
                    [](wchar_t character)
-                   {
-                       return static_cast<wchar_t>(std::towlower(static_cast<wint_t>(character)));
-                   });
+                   { return static_cast<wchar_t>(std::towlower(static_cast<wint_t>(character))); });
     return text;
 }
 
@@ -285,7 +283,8 @@ LSTATUS RegOpenKeyExW(HKEY hive, LPCWSTR path, DWORD /*options*/, REGSAM /*acces
     const wxString name = HiveName(hive);
     if (name.empty())
         return ERROR_INVALID_HANDLE;
-    std::unique_ptr<RegistryKey> found = FindKey(ReadHive(hive), Lower((name + L"\\" + path).ToStdWstring()));
+    std::unique_ptr<RegistryKey> found =
+        FindKey(ReadHive(hive), Lower((name + L"\\" + path).ToStdWstring()));
     if (!found)
         return ERROR_FILE_NOT_FOUND;
     *key = found.release(); // the caller's until RegCloseKey

@@ -24,6 +24,7 @@ void RaiseStackLimit()
 
 StartUp::StartUp()
 {
-    std::setlocale(LC_CTYPE, "C.UTF-8");
+    // Should the system lack it, names that are not ASCII stay what they were.
+    static_cast<void>(std::setlocale(LC_CTYPE, "C.UTF-8"));
     RaiseStackLimit();
 }
