@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
 # Builds and runs the tests and closes with their count.
 #
-#     ./test.sh             every test of this machine's program, with the sanitizers
+#     ./test.sh             every test of this machine's program, with the sanitizers, fuzzing and faults
 #     ./test.sh windows     the same table of scenarios against the Windows program, under Wine
 #     ./test.sh coverage    the lines of the program that the tests run
 #     ./test.sh checks      format and static checks alone
@@ -62,6 +62,9 @@ native() {
     quietly cmake --preset sanitize
     quietly cmake --build --preset sanitize
     part "Scenarios and unit tests" run_ctest sanitize
+    cmake/install_packages.sh clang libclang-rt-dev python3
+    part "Fuzzing, each corpus and 20 s of each target" fuzz/run.sh 20
+    part "Faults, each call of a run failing once with each of four errors" tests/faults/run.py
     checks
 }
 

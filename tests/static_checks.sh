@@ -17,10 +17,10 @@ check() {
     rm -f "$log"
 }
 
-mapfile -t sources < <(git ls-files '*.cpp' '*.h')
-mapfile -t scripts < <(git ls-files '*.sh' .ci/run)
-mapfile -t native < <(git ls-files '*.cpp' | grep -E '^(app|appearance|migrate|platform|store)/' |
-    grep -v '^platform/windows/')
+rooms=(app appearance migrate platform store)
+mapfile -t sources < <(find "${rooms[@]}" bench fuzz tests -name '*.cpp' -o -name '*.h')
+mapfile -t scripts < <(find . -path ./build -prune -o -name '*.sh' -print; echo .ci/run)
+mapfile -t native < <(find "${rooms[@]}" -name '*.cpp' -not -path 'platform/windows/*')
 
 tidy() {
     printf '%s\n' "${native[@]}" | xargs -P "$(nproc)" -n 2 clang-tidy -p build/native --quiet

@@ -13,6 +13,7 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <utility>
 #include <vector>
 
 namespace
@@ -49,15 +50,24 @@ wxString HiveName(HKEY hive)
     return hive == HKEY_CURRENT_USER ? wxString(L"HKEY_CURRENT_USER") : wxString();
 }
 
-wxString ReadHive(HKEY hive)
+// In UTF-8, or in what its byte-order mark says; text of ASCII alone needs no conversion.
+std::wstring Decode(const std::string& bytes)
+{
+    const bool isAscii =
+        std::all_of(bytes.begin(), bytes.end(),
+                    [](char byte) { return static_cast<unsigned char>(byte) < 0x80; });
+    if (isAscii)
+        return {bytes.begin(), bytes.end()};
+    return wxString(bytes.data(), wxConvAuto(), bytes.size()).ToStdWstring();
+}
+
+std::wstring ReadHive(HKEY hive)
 {
     const wxString folder =
         hive == HKEY_LOCAL_MACHINE ? GetMachineDataFolder() : GetUserDataFolder();
     const wxString path = folder + L"/registry/" + HiveName(hive) + L".reg";
     std::string bytes;
-    return ReadFileBytes(path.utf8_string(), bytes)
-               ? wxString(bytes.data(), wxConvAuto(), bytes.size())
-               : wxString();
+    return ReadFileBytes(path.utf8_string(), bytes) ? Decode(bytes) : std::wstring();
 }
 
 void AppendUnit(std::vector<BYTE>& data, unsigned unit)
@@ -185,7 +195,7 @@ void ParseData(std::wstring data, std::optional<Value>& value)
 class Lines
 {
   public:
-    explicit Lines(const wxString& text) : m_text(text.ToStdWstring())
+    explicit Lines(std::wstring text) : m_text(std::move(text))
     {
         SkipLineEnds();
     }
@@ -245,9 +255,9 @@ bool StartsWith(const std::wstring& text, const std::wstring& start)
 }
 
 // The key of that full path (hive name first, all in lower case) in the hive's text, or none.
-std::unique_ptr<RegistryKey> FindKey(const wxString& hive, const std::wstring& wanted)
+std::unique_ptr<RegistryKey> FindKey(std::wstring hive, const std::wstring& wanted)
 {
-    Lines lines(hive);
+    Lines lines(std::move(hive));
     std::wstring line;
     if (!lines.Next(line) || line != HiveFormat)
         return nullptr;

@@ -26,6 +26,12 @@ Function Real(Function /*replacement*/, const char* name)
     return reinterpret_cast<Function>(dlsym(RTLD_NEXT, name));
 }
 
+int FailAfter(int /*result*/)
+{
+    errno = std::atoi(std::getenv("FAULT_ERROR"));
+    return -1;
+}
+
 // Whether it is this call's turn. Plain C, since calls come before main and after it, too.
 bool IsHit(const char* call, const char* path)
 {
@@ -37,7 +43,7 @@ bool IsHit(const char* call, const char* path)
     const int report = open(std::getenv("FAULT_REPORT"), O_WRONLY | O_CREAT, 0600);
     if (dprintf(report, "%s\t%s", call, path) < 0)
         std::abort();
-    errno = std::atoi(std::getenv("FAULT_ERROR"));
+    FailAfter(0);
     return true;
 }
 
@@ -69,18 +75,6 @@ bool IsHit(const char* call, FILE* stream)
         static const auto real = Real(&name, #name);                                               \
         return IsHit(#name, subject) ? (failure) : real arguments;                                 \
     }
-// A descriptor or stream is closed all the same.
-#define FAILING_CLOSE(type, name)                                                                  \
-    extern "C" int name(type subject)                                                              \
-    {                                                                                              \
-        static const auto real = Real(&name, #name);                                               \
-        const bool isHit = IsHit(#name, subject);                                                  \
-        const int error = errno;                                                                   \
-        const int result = real(subject);                                                          \
-        errno = isHit ? error : errno;                                                             \
-        return isHit ? -1 : result;                                                                \
-    }
-
 extern "C" int open64(const char* path, int flags, ...)
 {
     static const auto real = Real(&open64, "open64");
@@ -103,8 +97,9 @@ FAILING(size_t, fwrite, (const void* data, size_t size, size_t count, FILE* file
         (data, size, count, file), file, 0)
 FAILING(int, fflush, (FILE * file), (file), file, EOF)
 FAILING(int, fsync, (int file), (file), file, -1)
-FAILING_CLOSE(int, close)
-FAILING_CLOSE(FILE*, fclose)
+// These close all the same.
+FAILING(int, close, (int file), (file), file, FailAfter(real(file)))
+FAILING(int, fclose, (FILE * file), (file), file, FailAfter(real(file)))
 FAILING(int, access, (const char* path, int mode) noexcept, (path, mode), path, -1)
 FAILING(int, stat64, (const char* path, struct stat64* status) noexcept, (path, status), path, -1)
 FAILING(int, lstat64, (const char* path, struct stat64* status) noexcept, (path, status), path, -1)

@@ -1,0 +1,61 @@
+// Any bytes as a profile file: a write changes its one line and no other byte, and a read gives the
+// value back.
+#include "fuzz/fuzzing.h"
+#include "platform/system.h"
+
+#include <algorithm>
+#include <array>
+
+namespace
+{
+
+constexpr LPCWSTR Section = L".ShellClassInfo";
+constexpr LPCWSTR Value = L".\\[_ORX_HotFolder_]\\hf_folder.ico";
+// The line feeds among the bytes from begin to end of the file, in UTF-16 or in bytes.
+int CountLineFeeds(const std::string& bytes, size_t begin, size_t end)
+{
+    const size_t unit = bytes.compare(0, 2, "\xFF\xFE") == 0 ? 2 : 1;
+    int count = 0;
+    for (size_t i = begin - begin % unit; i < end; i += unit)
+        count += bytes.compare(i, unit, "\n\0", unit) == 0 ? 1 : 0;
+    return count;
+}
+
+void CheckOneLineChanged(const std::string& before, const std::string& after)
+{
+    const size_t shorter = std::min(before.size(), after.size());
+    size_t same = 0;
+    while (same < shorter && before[same] == after[same])
+        ++same;
+    size_t rest = 0;
+    while (rest < shorter - same &&
+           before[before.size() - 1 - rest] == after[after.size() - 1 - rest])
+        ++rest;
+    Check(CountLineFeeds(before, same, before.size() - rest) == 0, "what goes is of one line");
+    Check(CountLineFeeds(after, same, after.size() - rest) <= 3,
+          "what comes is a line's end, a section and a key");
+}
+
+} // namespace
+
+void Try(const std::string& input)
+{
+    static const std::string path = NewFile();
+    const std::wstring widePath(path.begin(), path.end());
+    for (const LPCWSTR key : {L"IconFile", L"IconIndex", L"InfoTip"})
+    {
+        WriteBytes(path, input);
+        const auto write = [&]()
+        {
+            return WritePrivateProfileStringW(Section, key, Value, widePath.c_str()) != 0;
+        };
+        Check(write(), "a file that can be written is");
+        const std::string after = ReadBytes(path);
+        CheckOneLineChanged(input, after);
+
+        std::array<wchar_t, 200> read{};
+        GetPrivateProfileStringW(Section, key, L"00", read.data(), 200, widePath.c_str());
+        Check(std::wstring(read.data()) == Value, "the value is read back");
+        Check(write() && ReadBytes(path) == after, "a second write changes nothing");
+    }
+}
