@@ -121,7 +121,13 @@ void MoveTemplate(const wxString& cfgPath, const Direction& direction, ImposeSet
     if (!LookUp(direction.from, direction.fromMessage, from))
         return;
     const wxFileName templateFile(stored.Value, wxPATH_NATIVE);
-    if (!IsSameFolder(from, FolderOf(templateFile)))
+    const bool isInFolder = IsSameFolder(from, FolderOf(templateFile));
+    // In an encoding that is not known just what is ASCII can be told.
+    if (!isInFolder && stored.Value.IsAscii())
+        return;
+    if (!IsReadFaithfully(cfgPath))
+        return LogUntouched(cfgPath, "unknown encoding");
+    if (!isInFolder)
         return;
     wxFileName to;
     if (!LookUp(direction.to, direction.toMessage, to))
@@ -132,8 +138,6 @@ void MoveTemplate(const wxString& cfgPath, const Direction& direction, ImposeSet
                              templateFile.GetFullName();
     if (!IsXmlText(newPath))
         return LogUntouched(cfgPath, "new path holds a character that XML cannot store");
-    if (!IsReadFaithfully(cfgPath))
-        return LogUntouched(cfgPath, "unknown encoding");
     SetImposeSetting(table, ImposeTemplateKey, newPath, stored.KeyDisplayValue);
     RewriteFolderCfg(cfgPath, table);
 }

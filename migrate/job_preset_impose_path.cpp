@@ -12,6 +12,8 @@
 #include <wx/filename.h>
 #include <wx/textbuf.h>
 
+#include <string>
+
 namespace
 {
 
@@ -57,7 +59,9 @@ bool IsEmptyText(const wxCharBuffer& bytes)
     const wxBOM mark = wxConvAuto::DetectBOM(bytes.data(), bytes.length());
     if (mark != wxBOM_None && mark != wxBOM_Unknown)
         wxConvAuto::GetBOMChars(mark, &markLength);
-    return bytes.length() == markLength;
+    // Two bytes alone may be the beginning of another mark, but then there is no text either.
+    return bytes.length() == markLength ||
+           (mark == wxBOM_Unknown && std::string(bytes.data(), bytes.length()) == "\xFF\xFE");
 }
 
 bool ReadBytes(wxFFile& file, wxCharBuffer& bytes)
@@ -105,10 +109,11 @@ void UpdatePreset(const wxString& path, const wxString& from, const wxString& to
         return RunLog(wxString::Format("preset.xml left as it is (%s): %s", reason, path), NoCount);
     MovePresetPaths(text, from, to);
     CloseOnce(file);
+    const wxScopedCharBuffer bytes = text.utf8_str(); // before the file is emptied
 
     if (!file.Open(path, "w"))
         return RunLog("Unable to open preset.xml for write : " + path, NoCount);
-    file.Write(text, wxConvAuto());
+    file.Write(bytes.data(), bytes.length());
     CloseOnce(file);
     RunLog("Updated preset.xml  : " + path, NoCount);
 }

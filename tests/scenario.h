@@ -12,7 +12,7 @@ struct Scenario
     Files before;
     std::vector<std::string> arguments;
     Files after;     // what changes; every other file and attribute stays
-    std::string log; // the whole run log, with LF for CR LF; LogUntouched for one left alone
+    std::string log; // the whole run log, with LF for CR LF; OldLog for one left alone
     bool libraryLogs = false; // the library itself reports an error, on Windows in a message box
     bool asOtherUser = false; // what is tested would not stop root
     const char* notUnderWine = nullptr; // why the row cannot hold there

@@ -32,6 +32,9 @@ Files Expected(const Workstation& workstation, const Files& before, const Scenar
     Files expected = before;
     for (const auto& [place, text] : scenario.after)
         expected[place] = place.back() == '#' ? text : workstation.Expand(text);
+    for (auto entry = expected.begin(); entry != expected.end();)
+        entry = entry->first.back() == '#' && entry->second.empty() ? expected.erase(entry)
+                                                                     : std::next(entry);
     if (scenario.log != OldLog)
         expected[LogPlace] = workstation.Expand(WithLineEnds(scenario.log));
     return expected;

@@ -9,7 +9,7 @@ using Text = std::string;
 
 const char* const ListPlace = "machine/hotfolder/HotFolderList.cfg";
 const char* const CfgA = "hot/A/[P]/Folder.cfg";
-const char* const PresetP = "user/ORX/JPData/P/Presets/presets.xml";
+const char* const PresetP = "user/ORX/JPData/.P/Presets/presets.xml";
 const Text Removed = "(not there)";
 
 const Text MovedFrom = "{previous}{/}Booklet.tpl";
@@ -264,7 +264,7 @@ const Text NoPreviousTo = "unable to read: Previous Version  Default Impose Temp
 
 Text PresetLine(const Text& line)
 {
-    return line + "{user}{/}ORX{/}JPData{/}P{/}Presets{/}presets.xml\n";
+    return line + "{user}{/}ORX{/}JPData{/}.P{/}Presets{/}presets.xml\n";
 }
 
 Text LogOfPreset(const Text& line, const Text& letter = "I")
@@ -650,7 +650,8 @@ void AddIcons(Rows& rows)
 
     const Files icon = {{place("hf_folder_disabled"), "old"}};
     const auto refresh = [&](const Text& name, const Text& before, const Text& attributes,
-                             const Text& after, const Text& folderAttributes = "")
+                             const Text& after, const Text& folderAttributes = "",
+                             const Text& attributesAfter = "S")
     {
         Files files = icon;
         files[ini] = before;
@@ -661,7 +662,7 @@ void AddIcons(Rows& rows)
         rows.push_back({name,
                         World(files),
                         {"I"},
-                        {{"hot/A#", "S"},
+                        {{"hot/A#", attributesAfter},
                          {ini + "#", "RS"},
                          {ini, after},
                          {place("hf_folder_disabled"), "{icon:hf_folder_disabled.ico}"}},
@@ -680,6 +681,7 @@ void AddIcons(Rows& rows)
             header + IconFile("hf_folder") + "IconIndex=00\r\nInfoTip=old\r\n", "RS",
             header + disabled + "IconIndex=00\r\n" + InfoTip, "R");
     refresh("AUsersDesktopIniKeepsAllElse", users, "", usersAfter, "RS");
+    refresh("HiddenStaysOnTheFolderAlone", users, "HRS", usersAfter, "HR", "HS");
     refresh("AReadOnlyDesktopIniIsWritten", users, "R", usersAfter);
     refresh("ASystemDesktopIniIsWritten", users, "S", usersAfter);
     refresh("AMissingSectionIsAddedBehindTheLastLine", "[x]\r\na=b", "",
@@ -696,6 +698,9 @@ void AddIcons(Rows& rows)
                     {},
                     Log("I", Folder("A", 1, NoIcon("hf_folder"), ""))});
 }
+
+const char* const WineLosesSystem =
+    "Wine loses SYSTEM on a read-only file of a user who is not root";
 
 void AddRefusals(Rows& rows)
 {
@@ -715,6 +720,52 @@ void AddRefusals(Rows& rows)
         LogOfPreset("Unable to open preset.xml for write : "));
     add("AnUnreadableListIsEmpty", {{"hot/A/", ""}, {Text(ListPlace) + "#", "0"}}, {},
         Log("I", ""));
+    // The icon's state does not depend on what is refused, so the rest of the run is as ever.
+    const Text icon = "hot/A/[P]/hf_folder_disabled.ico";
+    const Text ini = "hot/A/Desktop.ini";
+    const Text copied = "Icon  copied from : {tool}{/}hf_folder_disabled.ico To "
+                        "{hot}{/}A{/}[_ORX_HotFolder_]{/}hf_folder_disabled.ico \n";
+    const Text noCfg =
+        "HF cfg file unable to read/exist: {hot}{/}A{/}[_ORX_HotFolder_]{/}Folder.cfg\n";
+    const Text iconLog = Log("I", Folder("A", 1, copied, noCfg));
+    const Text shipped = "{icon:hf_folder_disabled.ico}";
+    const Files refreshed = {{icon, shipped}, {"hot/A#", "S"}};
+    const Text own = "[.ShellClassInfo]\r\n" + InfoTip + IconFile("hf_folder_disabled");
+    Files after = refreshed;
+    after[ini] = own;
+    after[ini + "#"] = "RS";
+    rows.push_back({"AReadOnlyDesktopIniOfTheUsersIsWritten",
+                    World({{icon, "old"}, {ini, ""}, {ini + "#", "RS"}}),
+                    {"I"},
+                    after,
+                    iconLog,
+                    false,
+                    true,
+                    WineLosesSystem});
+    rows.push_back({"AnothersDesktopIniStays",
+                    World({{icon, "old"}, {ini, "[x]\r\n"}, {ini + "#", "X"}}),
+                    {"I"},
+                    refreshed,
+                    iconLog,
+                    false,
+                    true,
+                    WineLosesSystem});
+    rows.push_back({"AReadOnlyIconIsReplaced",
+                    World({{icon, "old"}, {icon + "#", "R"}, {ini, own}}),
+                    {"I"},
+                    {{icon, shipped}, {"hot/A#", "S"}, {ini + "#", "RS"}, {icon + "#", ""}},
+                    iconLog,
+                    false,
+                    true,
+                    "Wine refuses another user than root to replace it, as Windows does"});
+    rows.push_back({"AnothersFolderStays",
+                    World({{icon, "old"}, {icon + "#", "X"}, {"hot/A#", "X"}, {"hot/A/[P]#", "X"}}),
+                    {"I"},
+                    {},
+                    iconLog,
+                    true,
+                    true,
+                    nullptr});
 }
 
 } // namespace

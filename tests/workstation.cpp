@@ -44,7 +44,8 @@ std::string Letters(const fs::path& path)
     const unsigned long stored = StoredAttributes(path);
     const bool isDirectory = S_ISDIR(status.st_mode);
     const bool isReadOnly = isDirectory ? (stored & 1) != 0 : (status.st_mode & 0222) == 0;
-    return std::string(isReadOnly ? "R" : "") + ((stored & 4) != 0 ? "S" : "");
+    return std::string(isReadOnly ? "R" : "") + ((stored & 2) != 0 ? "H" : "") +
+           ((stored & 4) != 0 ? "S" : "");
 }
 
 // Whether a path in an application data folder, which others use too, belongs to a scenario.
@@ -163,7 +164,8 @@ void Workstation::SetAttributes(const std::string& place, const std::string& let
     {
         return letters.find(letter) != std::string::npos;
     };
-    const unsigned stored = (has('S') ? 4U : 0U) | (has('R') && isDirectory ? 1U : 0U);
+    const unsigned stored =
+        (has('H') ? 2U : 0U) | (has('S') ? 4U : 0U) | (has('R') && isDirectory ? 1U : 0U);
     const std::string text = "0x" + std::to_string(stored);
     if (stored != 0 && setxattr(path.c_str(), AttributeName, text.data(), text.size(), 0) != 0)
         throw std::runtime_error("no extended attributes in " + m_root.string());

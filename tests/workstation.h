@@ -8,7 +8,7 @@
 // {default} (each as the tool sees it) and {/}, the path separator; in capitals, {HOT} or {/2}, as
 // the registry editor's text has them. A text that begins with {utf16} is one in that encoding.
 // A place that ends in a slash is a directory; one that ends in '#' stands for the attributes of
-// the file or directory before it: R read-only, S system, X another user's, 0 no permission at all.
+// the file or directory before it: R read-only, H hidden, S system, X another user's, 0 no permission at all.
 #pragma once
 
 #include <filesystem>

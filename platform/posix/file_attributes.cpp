@@ -23,7 +23,7 @@ bool IsDirectory(const struct stat& status)
 
 DWORD ReadStored(const std::string& path)
 {
-    char text[32] = {};
+    char text[256] = {}; // Samba puts more behind the text and a NUL
     const ssize_t length = getxattr(path.c_str(), AttributeName, text, sizeof text - 1);
     return length > 0 ? static_cast<DWORD>(std::strtoul(text, nullptr, 16)) : 0;
 }

@@ -17,3 +17,13 @@ bool ReadFileBytes(const std::string& path, std::string& bytes)
     close(file);
     return count == status.st_size;
 }
+
+bool WriteFileBytes(const std::string& path, const std::string& bytes)
+{
+    constexpr mode_t Everybody = S_IRUSR | S_IWUSR | S_IRGRP | S_IWGRP | S_IROTH | S_IWOTH;
+    const int file = open(path.c_str(), O_WRONLY | O_CREAT | O_TRUNC | O_CLOEXEC, Everybody);
+    if (file < 0)
+        return false;
+    const ssize_t count = write(file, bytes.data(), bytes.size());
+    return close(file) == 0 && count == static_cast<ssize_t>(bytes.size());
+}

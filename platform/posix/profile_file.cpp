@@ -6,7 +6,6 @@
 #include "platform/posix/native_path.h"
 #include "platform/system.h"
 
-#include <wx/ffile.h>
 #include <wx/string.h>
 
 #include <algorithm>
@@ -37,13 +36,6 @@ bool ReadForWriting(const std::string& path, std::string& bytes)
     if (stat(path.c_str(), &status) != 0)
         return true;
     return (status.st_mode & (S_IWUSR | S_IWGRP | S_IWOTH)) != 0 && ReadFileBytes(path, bytes);
-}
-
-bool WriteBytes(const std::string& path, const std::string& bytes)
-{
-    wxFFile file(wxString::FromUTF8(path), "wb");
-    return file.IsOpened() && file.Write(bytes.data(), bytes.size()) == bytes.size() &&
-           file.Flush();
 }
 
 Text Decode(const std::string& bytes)
@@ -231,7 +223,7 @@ BOOL WritePrivateProfileStringW(LPCWSTR section, LPCWSTR key, LPCWSTR value, LPC
         Insert(text.units, text.units.size(),
                u"[" + sectionName + u"]" + LineEnd + keyName + u"=" + newValue);
     const std::string changed = Encode(text);
-    return changed == bytes || WriteBytes(native, changed) ? 1 : 0;
+    return changed == bytes || WriteFileBytes(native, changed) ? 1 : 0;
 }
 
 DWORD GetPrivateProfileStringW(LPCWSTR section, LPCWSTR key, LPCWSTR defaultValue, LPWSTR buffer,
