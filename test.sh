@@ -10,6 +10,7 @@ cd "$(dirname "$0")"
 
 passed=0
 failed=0
+skipped=0
 
 say() {
     printf '== %s (%d s)\n' "$1" "$SECONDS"
@@ -38,7 +39,9 @@ part() {
         cat "$log"
     fi
     counts=$(grep -oE '^[0-9]+ passed, [0-9]+ failed' "$log" | tail -n 1) || counts="0 passed, 1 failed"
-    tail -n 3 "$log"
+    grep '^skipped ' "$log" || true
+    tail -n 1 "$log"
+    skipped=$((skipped + $(grep -c '^skipped ' "$log" || true)))
     rm -f "$log"
     passed=$((passed + ${counts%% *}))
     counts=${counts#*, }
@@ -109,5 +112,5 @@ checks) checks ;;
     exit 2
     ;;
 esac
-echo "$passed passed, $failed failed"
+echo "$passed passed, $failed failed, $skipped skipped"
 [ "$failed" = 0 ]

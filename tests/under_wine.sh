@@ -45,7 +45,8 @@ as_other "$server" -p || true
 log=$prefixes/log
 WINEPREFIX=$prefixes/root timeout 300 "$wine" "$program_dir/tests/unit_test.exe" >"$log" 2>&1 || true
 timeout 1200 "$test_dir/tests/scenario_test" >>"$log" 2>&1 || true
-grep -vE '^\[( RUN|       OK)|^\[---' "$log" || true
+grep -vE '^\[( RUN|       OK|  SKIPPED)|^\[---' "$log" || true
+awk '/: Skipped$/ { getline reason } /^\[  SKIPPED \] .*\(/ { sub(".*/", "", $4); print "skipped " $4 ": " reason }' "$log"
 
 count() {
     sed -n "s/^\[  $1 \] \([0-9]*\) tests\{0,1\}[.,].*/\1/p" "$log" | awk '{ sum += $1 } END { print sum + 0 }'
