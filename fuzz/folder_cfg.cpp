@@ -25,11 +25,9 @@ struct Values
 
 auto RootFields(const HotFolderSettings& s)
 {
-    return std::tie(s.name, s.description, s.server_ip, s.server_name, s.server_version,
-                    s.server_textversion, s.server_type, s.BaseVirtualPrinter,
-                    s.BaseVirtualPrinterName, s.HFPresetName, s.PPDVersion,
-                    s.BaseVirtualPrinterDisplayName, s.Enable, s.Centralized, s.Isjobpresetattached,
-                    s.Quickset, s.IsCustomInterval, s.TimeInterval, s.ServerTypeAndJPDefaultKeyInfo,
+    return std::tie(s.name, s.description, s.server_ip, s.server_name, s.server_version, s.server_textversion, s.server_type,
+                    s.BaseVirtualPrinter, s.BaseVirtualPrinterName, s.HFPresetName, s.PPDVersion, s.BaseVirtualPrinterDisplayName, s.Enable,
+                    s.Centralized, s.Isjobpresetattached, s.Quickset, s.IsCustomInterval, s.TimeInterval, s.ServerTypeAndJPDefaultKeyInfo,
                     s.Quickset_Supported, s.Quickset_Enabled, s.IsWidthBased);
 }
 
@@ -53,8 +51,7 @@ wxString Sections(const Values& values)
 
 bool AreEqual(const Values& left, const Values& right)
 {
-    return RootFields(left.settings) == RootFields(right.settings) &&
-           Sections(left) == Sections(right);
+    return RootFields(left.settings) == RootFields(right.settings) && Sections(left) == Sections(right);
 }
 
 // False when the file does not load.
@@ -76,8 +73,8 @@ bool Read(const wxString& path, Values& values)
 
 void Save(const wxString& path, const Values& values)
 {
-    SaveHotFolderSettings(path, values.settings, values.jobSettings, values.paths,
-                          values.filterSetting, values.imposeSettings, values.preflightSettings);
+    SaveHotFolderSettings(path, values.settings, values.jobSettings, values.paths, values.filterSetting, values.imposeSettings,
+                          values.preflightSettings);
 }
 
 } // namespace

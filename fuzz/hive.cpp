@@ -22,8 +22,7 @@ std::vector<BYTE> Query(LPCWSTR path, LPCWSTR name)
     DWORD size = Capacity;
     const LSTATUS status = RegQueryValueExW(key, name, nullptr, &type, data.get(), &size);
     RegCloseKey(key);
-    Check(status == ERROR_FILE_NOT_FOUND || (status == ERROR_SUCCESS) == (size <= Capacity),
-          "a value is given if it fits");
+    Check(status == ERROR_FILE_NOT_FOUND || (status == ERROR_SUCCESS) == (size <= Capacity), "a value is given if it fits");
     return {data.get(), data.get() + (status == ERROR_SUCCESS ? size : 0)};
 }
 
@@ -47,7 +46,6 @@ void Try(const std::string& input)
     // The comment takes the place of the line with which an unfinished value would go on.
     WriteBytes(path, "Windows Registry Editor Version 5.00\r\n" + input +
                          "\r\n;\r\n[HKEY_CURRENT_USER\\SOFTWARE\\HF]\r\n\"Path\"=\"C:\\\\A\"\r\n");
-    Check(Query(L"SOFTWARE\\HF", L"Path") ==
-              std::vector<BYTE>{'C', 0, ':', 0, '\\', 0, 'A', 0, 0, 0},
+    Check(Query(L"SOFTWARE\\HF", L"Path") == std::vector<BYTE>{'C', 0, ':', 0, '\\', 0, 'A', 0, 0, 0},
           "a value behind any content is read");
 }

@@ -31,8 +31,7 @@ std::wstring Moved(const std::wstring& text, const std::wstring& from, const std
     for (size_t i = 0; i < text.size();)
     {
         const size_t end = i + path.size();
-        const bool isPath = text.compare(i, path.size(), path) == 0 && end < text.size() &&
-                            (text[end] == L'/' || text[end] == L'"');
+        const bool isPath = text.compare(i, path.size(), path) == 0 && end < text.size() && (text[end] == L'/' || text[end] == L'"');
         moved += isPath ? SearchText + to : text.substr(i, 1);
         i = isPath ? end : i + 1;
     }
@@ -47,8 +46,7 @@ bool LiesIn(const std::wstring& folder, const std::wstring& outer)
 // Whether the folder can lie on a disk, and its text begins no search text that the preset's ends.
 bool IsPlain(const std::wstring& folder)
 {
-    return IsXmlText(folder) && folder.find(L'"') == std::wstring::npos &&
-           !wxString(folder).EndsWith(Key);
+    return IsXmlText(folder) && folder.find(L'"') == std::wstring::npos && !wxString(folder).EndsWith(Key);
 }
 
 } // namespace
@@ -66,11 +64,9 @@ void Try(const std::string& input)
     MovePresetPaths(preset, from, to);
     const std::wstring upgraded = canMove ? Moved(text, left, entered) : text;
     Check(preset == upgraded, "just the paths in the folder move");
-    if (!canMove || !IsPlain(left) || !IsPlain(entered) || LiesIn(left, entered) ||
-        LiesIn(entered, left))
+    if (!canMove || !IsPlain(left) || !IsPlain(entered) || LiesIn(left, entered) || LiesIn(entered, left))
         return;
-    Check(MovePresetPaths(preset, from, to) == 0 && preset == upgraded,
-          "a second upgrade changes nothing");
+    Check(MovePresetPaths(preset, from, to) == 0 && preset == upgraded, "a second upgrade changes nothing");
     MovePresetPaths(preset, to, from);
     Check(preset == text || Moved(text, entered, left) != text, "a downgrade restores the text");
 }

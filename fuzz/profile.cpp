@@ -28,12 +28,10 @@ void CheckOneLineChanged(const std::string& before, const std::string& after)
     while (same < shorter && before[same] == after[same])
         ++same;
     size_t rest = 0;
-    while (rest < shorter - same &&
-           before[before.size() - 1 - rest] == after[after.size() - 1 - rest])
+    while (rest < shorter - same && before[before.size() - 1 - rest] == after[after.size() - 1 - rest])
         ++rest;
     Check(CountLineFeeds(before, same, before.size() - rest) == 0, "what goes is of one line");
-    Check(CountLineFeeds(after, same, after.size() - rest) <= 3,
-          "what comes is a line's end, a section and a key");
+    Check(CountLineFeeds(after, same, after.size() - rest) <= 3, "what comes is a line's end, a section and a key");
 }
 
 } // namespace

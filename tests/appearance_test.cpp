@@ -55,9 +55,8 @@ class Appearance : public testing::Test
         std::vector<std::string> calls = Version();
         if (isForced)
             calls.push_back("force " + folder + " 10 " + iconFile + " 0 0 2");
-        for (const std::string& call : {"notify 800 1005 " + ini, "info " + ini + " 0 1 4000",
-                                        std::string("notify 8000 1003 -7"), "notify 8 1005 " + ini,
-                                        std::string("notify 8000000 1000 0")})
+        for (const std::string& call : {"notify 800 1005 " + ini, "info " + ini + " 0 1 4000", std::string("notify 8000 1003 -7"),
+                                        "notify 8 1005 " + ini, std::string("notify 8000000 1000 0")})
             calls.push_back(call);
         return calls;
     }
@@ -81,11 +80,8 @@ TEST_F(Appearance, AnExistingOneIsForcedWithTheValueReadBack)
 
 TEST_F(Appearance, AnOldOrUnknownShellGetsNothingButTheAttributes)
 {
-    const std::vector<std::tuple<DWORD, DWORD, HRESULT, bool>> versions = {{4, 72, 0, true},
-                                                                           {4, 71, 0, false},
-                                                                           {0x8004, 72, 0, true},
-                                                                           {0x10004, 71, 0, false},
-                                                                           {6, 0, -1, false}};
+    const std::vector<std::tuple<DWORD, DWORD, HRESULT, bool>> versions = {
+        {4, 72, 0, true}, {4, 71, 0, false}, {0x8004, 72, 0, true}, {0x10004, 71, 0, false}, {6, 0, -1, false}};
     for (const auto& [major, minor, result, isCustomised] : versions)
     {
         WriteIni("");
@@ -96,8 +92,7 @@ TEST_F(Appearance, AnOldOrUnknownShellGetsNothingButTheAttributes)
         EXPECT_TRUE(ApplyFolderIcon(m_folder, "i.ico"));
         EXPECT_EQ(isCustomised, ShellCalls != Version()) << major << "." << minor;
         EXPECT_EQ(isCustomised, !Text().empty());
-        EXPECT_EQ(FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_SYSTEM,
-                  GetFileAttributesW(Ini().wc_str()));
+        EXPECT_EQ(FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_SYSTEM, GetFileAttributesW(Ini().wc_str()));
         wxRemoveFile(Ini());
     }
     EXPECT_FALSE(ApplyFolderIcon(m_folder + "/missing", "i.ico"));
@@ -122,13 +117,10 @@ TEST_F(Appearance, AProfileWriteChangesOneLine)
         wxString after;
     };
     for (const Change& change :
-         {Change{"[s]\nK = a\nk=b", "[s]\nK =v\r\nk=b"},
-          Change{"k=a\n[ S ]\n[s] ; c\nk", "k=a\n[ S ]\n[s] ; c\nk=v\r\n"},
-          Change{"[s]\n;k=a\n\n\n[t]\nk=a", "[s]\n;k=a\nk=v\r\n\n\n[t]\nk=a"},
-          Change{"[s]\nx", "[s]\nx\r\nk=v\r\n"}, Change{"[s\nk=a", "[s\nk=a\r\n[s]\r\nk=v\r\n"},
-          Change{"[s]\r\nk=v\r\n", "[s]\r\nk=v\r\n"},
-          Change{wxString::FromUTF8("ü\xEF\xBB\xBF[s]\nk=ä"),
-                 wxString::FromUTF8("ü\xEF\xBB\xBF[s]\nk=ä\r\n[s]\r\nk=v\r\n")}})
+         {Change{"[s]\nK = a\nk=b", "[s]\nK =v\r\nk=b"}, Change{"k=a\n[ S ]\n[s] ; c\nk", "k=a\n[ S ]\n[s] ; c\nk=v\r\n"},
+          Change{"[s]\n;k=a\n\n\n[t]\nk=a", "[s]\n;k=a\nk=v\r\n\n\n[t]\nk=a"}, Change{"[s]\nx", "[s]\nx\r\nk=v\r\n"},
+          Change{"[s\nk=a", "[s\nk=a\r\n[s]\r\nk=v\r\n"}, Change{"[s]\r\nk=v\r\n", "[s]\r\nk=v\r\n"},
+          Change{wxString::FromUTF8("ü\xEF\xBB\xBF[s]\nk=ä"), wxString::FromUTF8("ü\xEF\xBB\xBF[s]\nk=ä\r\n[s]\r\nk=v\r\n")}})
     {
         WriteIni(change.before);
         EXPECT_NE(0, WritePrivateProfileStringW(L"s", L"k", L"v", Ini().wc_str()));

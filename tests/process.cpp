@@ -6,8 +6,7 @@
 void Become(const std::vector<std::string>& commandLine, bool asOtherUser)
 {
     constexpr unsigned TimeLimitSeconds = 120;
-    if (asOtherUser && geteuid() == 0 &&
-        (setgroups(0, nullptr) != 0 || setgid(OtherUser) != 0 || setuid(OtherUser) != 0))
+    if (asOtherUser && geteuid() == 0 && (setgroups(0, nullptr) != 0 || setgid(OtherUser) != 0 || setuid(OtherUser) != 0))
         _exit(126);
     alarm(TimeLimitSeconds);
     std::vector<char*> argv;

@@ -33,8 +33,7 @@ Files Expected(const Workstation& workstation, const Files& before, const Scenar
     for (const auto& [place, text] : scenario.after)
         expected[place] = place.back() == '#' ? text : workstation.Expand(text);
     for (auto entry = expected.begin(); entry != expected.end();)
-        entry = entry->first.back() == '#' && entry->second.empty() ? expected.erase(entry)
-                                                                     : std::next(entry);
+        entry = entry->first.back() == '#' && entry->second.empty() ? expected.erase(entry) : std::next(entry);
     if (scenario.log != OldLog)
         expected[LogPlace] = workstation.Expand(WithLineEnds(scenario.log));
     return expected;
@@ -56,9 +55,7 @@ std::string Meaning(const std::string& profile)
         if (line[0] == '[')
             section = Lower(line);
         else if (sign != std::string::npos && Lower(line.substr(0, sign)) != "iconresource")
-            values.emplace(section +
-                               Lower(line.substr(0, line.find_last_not_of(' ', sign - 1) + 1)),
-                           line.substr(sign + 1));
+            values.emplace(section + Lower(line.substr(0, line.find_last_not_of(' ', sign - 1) + 1)), line.substr(sign + 1));
     }
     std::string meaning;
     for (const auto& [key, value] : values)
@@ -66,8 +63,7 @@ std::string Meaning(const std::string& profile)
     return meaning;
 }
 
-void ExpectText(const std::string& expected, const std::string& actual, const std::string& place,
-                const char* when)
+void ExpectText(const std::string& expected, const std::string& actual, const std::string& place, const char* when)
 {
     if (IsWindowsProgram() && place.find("Desktop.ini") != std::string::npos && place.back() != '#')
         EXPECT_EQ(Meaning(expected), Meaning(actual)) << when << ": " << place;

@@ -86,19 +86,15 @@ TEST_F(Store, TheChainOfAttributesEndsAtTheFirstGap)
         for (size_t i = 0; i < chain.size(); ++i)
             attributes += i == gap ? wxString() : " " + chain[i] + "='1'";
         HotFolderSettings read;
-        EXPECT_EQ(gap < 4 ? -1 : 1, Load("<r" + attributes + " server_version='12'/>", read))
-            << gap;
+        EXPECT_EQ(gap < 4 ? -1 : 1, Load("<r" + attributes + " server_version='12'/>", read)) << gap;
         size_t count = 0; // of the fields that were set
         for (const wxString& text :
-             {read.name, read.description, read.server_ip, read.server_name,
-              read.BaseVirtualPrinter, read.BaseVirtualPrinterName,
-              read.BaseVirtualPrinterDisplayName, read.HFPresetName, read.TimeInterval,
-              read.PPDVersion, read.ServerTypeAndJPDefaultKeyInfo, read.server_textversion,
-              read.server_type, read.Quickset})
+             {read.name, read.description, read.server_ip, read.server_name, read.BaseVirtualPrinter, read.BaseVirtualPrinterName,
+              read.BaseVirtualPrinterDisplayName, read.HFPresetName, read.TimeInterval, read.PPDVersion, read.ServerTypeAndJPDefaultKeyInfo,
+              read.server_textversion, read.server_type, read.Quickset})
             count += text == "1" ? 1 : 0;
-        for (const bool flag :
-             {read.Enable, read.Centralized, read.Isjobpresetattached, read.IsCustomInterval,
-              read.Quickset_Supported, read.Quickset_Enabled, read.IsWidthBased})
+        for (const bool flag : {read.Enable, read.Centralized, read.Isjobpresetattached, read.IsCustomInterval, read.Quickset_Supported,
+                                read.Quickset_Enabled, read.IsWidthBased})
             count += flag ? 1 : 0;
         EXPECT_EQ(gap, count) << "without " << (gap < chain.size() ? chain[gap] : wxString("none"));
         EXPECT_EQ(gap > 14 ? 12 : -1, read.server_version) << gap;
@@ -114,22 +110,19 @@ TEST_F(Store, ValuesHaveTheirForms)
         bool isTextFlag;
         int number;
     };
-    for (const Form& form :
-         {Form{"1", true, true, 1}, Form{"1 \t", true, true, 1}, Form{" 1", true, false, 1},
-          Form{"01", true, false, 1}, Form{"-1", true, false, -1}, Form{"0", false, false, 0},
-          Form{"", false, false, 0}, Form{"true", false, false, 0}, Form{"12x", true, false, 12},
-          Form{"x1", false, false, 0}, Form{"2147483648", false, false, 0},
-          Form{"99999999999999999999", false, false, 0}})
+    for (const Form& form : {Form{"1", true, true, 1}, Form{"1 \t", true, true, 1}, Form{" 1", true, false, 1}, Form{"01", true, false, 1},
+                             Form{"-1", true, false, -1}, Form{"0", false, false, 0}, Form{"", false, false, 0},
+                             Form{"true", false, false, 0}, Form{"12x", true, false, 12}, Form{"x1", false, false, 0},
+                             Form{"2147483648", false, false, 0}, Form{"99999999999999999999", false, false, 0}})
     {
         HotFolderSettings read;
-        Load(wxString::Format(
-                 "<r name='' description='' server_ip='' server_name='' Enable='%s' "
-                 "BaseVirtualPrinter='' BaseVirtualPrinterName='' BaseVirtualPrinterDisplayName='' "
-                 "HFPresetName='' Centralized='' Isjobpresetattached='' IsCustomInterval='' "
-                 "TimeInterval='' PPDVersion='' ServerTypeAndJPDefaultKeyInfo='' "
-                 "server_version='%s' "
-                 "server_textversion='' server_type='' Quickset='' Quickset_Supported='%s'/>",
-                 form.value, form.value, form.value),
+        Load(wxString::Format("<r name='' description='' server_ip='' server_name='' Enable='%s' "
+                              "BaseVirtualPrinter='' BaseVirtualPrinterName='' BaseVirtualPrinterDisplayName='' "
+                              "HFPresetName='' Centralized='' Isjobpresetattached='' IsCustomInterval='' "
+                              "TimeInterval='' PPDVersion='' ServerTypeAndJPDefaultKeyInfo='' "
+                              "server_version='%s' "
+                              "server_textversion='' server_type='' Quickset='' Quickset_Supported='%s'/>",
+                              form.value, form.value, form.value),
              read);
         EXPECT_EQ(form.isTextFlag, read.Enable) << form.value;
         EXPECT_EQ(form.isNumericFlag, read.Quickset_Supported) << form.value;
@@ -177,17 +170,14 @@ TEST_F(Store, SectionsThatAreMissingLeaveTheirValues)
 TEST_F(Store, AnEntryWithoutAShortNameHasNoNames)
 {
     std::vector<InputFormat> formats;
-    ReadInputFormats(
-        Root("<r><InputFormatsSummary><x/>text<x DisplayName='d'/></InputFormatsSummary></r>"),
-        formats);
+    ReadInputFormats(Root("<r><InputFormatsSummary><x/>text<x DisplayName='d'/></InputFormatsSummary></r>"), formats);
     ASSERT_EQ(1U, formats.size());
     EXPECT_EQ("", formats[0].DisplayName);
 }
 
 TEST_F(Store, DirectChildrenComeBeforeSubtrees)
 {
-    const wxXmlNode* root =
-        Root("<r><a><b><x n='3'/></b><x n='2'/></a><!--c--><c><x n='4'/></c><d/></r>");
+    const wxXmlNode* root = Root("<r><a><b><x n='3'/></b><x n='2'/></a><!--c--><c><x n='4'/></c><d/></r>");
     wxString value;
     EXPECT_TRUE(FindElement(root, "x", true)->GetAttribute("n", &value));
     EXPECT_EQ("2", value);
@@ -199,14 +189,12 @@ TEST_F(Store, DirectChildrenComeBeforeSubtrees)
 
 TEST_F(Store, DefaultsAreWrittenAndAFilterOfAnotherNameIsNot)
 {
-    SaveHotFolderSettings(m_path, {}, {}, {}, wxXmlNode(wxXML_ELEMENT_NODE, "filtersetting"), {},
-                          {});
-    EXPECT_TRUE(Text().EndsWith(
-        "Enable=\"0\" Centralized=\"0\" Isjobpresetattached=\"0\" "
-        "IsCustomInterval=\"0\" TimeInterval=\"\">\n  <InputFormatsSummary/>\n"
-        "  <Paths>\n    <Failfolder path=\"\"/>\n    <Workfolder path=\"\"/>\n"
-        "    <Movefolder path=\"\"/>\n    <Hotfolder path=\"\"/>\n  </Paths>\n"
-        "  <JobSetting/>\n  <ImposeSetting/>\n  <PreflightSettings/>\n</HotFolder>\n"));
+    SaveHotFolderSettings(m_path, {}, {}, {}, wxXmlNode(wxXML_ELEMENT_NODE, "filtersetting"), {}, {});
+    EXPECT_TRUE(Text().EndsWith("Enable=\"0\" Centralized=\"0\" Isjobpresetattached=\"0\" "
+                                "IsCustomInterval=\"0\" TimeInterval=\"\">\n  <InputFormatsSummary/>\n"
+                                "  <Paths>\n    <Failfolder path=\"\"/>\n    <Workfolder path=\"\"/>\n"
+                                "    <Movefolder path=\"\"/>\n    <Hotfolder path=\"\"/>\n  </Paths>\n"
+                                "  <JobSetting/>\n  <ImposeSetting/>\n  <PreflightSettings/>\n</HotFolder>\n"));
     EXPECT_TRUE(Text().Contains("server_version=\"-1\""));
 }
 

@@ -26,9 +26,8 @@ std::string FromEnvironment(const char* name)
 // Presses the button of a message box if there is one; what xdotool found to press is the answer.
 bool PressButton()
 {
-    return std::system(
-               "xdotool search --onlyvisible --name '^FolderUpgrade' windowfocus key Return "
-               ">/dev/null 2>&1") == 0;
+    return std::system("xdotool search --onlyvisible --name '^FolderUpgrade' windowfocus key Return "
+                       ">/dev/null 2>&1") == 0;
 }
 
 } // namespace
@@ -40,16 +39,13 @@ fs::path WindowsProgram()
 
 Wine::Wine(bool asOtherUser, const fs::path& driveH)
     : m_asOtherUser(asOtherUser),
-      m_prefix(FromEnvironment(asOtherUser ? "FOLDER_UPGRADE_WINE_PREFIX_OTHER"
-                                           : "FOLDER_UPGRADE_WINE_PREFIX")),
-      m_driveH(driveH)
+      m_prefix(FromEnvironment(asOtherUser ? "FOLDER_UPGRADE_WINE_PREFIX_OTHER" : "FOLDER_UPGRADE_WINE_PREFIX")), m_driveH(driveH)
 {
     const fs::path link = m_prefix / "dosdevices" / "h:";
     fs::remove(link);
     fs::create_symlink(driveH, link);
-    for (const fs::path& left :
-         {UserDataDir() / "ORX", UserDataDir() / "ORX_Installers", UserDataDir() / "registry",
-          MachineDataDir() / "hotfolder", MachineDataDir() / "registry"})
+    for (const fs::path& left : {UserDataDir() / "ORX", UserDataDir() / "ORX_Installers", UserDataDir() / "registry",
+                                 MachineDataDir() / "hotfolder", MachineDataDir() / "registry"})
         fs::remove_all(left);
 }
 
@@ -71,10 +67,8 @@ std::string Wine::UserDataPath() const
 void Wine::ImportHives(const std::string& machineHive, const std::string& userHive) const
 {
     std::string text = "Windows Registry Editor Version 5.00\r\n\r\n";
-    for (const char* key :
-         {"HKEY_LOCAL_MACHINE\\SOFTWARE\\Vantorix",
-          "HKEY_LOCAL_MACHINE\\SOFTWARE\\Wow6432Node\\Vantorix", "HKEY_CURRENT_USER\\SOFTWARE\\HF",
-          "HKEY_CURRENT_USER\\SOFTWARE\\Wow6432Node\\HF"})
+    for (const char* key : {"HKEY_LOCAL_MACHINE\\SOFTWARE\\Vantorix", "HKEY_LOCAL_MACHINE\\SOFTWARE\\Wow6432Node\\Vantorix",
+                            "HKEY_CURRENT_USER\\SOFTWARE\\HF", "HKEY_CURRENT_USER\\SOFTWARE\\Wow6432Node\\HF"})
         text += std::string("[-") + key + "]\r\n\r\n";
     for (const std::string& hive : {machineHive, userHive})
     {
@@ -92,8 +86,7 @@ void Wine::ImportHives(const std::string& machineHive, const std::string& userHi
     fs::remove(m_driveH / "hives.reg");
 }
 
-int Wine::Start(const std::vector<std::string>& commandLine, const fs::path& watched,
-                std::vector<std::string>& boxes) const
+int Wine::Start(const std::vector<std::string>& commandLine, const fs::path& watched, std::vector<std::string>& boxes) const
 {
     const pid_t child = fork();
     if (child == 0)
@@ -114,8 +107,7 @@ int Wine::Start(const std::vector<std::string>& commandLine, const fs::path& wat
     };
     while (waitpid(child, &status, WNOHANG) == 0)
     {
-        std::this_thread::sleep_for(
-            std::chrono::milliseconds(elapsed() < std::chrono::seconds(1) ? 10 : 100));
+        std::this_thread::sleep_for(std::chrono::milliseconds(elapsed() < std::chrono::seconds(1) ? 10 : 100));
         if (elapsed() > std::chrono::seconds(1))
         {
             const std::string text = ReadFile(watched);

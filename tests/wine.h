@@ -25,8 +25,7 @@ class Wine
     /// Starts a program and presses the button of every message box. Gives the exit status as a
     /// shell sees it; the text of the watched file while a box is there goes into boxes, once for
     /// as long as it stays the same.
-    int Start(const std::vector<std::string>& commandLine, const std::filesystem::path& watched,
-              std::vector<std::string>& boxes) const;
+    int Start(const std::vector<std::string>& commandLine, const std::filesystem::path& watched, std::vector<std::string>& boxes) const;
 
   private:
     bool m_asOtherUser;

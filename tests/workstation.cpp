@@ -44,8 +44,7 @@ std::string Letters(const fs::path& path)
     const unsigned long stored = StoredAttributes(path);
     const bool isDirectory = S_ISDIR(status.st_mode);
     const bool isReadOnly = isDirectory ? (stored & 1) != 0 : (status.st_mode & 0222) == 0;
-    return std::string(isReadOnly ? "R" : "") + ((stored & 2) != 0 ? "H" : "") +
-           ((stored & 4) != 0 ? "S" : "");
+    return std::string(isReadOnly ? "R" : "") + ((stored & 2) != 0 ? "H" : "") + ((stored & 4) != 0 ? "S" : "");
 }
 
 // Whether a path in an application data folder, which others use too, belongs to a scenario.
@@ -97,13 +96,12 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser)
     }
     const std::string separator = IsWindowsProgram() ? "\\" : "/";
     const std::string root = (IsWindowsProgram() ? "H:" : m_root.string()) + separator;
-    m_tokens = {
-        {"{hot}", root + "Hot Folders"},
-        {"{tool}", root + "Tool Größe"},
-        {"{app}", root + "Apps ä"},
-        {"{previous}", root + "Vorige 版"},
-        {"{user}", IsWindowsProgram() ? m_wine->UserDataPath() : m_hostDirs["user"].string()},
-        {"{/}", separator}};
+    m_tokens = {{"{hot}", root + "Hot Folders"},
+                {"{tool}", root + "Tool Größe"},
+                {"{app}", root + "Apps ä"},
+                {"{previous}", root + "Vorige 版"},
+                {"{user}", IsWindowsProgram() ? m_wine->UserDataPath() : m_hostDirs["user"].string()},
+                {"{/}", separator}};
     m_tokens["{default}"] = m_tokens["{app}"] + separator + "template";
     // In capitals as the registry editor's text has them.
     for (const auto& [token, value] : Files(m_tokens))
@@ -126,8 +124,8 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser)
 Workstation::~Workstation()
 {
     std::error_code ignored;
-    for (auto entry = fs::recursive_directory_iterator(m_root, ignored);
-         entry != fs::recursive_directory_iterator(); entry.increment(ignored))
+    for (auto entry = fs::recursive_directory_iterator(m_root, ignored); entry != fs::recursive_directory_iterator();
+         entry.increment(ignored))
     {
         if (entry->is_directory(ignored))
             fs::permissions(entry->path(), fs::perms::owner_all, fs::perm_options::add, ignored);
@@ -164,8 +162,7 @@ void Workstation::SetAttributes(const std::string& place, const std::string& let
     {
         return letters.find(letter) != std::string::npos;
     };
-    const unsigned stored =
-        (has('H') ? 2U : 0U) | (has('S') ? 4U : 0U) | (has('R') && isDirectory ? 1U : 0U);
+    const unsigned stored = (has('H') ? 2U : 0U) | (has('S') ? 4U : 0U) | (has('R') && isDirectory ? 1U : 0U);
     const std::string text = "0x" + std::to_string(stored);
     if (stored != 0 && setxattr(path.c_str(), AttributeName, text.data(), text.size(), 0) != 0)
         throw std::runtime_error("no extended attributes in " + m_root.string());
@@ -208,12 +205,10 @@ void Workstation::LayOut(const Files& files)
     {
         for (const auto& [name, directory] : m_hostDirs)
             GiveAway(directory);
-        ForEachEntry([](const std::string&, const fs::directory_entry& entry)
-                     { GiveAway(entry.path()); });
+        ForEachEntry([](const std::string&, const fs::directory_entry& entry) { GiveAway(entry.path()); });
     }
     if (m_wine)
-        m_wine->ImportHives(ExpandedAt(*this, files, MachineHive),
-                            ExpandedAt(*this, files, UserHive));
+        m_wine->ImportHives(ExpandedAt(*this, files, MachineHive), ExpandedAt(*this, files, UserHive));
     for (const auto& [place, text] : files)
     {
         if (place.back() == '#')

@@ -69,11 +69,11 @@ bool IsHit(const char* call, FILE* stream)
 } // namespace
 
 // The call with its parameters, what it is given, by what it is recognised, and how it fails.
-#define FAILING(result, name, parameters, arguments, subject, failure)                             \
-    extern "C" result name parameters                                                              \
-    {                                                                                              \
-        static const auto real = Real(&name, #name);                                               \
-        return IsHit(#name, subject) ? (failure) : real arguments;                                 \
+#define FAILING(result, name, parameters, arguments, subject, failure)                                                                     \
+    extern "C" result name parameters                                                                                                      \
+    {                                                                                                                                      \
+        static const auto real = Real(&name, #name);                                                                                       \
+        return IsHit(#name, subject) ? (failure) : real arguments;                                                                         \
     }
 extern "C" int open64(const char* path, int flags, ...)
 {
@@ -91,10 +91,8 @@ FAILING(DIR*, opendir, (const char* path), (path), path, nullptr)
 FAILING(dirent64*, readdir64, (DIR * dir), (dir), dirfd(dir), nullptr)
 FAILING(ssize_t, read, (int file, void* data, size_t size), (file, data, size), file, -1)
 FAILING(ssize_t, write, (int file, const void* data, size_t size), (file, data, size), file, -1)
-FAILING(size_t, fread, (void* data, size_t size, size_t count, FILE* file),
-        (data, size, count, file), file, 0)
-FAILING(size_t, fwrite, (const void* data, size_t size, size_t count, FILE* file),
-        (data, size, count, file), file, 0)
+FAILING(size_t, fread, (void* data, size_t size, size_t count, FILE* file), (data, size, count, file), file, 0)
+FAILING(size_t, fwrite, (const void* data, size_t size, size_t count, FILE* file), (data, size, count, file), file, 0)
 FAILING(int, fflush, (FILE * file), (file), file, EOF)
 FAILING(int, fsync, (int file), (file), file, -1)
 // These close all the same.
@@ -107,9 +105,7 @@ FAILING(int, fstat64, (int file, struct stat64* status) noexcept, (file, status)
 FAILING(int, chmod, (const char* path, mode_t mode) noexcept, (path, mode), path, -1)
 FAILING(int, unlink, (const char* path) noexcept, (path), path, -1)
 FAILING(int, rename, (const char* from, const char* to) noexcept, (from, to), to, -1)
-FAILING(ssize_t, getxattr, (const char* path, const char* name, void* data, size_t size) noexcept,
-        (path, name, data, size), path, -1)
-FAILING(int, setxattr,
-        (const char* path, const char* name, const void* data, size_t size, int flags) noexcept,
+FAILING(ssize_t, getxattr, (const char* path, const char* name, void* data, size_t size) noexcept, (path, name, data, size), path, -1)
+FAILING(int, setxattr, (const char* path, const char* name, const void* data, size_t size, int flags) noexcept,
         (path, name, data, size, flags), path, -1)
 FAILING(int, removexattr, (const char* path, const char* name) noexcept, (path, name), path, -1)
