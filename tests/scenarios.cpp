@@ -342,6 +342,11 @@ void AddFolderCfgs(Rows& rows)
                     {"I"},
                     {{CfgA, MinimalWritten("{hot}{/}template{/}x", "€ä")}},
                     LogOfA(asciiFound, "I", disabled)});
+    rows.push_back({"AShiftJisDeclarationWithBlanksStays",
+                    OneFolder(Minimal("{hot}{/}x", "<?xml version='1.0' encoding = 'Shift_JIS'?>", "\x93\xFA"), ascii),
+                    {"I"},
+                    {},
+                    LogOfA(asciiFound + Untouched("unknown encoding"), "I", disabled)});
     for (const auto& [encoding, name] : Files{{"windows-1253", "\xE1\xD2"}, {"Shift_JIS", "\x93\xFA\x96\x7B"}, {"x-own", "x"}})
         rows.push_back({"ThisEncodingStays_" + encoding.substr(encoding.size() - 3),
                         OneFolder(declared(encoding, name), ascii),

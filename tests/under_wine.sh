@@ -6,6 +6,7 @@
 # PROGRAM_DIR holds FolderUpgrade.exe and tests/unit_test.exe, TEST_DIR this machine's
 # tests/scenario_test. Makes two prefixes, root's and another user's, and a display of its own.
 set -euo pipefail
+[ "$(id -u)" = 0 ] || { echo "needs root: the rows about refusals run as another user" >&2; exit 1; }
 program_dir=$(realpath "$1")
 test_dir=$(realpath "$2")
 wine=/usr/lib/wine/wine64

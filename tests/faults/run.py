@@ -130,7 +130,8 @@ def try_faults(worker):
 
 if __name__ == "__main__":
     packages = ["g++", "clang", "libclang-rt-dev", "cmake", "ninja-build", "libwxgtk3.2-dev"]
-    for step in (["cmake/install_packages.sh", *packages], ["cmake", "--preset", "fuzz"], ["cmake", "--build", "--preset", "fuzz"]):
+    build = ["cmake", "--build", "--preset", "fuzz"]
+    for step in (["cmake/install_packages.sh", *packages], ["cmake", "--preset", "fuzz"], build):
         subprocess.run(step, cwd=BUILD.parents[1], check=True, stdout=subprocess.DEVNULL)
     with concurrent.futures.ProcessPoolExecutor(WORKERS) as pool:
         results = list(pool.map(try_faults, range(WORKERS)))
