@@ -31,9 +31,9 @@ bool ReadSwitch(const wxString& text, bool& isUpgrade)
 void UpdateHotFolder(FolderUpgradeApp& app, const wxString& folder, int position)
 {
     UpdateFolderIcon(app, folder);
-    RunLog("Updated icon for hf" + folder, position);
+    RunLog(L"Updated icon for hf" + folder, position);
     UpdateHotFolderImposePath(app, folder);
-    RunLog("updated Impose path for hf" + folder, position);
+    RunLog(L"updated Impose path for hf" + folder, position);
 }
 
 } // namespace

@@ -9,13 +9,13 @@
 namespace
 {
 
-const char* const Section = ".ShellClassInfo";
-const char* const IconFileKey = "IconFile";
-const char* const IconIndexKey = "IconIndex";
-const char* const InfoTipKey = "InfoTip";
-const char* const IconIndexValue = "00";
-const wxString HotFolderInfoTip = "This folder has been configured as an ORX hot folder.";
-const char* const IconDir = ".\\[_ORX_HotFolder_]\\";
+const wchar_t* const Section = L".ShellClassInfo";
+const wchar_t* const IconFileKey = L"IconFile";
+const wchar_t* const IconIndexKey = L"IconIndex";
+const wchar_t* const InfoTipKey = L"InfoTip";
+const wchar_t* const IconIndexValue = L"00";
+const wchar_t* const HotFolderInfoTip = L"This folder has been configured as an ORX hot folder.";
+const wchar_t* const IconDir = L".\\[_ORX_HotFolder_]\\";
 const wchar_t* const DefaultIconFile = L"00";
 
 constexpr DWORD ReadOnlyAndSystem = FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_SYSTEM;
@@ -46,7 +46,7 @@ void ForceFolderIcon(const wxString& hotFolder, wchar_t* iconFile)
 
 wxString DesktopIniPath(const wxString& hotFolder)
 {
-    return hotFolder + "\\Desktop.ini";
+    return hotFolder + L"\\Desktop.ini";
 }
 
 bool WriteIniString(const wxString& section, const wxString& key, const wxString& value,
@@ -77,8 +77,8 @@ bool RefreshDesktopIni(const wxString& hotFolder, const wxString& iconName)
     WriteIniString(Section, IconFileKey, IconDir + iconName, path);
 
     std::array<wchar_t, IconFileCapacity> iconFile{};
-    GetPrivateProfileStringW(wxString(Section).wc_str(), wxString(IconFileKey).wc_str(),
-                             DefaultIconFile, iconFile.data(), IconFileCapacity, path.wc_str());
+    GetPrivateProfileStringW(Section, IconFileKey, DefaultIconFile, iconFile.data(),
+                             IconFileCapacity, path.wc_str());
     SetFileAttributesW(path.wc_str(), FILE_ATTRIBUTE_NORMAL);
     ForceFolderIcon(hotFolder, iconFile.data());
     return true;

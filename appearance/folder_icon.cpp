@@ -27,7 +27,8 @@ constexpr int NormalizeAll = wxPATH_NORM_ENV_VARS | wxPATH_NORM_DOTS | wxPATH_NO
 wxFileName SourceIcon(const FolderUpgradeApp& app, const wxString& iconName)
 {
     const wxString separator = wxFileName::GetPathSeparator();
-    wxString path = wxStandardPaths::Get().GetExecutablePath() + "/../";
+    static const wxString executable = wxStandardPaths::Get().GetExecutablePath();
+    wxString path = executable + L"/../";
     if (!app.m_isUpgrade)
         path += separator + app.m_bundleIconsDir + separator;
     wxFileName source(path + iconName);
@@ -98,7 +99,7 @@ bool ApplyFolderIcon(const wxString& hotFolder, const wxString& iconName)
 {
     wxFileName ini;
     ini.AssignDir(hotFolder);
-    ini.SetFullName("Desktop.ini");
+    ini.SetFullName(L"Desktop.ini");
     const wxString iniPath = ini.GetFullPath();
     if (GetPackedShellVersion() >= CustomFolderVersion)
     {
@@ -130,7 +131,7 @@ void UpdateFolderIcon(const FolderUpgradeApp& app, const wxString& hotFolder)
     }
     wxCopyFile(source.GetFullPath(), destination.GetFullPath(), true);
     ApplyFolderIcon(hotFolder, iconName);
-    RunLog(wxString::Format("Icon  copied from : %s To %s ", source.GetFullPath(),
-                            destination.GetFullPath()),
+    RunLog(L"Icon  copied from : " + source.GetFullPath() + L" To " + destination.GetFullPath() +
+               L" ",
            NoCount);
 }

@@ -8,8 +8,8 @@
 namespace
 {
 
-const char* const ErrorFileName = "Error.er";
-const char* const IconExtension = ".ico";
+const wchar_t* const ErrorFileName = L"Error.er";
+const wchar_t* const IconExtension = L".ico";
 
 bool IsEnabled(const wxString& hotFolder)
 {
@@ -21,30 +21,33 @@ bool IsEnabled(const wxString& hotFolder)
     return settings.Enable;
 }
 
-// The library logs a directory that it cannot open, so that is asked first.
+// The library logs a directory that it cannot open, so that is asked first; and it looks at every
+// entry of the directory, which most of the time can be spared.
 bool HasError(const wxString& hotFolder)
 {
     const wxString path = PrivateDirPath(hotFolder);
+    if (!wxFileName::Exists(path + ErrorFileName, wxFILE_EXISTS_ANY | wxFILE_EXISTS_NO_FOLLOW))
+        return false;
     if (!wxFileName::DirExists(path) || !wxFileName::IsDirReadable(path))
         return false;
     const wxDir directory(path);
     return directory.IsOpened() && directory.HasFiles(ErrorFileName);
 }
 
-const char* IconBaseName(FolderIconState state)
+const wchar_t* IconBaseName(FolderIconState state)
 {
     switch (state)
     {
     case FolderIconState::Active:
-        return "hf_folder";
+        return L"hf_folder";
     case FolderIconState::Inactive:
-        return "hf_folder_disabled";
+        return L"hf_folder_disabled";
     case FolderIconState::ErrorActive:
-        return "hf_error_active";
+        return L"hf_error_active";
     case FolderIconState::ErrorInactive:
         break;
     }
-    return "hf_error_inactive";
+    return L"hf_error_inactive";
 }
 
 } // namespace

@@ -165,7 +165,7 @@ void UpdateHotFolderImposePath(const FolderUpgradeApp& app, const wxString& hotF
     const auto entry = table.find(ImposeTemplateKey);
     const bool isPresent = entry != table.end();
     const wxString storedPath = isPresent ? entry->second.Value : wxString();
-    RunLog("Imposepath:" + hotFolder + "is: " + storedPath, NoCount);
+    RunLog(L"Imposepath:" + hotFolder + L"is: " + storedPath, NoCount);
     if (isPresent)
         MoveTemplate(cfgPath, app.m_isUpgrade ? Upgrade : Downgrade, table);
 }

@@ -5,7 +5,6 @@
 #include "store/xml_tree.h"
 
 #include <wx/filename.h>
-#include <wx/wfstream.h>
 
 #include <array>
 #include <limits>
@@ -190,9 +189,7 @@ wxString FolderCfgPath(const wxString& hotFolder)
 
 bool LoadFolderCfg(const wxString& path, wxXmlDocument& document, int flags)
 {
-    // By name it would come in reads of a kilobyte.
-    wxFFileInputStream file(path, L"rb");
-    return file.IsOk() && document.Load(file, L"UTF-8", flags) && document.GetRoot();
+    return document.Load(path, L"UTF-8", flags) && document.GetRoot();
 }
 
 int LoadHotFolderSettings(const wxString& path, HotFolderSettings& settings, bool* loaded)

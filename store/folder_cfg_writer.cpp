@@ -11,7 +11,7 @@ namespace
 {
 
 constexpr int IndentationStep = 2;
-constexpr size_t WriteBufferBytes = size_t{64} * 1024;
+constexpr size_t WriteBufferBytes = size_t{16} * 1024;
 
 const wchar_t* FormatFlag(bool flag)
 {

@@ -4,18 +4,23 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-bool ReadFileBytes(const std::string& path, std::string& bytes)
+bool ReadFileBytes(const std::string& path, std::string& bytes, mode_t* mode)
 {
-    struct stat status = {};
-    if (stat(path.c_str(), &status) != 0 || !S_ISREG(status.st_mode))
-        return false;
-    const int file = open(path.c_str(), O_RDONLY | O_CLOEXEC);
+    // So that a pipe in the file's place holds nobody up.
+    const int file = open(path.c_str(), O_RDONLY | O_NONBLOCK | O_CLOEXEC);
     if (file < 0)
         return false;
-    bytes.resize(static_cast<size_t>(status.st_size));
-    const ssize_t count = read(file, bytes.data(), bytes.size());
+    struct stat status = {};
+    bool isWhole = false;
+    if (fstat(file, &status) == 0 && S_ISREG(status.st_mode))
+    {
+        bytes.resize(static_cast<size_t>(status.st_size));
+        isWhole = read(file, bytes.data(), bytes.size()) == status.st_size;
+    }
     close(file);
-    return count == status.st_size;
+    if (mode)
+        *mode = status.st_mode;
+    return isWhole;
 }
 
 bool WriteFileBytes(const std::string& path, const std::string& bytes)

@@ -11,6 +11,7 @@
 #include <algorithm>
 #include <string>
 #include <sys/stat.h>
+#include <unistd.h>
 
 namespace
 {
@@ -32,10 +33,10 @@ struct Text
 // file, whoever asks, and for what cannot be read.
 bool ReadForWriting(const std::string& path, std::string& bytes)
 {
-    struct stat status = {};
-    if (stat(path.c_str(), &status) != 0)
-        return true;
-    return (status.st_mode & (S_IWUSR | S_IWGRP | S_IWOTH)) != 0 && ReadFileBytes(path, bytes);
+    mode_t mode = 0;
+    if (!ReadFileBytes(path, bytes, &mode))
+        return access(path.c_str(), F_OK) != 0;
+    return (mode & (S_IWUSR | S_IWGRP | S_IWOTH)) != 0;
 }
 
 Text Decode(const std::string& bytes)

@@ -13,6 +13,7 @@
 #include <memory>
 #include <optional>
 #include <string>
+#include <string_view>
 #include <utility>
 #include <vector>
 
@@ -241,20 +242,40 @@ class Lines
     size_t m_next = 0;
 };
 
-std::wstring Lower(std::wstring text)
+bool IsSameLetter(wchar_t left, wchar_t right)
 {
-    std::transform(text.begin(), text.end(), text.begin(),
-                   [](wchar_t character)
-                   { return static_cast<wchar_t>(std::towlower(static_cast<wint_t>(character))); });
-    return text;
+    return left == right ||
+           std::towlower(static_cast<wint_t>(left)) == std::towlower(static_cast<wint_t>(right));
 }
 
-bool StartsWith(const std::wstring& text, const std::wstring& start)
+// The number of characters with which both texts begin, in any letter case.
+size_t CommonLength(std::wstring_view left, std::wstring_view right)
 {
-    return text.compare(0, start.length(), start) == 0;
+    const auto [end, _] =
+        std::mismatch(left.begin(), left.end(), right.begin(), right.end(), IsSameLetter);
+    return static_cast<size_t>(end - left.begin());
 }
 
-// The key of that full path (hive name first, all in lower case) in the hive's text, or none.
+bool IsSameName(std::wstring_view left, std::wstring_view right)
+{
+    return left.length() == right.length() && CommonLength(left, right) == left.length();
+}
+
+bool IsBelow(std::wstring_view path, std::wstring_view parent)
+{
+    return path.length() > parent.length() && path[parent.length()] == L'\\' &&
+           CommonLength(path, parent) == parent.length();
+}
+
+// The path of a key's line, hive name first: empty when the line is not whole.
+std::wstring_view KeyPath(std::wstring_view line, bool isRemoval)
+{
+    const size_t bracket = line.rfind(L']');
+    const size_t begin = isRemoval ? 2 : 1;
+    return bracket == std::wstring_view::npos ? L"" : line.substr(begin, bracket - begin);
+}
+
+// The key of that full path in the hive's text, or none.
 std::unique_ptr<RegistryKey> FindKey(std::wstring hive, const std::wstring& wanted)
 {
     Lines lines(std::move(hive));
@@ -262,25 +283,22 @@ std::unique_ptr<RegistryKey> FindKey(std::wstring hive, const std::wstring& want
     if (!lines.Next(line) || line != HiveFormat)
         return nullptr;
     std::unique_ptr<RegistryKey> key;
-    const std::wstring wantedParent = wanted + L"\\";
     bool isInKey = false;
     while (lines.Next(line))
     {
-        if (!StartsWith(line, L"["))
+        if (line.empty() || line.front() != L'[')
         {
             if (isInKey)
                 key->lines.push_back(line);
             continue;
         }
-        const bool isRemoval = StartsWith(line, L"[-");
-        const size_t bracket = line.rfind(L']');
-        const size_t begin = isRemoval ? 2 : 1;
-        const std::wstring path =
-            bracket == std::wstring::npos ? L"" : Lower(line.substr(begin, bracket - begin));
-        isInKey = path == wanted && !isRemoval;
-        if (isRemoval && (wanted == path || StartsWith(wanted, path + L"\\")))
+        const bool isRemoval = line.compare(0, 2, L"[-") == 0;
+        const std::wstring_view path = KeyPath(line, isRemoval);
+        const bool isWanted = IsSameName(path, wanted);
+        isInKey = isWanted && !isRemoval;
+        if (isRemoval && (isWanted || IsBelow(wanted, path)))
             key.reset();
-        else if (!isRemoval && !key && (isInKey || StartsWith(path, wantedParent)))
+        else if (!isRemoval && !key && (isInKey || IsBelow(path, wanted)))
             key = std::make_unique<RegistryKey>();
     }
     return key;
@@ -294,7 +312,7 @@ LSTATUS RegOpenKeyExW(HKEY hive, LPCWSTR path, DWORD /*options*/, REGSAM /*acces
     if (name.empty())
         return ERROR_INVALID_HANDLE;
     std::unique_ptr<RegistryKey> found =
-        FindKey(ReadHive(hive), Lower((name + L"\\" + path).ToStdWstring()));
+        FindKey(ReadHive(hive), (name + L"\\" + path).ToStdWstring());
     if (!found)
         return ERROR_FILE_NOT_FOUND;
     *key = found.release(); // the caller's until RegCloseKey
@@ -304,13 +322,12 @@ LSTATUS RegOpenKeyExW(HKEY hive, LPCWSTR path, DWORD /*options*/, REGSAM /*acces
 LSTATUS RegQueryValueExW(HKEY key, LPCWSTR name, DWORD* /*reserved*/, DWORD* type, BYTE* data,
                          DWORD* size)
 {
-    const std::wstring wanted = Lower(name);
     std::optional<Value> found;
     std::wstring lineName;
     std::wstring lineData;
     for (const std::wstring& line : key->lines)
     {
-        if (SplitLine(line, lineName, lineData) && Lower(lineName) == wanted)
+        if (SplitLine(line, lineName, lineData) && IsSameName(lineName, name))
             ParseData(lineData, found);
     }
     if (!found)
