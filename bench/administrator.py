@@ -1,30 +1,62 @@
 #!/usr/bin/python3
-"""The same upgrade the way an administrator would write it today: one load of each Folder.cfg with lxml.
+"""The same upgrade the way an administrator would write it today: one load of each Folder.cfg, with lxml.
 
-    administrator.py FOLDERS ICON FROM TO
+    administrator.py LIST ICON_DIR OLD NEW PRESET_DIR
+
+LIST is HotFolderList.cfg; template paths move from the folder OLD to the folder NEW, in the hot folders and in the
+presets below PRESET_DIR. It keeps no log and asks no registry.
 """
+import glob
 import os
 import shutil
 import sys
 
 from lxml import etree
 
-INFO_TIP = 'InfoTip=This folder has been configured as an ORX hot folder.'
+KEY = 'ORXImposeTemplate'
+INI = {'InfoTip': 'This folder has been configured as an ORX hot folder.'}
 
-folders, icon, old, new = sys.argv[1:]
-for folder in open(folders, encoding='utf-8').read().splitlines():
-    private = os.path.join(folder, '[_ORX_HotFolder_]')
-    cfg = os.path.join(private, 'Folder.cfg')
-    document = etree.parse(cfg)
-    shutil.copyfile(icon, os.path.join(private, os.path.basename(icon)))
-    ini = os.path.join(folder, 'Desktop.ini')
-    os.chmod(ini, 0o644)
+
+def refresh_icon(folder, private, enabled, icon_dir):
+    error = os.path.isfile(f'{private}/Error.er')
+    name = {(True, False): 'hf_folder', (False, False): 'hf_folder_disabled',
+            (True, True): 'hf_error_active', (False, True): 'hf_error_inactive'}[enabled, error] + '.ico'
+    if not os.path.isfile(f'{private}/{name}'):
+        return
+    shutil.copyfile(f'{icon_dir}/{name}', f'{private}/{name}')
+    ini = f'{folder}/Desktop.ini'
+    values = dict(INI, IconFile=f'.\\[_ORX_HotFolder_]\\{name}')
     with open(ini, encoding='utf-8', newline='') as file:
         lines = file.read().split('\r\n')
+    lines = [f'{key}={values[key]}' if (key := line.partition('=')[0]) in values else line for line in lines]
+    os.chmod(ini, 0o644)
     with open(ini, 'w', encoding='utf-8', newline='') as file:
-        file.write('\r\n'.join(INFO_TIP if line.startswith('InfoTip=') else line for line in lines))
+        file.write('\r\n'.join(lines))
+    os.setxattr(ini, 'user.DOSATTRIB', b'0x4')
     os.chmod(ini, 0o444)
-    for entry in document.iterfind('.//ImposeSetting/KEYVALUE[@Key="ORXImposeTemplate"]'):
-        if os.path.dirname(entry.get('Value')) == old:
-            entry.set('Value', os.path.join(new, os.path.basename(entry.get('Value'))))
-            document.write(cfg, encoding='UTF-8', xml_declaration=True)
+    os.setxattr(folder, 'user.DOSATTRIB', b'0x4')
+
+
+def move_template(path, document, old, new):
+    for entry in document.iterfind(f'.//ImposeSetting/KEYVALUE[@Key="{KEY}"]'):
+        directory, name = os.path.split(entry.get('Value'))
+        if directory == old:
+            entry.set('Value', os.path.join(new, name))
+            document.write(path, encoding='UTF-8', xml_declaration=True)
+
+
+def main(hot_folder_list, icon_dir, old, new, preset_dir):
+    for element in etree.parse(hot_folder_list).iterfind('HotFolder'):
+        folder = element.get('path')
+        private = f'{folder}/[_ORX_HotFolder_]'
+        document = etree.parse(f'{private}/Folder.cfg')
+        refresh_icon(folder, private, document.getroot().get('Enable') == '1', icon_dir)
+        move_template(f'{private}/Folder.cfg', document, old, new)
+    for path in glob.glob(f'{preset_dir}/*/Presets/presets.xml'):
+        with open(path, encoding='utf-8', newline='') as file:
+            text = file.read()
+        with open(path, 'w', encoding='utf-8', newline='') as file:
+            file.write(text.replace(f'{KEY}">"{old}/', f'{KEY}">"{new}/'))
+
+
+main(*sys.argv[1:])

@@ -1,10 +1,12 @@
 // The floor of a whole run: nothing but the library's loads of each Folder.cfg, the one save and
 // the copy of the icon.
 //
-//     floor FOLDERS ICON
+//     floor FOLDERS ICON [SAVE]
 //
 // FOLDERS is a text file that names a hot folder a line, ICON the icon that goes over each folder's
-// own.
+// own. SAVE is the library's way to the file: "buffered" on its plain file stream, as if nothing is
+// given, where the buffer's end waits for the disk; "unsynced", on its stream of the C library,
+// which does not and is what the tool does; "named", with its own save by file name.
 
 #include <wx/filefn.h>
 #include <wx/filename.h>
@@ -20,9 +22,26 @@ namespace
 constexpr int LoadsPerFolder = 8;
 
 constexpr int IndentationStep = 2;
-constexpr size_t WriteBufferBytes = 64 * 1024;
+constexpr size_t WriteBufferBytes = 16 * 1024;
 
-bool Refresh(const wxString& folder, const wxString& icon, const wxString& iconName)
+template <typename Stream>
+bool SaveBuffered(const wxXmlDocument& document, Stream&& file)
+{
+    wxBufferedOutputStream buffered(file, WriteBufferBytes);
+    return document.Save(buffered, IndentationStep) && buffered.Close() && file.Close();
+}
+
+bool Save(const wxXmlDocument& document, const wxString& path, const wxString& way)
+{
+    if (way == "named")
+        return document.Save(path, IndentationStep);
+    if (way == "unsynced")
+        return SaveBuffered(document, wxFFileOutputStream(path, "wb"));
+    return SaveBuffered(document, wxFileOutputStream(path));
+}
+
+bool Refresh(const wxString& folder, const wxString& icon, const wxString& iconName,
+             const wxString& saveWay)
 {
     const wxString privateDir = folder + "/[_ORX_HotFolder_]/";
     const wxString cfgPath = privateDir + "Folder.cfg";
@@ -35,10 +54,7 @@ bool Refresh(const wxString& folder, const wxString& icon, const wxString& iconN
     wxXmlDocument document;
     if (!document.Load(cfgPath, "UTF-8"))
         return false;
-    wxFileOutputStream file(cfgPath);
-    wxBufferedOutputStream buffered(file, WriteBufferBytes);
-    return document.Save(buffered, IndentationStep) && buffered.Close() && file.Close() &&
-           wxCopyFile(icon, privateDir + iconName, true);
+    return Save(document, cfgPath, saveWay) && wxCopyFile(icon, privateDir + iconName, true);
 }
 
 } // namespace
@@ -46,16 +62,17 @@ bool Refresh(const wxString& folder, const wxString& icon, const wxString& iconN
 int main(int argc, char** argv)
 {
     const wxInitializer library(argc, argv);
-    if (argc != 3)
+    if (argc < 3)
         return 2;
     wxTextFile folders;
     if (!folders.Open(wxString::FromUTF8(argv[1])))
         return 1;
     const wxString icon = wxString::FromUTF8(argv[2]);
     const wxString iconName = wxFileName(icon).GetFullName();
+    const wxString saveWay = argc > 3 ? argv[3] : "buffered";
     for (size_t i = 0; i < folders.GetLineCount(); ++i)
     {
-        if (!Refresh(folders[i], icon, iconName))
+        if (!Refresh(folders[i], icon, iconName, saveWay))
             return 1;
     }
     return 0;

@@ -15,6 +15,8 @@ SAMPLE = 'Flyers A4'
 PRIVATE = '[_ORX_HotFolder_]'
 ICON = 'hf_folder.ico'
 ICON_BYTES = 60 * 1024
+OLD_TEMPLATES = 'Program Files (x86)/Vantorix/HF/Templates'  # as the sample's registry has it
+NEW_TEMPLATES = 'Program Files/Vantorix/QZA/template'
 DESKTOP_INI = ('[.ShellClassInfo]\r\nIconFile=.\\[_ORX_HotFolder_]\\hf_folder.ico\r\nIconIndex=00\r\n'
                'InfoTip=This folder has been configured as an ORX hot folder.\r\n')
 

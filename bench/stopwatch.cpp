@@ -34,10 +34,11 @@ enum Kind
     KindCount
 };
 
-constexpr std::array<const char*, KindCount> Names = {
-    "the rest",         "loads",     "library's save",
-    "document to save", "icon copy", "Desktop.ini, attributes",
-    "registry",         "run log",   "presets"};
+constexpr std::array<const char*, KindCount> Names = {"the rest",       "loads",
+                                                      "library's save", "its document and file",
+                                                      "icon copy",      "Desktop.ini, attributes",
+                                                      "registry",       "run log",
+                                                      "presets"};
 
 class Stopwatch
 {

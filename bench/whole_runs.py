@@ -1,65 +1,207 @@
 #!/usr/bin/python3
-"""Times whole runs over more and more hot folders, beside the library's floor and a script.
+"""Times whole runs over more and more hot folders, beside the library's floor and a script, and prints the tables.
 
-    bench/whole_runs.py BUILD_DIR [COUNT...]      (10, 100 and 1,000 folders if none is given)
+    bench/whole_runs.py [--log-limit SECONDS] BUILD_DIR PICTURE [COUNT...]
 
-Each figure is the least of several runs, the three taken in turn. The script's time includes its start.
+BUILD_DIR is a build with the benchmarks; the counts are 10, 100, 1,000 and 10,000 unless others are given; PICTURE is
+an SVG file to write. Each figure is the least of several runs, the programs taken in turn; all of them include the
+start of the process. With the log on a run takes a time that grows with the square of the folders: one that is
+expected to take longer than --log-limit (120 seconds) is left out, and the table says so.
 """
+import argparse
+import filecmp
 import os
-import re
 import subprocess
 import sys
 import tempfile
 import time
 
+import lay_out
+import picture
+from lxml import etree
+
 HERE = os.path.dirname(os.path.abspath(__file__))
-ROUNDS = {10: 20, 100: 10}
-FEWEST_ROUNDS = 5
+FINISHED = 255  # the tool's exit status on every path
+ROUNDS = {10: 30, 100: 15, 1000: 7}
+FEWEST_ROUNDS = 3
+PRIVATE = '[_ORX_HotFolder_]'
 
 
-def seconds(*command, env=None, status=0):
-    start = time.perf_counter()
-    result = subprocess.run(command, env=env, stderr=subprocess.PIPE, check=False)
-    elapsed = time.perf_counter() - start
-    if result.returncode != status or result.stderr:
-        raise SystemExit(f'{command[0]}: status {result.returncode} {result.stderr!r}')
-    return elapsed
+class Workstation:
+    """Hot folders in a temporary folder, and the commands that move their templates forth and back."""
+
+    def __init__(self, root, build, count):
+        lay_out.lay_out(root, count, f'{build}/FolderUpgrade')
+        subprocess.run(['cp', f'{build}/bench/FolderUpgradeTimed', f'{root}/program'], check=True)
+        self.root, self.build = root, build
+        self.old, self.new = f'{root}/{lay_out.OLD_TEMPLATES}', f'{root}/{lay_out.NEW_TEMPLATES}'
+
+    def seconds(self, *command, status=0):
+        env = {'XDG_CONFIG_HOME': f'{self.root}/user', 'XDG_CONFIG_DIRS': f'{self.root}/machine'}
+        start = time.perf_counter()
+        result = subprocess.run(command, env=env, capture_output=True, text=True, check=False)
+        elapsed = time.perf_counter() - start
+        if result.returncode != status or result.stderr:
+            raise SystemExit(f'{command[0]}: status {result.returncode} {result.stderr!r}')
+        return elapsed, result.stdout
+
+    def tool(self, *switches, program='FolderUpgrade'):
+        return self.seconds(f'{self.root}/program/{program}', *switches, status=FINISHED)
+
+    def floor(self, save='buffered'):
+        return self.seconds(f'{self.build}/bench/floor', f'{self.root}/folders.txt',
+                            f'{self.root}/program/{lay_out.ICON}', save)
+
+    def script(self):
+        return self.seconds(sys.executable, f'{HERE}/administrator.py',
+                            f'{self.root}/machine/hotfolder/HotFolderList.cfg', f'{self.root}/program', self.old,
+                            self.new, f'{self.root}/user/ORX/JPData')
+
+    def outcome(self):
+        """What a run leaves: every settings file as a canonical document, the presets, one folder's appearance."""
+        with open(f'{self.root}/folders.txt', encoding='utf-8') as file:
+            folders = file.read().splitlines()
+        documents = [etree.tostring(etree.parse(f'{folder}/{PRIVATE}/Folder.cfg'), method='c14n')
+                     for folder in folders]
+        if not filecmp.cmp(f'{folders[-1]}/{PRIVATE}/{lay_out.ICON}', f'{self.root}/program/{lay_out.ICON}', False):
+            raise SystemExit('the icon was not copied')
+        ini = f'{folders[-1]}/Desktop.ini'
+        texts = []
+        for path in [ini, *sorted(self.presets())]:
+            with open(path, 'rb') as file:
+                texts.append(file.read())
+        attributes = [os.getxattr(path, 'user.DOSATTRIB') for path in (folders[-1], ini)]
+        return documents, texts, attributes, os.stat(ini).st_mode
+
+    def presets(self):
+        data = f'{self.root}/user/ORX/JPData'
+        return (f'{data}/{name}/Presets/presets.xml' for name in os.listdir(data))
 
 
-def registry(root, hive, value):
-    with open(f'{root}/{hive}', encoding='utf-8') as file:
-        return re.search(f'"{value}"="([^"]*)"', file.read()).group(1).replace('\\\\', '\\')
+def check_outcome(station):
+    """The tool and the script have to leave the same, and something else than they found."""
+    station.tool('U', 'V')
+    found = station.outcome()
+    station.tool('I', 'V')
+    by_tool = station.outcome()
+    station.tool('U', 'V')
+    station.script()
+    if station.outcome() != by_tool or by_tool[0] == found[0] or by_tool[1] == found[1]:
+        raise SystemExit('the tool and the script do not leave the same')
+    station.tool('U', 'V')
 
 
-def measure(build, count):
+def shares(station, *switches):
+    """The microseconds of each kind of work in the quicker of two runs; what no kind counts is the rest."""
+    best = None
+    for _ in range(1 if len(switches) == 1 else 2):
+        elapsed, output = station.tool(*switches, program='FolderUpgradeTimed')
+        kinds = {name: int(spent) for spent, name in (line.split(' ', 1) for line in output.splitlines())}
+        kinds['the rest'] = 0
+        kinds['the rest'] = round(elapsed * 1e6) - sum(kinds.values())
+        best = min(best or kinds, kinds, key=lambda each: sum(each.values()))
+        station.tool('U', 'V')
+    return best
+
+
+def measure(build, count, previous, log_limit):
     with tempfile.TemporaryDirectory(prefix='bench ') as root:
-        subprocess.run([f'{HERE}/lay_out.py', root, str(count), f'{build}/FolderUpgrade'], check=True)
-        tool = f'{root}/program/FolderUpgrade'
-        env = {'XDG_CONFIG_HOME': f'{root}/user', 'XDG_CONFIG_DIRS': f'{root}/machine'}
-        common = [f'{root}/folders.txt', f'{root}/program/hf_folder.ico']
-        old = registry(root, 'user/registry/HKEY_CURRENT_USER.reg', 'Path')
-        new = registry(root, 'machine/registry/HKEY_LOCAL_MACHINE.reg', 'InstallPath') + '/template'
-        best = {}
+        station = Workstation(root, build, count)
+        check_outcome(station)
+        times = {'count': count}
         for _ in range(ROUNDS.get(count, FEWEST_ROUNDS)):
             # Each leaves the folders as the next one wants to find them.
-            times = {'tool': seconds(tool, 'I', 'V', env=env, status=255),
-                     'back': seconds(tool, 'U', 'V', env=env, status=255),
-                     'floor': seconds(f'{build}/bench/floor', *common),
-                     'script': seconds('/usr/bin/python3', f'{HERE}/administrator.py', *common, old, new)}
-            seconds(tool, 'U', 'V', env=env, status=255)
-            best = {name: min(value, best.get(name, value)) for name, value in times.items()}
-        logged = seconds(tool, 'I', env=env, status=255)
-        return best, logged
+            for name, run in (('tool', lambda: station.tool('I', 'V')), ('floor', station.floor),
+                              ('unsynced', lambda: station.floor('unsynced')),
+                              ('named', lambda: station.floor('named')),
+                              ('back', lambda: station.tool('U', 'V')), ('script', station.script)):
+                times[name] = min(times.get(name, float('inf')), run()[0])
+            station.tool('U', 'V')
+        times['shares'] = shares(station, 'I', 'V')
+        expected = previous['logged'] * (count / previous['count']) ** 2 if previous and 'logged' in previous else 0
+        if expected > log_limit:
+            times['expected'] = expected
+            return times
+        for _ in range(ROUNDS.get(count, FEWEST_ROUNDS) if expected < log_limit / 10 else 1):
+            times['logged'] = min(times.get('logged', float('inf')), station.tool('I')[0])
+            station.tool('U', 'V')
+        if expected < log_limit / 10:
+            times['logged shares'] = shares(station, 'I')
+        return times
+
+
+def milliseconds(seconds):
+    return f'{seconds * 1e3:,.1f}' if seconds < 10 else f'{seconds * 1e3:,.0f}'
+
+
+def print_times(results):
+    print('| Folders | Tool, log off (ms) | per folder (ms) | per folder, growth | Floor (ms) | Tool / floor '
+          '| Script (ms) | Tool / script | Tool, log on (ms) | growth | On / off |')
+    print('|---:' * 11 + '|')
+    first, previous = results[0], None
+    for now in results:
+        tool, each = now['tool'], now['tool'] / now['count']
+        cells = [f"{now['count']:,}", milliseconds(tool), f'{each * 1e3:.2f}',
+                 f"{each / (first['tool'] / first['count']):.2f}", milliseconds(now['floor']),
+                 f"**{tool / now['floor']:.2f}**", milliseconds(now['script']), f"{tool / now['script']:.2f}"]
+        if 'logged' in now:
+            grown = f"{now['logged'] / previous['logged']:.1f}" if previous else '-'
+            cells += [milliseconds(now['logged']), grown, f"{now['logged'] / tool:.1f}"]
+        else:
+            cells += [f"left out, some {now['expected']:,.0f} s", '-', '-']
+        print('| ' + ' | '.join(cells) + ' |')
+        previous = now
+
+
+def print_floors(results):
+    """The tool beside floors that save through another of the library's streams."""
+    print('\n| Folders | Floor without wait for the disk (ms) | Tool / that '
+          '| Floor with save by name (ms) | Tool / that |')
+    print('|---:' * 5 + '|')
+    for now in results:
+        print(f"| {now['count']:,} | " + ' | '.join(f"{milliseconds(now[name])} | {now['tool'] / now[name]:.2f}"
+                                                  for name in ('unsynced', 'named')) + ' |')
+
+
+def print_shares(results):
+    columns = [(f"{now['count']:,}{text}", now[key]) for key, text in
+               (('shares', ''), ('logged shares', ', log on')) for now in results if key in now]
+    print('\n| Share of the time (%) | ' + ' | '.join(name for name, _ in columns) + ' |')
+    print('|:---' + '|---:' * len(columns) + '|')
+    for kind in results[0]['shares']:
+        print(f'| {kind} | ' + ' | '.join(f'{100 * kinds[kind] / sum(kinds.values()):.1f}' for _, kinds in columns)
+              + ' |')
+
+
+def print_crossing(results):
+    """Where the script overtakes, on a straight line between the two counts around it."""
+    leads = [(now['count'], now['script'] - now['tool']) for now in results]
+    for (count, lead), (next_count, next_lead) in zip(leads, leads[1:]):
+        if lead > 0 >= next_lead:
+            crossing = count + (next_count - count) * lead / (lead - next_lead)
+            print(f'\nThe script overtakes the tool at {crossing:.0f} folders.')
+            return
+    print(f"\nThe script is {'never' if leads[-1][1] > 0 else 'always'} the quicker one.")
 
 
 def main():
-    build = sys.argv[1]
-    print('folders   tool ms   per folder   with log ms   floor ms   tool/floor   script ms   tool/script')
-    for count in [int(text) for text in sys.argv[2:]] or [10, 100, 1000]:
-        best, logged = measure(build, count)
-        print(f"{count:7} {best['tool'] * 1e3:9.1f} {best['tool'] * 1e3 / count:12.3f} {logged * 1e3:13.1f} "
-              f"{best['floor'] * 1e3:10.1f} {best['tool'] / best['floor']:12.2f} {best['script'] * 1e3:11.1f} "
-              f"{best['tool'] / best['script']:13.2f}", flush=True)
+    parser = argparse.ArgumentParser()
+    parser.add_argument('--log-limit', type=float, default=120)
+    parser.add_argument('build')
+    parser.add_argument('picture')
+    parser.add_argument('counts', nargs='*', type=int, default=[10, 100, 1000, 10000])
+    options = parser.parse_args()
+    results = []
+    for count in options.counts:
+        print(f'{count:,} hot folders', file=sys.stderr, flush=True)
+        results.append(measure(os.path.abspath(options.build), count, results[-1] if results else None,
+                               options.log_limit))
+    print_times(results)
+    print_floors(results)
+    print_shares(results)
+    print_crossing(results)
+    with open(options.picture, 'w', encoding='utf-8') as file:
+        file.write(picture.draw(results))
 
 
 main()
