@@ -87,7 +87,7 @@ windows() {
 # The counters go where the runs of another user can write them, too.
 coverage() {
     local counters file
-    cmake/install_packages.sh g++ cmake ninja-build libwxgtk3.2-dev libgtest-dev gcovr
+    cmake/install_packages.sh g++ cmake ninja-build libwxgtk3.2-dev libgtest-dev gcovr python3
     say "Building with counters"
     quietly cmake --preset coverage
     quietly cmake --build --preset coverage
@@ -102,7 +102,8 @@ coverage() {
     cp -r "$counters$PWD/build/coverage/." build/coverage/
     rm -r "$counters"
     gcovr --root . --filter '(app|store|migrate|appearance|platform)/' --exclude-throw-branches \
-        --fail-under-line 95 build/coverage || failed=$((failed + 1))
+        --fail-under-line 95 --json build/coverage.json --txt - build/coverage || failed=$((failed + 1))
+    tests/uncovered.py <build/coverage.json || failed=$((failed + 1))
 }
 
 checks() {

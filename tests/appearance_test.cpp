@@ -129,9 +129,12 @@ TEST_F(Appearance, AProfileWriteChangesOneLine)
         EXPECT_EQ(1U, GetPrivateProfileStringW(L"S", L"K", L"default", value, 8, Ini().wc_str()));
         EXPECT_EQ(wxString("v"), value);
     }
+    wchar_t cut[4] = {};
+    WriteIni("[s]\n k = \tv w \n");
+    EXPECT_EQ(3U, GetPrivateProfileStringW(L"s", L"k", L"", cut, 4, Ini().wc_str()));
+    EXPECT_EQ(wxString("v w"), cut);
     SetFileAttributesW(Ini().wc_str(), FILE_ATTRIBUTE_READONLY);
     EXPECT_EQ(0, WritePrivateProfileStringW(L"s", L"k", L"other", Ini().wc_str()));
-    wchar_t cut[4] = {};
     EXPECT_EQ(3U, GetPrivateProfileStringW(L"none", L"k", L"default", cut, 4, Ini().wc_str()));
     EXPECT_EQ(wxString("def"), cut);
 }

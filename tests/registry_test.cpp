@@ -26,7 +26,8 @@ TEST(Registry, EveryFormOfAValueIsRead)
           Form{"\"v\"=hex(2):78,00,\\\n  79,00", L"xy", 6}, Form{"\"v\"=hex:78,00", L"x", 2}, Form{"\"v\"=hex(1):78,00,79", L"x", 3},
           Form{"\"v\"=dword:00000078", L"x", 4}, Form{"\"v\"=\"x\"\n\"v\"=-", none, 0}, Form{"\"v\"=\"x\"\n\"v\"=\"y\"", L"y", 4},
           Form{"\"v\"=\"x\"\n[-HKEY_CURRENT_USER\\K]\n[HKEY_CURRENT_USER\\k]", none, 0}, Form{";\"v\"=\"x\"", none, 0},
-          Form{"\"v\"=hex:7x\n\"v\"=dword:g\n\"v\"x\n\"v", none, 0}, Form{"\"v\"=hex:3d,d8,00,de", L"\U0001F600", 4}})
+          Form{"\"v\"=hex:7x\n\"v\"=hex(g):78\n\"v\"=dword:g\n\"v\"x\n\"v", none, 0}, Form{"\"v\"=\"\U0001F600\"", L"\U0001F600", 6},
+          Form{"\"v\"=hex:3d,d8,00,de", L"\U0001F600", 4}})
     {
         wxFFile(folder + "/registry/HKEY_CURRENT_USER.reg", "wb")
             .Write("Windows Registry Editor Version 5.00\n\n[HKEY_CURRENT_USER\\K]\n" + wxString(form.text));

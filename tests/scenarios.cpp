@@ -65,7 +65,7 @@ Text Data(const Text& file, const Files& values)
 }
 
 // A Folder.cfg as the tool writes it.
-Text Written(const Text& path, const Text& filter = "  <FilterSetting mode=\"2\">\n    <a/>\n  </FilterSetting>\n")
+Text Written(const Text& path, const Text& filter = "  <FilterSetting mode=\"2\" name=\"&lt;\">\n    <a/>\n  </FilterSetting>\n")
 {
     return Data("written.cfg", {{"path", path}, {"filter", filter}});
 }
@@ -302,6 +302,8 @@ void AddFolderCfgs(Rows& rows)
     add("AnIncompleteChainIsRewrittenWithDefaults", Minimal(MovedFrom), MinimalWritten(MovedTo), LogOfA(found, "I", disabled));
     add("ADocumentTypeIsNotCarriedOver", Minimal(MovedFrom, "<!DOCTYPE h [<!ENTITY e 'x'>]>", "&e;"), MinimalWritten(MovedTo, "x"),
         LogOfA(found, "I", disabled));
+    add("AByteOrderMarkGoesFromFolderCfg", "\xEF\xBB\xBF" + Minimal(MovedFrom, "<?xml version='1.0' encoding='utf-8'?>"),
+        MinimalWritten(MovedTo), LogOfA(found, "I", disabled));
     add("AUtf16FolderCfgComesOutInUtf8", "{utf16}" + Minimal(MovedFrom), MinimalWritten(MovedTo), LogOfA(found, "I", disabled));
     keep("ATemplateInASubfolderStays", Written("{previous}{/}Sub{/}x"), LogOfA(Found("{previous}{/}Sub{/}x")));
     keep("ATemplateElsewhereStays", Written("{previous}2{/}x"), LogOfA(Found("{previous}2{/}x")));
@@ -311,7 +313,7 @@ void AddFolderCfgs(Rows& rows)
     keep("WithoutTheTemplateKeyNothingMoves", "<H><ImposeSetting><K k='orximposetemplate' v='" + MovedFrom + "'/></ImposeSetting></H>",
          LogOfA(Found(""), "I", disabled));
     const Text mixed = Filter("t\n    <x>u\n      <y/>v</x>\n    <![CDATA[<w>]]>z\n    <!--c-->\n  ");
-    add("MixedContentIsIndented", Written(MovedFrom, Filter("t<x>u<y/>v</x><![CDATA[<w>]]>z<!--c-->")), Written(MovedTo, mixed),
+    add("MixedContentIsIndented", Written(MovedFrom, Filter("\n \nt<x>u<y/>v</x><![CDATA[<w>]]>z<!--c-->")), Written(MovedTo, mixed),
         LogOfA(found));
     add("MixedContentIsIndentedOnceOnly", Written(MovedFrom, mixed), Written(MovedTo, mixed), LogOfA(found));
     add("AFilterOf1024LevelsIsSaved", Written(MovedFrom, Filter(Nested(1024))), Written(MovedTo, Filter(Nested(1024))), LogOfA(found));
@@ -524,6 +526,8 @@ void AddIcons(Rows& rows)
     refresh("AReadOnlyDesktopIniIsWritten", users, "R", usersAfter);
     refresh("ASystemDesktopIniIsWritten", users, "S", usersAfter);
     refresh("AMissingSectionIsAddedBehindTheLastLine", "[x]\r\na=b", "", "[x]\r\na=b\r\n" + header + InfoTip + disabled);
+    refresh("AUtf16DesktopIniStaysUtf16", "{utf16}" + header + "IconFile=ü.ico\r\nInfoTip=old\r\n", "RS",
+            "{utf16}" + header + disabled + InfoTip);
     refresh("AnEmptyDesktopIniIsFilled", "", "RS", header + InfoTip + disabled);
 
     Files noSource = icon;
