@@ -22,8 +22,7 @@ from lxml import etree
 
 HERE = os.path.dirname(os.path.abspath(__file__))
 FINISHED = 255  # the tool's exit status on every path
-ROUNDS = {10: 30, 100: 15, 1000: 7}
-FEWEST_ROUNDS = 3
+FOLDERS_IN_ALL_ROUNDS, MOST_ROUNDS, FEWEST_ROUNDS = 7000, 30, 3
 PRIVATE = '[_ORX_HotFolder_]'
 
 
@@ -109,7 +108,8 @@ def measure(build, count, previous, log_limit):
         station = Workstation(root, build, count)
         check_outcome(station)
         times = {'count': count}
-        for _ in range(ROUNDS.get(count, FEWEST_ROUNDS)):
+        rounds = min(max(FOLDERS_IN_ALL_ROUNDS // count, FEWEST_ROUNDS), MOST_ROUNDS)
+        for _ in range(rounds):
             # Each leaves the folders as the next one wants to find them.
             for name, run in (('tool', lambda: station.tool('I', 'V')), ('floor', station.floor),
                               ('unsynced', lambda: station.floor('unsynced')),
@@ -122,10 +122,10 @@ def measure(build, count, previous, log_limit):
         if expected > log_limit:
             times['expected'] = expected
             return times
-        for _ in range(ROUNDS.get(count, FEWEST_ROUNDS) if expected < log_limit / 10 else 1):
+        for _ in range(rounds if expected <= log_limit / 10 else 1):
             times['logged'] = min(times.get('logged', float('inf')), station.tool('I')[0])
             station.tool('U', 'V')
-        if expected < log_limit / 10:
+        if expected <= log_limit / 10:
             times['logged shares'] = shares(station, 'I')
         return times
 
@@ -173,13 +173,15 @@ def print_shares(results):
               + ' |')
 
 
-def print_crossing(results):
-    """Where the script overtakes, on a straight line between the two counts around it."""
+def print_crossing(build, results):
+    """Where the script overtakes: on a straight line between the two counts around it, and then measured there."""
     leads = [(now['count'], now['script'] - now['tool']) for now in results]
     for (count, lead), (next_count, next_lead) in zip(leads, leads[1:]):
         if lead > 0 >= next_lead:
-            crossing = count + (next_count - count) * lead / (lead - next_lead)
-            print(f'\nThe script overtakes the tool at {crossing:.0f} folders.')
+            crossing = round(count + (next_count - count) * lead / (lead - next_lead))
+            there = measure(build, crossing, None, 0)
+            print(f'\nThe script overtakes the tool at {crossing:,} folders: '
+                  f"{milliseconds(there['script'])} ms beside {milliseconds(there['tool'])} ms.")
             return
     print(f"\nThe script is {'never' if leads[-1][1] > 0 else 'always'} the quicker one.")
 
@@ -191,15 +193,14 @@ def main():
     parser.add_argument('picture')
     parser.add_argument('counts', nargs='*', type=int, default=[10, 100, 1000, 10000])
     options = parser.parse_args()
-    results = []
+    build, results = os.path.abspath(options.build), []
     for count in options.counts:
         print(f'{count:,} hot folders', file=sys.stderr, flush=True)
-        results.append(measure(os.path.abspath(options.build), count, results[-1] if results else None,
-                               options.log_limit))
+        results.append(measure(build, count, results[-1] if results else None, options.log_limit))
     print_times(results)
     print_floors(results)
     print_shares(results)
-    print_crossing(results)
+    print_crossing(build, results)
     with open(options.picture, 'w', encoding='utf-8') as file:
         file.write(picture.draw(results))
 
