@@ -11,6 +11,7 @@ expected to take longer than --log-limit (120 seconds) is left out, and the tabl
 import argparse
 import filecmp
 import os
+import shutil
 import subprocess
 import sys
 import tempfile
@@ -31,8 +32,9 @@ class Workstation:
 
     def __init__(self, root, build, count):
         lay_out.lay_out(root, count, f'{build}/FolderUpgrade')
-        subprocess.run(['cp', f'{build}/bench/FolderUpgradeTimed', f'{root}/program'], check=True)
-        self.root, self.build = root, build
+        shutil.copy(f'{build}/bench/FolderUpgradeTimed', f'{root}/program')
+        self.root, self.build, self.count = root, build, count
+        self.rounds = min(max(FOLDERS_IN_ALL_ROUNDS // count, FEWEST_ROUNDS), MOST_ROUNDS)
         self.old, self.new = f'{root}/{lay_out.OLD_TEMPLATES}', f'{root}/{lay_out.NEW_TEMPLATES}'
 
     def seconds(self, *command, status=0):
@@ -103,31 +105,51 @@ def shares(station, *switches):
     return best
 
 
+def measure_unlogged(station):
+    """The seconds of each program with the log off."""
+    times = {'count': station.count}
+    for _ in range(station.rounds):
+        # Each leaves the folders as the next one wants to find them.
+        for name, run in (('tool', lambda: station.tool('I', 'V')), ('floor', station.floor),
+                          ('unsynced', lambda: station.floor('unsynced')), ('named', lambda: station.floor('named')),
+                          ('back', lambda: station.tool('U', 'V')), ('script', station.script)):
+            times[name] = min(times.get(name, float('inf')), run()[0])
+        station.tool('U', 'V')
+    return times
+
+
+def measure_logged(station, times, previous, log_limit):
+    """Adds the seconds of the tool with the log on, or those to be expected where they pass the limit."""
+    expected = previous['logged'] * (station.count / previous['count']) ** 2 if previous and 'logged' in previous else 0
+    if expected > log_limit:
+        times['expected'] = expected
+        return
+    is_short = expected <= log_limit / 10
+    for _ in range(station.rounds if is_short else 1):
+        times['logged'] = min(times.get('logged', float('inf')), station.tool('I')[0])
+        station.tool('U', 'V')
+    if is_short:
+        times['logged shares'] = shares(station, 'I')
+
+
 def measure(build, count, previous, log_limit):
     with tempfile.TemporaryDirectory(prefix='bench ') as root:
         station = Workstation(root, build, count)
         check_outcome(station)
-        times = {'count': count}
-        rounds = min(max(FOLDERS_IN_ALL_ROUNDS // count, FEWEST_ROUNDS), MOST_ROUNDS)
-        for _ in range(rounds):
-            # Each leaves the folders as the next one wants to find them.
-            for name, run in (('tool', lambda: station.tool('I', 'V')), ('floor', station.floor),
-                              ('unsynced', lambda: station.floor('unsynced')),
-                              ('named', lambda: station.floor('named')),
-                              ('back', lambda: station.tool('U', 'V')), ('script', station.script)):
-                times[name] = min(times.get(name, float('inf')), run()[0])
-            station.tool('U', 'V')
+        times = measure_unlogged(station)
         times['shares'] = shares(station, 'I', 'V')
-        expected = previous['logged'] * (count / previous['count']) ** 2 if previous and 'logged' in previous else 0
-        if expected > log_limit:
-            times['expected'] = expected
-            return times
-        for _ in range(rounds if expected <= log_limit / 10 else 1):
-            times['logged'] = min(times.get('logged', float('inf')), station.tool('I')[0])
-            station.tool('U', 'V')
-        if expected <= log_limit / 10:
-            times['logged shares'] = shares(station, 'I')
+        measure_logged(station, times, previous, log_limit)
         return times
+
+
+def find_crossing(build, low, high):
+    """The least count, above the first and up to the second, at which the script is the quicker one."""
+    while high - low > 1:
+        middle = (low + high) // 2
+        with tempfile.TemporaryDirectory(prefix='bench ') as root:
+            times = measure_unlogged(Workstation(root, build, middle))
+        low, high = (low, middle) if times['script'] < times['tool'] else (middle, high)
+    return high
 
 
 def milliseconds(seconds):
@@ -174,16 +196,12 @@ def print_shares(results):
 
 
 def print_crossing(build, results):
-    """Where the script overtakes: on a straight line between the two counts around it, and then measured there."""
-    leads = [(now['count'], now['script'] - now['tool']) for now in results]
-    for (count, lead), (next_count, next_lead) in zip(leads, leads[1:]):
-        if lead > 0 >= next_lead:
-            crossing = round(count + (next_count - count) * lead / (lead - next_lead))
-            there = measure(build, crossing, None, 0)
-            print(f'\nThe script overtakes the tool at {crossing:,} folders: '
-                  f"{milliseconds(there['script'])} ms beside {milliseconds(there['tool'])} ms.")
+    for now, after in zip(results, results[1:]):
+        if now['script'] >= now['tool'] and after['script'] < after['tool']:
+            crossing = find_crossing(build, now['count'], after['count'])
+            print(f'\nThe script overtakes the tool at {crossing:,} folders.')
             return
-    print(f"\nThe script is {'never' if leads[-1][1] > 0 else 'always'} the quicker one.")
+    print(f"\nThe script is {'always' if results[0]['script'] < results[0]['tool'] else 'never'} the quicker one.")
 
 
 def main():

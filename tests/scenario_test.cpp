@@ -2,6 +2,7 @@
 
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cctype>
 #include <sstream>
 
@@ -44,7 +45,10 @@ Files Expected(const Workstation& workstation, const Files& before, const Scenar
 std::string Meaning(const std::string& profile)
 {
     std::map<std::string, std::string> values;
-    std::istringstream lines(profile);
+    const bool isUtf16 = profile.compare(0, 2, "\xFF\xFE") == 0;
+    std::string text = profile.substr(isUtf16 ? 2 : 0);
+    text.erase(std::remove(text.begin(), text.end(), '\0'), text.end()); // what is UTF-16 here is of ASCII
+    std::istringstream lines(text);
     std::string section;
     for (std::string line; std::getline(lines, line);)
     {
@@ -57,7 +61,7 @@ std::string Meaning(const std::string& profile)
         else if (sign != std::string::npos && Lower(line.substr(0, sign)) != "iconresource")
             values.emplace(section + Lower(line.substr(0, line.find_last_not_of(' ', sign - 1) + 1)), line.substr(sign + 1));
     }
-    std::string meaning;
+    std::string meaning = isUtf16 ? "in UTF-16\n" : "";
     for (const auto& [key, value] : values)
         meaning += key + "=" + value + "\n";
     return meaning;
