@@ -100,13 +100,15 @@ TEST_F(Appearance, AnOldOrUnknownShellGetsNothingButTheAttributes)
 
 TEST_F(Appearance, APathBeyondTheShellsBuffersIsNotForced)
 {
-    wxString folder = m_folder;
-    while (folder.length() < MAX_PATH)
-        folder += "/" + wxString('d', 100);
-    wxFileName::Mkdir(folder, wxS_DIR_DEFAULT, wxPATH_MKDIR_FULL);
-    wxFFile(folder + "/Desktop.ini", "wb");
-    EXPECT_TRUE(ApplyFolderIcon(folder, "i.ico"));
-    EXPECT_EQ(Calls(false, "").size(), ShellCalls.size());
+    for (const size_t length : {size_t{MAX_PATH} - 1, size_t{MAX_PATH}})
+    {
+        const wxString folder = m_folder + "/" + wxString('d', length - m_folder.length() - 1);
+        wxMkdir(folder);
+        wxFFile(folder + "/Desktop.ini", "wb");
+        ShellCalls.clear();
+        EXPECT_TRUE(ApplyFolderIcon(folder, "i.ico"));
+        EXPECT_EQ(Calls(length < MAX_PATH, "").size(), ShellCalls.size()) << length;
+    }
 }
 
 TEST_F(Appearance, AProfileWriteChangesOneLine)

@@ -378,7 +378,9 @@ void AddRegistries(Rows& rows)
         {{UserHive, UserValue("\"Path\"=\"{PREVIOUS}\"\r\n\r\n[HKEY_CURRENT_USER\\software\\wow6432node\\hf]")}}, NoPrevious, NoPrevious);
     add("A32BitKeyComesFirst", "I",
         {{UserHive, UserValue("\"Path\"=\"x\"\r\n[HKEY_CURRENT_USER\\SOFTWARE\\Wow6432Node\\HF]\r\n"
-                              "\"PATH\"=\"{PREVIOUS}\"")}},
+                              "\"PATH\"=\"{PREVIOUS}\"")},
+         {MachineHive, MachineValue("\"InstallPath\"=\"x\"\r\n[HKEY_LOCAL_MACHINE\\SOFTWARE\\Wow6432Node\\Vantorix\\QZA]\r\n"
+                                    "\"InstallPath\"=\"{APP}\"")}},
         "", updated, moved);
     add("ATextOf258CharactersIsTooLong", "I", {{UserHive, UserValue("\"Path\"=\"" + Text(258, 'x') + "\"")}}, NoPrevious, NoPrevious);
     add("ATextOf257CharactersIsRead", "I", {{UserHive, UserValue("\"Path\"=\"" + Text(257, 'x') + "\"")}}, "", updated);
