@@ -111,7 +111,7 @@ esac
 scratch=$(mktemp -d)
 trap 'rm -rf "$scratch"' EXIT
 cmake/install_packages.sh g++ cmake ninja-build libwxgtk3.2-dev attr
-quietly cmake --preset native
+quietly cmake --preset native -DBUILD_TESTING=OFF
 quietly cmake --build --preset native
 if [ "$fresh" = yes ]; then
     samples/lay_out.sh --fresh "$workstation"

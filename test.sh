@@ -79,7 +79,7 @@ windows() {
     say "Building the Windows program and this machine's"
     quietly cmake --preset windows
     quietly cmake --build --preset windows
-    quietly cmake --preset native
+    quietly cmake --preset native -DBUILD_TESTING=ON
     quietly cmake --build --preset native
     part "Scenarios and unit tests under Wine" tests/under_wine.sh build/windows build/native
 }

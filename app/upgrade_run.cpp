@@ -17,12 +17,12 @@ bool ReadSwitch(const wxString& text, bool& isUpgrade)
 {
     isUpgrade = text.CmpNoCase("I") == 0;
     if (isUpgrade)
-        RunLog("Installation : Upgrade call with switch: I", NoCount);
+        RunLog(L"Installation : Upgrade call with switch: I", NoCount);
     else if (text.CmpNoCase("U") == 0)
-        RunLog("Un-installation : Downgrade call with switch: U", NoCount);
+        RunLog(L"Un-installation : Downgrade call with switch: U", NoCount);
     else
     {
-        RunLog("Invalid call check calling parameter: exiting....", NoCount);
+        RunLog(L"Invalid call check calling parameter: exiting....", NoCount);
         return false;
     }
     return true;
@@ -51,15 +51,15 @@ bool FolderUpgradeApp::OnInit()
     wxArrayString folders;
     ReadHotFolderList(folders);
     if (folders.empty())
-        RunLog("No Hotfolder listed", NoCount);
+        RunLog(L"No Hotfolder listed", NoCount);
 
-    RunLog("Start: HF updation", NoCount);
+    RunLog(L"Start: HF updation", NoCount);
     for (size_t i = 0; i < folders.size(); ++i)
         UpdateHotFolder(*this, folders[i], static_cast<int>(i + 1));
-    RunLog("End: HF updation", NoCount);
+    RunLog(L"End: HF updation", NoCount);
 
-    RunLog("Start: Updating Impose path for JP Presets", NoCount);
+    RunLog(L"Start: Updating Impose path for JP Presets", NoCount);
     UpdateJobPresetImposePath(*this);
-    RunLog("End: Updating Impose path for JP Presets", NoCount);
+    RunLog(L"End: Updating Impose path for JP Presets", NoCount);
     return false;
 }

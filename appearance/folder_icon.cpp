@@ -119,14 +119,14 @@ void UpdateFolderIcon(const FolderUpgradeApp& app, const wxString& hotFolder)
     wxString iconName;
     if (!GetFolderIconName(hotFolder, iconName))
     {
-        RunLog("Unable to get Icon filename " + iconName, NoCount);
+        RunLog(L"Unable to get Icon filename " + iconName, NoCount);
         return;
     }
     const wxFileName source = SourceIcon(app, iconName);
     const wxFileName destination(PrivateDirPath(hotFolder), iconName);
     if (!source.FileExists() || !destination.FileExists())
     {
-        RunLog("Icon path  not exist: " + source.GetFullPath(), NoCount);
+        RunLog(L"Icon path  not exist: " + source.GetFullPath(), NoCount);
         return;
     }
     wxCopyFile(source.GetFullPath(), destination.GetFullPath(), true);

@@ -21,13 +21,10 @@ bool IsEnabled(const wxString& hotFolder)
     return settings.Enable;
 }
 
-// The library logs a directory that it cannot open, so that is asked first; and it looks at every
-// entry of the directory, which most of the time can be spared.
+// The library logs a directory that it cannot open, so that is asked first.
 bool HasError(const wxString& hotFolder)
 {
     const wxString path = PrivateDirPath(hotFolder);
-    if (!wxFileName::Exists(path + ErrorFileName, wxFILE_EXISTS_ANY | wxFILE_EXISTS_NO_FOLLOW))
-        return false;
     if (!wxFileName::DirExists(path) || !wxFileName::IsDirReadable(path))
         return false;
     const wxDir directory(path);

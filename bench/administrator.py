@@ -27,11 +27,13 @@ def refresh_icon(folder, private, enabled, icon_dir):
     ini = f'{folder}/Desktop.ini'
     values = dict(INI, IconFile=f'.\\[_ORX_HotFolder_]\\{name}')
     with open(ini, encoding='utf-8', newline='') as file:
-        lines = file.read().split('\r\n')
-    lines = [f'{key}={values[key]}' if (key := line.partition('=')[0]) in values else line for line in lines]
+        before = file.read()
+    text = '\r\n'.join(f'{key}={values[key]}' if (key := line.partition('=')[0]) in values else line
+                        for line in before.split('\r\n'))
     os.chmod(ini, 0o644)
-    with open(ini, 'w', encoding='utf-8', newline='') as file:
-        file.write('\r\n'.join(lines))
+    if text != before:
+        with open(ini, 'w', encoding='utf-8', newline='') as file:
+            file.write(text)
     os.setxattr(ini, 'user.DOSATTRIB', b'0x4')
     os.chmod(ini, 0o444)
     os.setxattr(folder, 'user.DOSATTRIB', b'0x4')

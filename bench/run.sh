@@ -25,8 +25,11 @@ machine() {
 }
 
 cmake/install_packages.sh g++ cmake ninja-build libwxgtk3.2-dev libbenchmark-dev python3 python3-lxml
-cmake --preset bench >/dev/null
-cmake --build --preset bench >/dev/null
+mkdir -p "$build"
+{ cmake --preset bench && cmake --build --preset bench; } >"$build/build.log" || {
+    cat "$build/build.log"
+    exit 1
+}
 
 {
     machine
@@ -35,5 +38,5 @@ cmake --build --preset bench >/dev/null
     printf '\nA preset file of 64 MiB\n\n'
     bench/preset_runs.py "$build"
     printf '\nParts\n\n'
-    "$build/parts" 2>/dev/null
+    "$build/parts"
 } | tee "$build/results.md"

@@ -25,6 +25,7 @@ HERE = os.path.dirname(os.path.abspath(__file__))
 FINISHED = 255  # the tool's exit status on every path
 FOLDERS_IN_ALL_ROUNDS, MOST_ROUNDS, FEWEST_ROUNDS = 7000, 30, 3
 PRIVATE = '[_ORX_HotFolder_]'
+ATTRIBUTES = 'user.DOSATTRIB'
 
 
 class Workstation:
@@ -35,6 +36,7 @@ class Workstation:
         shutil.copy(f'{build}/bench/FolderUpgradeTimed', f'{root}/program')
         self.root, self.build, self.count = root, build, count
         self.rounds = min(max(FOLDERS_IN_ALL_ROUNDS // count, FEWEST_ROUNDS), MOST_ROUNDS)
+        self.last = f'{root}/Hot Folders/Jobs {count:05}'
         self.old, self.new = f'{root}/{lay_out.OLD_TEMPLATES}', f'{root}/{lay_out.NEW_TEMPLATES}'
 
     def seconds(self, *command, status=0):
@@ -58,21 +60,33 @@ class Workstation:
                             f'{self.root}/machine/hotfolder/HotFolderList.cfg', f'{self.root}/program', self.old,
                             self.new, f'{self.root}/user/ORX/JPData')
 
+    def spoil(self):
+        """Gives the last folder another icon, InfoTip and attributes."""
+        ini = f'{self.last}/Desktop.ini'
+        os.chmod(ini, 0o644)
+        with open(ini, 'w', encoding='utf-8', newline='') as file:
+            file.write(lay_out.DESKTOP_INI.replace('InfoTip=', 'InfoTip=Spoilt. '))
+        for path in (ini, self.last):
+            os.removexattr(path, ATTRIBUTES)
+        with open(f'{self.last}/{PRIVATE}/{lay_out.ICON}', 'wb') as file:
+            file.write(b'spoilt')
+
     def outcome(self):
-        """What a run leaves: every settings file as a canonical document, the presets, one folder's appearance."""
+        """What stands there: every settings file as a canonical document, the presets, one folder's appearance."""
         with open(f'{self.root}/folders.txt', encoding='utf-8') as file:
-            folders = file.read().splitlines()
-        documents = [etree.tostring(etree.parse(f'{folder}/{PRIVATE}/Folder.cfg'), method='c14n')
-                     for folder in folders]
-        if not filecmp.cmp(f'{folders[-1]}/{PRIVATE}/{lay_out.ICON}', f'{self.root}/program/{lay_out.ICON}', False):
-            raise SystemExit('the icon was not copied')
-        ini = f'{folders[-1]}/Desktop.ini'
+            documents = [etree.tostring(etree.parse(f'{folder}/{PRIVATE}/Folder.cfg'), method='c14n')
+                         for folder in file.read().splitlines()]
+        ini = f'{self.last}/Desktop.ini'
         texts = []
-        for path in [ini, *sorted(self.presets())]:
+        for path in [*sorted(self.presets()), ini, f'{self.last}/{PRIVATE}/{lay_out.ICON}']:
             with open(path, 'rb') as file:
                 texts.append(file.read())
-        attributes = [os.getxattr(path, 'user.DOSATTRIB') for path in (folders[-1], ini)]
-        return documents, texts, attributes, os.stat(ini).st_mode
+        return documents, texts[:-2], texts[-2], texts[-1], self.attributes(self.last), self.attributes(ini)
+
+    @staticmethod
+    def attributes(path):
+        stored = os.getxattr(path, ATTRIBUTES) if ATTRIBUTES in os.listxattr(path) else b''
+        return stored, os.stat(path).st_mode
 
     def presets(self):
         data = f'{self.root}/user/ORX/JPData'
@@ -80,15 +94,24 @@ class Workstation:
 
 
 def check_outcome(station):
-    """The tool and the script have to leave the same, and something else than they found."""
-    station.tool('U', 'V')
-    found = station.outcome()
-    station.tool('I', 'V')
-    by_tool = station.outcome()
-    station.tool('U', 'V')
-    station.script()
-    if station.outcome() != by_tool or by_tool[0] == found[0] or by_tool[1] == found[1]:
+    """The tool and the script have to leave the same of what they find, and the floor has to do its work."""
+    outcomes = []
+    for run in (lambda: station.tool('I', 'V'), station.script):
+        station.tool('U', 'V')
+        station.spoil()
+        found = station.outcome()
+        run()
+        outcomes.append(station.outcome())
+        if any(now == before for now, before in zip(outcomes[-1], found)):
+            raise SystemExit('a run has left what it should change')
+    if outcomes[0] != outcomes[1]:
         raise SystemExit('the tool and the script do not leave the same')
+    station.spoil()
+    icon, cfg = (f'{station.last}/{PRIVATE}/{name}' for name in (lay_out.ICON, 'Folder.cfg'))
+    os.utime(cfg, (0, 0))
+    station.floor()
+    if not filecmp.cmp(icon, f'{station.root}/program/{lay_out.ICON}', False) or os.stat(cfg).st_mtime == 0:
+        raise SystemExit('the floor does not do its work')
     station.tool('U', 'V')
 
 
@@ -119,12 +142,15 @@ def measure_unlogged(station):
 
 
 def measure_logged(station, times, previous, log_limit):
-    """Adds the seconds of the tool with the log on, or those to be expected where they pass the limit."""
-    expected = previous['logged'] * (station.count / previous['count']) ** 2 if previous and 'logged' in previous else 0
+    """Adds the seconds of the tool with the log on, or those to be expected where they pass the limit.
+
+    previous is the result over fewer folders that was measured last; without one a single run is measured.
+    """
+    expected = previous['logged'] * (station.count / previous['count']) ** 2 if previous else log_limit
     if expected > log_limit:
         times['expected'] = expected
         return
-    is_short = expected <= log_limit / 10
+    is_short = expected <= log_limit / 10 or station.count <= 100
     for _ in range(station.rounds if is_short else 1):
         times['logged'] = min(times.get('logged', float('inf')), station.tool('I')[0])
         station.tool('U', 'V')
@@ -167,7 +193,7 @@ def print_times(results):
                  f"{each / (first['tool'] / first['count']):.2f}", milliseconds(now['floor']),
                  f"**{tool / now['floor']:.2f}**", milliseconds(now['script']), f"{tool / now['script']:.2f}"]
         if 'logged' in now:
-            grown = f"{now['logged'] / previous['logged']:.1f}" if previous else '-'
+            grown = f"{now['logged'] / previous['logged']:.1f}" if previous and 'logged' in previous else '-'
             cells += [milliseconds(now['logged']), grown, f"{now['logged'] / tool:.1f}"]
         else:
             cells += [f"left out, some {now['expected']:,.0f} s", '-', '-']
@@ -201,7 +227,8 @@ def print_crossing(build, results):
             crossing = find_crossing(build, now['count'], after['count'])
             print(f'\nThe script overtakes the tool at {crossing:,} folders.')
             return
-    print(f"\nThe script is {'always' if results[0]['script'] < results[0]['tool'] else 'never'} the quicker one.")
+    quicker = 'script' if results[0]['script'] < results[0]['tool'] else 'tool'
+    print(f'\nAt these counts the {quicker} is always quicker.')
 
 
 def main():
@@ -210,11 +237,12 @@ def main():
     parser.add_argument('build')
     parser.add_argument('picture')
     parser.add_argument('counts', nargs='*', type=int, default=[10, 100, 1000, 10000])
-    options = parser.parse_args()
+    options = parser.parse_intermixed_args()
     build, results = os.path.abspath(options.build), []
     for count in options.counts:
         print(f'{count:,} hot folders', file=sys.stderr, flush=True)
-        results.append(measure(build, count, results[-1] if results else None, options.log_limit))
+        logged = [each for each in results if 'logged' in each]
+        results.append(measure(build, count, logged[-1] if logged else None, options.log_limit))
     print_times(results)
     print_floors(results)
     print_shares(results)

@@ -34,7 +34,7 @@ constexpr Direction Downgrade = {GetDefaultImposeTemplatePath, NoDefaultPathMess
 
 void LogUntouched(const wxString& cfgPath, const wxString& reason)
 {
-    RunLog(wxString::Format("HF cfg file left as it is (%s): %s", reason, cfgPath), NoCount);
+    RunLog(wxString::Format(L"HF cfg file left as it is (%s): %s", reason, cfgPath), NoCount);
 }
 
 bool Load(const wxString& cfgPath, wxXmlDocument& document)
@@ -106,9 +106,9 @@ void RewriteFolderCfg(const wxString& cfgPath, const ImposeSettingTable& imposeS
 {
     OtherSettings other;
     if (!ReadOtherSettings(cfgPath, other))
-        return LogUntouched(cfgPath, "cannot be loaded again");
+        return LogUntouched(cfgPath, L"cannot be loaded again");
     if (CountLevels(other.filterSetting) > MaxFilterLevels)
-        return LogUntouched(cfgPath, "filter setting nested too deep");
+        return LogUntouched(cfgPath, L"filter setting nested too deep");
     SaveHotFolderSettings(cfgPath, other.settings, other.jobSettings, other.paths,
                           other.filterSetting, imposeSettings, other.preflightSettings);
 }
@@ -126,7 +126,7 @@ void MoveTemplate(const wxString& cfgPath, const Direction& direction, ImposeSet
     if (!isInFolder && stored.Value.IsAscii())
         return;
     if (!IsReadFaithfully(cfgPath))
-        return LogUntouched(cfgPath, "unknown encoding");
+        return LogUntouched(cfgPath, L"unknown encoding");
     if (!isInFolder)
         return;
     wxFileName to;
@@ -137,7 +137,7 @@ void MoveTemplate(const wxString& cfgPath, const Direction& direction, ImposeSet
                              wxFileName::GetPathSeparator(wxPATH_NATIVE) +
                              templateFile.GetFullName();
     if (!IsXmlText(newPath))
-        return LogUntouched(cfgPath, "new path holds a character that XML cannot store");
+        return LogUntouched(cfgPath, L"new path holds a character that XML cannot store");
     SetImposeSetting(table, ImposeTemplateKey, newPath, stored.KeyDisplayValue);
     RewriteFolderCfg(cfgPath, table);
 }
@@ -149,7 +149,7 @@ void UpdateHotFolderImposePath(const FolderUpgradeApp& app, const wxString& hotF
     const wxString cfgPath = FolderCfgPath(hotFolder);
     if (!wxFileName::FileExists(cfgPath))
     {
-        RunLog(wxString::Format("HF cfg file unable to read/exist: %s", cfgPath), NoCount);
+        RunLog(wxString::Format(L"HF cfg file unable to read/exist: %s", cfgPath), NoCount);
         return;
     }
 

@@ -23,7 +23,7 @@ TEST(Registry, EveryFormOfAValueIsRead)
     const wchar_t* const none = nullptr;
     for (const Form& form :
          {Form{"\"v\"=\"C:\\\\a \\\"b\\\"\"", L"C:\\a \"b\"", 18}, Form{" \"V\" = \"x\" ", L"x", 4}, Form{"@=\"x\"\n\"v\"=\"y\"", L"y", 4},
-          Form{"\"v\"=hex(2):78,00,\\\n  79,00", L"xy", 6}, Form{"\"v\"=hex:78,00", L"x", 2}, Form{"\"v\"=hex(1):78,00,79", L"x", 3},
+          Form{"\"v\"=hex(2):78,00,\\\n  79,00", L"xy", 6}, Form{"\"v\"=hex:78, 00", L"x", 2}, Form{"\"v\"=hex(1):78,00,79", L"x", 3},
           Form{"\"v\"=dword:00000078", L"x", 4}, Form{"\"v\"=\"x\"\n\"v\"=-", none, 0}, Form{"\"v\"=\"x\"\n\"v\"=\"y\"", L"y", 4},
           Form{"\"v\"=\"x\"\n[-HKEY_CURRENT_USER\\K]\n[HKEY_CURRENT_USER\\k]", none, 0}, Form{";\"v\"=\"x\"", none, 0},
           Form{"\"v\"=hex:7x\n\"v\"=hex(g):78\n\"v\"=dword:g\n\"v\"x\n\"v", none, 0}, Form{"\"v\"=\"\U0001F600\"", L"\U0001F600", 6},

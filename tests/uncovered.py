@@ -29,20 +29,20 @@ def uncovered(report):
                 counts[line['line_number']] = counts.get(line['line_number'], 0) + line['count']
         with open(file['file'], encoding='utf-8') as source:
             texts = source.read().splitlines()
-        yield from ((file['file'], number, texts[number - 1].strip()) for number in sorted(counts) if counts[number] == 0)
+        for number in sorted(counts):
+            if counts[number] == 0:
+                yield file['file'], number, texts[number - 1].strip()
 
 
 def main():
-    known = reasons()
-    used, unknown = set(), 0
+    known, is_explained = reasons(), True
     for path, number, text in uncovered(json.load(sys.stdin)):
-        words = known.get((path, text), ['NO REASON'])
-        unknown += words == ['NO REASON']
-        print(f'{path}:{number}: {text}  ({words[0] if len(words) == 1 else words.pop(0)})')
-        used.add((path, text))
-    for path, text in sorted(set(known) - used):
-        print(f'{path}: {text}  (is run)')
-    return 1 if unknown or set(known) - used else 0
+        words = known.get((path, text))
+        is_explained = is_explained and bool(words)
+        print(f"{path}:{number}: {text}  ({words.pop(0) if words else 'NO REASON'})")
+    left = [f'{path}: {text}  (is run)' for (path, text), words in known.items() for _ in words]
+    print(*left, sep='\n', end='\n' * bool(left))
+    return 0 if is_explained and not left else 1
 
 
 sys.exit(main())

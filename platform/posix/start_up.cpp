@@ -1,8 +1,6 @@
 // What has to be so before the library starts.
 #include "platform/posix/start_up.h"
 
-#include <wx/strconv.h>
-
 #include <algorithm>
 #include <clocale>
 #include <sys/resource.h>
@@ -28,6 +26,5 @@ StartUp::StartUp()
 {
     // Should the system lack it, names that are not ASCII stay what they were.
     static_cast<void>(std::setlocale(LC_CTYPE, "C.UTF-8"));
-    wxConvFileName = &wxConvUTF8;
     RaiseStackLimit();
 }
