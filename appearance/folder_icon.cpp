@@ -24,7 +24,7 @@ constexpr std::uint32_t CustomFolderVersion = 0x00040048;
 constexpr int NormalizeAll = wxPATH_NORM_ENV_VARS | wxPATH_NORM_DOTS | wxPATH_NORM_TILDE |
                              wxPATH_NORM_ABSOLUTE | wxPATH_NORM_LONG | wxPATH_NORM_SHORTCUT;
 
-wxFileName SourceIcon(const FolderUpgradeApp& app, const wxString& iconName)
+wxString SourceIcon(const FolderUpgradeApp& app, const wxString& iconName)
 {
     const wxString separator = wxFileName::GetPathSeparator();
     static const wxString executable = wxStandardPaths::Get().GetExecutablePath();
@@ -33,7 +33,7 @@ wxFileName SourceIcon(const FolderUpgradeApp& app, const wxString& iconName)
         path += separator + app.m_bundleIconsDir + separator;
     wxFileName source(path + iconName);
     source.Normalize(NormalizeAll, wxString(), wxPATH_NATIVE);
-    return source;
+    return source.GetFullPath();
 }
 
 // The shell's version, major in the upper 16 bits and minor in the lower; 0 when it is not to be
@@ -122,16 +122,14 @@ void UpdateFolderIcon(const FolderUpgradeApp& app, const wxString& hotFolder)
         RunLog(L"Unable to get Icon filename " + iconName, NoCount);
         return;
     }
-    const wxFileName source = SourceIcon(app, iconName);
-    const wxFileName destination(PrivateDirPath(hotFolder), iconName);
-    if (!source.FileExists() || !destination.FileExists())
+    const wxString source = SourceIcon(app, iconName);
+    const wxString destination = PrivateDirPath(hotFolder) + iconName;
+    if (!wxFileExists(source) || !wxFileExists(destination))
     {
-        RunLog(L"Icon path  not exist: " + source.GetFullPath(), NoCount);
+        RunLog(L"Icon path  not exist: " + source, NoCount);
         return;
     }
-    wxCopyFile(source.GetFullPath(), destination.GetFullPath(), true);
+    wxCopyFile(source, destination, true);
     ApplyFolderIcon(hotFolder, iconName);
-    RunLog(L"Icon  copied from : " + source.GetFullPath() + L" To " + destination.GetFullPath() +
-               L" ",
-           NoCount);
+    RunLog(L"Icon  copied from : " + source + L" To " + destination + L" ", NoCount);
 }

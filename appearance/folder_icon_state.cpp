@@ -21,11 +21,12 @@ bool IsEnabled(const wxString& hotFolder)
     return settings.Enable;
 }
 
-// The library logs a directory that it cannot open, so that is asked first.
+// The library logs a directory that it cannot open, so that is asked first; and before that whether
+// the file is there at all, which is quicker than a look through the directory.
 bool HasError(const wxString& hotFolder)
 {
     const wxString path = PrivateDirPath(hotFolder);
-    if (!wxFileName::DirExists(path) || !wxFileName::IsDirReadable(path))
+    if (!wxFileName::Exists(path + ErrorFileName) || !wxFileName::IsDirReadable(path))
         return false;
     const wxDir directory(path);
     return directory.IsOpened() && directory.HasFiles(ErrorFileName);
