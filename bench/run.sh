@@ -7,8 +7,8 @@
 #     --log-limit  how long a single run with the log on may be expected to take (120); 10,000 folders take longer
 #
 # On Debian 12 it first installs what it needs. The tables are kept in build/bench/results.md, the picture of the whole
-# runs in build/bench/results.svg. With all counts it takes ten minutes and 2 GB in the temporary folder; the machine
-# should have nothing else to do.
+# runs in build/bench/results.svg. With all counts it takes a quarter of an hour and 2 GB in the temporary folder; the
+# machine should have nothing else to do.
 set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")/.."
 

@@ -154,7 +154,7 @@ def measure_logged(station, times, previous, log_limit):
     for _ in range(station.rounds if is_short else 1):
         times['logged'] = min(times.get('logged', float('inf')), station.tool('I')[0])
         station.tool('U', 'V')
-    if is_short:
+    if expected <= log_limit / 2:
         times['logged shares'] = shares(station, 'I')
 
 
