@@ -116,7 +116,7 @@ def check_outcome(station):
 
 
 def shares(station, *switches):
-    """The microseconds of each kind of work in the quicker of two runs; what no kind counts is the rest."""
+    """The microseconds of each kind of work, with the log off in the quicker of two runs; the rest is no kind's."""
     best = None
     for _ in range(1 if len(switches) == 1 else 2):
         elapsed, output = station.tool(*switches, program='FolderUpgradeTimed')
