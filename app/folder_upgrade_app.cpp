@@ -1,7 +1,72 @@
-#include "app/folder_upgrade_app.h"
+// The application object, and in OnInit the body of the run: the switch, and the fixed order of the
+// steps.
+#include "run/folder_upgrade_app.h"
+#include "store/hot_folder_list.h"
+#include "run/run_log.h"
+#include "appearance/folder_icon.h"
+#include "migrate/hot_folder_impose_path.h"
+#include "migrate/job_preset_impose_path.h"
+
+#include <wx/arrstr.h>
+#include <wx/debug.h>
+
+namespace
+{
+
+// Reads and announces the switch; false when it is neither of the two.
+bool ReadSwitch(const wxString& text, bool& isUpgrade)
+{
+    isUpgrade = text.CmpNoCase("I") == 0;
+    if (isUpgrade)
+        RunLog(L"Installation : Upgrade call with switch: I", NoCount);
+    else if (text.CmpNoCase("U") == 0)
+        RunLog(L"Un-installation : Downgrade call with switch: U", NoCount);
+    else
+    {
+        RunLog(L"Invalid call check calling parameter: exiting....", NoCount);
+        return false;
+    }
+    return true;
+}
+
+void UpdateHotFolder(FolderUpgradeApp& app, const wxString& folder, int position)
+{
+    UpdateFolderIcon(app, folder);
+    RunLog(L"Updated icon for hf" + folder, position);
+    UpdateHotFolderImposePath(app, folder);
+    RunLog(L"updated Impose path for hf" + folder, position);
+}
+
+} // namespace
 
 FolderUpgradeApp::FolderUpgradeApp() : m_bundleIconsDir("BundleIcons")
 {
 }
 
 FolderUpgradeApp::~FolderUpgradeApp() = default;
+
+bool FolderUpgradeApp::OnInit()
+{
+    wxDisableAsserts();
+    if (argc < 2)
+        return false;
+    if (argc == 3 && argv[2].CmpNoCase("V") == 0)
+        RunLogEnabled = false;
+    if (!ReadSwitch(argv[1], m_isUpgrade))
+        return false;
+
+    wxArrayString folders;
+    ReadHotFolderList(folders);
+    if (folders.empty())
+        RunLog(L"No Hotfolder listed", NoCount);
+
+    RunLog(L"Start: HF updation", NoCount);
+    for (size_t i = 0; i < folders.size(); ++i)
+        UpdateHotFolder(*this, folders[i], static_cast<int>(i + 1));
+    RunLog(L"End: HF updation", NoCount);
+
+    RunLog(L"Start: Updating Impose path for JP Presets", NoCount);
+    UpdateJobPresetImposePath(*this);
+    RunLog(L"End: Updating Impose path for JP Presets", NoCount);
+    return false;
+}

@@ -1,3 +1,3 @@
-#include "app/folder_upgrade_app.h"
+#include "run/folder_upgrade_app.h"
 
 wxIMPLEMENT_APP(FolderUpgradeApp);

@@ -1,6 +1,6 @@
 #include "appearance/folder_icon.h"
 
-#include "app/run_log.h"
+#include "run/run_log.h"
 #include "appearance/desktop_ini.h"
 #include "appearance/folder_icon_state.h"
 #include "platform/system.h"

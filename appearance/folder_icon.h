@@ -1,7 +1,7 @@
 // A hot folder's icon in Explorer.
 #pragma once
 
-#include "app/folder_upgrade_app.h"
+#include "run/folder_upgrade_app.h"
 
 #include <wx/string.h>
 

@@ -1,7 +1,7 @@
 // Times the parts of a run with Google Benchmark; the samples' hot folder and presets serve as
 // typical ones.
-#include "app/folder_upgrade_app.h"
-#include "app/run_log.h"
+#include "run/folder_upgrade_app.h"
+#include "run/run_log.h"
 #include "appearance/folder_icon.h"
 #include "migrate/install_locations.h"
 #include "migrate/preset_text.h"

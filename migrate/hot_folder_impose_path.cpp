@@ -1,6 +1,6 @@
 #include "migrate/hot_folder_impose_path.h"
 
-#include "app/run_log.h"
+#include "run/run_log.h"
 #include "migrate/install_locations.h"
 #include "store/folder_cfg_format.h"
 #include "store/folder_cfg_reader.h"

@@ -1,7 +1,7 @@
 // Moving the template path of one hot folder.
 #pragma once
 
-#include "app/folder_upgrade_app.h"
+#include "run/folder_upgrade_app.h"
 
 #include <wx/string.h>
 

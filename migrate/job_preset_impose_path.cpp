@@ -1,6 +1,6 @@
 #include "migrate/job_preset_impose_path.h"
 
-#include "app/run_log.h"
+#include "run/run_log.h"
 #include "migrate/install_locations.h"
 #include "migrate/preset_text.h"
 #include "platform/standard_folders.h"

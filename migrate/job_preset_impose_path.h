@@ -1,7 +1,7 @@
 // Moving the template paths in the current user's job presets.
 #pragma once
 
-#include "app/folder_upgrade_app.h"
+#include "run/folder_upgrade_app.h"
 
 #include <wx/arrstr.h>
 

@@ -1,7 +1,7 @@
 // The operating system calls that the tool makes, under their real names.
 //
 // On Windows this is the system's own headers. Elsewhere it declares the same names with the same
-// contracts, and platform/posix/ answers them: the hives are text files, attributes live in file
+// contracts, and platform/linux/ answers them: the hives are text files, attributes live in file
 // modes and extended attributes, a profile file is a file, and there is no shell to tell.
 #pragma once
 

@@ -1,7 +1,7 @@
 // File attributes where the file system has none: READONLY of a file is its missing write
 // permission; every other one, and READONLY of a directory, stands as hexadecimal text in the
 // extended attribute in which Wine and Samba keep them.
-#include "platform/posix/native_path.h"
+#include "platform/linux/native_path.h"
 #include "platform/system.h"
 
 #include <cerrno>

@@ -1,6 +1,6 @@
 #include "platform/standard_folders.h"
 
-#include "platform/posix/start_up.h"
+#include "platform/linux/start_up.h"
 
 #include <wx/filename.h>
 #include <wx/utils.h>
@@ -10,6 +10,8 @@
 namespace
 {
 
+// Made before main() runs. It is here because the linker takes this file from the library for the
+// functions below, and takes no file for the sake of a static object alone.
 const StartUp startUp;
 
 wxString FromEnvironment(const char* name)

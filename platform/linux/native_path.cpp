@@ -1,4 +1,4 @@
-#include "platform/posix/native_path.h"
+#include "platform/linux/native_path.h"
 
 #include <wx/string.h>
 

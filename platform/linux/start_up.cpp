@@ -1,5 +1,5 @@
 // What has to be so before the library starts.
-#include "platform/posix/start_up.h"
+#include "platform/linux/start_up.h"
 
 #include <algorithm>
 #include <clocale>

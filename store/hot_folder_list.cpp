@@ -1,4 +1,4 @@
-#include "app/hot_folder_list.h"
+#include "store/hot_folder_list.h"
 
 #include "platform/standard_folders.h"
 #include "store/xml_lookup.h"

@@ -1,6 +1,6 @@
 // The registry of a machine without one: a hive is a file in the registry editor's own text form,
 // "Windows Registry Editor Version 5.00", read afresh each time a key is opened.
-#include "platform/posix/file_bytes.h"
+#include "platform/linux/file_bytes.h"
 #include "platform/standard_folders.h"
 #include "platform/system.h"
 

@@ -1,4 +1,4 @@
-#include "platform/posix/file_bytes.h"
+#include "platform/linux/file_bytes.h"
 
 #include <fcntl.h>
 #include <sys/stat.h>

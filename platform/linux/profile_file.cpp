@@ -2,8 +2,8 @@
 //
 // The text is handled in units, a byte each or, behind a UTF-16LE byte-order mark, two, so that
 // bytes of any encoding come out as they went in. Of a repeated section or key the first counts.
-#include "platform/posix/file_bytes.h"
-#include "platform/posix/native_path.h"
+#include "platform/linux/file_bytes.h"
+#include "platform/linux/native_path.h"
 #include "platform/system.h"
 
 #include <wx/string.h>
