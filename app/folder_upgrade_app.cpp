@@ -4,6 +4,7 @@
 #include "store/hot_folder_list.h"
 #include "run/run_log.h"
 #include "appearance/folder_icon.h"
+#include "appearance/icon_source.h"
 #include "migrate/hot_folder_impose_path.h"
 #include "migrate/job_preset_impose_path.h"
 
@@ -18,18 +19,18 @@ bool ReadSwitch(const wxString& text, bool& isUpgrade)
 {
     isUpgrade = text.CmpNoCase("I") == 0;
     if (isUpgrade)
-        RunLog(L"Installation : Upgrade call with switch: I", NoCount);
+        RunLog(L"Installation : Upgrade call with switch: I");
     else if (text.CmpNoCase("U") == 0)
-        RunLog(L"Un-installation : Downgrade call with switch: U", NoCount);
+        RunLog(L"Un-installation : Downgrade call with switch: U");
     else
     {
-        RunLog(L"Invalid call check calling parameter: exiting....", NoCount);
+        RunLog(L"Invalid call check calling parameter: exiting....");
         return false;
     }
     return true;
 }
 
-void UpdateHotFolder(FolderUpgradeApp& app, const wxString& folder, int position)
+void UpdateHotFolder(const FolderUpgradeApp& app, const wxString& folder, int position)
 {
     UpdateFolderIcon(app, folder);
     RunLog(L"Updated icon for hf" + folder, position);
@@ -39,7 +40,7 @@ void UpdateHotFolder(FolderUpgradeApp& app, const wxString& folder, int position
 
 } // namespace
 
-FolderUpgradeApp::FolderUpgradeApp() : m_bundleIconsDir("BundleIcons")
+FolderUpgradeApp::FolderUpgradeApp() : m_bundleIconsDir(BundleIconsDirName)
 {
 }
 
@@ -58,15 +59,15 @@ bool FolderUpgradeApp::OnInit()
     wxArrayString folders;
     ReadHotFolderList(folders);
     if (folders.empty())
-        RunLog(L"No Hotfolder listed", NoCount);
+        RunLog(L"No Hotfolder listed");
 
-    RunLog(L"Start: HF updation", NoCount);
+    RunLog(L"Start: HF updation");
     for (size_t i = 0; i < folders.size(); ++i)
         UpdateHotFolder(*this, folders[i], static_cast<int>(i + 1));
-    RunLog(L"End: HF updation", NoCount);
+    RunLog(L"End: HF updation");
 
-    RunLog(L"Start: Updating Impose path for JP Presets", NoCount);
+    RunLog(L"Start: Updating Impose path for JP Presets");
     UpdateJobPresetImposePath(*this);
-    RunLog(L"End: Updating Impose path for JP Presets", NoCount);
+    RunLog(L"End: Updating Impose path for JP Presets");
     return false;
 }

@@ -1,33 +1,28 @@
 #include "appearance/desktop_ini.h"
 
+#include "appearance/attribute_change.h"
+#include "platform/regular_file.h"
 #include "platform/system.h"
-
-#include <wx/dir.h>
+#include "store/hot_folder.h"
 
 #include <array>
 
 namespace
 {
 
-const wchar_t* const Section = L".ShellClassInfo";
 const wchar_t* const IconFileKey = L"IconFile";
 const wchar_t* const IconIndexKey = L"IconIndex";
 const wchar_t* const InfoTipKey = L"InfoTip";
 const wchar_t* const IconIndexValue = L"00";
 const wchar_t* const HotFolderInfoTip = L"This folder has been configured as an ORX hot folder.";
-const wchar_t* const IconDir = L".\\[_ORX_HotFolder_]\\";
 const wchar_t* const DefaultIconFile = L"00";
 
-constexpr DWORD ReadOnlyAndSystem = FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_SYSTEM;
 constexpr DWORD IconFileCapacity = 200; // characters, the terminating NUL included
 
-// Both bits go, also when only one is there: with the other bit set in its place the writes that
-// follow would fail, and the icon that the user chose would be overwritten with a default.
-void MakeWritable(const wxString& path)
+void WriteKeys(const wxString& path, const std::vector<DesktopIniKey>& keys)
 {
-    const DWORD attributes = GetFileAttributesW(path.wc_str());
-    if (attributes != INVALID_FILE_ATTRIBUTES)
-        SetFileAttributesW(path.wc_str(), attributes & ~ReadOnlyAndSystem);
+    for (const DesktopIniKey& each : keys)
+        WriteIniString(DesktopIniSection, each.key, each.value, path);
 }
 
 void ForceFolderIcon(const wxString& hotFolder, wchar_t* iconFile)
@@ -44,9 +39,12 @@ void ForceFolderIcon(const wxString& hotFolder, wchar_t* iconFile)
 
 } // namespace
 
-wxString DesktopIniPath(const wxString& hotFolder)
+std::vector<DesktopIniKey> DesktopIniKeys(bool isThere, const wxString& iconName)
 {
-    return hotFolder + L"\\Desktop.ini";
+    const wxString iconFile = wxString(L".\\") + PrivateDirName + L"\\" + iconName;
+    if (isThere)
+        return {{InfoTipKey, HotFolderInfoTip}, {IconFileKey, iconFile}};
+    return {{IconFileKey, iconFile}, {IconIndexKey, IconIndexValue}, {InfoTipKey, HotFolderInfoTip}};
 }
 
 bool WriteIniString(const wxString& section, const wxString& key, const wxString& value,
@@ -58,28 +56,37 @@ bool WriteIniString(const wxString& section, const wxString& key, const wxString
 
 bool CreateDesktopIni(const wxString& hotFolder, const wxString& iconName)
 {
-    if (!wxDir::Exists(hotFolder))
+    const PinnedDirectory directory(hotFolder, Links::Follow);
+    if (!directory.IsOpen())
         return false;
-    const wxString path = DesktopIniPath(hotFolder);
-    WriteIniString(Section, IconFileKey, IconDir + iconName, path);
-    WriteIniString(Section, IconIndexKey, IconIndexValue, path);
-    WriteIniString(Section, InfoTipKey, HotFolderInfoTip, path);
+    // The profile functions would create it through a link, too. While the file is open for reading, nobody
+    // puts one in its place.
+    const wxString path = directory.Reach(DesktopIniName);
+    RegularFile ini;
+    if (ini.CreateNew(path) == RegularFile::Status::Open &&
+        ini.OpenForReading(path, Links::Refuse) == RegularFile::Status::Open)
+        WriteKeys(path, DesktopIniKeys(false, iconName));
     return true;
 }
 
 bool RefreshDesktopIni(const wxString& hotFolder, const wxString& iconName)
 {
-    if (!wxDir::Exists(hotFolder))
+    const PinnedDirectory directory(hotFolder, Links::Follow);
+    if (!directory.IsOpen())
         return false;
-    const wxString path = DesktopIniPath(hotFolder);
-    MakeWritable(path);
-    WriteIniString(Section, InfoTipKey, HotFolderInfoTip, path);
-    WriteIniString(Section, IconFileKey, IconDir + iconName, path);
+    const wxString path = directory.Reach(DesktopIniName);
+    RegularFile ini; // as above; what cannot be read, the profile functions cannot write
+    if (ini.OpenForReading(path, Links::Refuse) != RegularFile::Status::Open)
+        return true;
+    // Both bits go, also when only one is there: with the other bit set instead the writes that follow
+    // would fail, and the icon that the user chose would be overwritten with a default.
+    ChangeAttributes(path, 0, ReadOnlyAndSystem);
+    WriteKeys(path, DesktopIniKeys(true, iconName));
 
     std::array<wchar_t, IconFileCapacity> iconFile{};
-    GetPrivateProfileStringW(Section, IconFileKey, DefaultIconFile, iconFile.data(),
+    GetPrivateProfileStringW(DesktopIniSection, IconFileKey, DefaultIconFile, iconFile.data(),
                              IconFileCapacity, path.wc_str());
-    SetFileAttributesW(path.wc_str(), FILE_ATTRIBUTE_NORMAL);
+    ChangeAttributes(path, FILE_ATTRIBUTE_NORMAL, ~DWORD{FILE_ATTRIBUTE_NORMAL});
     ForceFolderIcon(hotFolder, iconFile.data());
     return true;
 }

@@ -3,21 +3,30 @@
 
 #include <wx/string.h>
 
-/// The path of the folder's Desktop.ini, the folder as it is given: one that ends in a separator
-/// gives a doubled one, which names the same file.
-wxString DesktopIniPath(const wxString& hotFolder);
+#include <vector>
+
+constexpr const wchar_t* DesktopIniName = L"Desktop.ini";
+constexpr const wchar_t* DesktopIniSection = L".ShellClassInfo";
+
+struct DesktopIniKey
+{
+    const wchar_t* key;
+    wxString value;
+};
+
+/// The keys that are written, in their order: all for a Desktop.ini that is not there yet, else those that show
+/// the icon and the info tip.
+std::vector<DesktopIniKey> DesktopIniKeys(bool isThere, const wxString& iconName);
 
 /// Sets one key; the success flag of WritePrivateProfileStringW, which changes no other key and
 /// creates a missing file.
 bool WriteIniString(const wxString& section, const wxString& key, const wxString& value,
                     const wxString& path);
 
-/// Writes the keys of a Desktop.ini that is not there yet: IconFile, IconIndex, InfoTip, in the
-/// section .ShellClassInfo. False, and nothing written, when the hot folder is not a directory;
-/// failed writes are not reported.
+/// Makes a Desktop.ini with its keys. False, and nothing written, when the hot folder is not a directory; failed
+/// writes are not reported. Nothing is written when anything of that name is there.
 bool CreateDesktopIni(const wxString& hotFolder, const wxString& iconName);
 
-/// Takes read-only and system from a Desktop.ini, writes its keys InfoTip and IconFile and has the
-/// shell force the folder's icon with SHGetSetFolderCustomSettings. All other keys stay; of the
-/// attributes none does. Result as above.
+/// Takes read-only and system from a Desktop.ini, writes its keys and has the shell force the folder's icon
+/// with SHGetSetFolderCustomSettings. All other keys stay; of the attributes none does. Result as above.
 bool RefreshDesktopIni(const wxString& hotFolder, const wxString& iconName);

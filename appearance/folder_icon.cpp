@@ -1,68 +1,31 @@
 #include "appearance/folder_icon.h"
 
-#include "run/run_log.h"
+#include "appearance/attribute_change.h"
 #include "appearance/desktop_ini.h"
 #include "appearance/folder_icon_state.h"
+#include "appearance/icon_source.h"
+#include "appearance/shell_version.h"
+#include "platform/file_copy.h"
 #include "platform/system.h"
-#include "store/folder_cfg_reader.h"
+#include "run/run_log.h"
+#include "store/hot_folder.h"
 
-#include <wx/file.h>
 #include <wx/filename.h>
-#include <wx/stdpaths.h>
+#include <wx/intl.h>
+#include <wx/log.h>
 
 #include <cstdint>
 
 namespace
 {
 
-constexpr DWORD ReadOnlyAndSystem = FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_SYSTEM;
-
-// The first shell that takes a folder's settings from Desktop.ini: version 4.72.
-constexpr std::uint32_t CustomFolderVersion = 0x00040048;
-
-// What the library calls wxPATH_NORM_ALL: everything but the letter case.
-constexpr int NormalizeAll = wxPATH_NORM_ENV_VARS | wxPATH_NORM_DOTS | wxPATH_NORM_TILDE |
-                             wxPATH_NORM_ABSOLUTE | wxPATH_NORM_LONG | wxPATH_NORM_SHORTCUT;
-
-wxString SourceIcon(const FolderUpgradeApp& app, const wxString& iconName)
+// The path by which people and the shell know it.
+wxString IniPath(const wxString& hotFolder)
 {
-    const wxString separator = wxFileName::GetPathSeparator();
-    static const wxString executable = wxStandardPaths::Get().GetExecutablePath();
-    wxString path = executable + L"/../";
-    if (!app.m_isUpgrade)
-        path += separator + app.m_bundleIconsDir + separator;
-    wxFileName source(path + iconName);
-    source.Normalize(NormalizeAll, wxString(), wxPATH_NATIVE);
-    return source.GetFullPath();
-}
-
-// The shell's version, major in the upper 16 bits and minor in the lower; 0 when it is not to be
-// learnt.
-std::uint32_t GetPackedShellVersion()
-{
-    const HMODULE shell = LoadLibraryW(L"shell32.dll");
-    if (!shell)
-        return 0;
-    std::uint32_t packed = 0;
-    const FARPROC entry = GetProcAddress(shell, "DllGetVersion");
-    if (entry)
-    {
-        DLLVERSIONINFO version = {};
-        version.cbSize = sizeof version;
-        // By way of void*, since the two types of function have nothing in common.
-        const auto getVersion = reinterpret_cast<DLLGETVERSIONPROC>(reinterpret_cast<void*>(entry));
-        if (SUCCEEDED(getVersion(&version)))
-            packed = (version.dwMajorVersion & 0xFFFF) << 16 | (version.dwMinorVersion & 0xFFFF);
-    }
-    FreeLibrary(shell);
-    return packed;
-}
-
-void MakeSystemFolder(const wxString& hotFolder)
-{
-    const DWORD attributes = GetFileAttributesW(hotFolder.wc_str());
-    if (attributes != 0 && (attributes & ReadOnlyAndSystem) != ReadOnlyAndSystem)
-        SetFileAttributesW(hotFolder.wc_str(), attributes | ReadOnlyAndSystem);
+    wxFileName ini;
+    ini.AssignDir(hotFolder);
+    ini.SetFullName(DesktopIniName);
+    return ini.GetFullPath();
 }
 
 void TellShell(const wxString& iniPath)
@@ -77,59 +40,58 @@ void TellShell(const wxString& iniPath)
     SHChangeNotify(SHCNE_ASSOCCHANGED, SHCNF_IDLIST | SHCNF_FLUSH, nullptr, nullptr);
 }
 
-void MakeFolderWritable(const wxString& hotFolder)
+void WriteDesktopIni(const wxString& hotFolder, const wxString& iniPath, const wxString& iconName)
 {
-    if (hotFolder.empty())
-        return;
-    const DWORD attributes = GetFileAttributesW(hotFolder.wc_str());
-    if (attributes != INVALID_FILE_ATTRIBUTES && (attributes & FILE_ATTRIBUTE_READONLY) != 0)
-        SetFileAttributesW(hotFolder.wc_str(), attributes & ~FILE_ATTRIBUTE_READONLY);
+    if (wxFileExists(iniPath))
+        RefreshDesktopIni(hotFolder, iconName);
+    else
+        CreateDesktopIni(hotFolder, iconName);
 }
 
-bool ProtectDesktopIni(const wxString& iniPath)
+bool IsFileItself(const wxString& path)
 {
-    const DWORD attributes = GetFileAttributesW(iniPath.wc_str());
-    return attributes != INVALID_FILE_ATTRIBUTES &&
-           SetFileAttributesW(iniPath.wc_str(), attributes | ReadOnlyAndSystem) != 0;
+    return wxFileExists(path) && !IsLink(path);
 }
 
 } // namespace
 
 bool ApplyFolderIcon(const wxString& hotFolder, const wxString& iconName)
 {
-    wxFileName ini;
-    ini.AssignDir(hotFolder);
-    ini.SetFullName(L"Desktop.ini");
-    const wxString iniPath = ini.GetFullPath();
+    const PinnedDirectory directory(hotFolder, Links::Follow);
+    const wxString iniPath = IniPath(hotFolder);
+    const bool isLinked = IsLink(directory.Reach(DesktopIniName));
+    if (isLinked)
+        RunLog(L"Desktop.ini left as it is (reached over a link): " + iniPath);
     if (GetPackedShellVersion() >= CustomFolderVersion)
     {
-        if (wxFile::Exists(iniPath))
-            RefreshDesktopIni(hotFolder, iconName);
-        else
-            CreateDesktopIni(hotFolder, iconName);
-        MakeSystemFolder(hotFolder);
+        if (!isLinked)
+            WriteDesktopIni(hotFolder, directory.Reach(DesktopIniName), iconName);
+        ChangeAttributes(directory.Reach(L""), ReadOnlyAndSystem, 0);
         TellShell(iniPath);
-        MakeFolderWritable(hotFolder);
+        ChangeAttributes(directory.Reach(L""), 0, FILE_ATTRIBUTE_READONLY);
     }
-    return ProtectDesktopIni(iniPath);
+    return !isLinked && ChangeAttributes(directory.Reach(DesktopIniName), ReadOnlyAndSystem, 0);
 }
 
 void UpdateFolderIcon(const FolderUpgradeApp& app, const wxString& hotFolder)
 {
+    const PinnedHotFolder folder(hotFolder);
     wxString iconName;
-    if (!GetFolderIconName(hotFolder, iconName))
+    if (!GetFolderIconName(folder, hotFolder, iconName))
     {
-        RunLog(L"Unable to get Icon filename " + iconName, NoCount);
+        RunLog(L"Unable to get Icon filename " + iconName);
         return;
     }
-    const wxString source = SourceIcon(app, iconName);
-    const wxString destination = PrivateDirPath(hotFolder) + iconName;
-    if (!wxFileExists(source) || !wxFileExists(destination))
+    const wxString source = SourceIconPath(iconName, app.m_isUpgrade, app.m_bundleIconsDir);
+    const wxString destination = folder.privateDir.Reach(iconName);
+    if (!wxFileExists(source) || !IsFileItself(destination))
     {
-        RunLog(L"Icon path  not exist: " + source, NoCount);
+        RunLog(L"Icon path  not exist: " + source);
         return;
     }
-    wxCopyFile(source, destination, true);
+    const wxString shownDestination = PrivateDirPath(hotFolder) + iconName;
+    if (!CopyOver(source, destination))
+        wxLogSysError(_("Failed to copy the file '%s' to '%s'"), source, shownDestination);
     ApplyFolderIcon(hotFolder, iconName);
-    RunLog(L"Icon  copied from : " + source + L" To " + destination + L" ", NoCount);
+    RunLog(L"Icon  copied from : " + source + L" To " + shownDestination + L" ");
 }

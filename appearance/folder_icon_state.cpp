@@ -1,6 +1,7 @@
 #include "appearance/folder_icon_state.h"
 
 #include "store/folder_cfg_reader.h"
+#include "store/xml_file.h"
 
 #include <wx/dir.h>
 #include <wx/filename.h>
@@ -11,22 +12,23 @@ namespace
 const wchar_t* const ErrorFileName = L"Error.er";
 const wchar_t* const IconExtension = L".ico";
 
-bool IsEnabled(const wxString& hotFolder)
+bool IsEnabled(const PinnedHotFolder& folder, const wxString& hotFolder)
 {
     HotFolderSettings settings;
-    const wxString cfgPath = FolderCfgPath(hotFolder);
+    XmlFile cfg;
     const wxCriticalSectionLocker lock(FolderCfgLock);
-    if (wxFileExists(cfgPath))
-        LoadHotFolderSettings(cfgPath, settings);
+    cfg.Load(folder.privateDir.Reach(FolderCfgName), Links::Refuse, FolderCfgPath(hotFolder));
+    ReadHotFolderSettings(cfg.GetRoot(), settings);
     return settings.Enable;
 }
 
-// The library logs a directory that it cannot open, so that is asked first; and before that whether
+// The library reports a directory that it cannot open, so that is asked first; and before that whether
 // the file is there at all, which is quicker than a look through the directory.
-bool HasError(const wxString& hotFolder)
+bool HasError(const PinnedHotFolder& folder)
 {
-    const wxString path = PrivateDirPath(hotFolder);
-    if (!wxFileName::Exists(path + ErrorFileName) || !wxFileName::IsDirReadable(path))
+    const wxString path = folder.privateDir.Reach(L"");
+    if (!wxFileName::Exists(folder.privateDir.Reach(ErrorFileName), wxFILE_EXISTS_ANY) ||
+        !wxFileName::IsDirReadable(path))
         return false;
     const wxDir directory(path);
     return directory.IsOpened() && directory.HasFiles(ErrorFileName);
@@ -52,9 +54,14 @@ const wchar_t* IconBaseName(FolderIconState state)
 
 bool GetFolderIconName(const wxString& hotFolder, wxString& iconName)
 {
-    const bool isEnabled = IsEnabled(hotFolder);
+    return GetFolderIconName(PinnedHotFolder(hotFolder), hotFolder, iconName);
+}
+
+bool GetFolderIconName(const PinnedHotFolder& folder, const wxString& hotFolder, wxString& iconName)
+{
+    const bool isEnabled = IsEnabled(folder, hotFolder);
     FolderIconState state = isEnabled ? FolderIconState::Active : FolderIconState::Inactive;
-    if (HasError(hotFolder))
+    if (HasError(folder))
         state = isEnabled ? FolderIconState::ErrorActive : FolderIconState::ErrorInactive;
     iconName = wxString(IconBaseName(state)) + IconExtension;
     return true;

@@ -1,6 +1,8 @@
 // The choice of the icon that shows a hot folder's state in Explorer.
 #pragma once
 
+#include "store/hot_folder.h"
+
 #include <wx/string.h>
 
 enum class FolderIconState
@@ -16,3 +18,6 @@ enum class FolderIconState
 /// whose Folder.cfg cannot be read is not enabled; one whose private directory is missing or cannot
 /// be listed is not in error. Changes and logs nothing; returns true.
 bool GetFolderIconName(const wxString& hotFolder, wxString& iconName);
+
+/// The same for a hot folder that is pinned; people know it by the path.
+bool GetFolderIconName(const PinnedHotFolder& folder, const wxString& hotFolder, wxString& iconName);

@@ -4,12 +4,6 @@
 #include <wx/filename.h>
 #include <wx/string.h>
 
-/// The keys of a stored template path, and the lines that callers log when a lookup fails.
-constexpr const char* ImposeTemplateKey = "ORXImposeTemplate";
-constexpr const char* NoDefaultPathMessage = "Unable to read: Default Impose Template Path";
-constexpr const char* NoPreviousPathMessage =
-    "Unable to read: Previous Version  Default Impose Template Path";
-
 /// The default template folder of the installed software: "template" below the InstallPath of the
 /// machine's key. False, and the folder as it was, when that cannot be read.
 ///

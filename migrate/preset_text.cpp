@@ -1,9 +1,12 @@
 #include "migrate/preset_text.h"
 
-#include "migrate/install_locations.h"
+#include "platform/unicode_text.h"
+#include "store/folder_cfg_format.h"
 #include "store/xml_tree.h"
 
+#include <wx/convauto.h>
 #include <wx/filename.h>
+#include <wx/textbuf.h>
 
 #include <vector>
 
@@ -24,10 +27,10 @@ bool EndsFolder(const wxString& text, size_t position)
            (text[position] == '"' || wxFileName::IsPathSeparator(text[position]));
 }
 
-// Where the folder's text stands in the text's template paths, in ascending order.
+// The positions of the folder's text in the text's template paths, in ascending order.
 std::vector<size_t> FindFolders(const wxString& text, const wxString& folder)
 {
-    const wxString introduction = wxString(ImposeTemplateKey) + PathIntroduction;
+    const wxString introduction = wxString(FolderCfg::ImposeTemplateKey) + PathIntroduction;
     const wxString searched = introduction + folder;
     std::vector<size_t> folders;
     for (size_t found = text.find(searched); found != wxString::npos;)
@@ -37,10 +40,35 @@ std::vector<size_t> FindFolders(const wxString& text, const wxString& folder)
         const bool isPath = EndsFolder(text, end);
         if (isPath)
             folders.push_back(begin);
-        // Behind a path, for a folder's text that holds the introduction would overlap itself.
+        // After a path, for a folder's text that holds the introduction would overlap itself.
         found = text.find(searched, isPath ? end : begin);
     }
     return folders;
+}
+
+// Whether the bytes are nothing but a byte-order mark, if anything.
+bool IsEmptyText(const std::string& bytes)
+{
+    size_t markLength = 0;
+    const wxBOM mark = wxConvAuto::DetectBOM(bytes.data(), bytes.length());
+    if (mark != wxBOM_None && mark != wxBOM_Unknown)
+        wxConvAuto::GetBOMChars(mark, &markLength);
+    // Two bytes alone may be the beginning of another mark, but then there is no text either.
+    return bytes.length() == markLength || (mark == wxBOM_Unknown && bytes == "\xFF\xFE");
+}
+
+// The bytes are decoded as they are and line ends treated as text mode does, where the system has one: text
+// mode itself would end the file at the first Ctrl-Z, and see line ends inside UTF-16.
+const char* Decode(const std::string& bytes, wxString& text)
+{
+    if (IsEmptyText(bytes))
+        return nullptr;
+    wxString(bytes.data(), wxConvAuto(), bytes.length()).swap(text); // to assign it would copy it
+    if (text.empty())
+        return "cannot be decoded";
+    if (wxTextBuffer::typeDefault == wxTextFileType_Dos)
+        text.Replace("\r\n", "\n");
+    return IsUnicodeText(text) ? nullptr : "cannot be encoded again";
 }
 
 } // namespace
@@ -55,10 +83,10 @@ size_t MovePresetPaths(wxString& text, wxString from, wxString to)
     if (folders.empty())
         return 0;
 
-    // A text that grew as it is put together would stand in memory three times at the worst.
+    // A text that grew as it is put together would be in memory three times at the worst.
     wxString moved;
     moved.reserve(text.length() + folders.size() * to.length() - folders.size() * from.length());
-    size_t copied = 0; // the characters of the text that stand in moved
+    size_t copied = 0; // how many characters of the text are in moved
     for (const size_t folder : folders)
     {
         moved.append(text, copied, folder - copied).append(to);
@@ -67,4 +95,18 @@ size_t MovePresetPaths(wxString& text, wxString from, wxString to)
     moved.append(text, copied, wxString::npos);
     text.swap(moved);
     return folders.size();
+}
+
+RewrittenPreset RewritePreset(const std::string& before, const wxString& from, const wxString& to)
+{
+    RewrittenPreset preset;
+    wxString text;
+    preset.reasonToStay = Decode(before, text);
+    if (preset.reasonToStay)
+        return preset;
+    preset.movedPaths = MovePresetPaths(text, from, to);
+    if (wxTextBuffer::typeDefault == wxTextFileType_Dos)
+        text.Replace("\n", "\r\n");
+    preset.bytes = text.utf8_string();
+    return preset;
 }

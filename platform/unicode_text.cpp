@@ -15,7 +15,7 @@ bool IsLow(unsigned long unit)
     return unit >= 0xDC00 && unit < 0xE000;
 }
 
-// The position of the first wide character at or behind the start that is not part of Unicode text.
+// The position of the first wide character from the start on that is not part of Unicode text.
 size_t FindOffender(const wchar_t* text, size_t length, size_t start)
 {
     for (size_t i = start; i < length; ++i)
@@ -61,10 +61,16 @@ wxString FromUtf16Bytes(const unsigned char* bytes, size_t count)
     return text;
 }
 
-wxString ToUnicodeText(const wxString& text)
+wxString ToOneLine(const wxString& text)
 {
     wxString result = text;
     for (size_t i = 0; (i = FindOffender(result.wc_str(), result.length(), i)) < result.length();)
         result[i] = wxUniChar(0xFFFD);
+    for (auto character = result.begin(); character != result.end(); ++character)
+    {
+        const auto code = static_cast<unsigned long>((*character).GetValue());
+        if ((code < 0x20 && code != '\t') || (code >= 0x7F && code < 0xA0) || code == 0x2028 || code == 0x2029)
+            *character = wxUniChar(0xFFFD);
+    }
     return result;
 }

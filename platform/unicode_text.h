@@ -5,7 +5,7 @@
 
 #include <cstddef>
 
-/// Whether the text is Unicode: no surrogate without its partner, nothing above U+10FFFF. Just then
+/// Whether the text is Unicode: no surrogate without its partner, nothing above U+10FFFF. Exactly then
 /// it encodes as UTF-8 and comes back from it as it was.
 bool IsUnicodeText(const wxString& text);
 
@@ -13,5 +13,7 @@ bool IsUnicodeText(const wxString& text);
 /// partner stays what it is.
 wxString FromUtf16Bytes(const unsigned char* bytes, size_t count);
 
-/// The text with U+FFFD in the place of every character that is not Unicode.
-wxString ToUnicodeText(const wxString& text);
+/// The text as one line of Unicode, for a log or a report: U+FFFD in place of every control character
+/// but tab (U+0000 to U+001F, U+007F to U+009F), of U+2028 and U+2029, which end lines too, and of
+/// everything that is not Unicode.
+wxString ToOneLine(const wxString& text);

@@ -1,11 +1,11 @@
 #include "run/run_log.h"
 
+#include "platform/path_normal_form.h"
+#include "platform/regular_file.h"
 #include "platform/standard_folders.h"
 #include "platform/unicode_text.h"
 
-#include <wx/convauto.h>
 #include <wx/filename.h>
-#include <wx/textfile.h>
 
 bool RunLogEnabled = true;
 
@@ -15,42 +15,33 @@ namespace
 const char* const LogDirName = "ORX_Installers";
 const char* const LogFileName = "UpgradeDowngrade.log";
 
-// What the library calls wxPATH_NORM_ALL: everything but the letter case.
-constexpr int NormalizeAll = wxPATH_NORM_ENV_VARS | wxPATH_NORM_DOTS | wxPATH_NORM_TILDE |
-                             wxPATH_NORM_ABSOLUTE | wxPATH_NORM_LONG | wxPATH_NORM_SHORTCUT;
-
-// Where the folder is missing, or a folder bears the log's name, the library would log an error:
-// on Windows a message box that holds an unattended installer up.
-void CreateEmptyLog(const wxFileName& directory, const wxString& path)
-{
-    if (!directory.DirExists() || wxDirExists(path))
-        return;
-    wxTextFile file(path);
-    if (!file.Exists())
-        file.Create();
-    if (wxFileExists(path) && file.Open(wxConvAuto()))
-    {
-        file.Clear();
-        file.Write(wxTextFileType_None, wxConvAuto());
-        file.Close();
-    }
-}
-
-wxString PrepareLog()
+wxString LogDirPath()
 {
     wxFileName directory(GetUserDataFolder() + wxFileName::GetPathSeparator());
     directory.AppendDir(LogDirName);
     directory.Normalize(NormalizeAll, wxString(), wxPATH_NATIVE);
-    const wxString path =
-        directory.GetPath(wxPATH_GET_VOLUME) + wxFileName::GetPathSeparator() + LogFileName;
-    CreateEmptyLog(directory, path);
-    return path;
+    return directory.GetPath(wxPATH_GET_VOLUME) + wxFileName::GetPathSeparator();
 }
 
-const wxString& RunLogPath()
+std::string FormatLine(const wxString& message, int count)
 {
-    static const wxString path = PrepareLog();
-    return path;
+    const wxString line = count == NoCount ? wxString::Format("%s", message)
+                                           : wxString::Format("%s count:  %d", message, count);
+    return ToOneLine(line).utf8_string() + "\r\n";
+}
+
+// The first line makes the file, or empties it, a byte-order mark included.
+RegularFile::Status OpenLog(RegularFile& file, const PinnedDirectory& directory, bool isFirstLine)
+{
+    const wxString path = directory.Reach(LogFileName);
+    const RegularFile::Status status = file.OpenForUpdate(path, Links::Refuse);
+    if (!isFirstLine)
+        return status;
+    if (status == RegularFile::Status::NotThere)
+        return file.CreateNew(path) == RegularFile::Status::Open ? RegularFile::Status::Open : status;
+    if (status == RegularFile::Status::Open)
+        file.SetLength(0);
+    return status;
 }
 
 } // namespace
@@ -59,16 +50,18 @@ void RunLog(const wxString& message, int count)
 {
     if (!RunLogEnabled)
         return;
-    const wxString& path = RunLogPath();
-    if (!wxFileExists(path))
+    static const wxString directoryPath = LogDirPath();
+    static bool isFirstLine = true;
+    static bool isReported = false;
+    const PinnedDirectory directory(directoryPath, Links::Refuse);
+    RegularFile file;
+    const RegularFile::Status status = OpenLog(file, directory, isFirstLine);
+    isFirstLine = false;
+    if (status == RegularFile::Status::Open && file.Append(FormatLine(message, count)))
         return;
-    wxTextFile file(path);
-    if (!file.Open(wxConvAuto()))
-        return;
-    const wxString line = count == NoCount ? wxString::Format("%s", message)
-                                           : wxString::Format("%s count:  %d", message, count);
-    // One character that does not encode would cost the library all lines, not only its own.
-    file.AddLine(ToUnicodeText(line), wxTextFileType_Dos);
-    file.Write(wxTextFileType_None, wxConvAuto());
-    file.Close();
+    if (status == RegularFile::Status::Open && !isReported)
+        file.ReportNotWritten(directoryPath + LogFileName);
+    else if (status == RegularFile::Status::Refused && !isReported)
+        ReportNotOpened(directoryPath + LogFileName);
+    isReported = isReported || status != RegularFile::Status::NotThere;
 }

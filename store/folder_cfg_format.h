@@ -1,8 +1,8 @@
 // The names in Folder.cfg, which its reader and its writer share.
 //
-// An XML 1.0 document in UTF-8. The root element carries the attributes of HotFolderSettings; below
-// it stand the sections, in the order of their names here. Inside JobSetting, ImposeSetting and
-// PreflightSettings attributes are told apart by their position.
+// An XML 1.0 document in UTF-8. The root element has the attributes of store/root_attributes.h; below it
+// are the sections, in the order of their names here. Inside JobSetting, ImposeSetting and
+// PreflightSettings an attribute's position counts, not its name.
 //
 // The names are wide, as the library's strings are: converting them took as long as half a load.
 #pragma once
@@ -18,6 +18,9 @@ constexpr const wchar_t* JobSettingSection = L"JobSetting";
 constexpr const wchar_t* ImposeSettingSection = L"ImposeSetting";
 constexpr const wchar_t* FilterSettingSection = L"FilterSetting";
 constexpr const wchar_t* PreflightSection = L"PreflightSettings";
+
+/// The key of the imposition setting whose value is the template's path. Job presets use the same key.
+constexpr const wchar_t* ImposeTemplateKey = L"ORXImposeTemplate";
 
 constexpr const wchar_t* Failfolder = L"Failfolder";
 constexpr const wchar_t* Workfolder = L"Workfolder";

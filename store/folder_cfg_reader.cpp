@@ -1,106 +1,15 @@
 #include "store/folder_cfg_reader.h"
 
+#include "store/xml_file.h"
 #include "store/folder_cfg_format.h"
+#include "store/root_attributes.h"
 #include "store/xml_lookup.h"
 #include "store/xml_tree.h"
 
-#include <wx/filename.h>
-
 #include <array>
-#include <limits>
 
 namespace
 {
-
-const wchar_t* const PrivateDirName = L"[_ORX_HotFolder_]";
-const wchar_t* const FolderCfgName = L"Folder.cfg";
-
-// The base-10 number at the front of the text; 0 without one and for one beyond 32 bits, which is
-// what a 32-bit long makes of it everywhere.
-std::int32_t ReadNumber(const wxString& text)
-{
-    using Limits = std::numeric_limits<std::int32_t>;
-    long number = 0;
-    text.ToLong(&number);
-    return number < Limits::min() || number > Limits::max() ? 0 : static_cast<std::int32_t>(number);
-}
-
-bool ReadNumericFlag(const wxString& text)
-{
-    return ReadNumber(text) != 0;
-}
-
-bool ReadTextFlag(const wxString& text)
-{
-    return wxString(text).Trim() == L"1";
-}
-
-// Looks attributes up one after another until the first that is absent.
-class AttributeChain
-{
-  public:
-    explicit AttributeChain(const AttributeMap& attributes) : m_attributes(attributes)
-    {
-    }
-
-    AttributeChain& Text(const wchar_t* name, wxString& field)
-    {
-        m_isWhole = m_isWhole && GetAttribute(m_attributes, name, field);
-        return *this;
-    }
-
-    AttributeChain& Flag(const wchar_t* name, bool& field, bool (*read)(const wxString&))
-    {
-        wxString value;
-        if (Text(name, value).m_isWhole)
-            field = read(value);
-        return *this;
-    }
-
-    bool IsWhole() const
-    {
-        return m_isWhole;
-    }
-
-  private:
-    const AttributeMap& m_attributes;
-    bool m_isWhole = true;
-};
-
-int ReadRootAttributes(const AttributeMap& attributes, HotFolderSettings& settings)
-{
-    AttributeChain chain(attributes);
-    chain.Text(L"name", settings.name)
-        .Text(L"description", settings.description)
-        .Text(L"server_ip", settings.server_ip)
-        .Text(L"server_name", settings.server_name);
-    const int result = chain.IsWhole() ? 1 : -1;
-
-    chain.Flag(L"Enable", settings.Enable, ReadTextFlag)
-        .Text(L"BaseVirtualPrinter", settings.BaseVirtualPrinter)
-        .Text(L"BaseVirtualPrinterName", settings.BaseVirtualPrinterName)
-        .Text(L"BaseVirtualPrinterDisplayName", settings.BaseVirtualPrinterDisplayName)
-        .Text(L"HFPresetName", settings.HFPresetName)
-        .Flag(L"Centralized", settings.Centralized, ReadTextFlag)
-        .Flag(L"Isjobpresetattached", settings.Isjobpresetattached, ReadTextFlag)
-        .Flag(L"IsCustomInterval", settings.IsCustomInterval, ReadTextFlag)
-        .Text(L"TimeInterval", settings.TimeInterval)
-        .Text(L"PPDVersion", settings.PPDVersion)
-        .Text(L"ServerTypeAndJPDefaultKeyInfo", settings.ServerTypeAndJPDefaultKeyInfo);
-    if (chain.IsWhole())
-    {
-        wxString version;
-        const bool found = GetAttribute(attributes, L"server_version", version);
-        settings.server_version = found ? ReadNumber(version) : -1;
-    }
-    chain.Text(L"server_textversion", settings.server_textversion)
-        .Text(L"server_type", settings.server_type)
-        .Text(L"Quickset", settings.Quickset)
-        .Flag(L"Quickset_Supported", settings.Quickset_Supported, ReadNumericFlag)
-        .Flag(L"Quickset_Enabled", settings.Quickset_Enabled, ReadNumericFlag)
-        .Flag(L"IsWidthBased", settings.IsWidthBased, ReadNumericFlag);
-    return result;
-}
 
 const wxXmlNode* FindSection(const wxXmlNode* root, const wchar_t* name)
 {
@@ -166,68 +75,46 @@ void ReadPath(const wxXmlNode& section, const wchar_t* name, wxString& path)
         path = element->GetAttributes()->GetValue();
 }
 
-void Report(bool* loaded, bool value)
-{
-    if (loaded)
-        *loaded = value;
-}
-
 } // namespace
 
-wxString PrivateDirPath(const wxString& hotFolder)
+int LoadHotFolderSettings(const wxString& path, HotFolderSettings& settings)
 {
-    wxFileName directory;
-    directory.AssignDir(hotFolder);
-    directory.AppendDir(PrivateDirName);
-    return directory.GetFullPath();
-}
-
-wxString FolderCfgPath(const wxString& hotFolder)
-{
-    return PrivateDirPath(hotFolder) + FolderCfgName;
-}
-
-bool LoadFolderCfg(const wxString& path, wxXmlDocument& document, int flags)
-{
-    return document.Load(path, L"UTF-8", flags) && document.GetRoot();
-}
-
-int LoadHotFolderSettings(const wxString& path, HotFolderSettings& settings, bool* loaded)
-{
-    Report(loaded, false);
-    if (!wxFileExists(path))
+    XmlFile file;
+    if (file.Load(path, Links::Refuse, path) == XmlFile::State::Missing)
         return 0;
-    wxXmlDocument document;
-    if (!LoadFolderCfg(path, document))
-        return -1;
-    Report(loaded, true);
+    return ReadHotFolderSettings(file.GetRoot(), settings);
+}
 
-    const wxXmlNode* root = document.GetRoot();
+int ReadFilterSetting(const wxString& path, wxXmlNode& node)
+{
+    XmlFile file;
+    file.Load(path, Links::Refuse, path);
+    ReadFilterSetting(file.GetRoot(), node);
+    return 0;
+}
+
+int ReadHotFolderSettings(const wxXmlNode* root, HotFolderSettings& settings)
+{
+    if (!root)
+        return -1;
     AttributeMap attributes;
     CollectAttributes(*root, attributes);
-    const int result = ReadRootAttributes(attributes, settings);
+    const RootAttribute* gap = ReadRootAttributes(attributes, settings);
     std::vector<InputFormat> formats;
     ReadInputFormats(root, formats);
     settings.InputFormatsSummary.swap(formats);
-    return result;
+    return gap && gap->chainPlace <= LastRequiredPlace ? -1 : 1;
 }
 
-int ReadFilterSetting(const wxString& path, wxXmlNode& node, bool* loaded)
+void ReadFilterSetting(const wxXmlNode* root, wxXmlNode& node)
 {
-    Report(loaded, false);
-    wxXmlDocument document;
-    if (!wxFileExists(path) || !LoadFolderCfg(path, document, wxXMLDOC_KEEP_WHITESPACE_NODES))
-        return 0;
-    Report(loaded, true);
-    const wxXmlNode* section = FindSection(document.GetRoot(), FolderCfg::FilterSettingSection);
-    if (section)
-    {
-        node = wxXmlNode();
-        CopyTree(*section, node);
-        RemoveIgnoredBlanks(node);
-        RemoveSavedIndentation(node, FolderCfg::FilterSettingLevel);
-    }
-    return 0;
+    const wxXmlNode* section = FindSection(root, FolderCfg::FilterSettingSection);
+    if (!section)
+        return;
+    node = wxXmlNode();
+    CopyTree(*section, node);
+    RemoveIgnoredBlanks(node);
+    RemoveSavedIndentation(node, FolderCfg::FilterSettingLevel);
 }
 
 int ReadPaths(const wxXmlNode* root, HotFolderPaths& paths)

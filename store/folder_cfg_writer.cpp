@@ -1,51 +1,34 @@
 #include "store/folder_cfg_writer.h"
 
+#include "platform/regular_file.h"
 #include "store/folder_cfg_format.h"
+#include "store/root_attributes.h"
 #include "store/xml_tree.h"
 
-#include <wx/wfstream.h>
+#include <wx/stream.h>
 
-#include <string>
+#include <utility>
 
 namespace
 {
 
 constexpr int IndentationStep = 2;
-constexpr size_t WriteBufferBytes = size_t{16} * 1024;
-
-const wchar_t* FormatFlag(bool flag)
+// The library's stream to memory moves all bytes for every kilobyte.
+class StringOutputStream : public wxOutputStream
 {
-    return flag ? L"1" : L"0";
-}
+  public:
+    std::string bytes;
 
-void AddRootAttributes(wxXmlNode& root, const HotFolderSettings& settings)
-{
-    root.AddAttribute(L"name", settings.name);
-    root.AddAttribute(L"description", settings.description);
-    root.AddAttribute(L"server_ip", settings.server_ip);
-    root.AddAttribute(L"server_name", settings.server_name);
-    root.AddAttribute(L"server_version", std::to_wstring(settings.server_version));
-    root.AddAttribute(L"server_textversion", settings.server_textversion);
-    root.AddAttribute(L"server_type", settings.server_type);
-    root.AddAttribute(L"BaseVirtualPrinter", settings.BaseVirtualPrinter);
-    root.AddAttribute(L"BaseVirtualPrinterName", settings.BaseVirtualPrinterName);
-    root.AddAttribute(L"BaseVirtualPrinterDisplayName", settings.BaseVirtualPrinterDisplayName);
-    root.AddAttribute(L"HFPresetName", settings.HFPresetName);
-    root.AddAttribute(L"PPDVersion", settings.PPDVersion);
-    root.AddAttribute(L"ServerTypeAndJPDefaultKeyInfo", settings.ServerTypeAndJPDefaultKeyInfo);
-    root.AddAttribute(L"Quickset_Supported", FormatFlag(settings.Quickset_Supported));
-    root.AddAttribute(L"Quickset_Enabled", FormatFlag(settings.Quickset_Enabled));
-    root.AddAttribute(L"Quickset", settings.Quickset);
-    root.AddAttribute(L"IsWidthBased", FormatFlag(settings.IsWidthBased));
-    root.AddAttribute(L"Enable", FormatFlag(settings.Enable));
-    root.AddAttribute(L"Centralized", FormatFlag(settings.Centralized));
-    root.AddAttribute(L"Isjobpresetattached", FormatFlag(settings.Isjobpresetattached));
-    root.AddAttribute(L"IsCustomInterval", FormatFlag(settings.IsCustomInterval));
-    root.AddAttribute(L"TimeInterval", settings.TimeInterval);
-}
+  protected:
+    size_t OnSysWrite(const void* data, size_t size) override
+    {
+        bytes.append(static_cast<const char*>(data), size);
+        return size;
+    }
+};
 
-// One section under construction. Each child goes behind the one before it, which the section
-// remembers: to look for the last child each time would take a time that grows with the square.
+// One section under construction. It remembers its last child: to look for it each time would take a time
+// that grows with the square.
 class Section
 {
   public:
@@ -163,31 +146,43 @@ void WritePreflightSettings(wxXmlNode* root, const PreflightSettingList& list)
     }
 }
 
-int SaveHotFolderSettings(const wxString& path, const HotFolderSettings& settings,
-                          const JobSettingTable& jobSettings, const HotFolderPaths& paths,
-                          const wxXmlNode& filterSetting, const ImposeSettingTable& imposeSettings,
-                          const PreflightSettingList& preflightSettings)
+std::string FolderCfgBytes(const HotFolderSettings& settings, const JobSettingTable& jobSettings,
+                           const HotFolderPaths& paths, const wxXmlNode& filterSetting,
+                           const ImposeSettingTable& imposeSettings,
+                           const PreflightSettingList& preflightSettings)
 {
-    const wxCriticalSectionLocker lock(FolderCfgLock);
     wxXmlDocument document;
     auto* root = new wxXmlNode(wxXML_ELEMENT_NODE, FolderCfg::Root);
     document.SetRoot(root); // the document's from here on
-    AddRootAttributes(*root, settings);
+    for (const RootAttribute& attribute : RootAttributes())
+        root->AddAttribute(attribute.name, attribute.Format(settings));
     WriteInputFormats(root, settings.InputFormatsSummary);
     WritePaths(root, paths);
     WriteJobSettings(root, jobSettings);
     WriteImposeSettings(root, imposeSettings);
     WriteFilterSetting(*root, filterSetting);
     WritePreflightSettings(root, preflightSettings);
+    StringOutputStream stream;
+    document.Save(stream, IndentationStep);
+    return std::move(stream.bytes);
+}
 
-    // Saving by name would give the same bytes in a write call for each token. Not through a
-    // wxFileOutputStream, which the buffer's end would make wait for the disk.
-    wxFFileOutputStream file(path, "wb");
-    if (!file.IsOk())
-        return 0;
-    wxBufferedOutputStream buffered(file, WriteBufferBytes);
-    document.Save(buffered, IndentationStep);
-    buffered.Close();
-    // The end of the scope closes the file: the library closes what did not close well once more.
+int SaveHotFolderSettings(const wxString& path, const HotFolderSettings& settings,
+                          const JobSettingTable& jobSettings, const HotFolderPaths& paths,
+                          const wxXmlNode& filterSetting, const ImposeSettingTable& imposeSettings,
+                          const PreflightSettingList& preflightSettings)
+{
+    const wxCriticalSectionLocker lock(FolderCfgLock);
+    const std::string bytes = FolderCfgBytes(settings, jobSettings, paths, filterSetting,
+                                             imposeSettings, preflightSettings);
+    RegularFile file;
+    RegularFile::Status status = file.OpenForUpdate(path, Links::Refuse);
+    if (status == RegularFile::Status::NotThere)
+        status = file.CreateNew(path);
+    std::string before;
+    if (status != RegularFile::Status::Open || !file.Read(before))
+        ReportNotOpened(path);
+    else if (!file.Rewrite(before, bytes))
+        file.ReportNotWritten(path);
     return 0;
 }

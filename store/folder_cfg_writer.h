@@ -6,13 +6,19 @@
 #include <wx/string.h>
 #include <wx/xml/xml.h>
 
+#include <string>
 #include <vector>
 
-/// Rewrites the whole file from the six values; nothing of the old file survives but what is in
-/// them. The file is opened in place, so an interrupted write leaves a part of it; a file that
-/// cannot be opened stays as it was. A filter setting of another name than "FilterSetting" is not
-/// written, and one deeper than MaxFilterLevels must not be given. Holds FolderCfgLock throughout.
-/// Returns 0 in every case; the library logs what it cannot open or write.
+/// The content of a Folder.cfg with the six values, and nothing else. A filter setting of another name than
+/// "FilterSetting" is left out, and one deeper than MaxFilterLevels must not be given.
+std::string FolderCfgBytes(const HotFolderSettings& settings, const JobSettingTable& jobSettings,
+                           const HotFolderPaths& paths, const wxXmlNode& filterSetting,
+                           const ImposeSettingTable& imposeSettings,
+                           const PreflightSettingList& preflightSettings);
+
+/// Makes that the content of the file, as RegularFile::Rewrite does; a file that is not there is created. One
+/// that cannot be opened or written stays as it was. Holds FolderCfgLock throughout. Returns 0 in
+/// every case; the library reports what cannot be opened or written.
 int SaveHotFolderSettings(const wxString& path, const HotFolderSettings& settings,
                           const JobSettingTable& jobSettings, const HotFolderPaths& paths,
                           const wxXmlNode& filterSetting, const ImposeSettingTable& imposeSettings,

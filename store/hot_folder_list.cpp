@@ -3,10 +3,8 @@
 #include "platform/standard_folders.h"
 #include "store/xml_lookup.h"
 
-#include <wx/file.h>
 #include <wx/filename.h>
 #include <wx/hashmap.h>
-#include <wx/xml/xml.h>
 
 #include <unordered_set>
 
@@ -66,19 +64,37 @@ wxString GetHotFolderDataDir()
     return directory.GetFullPath();
 }
 
-void ReadHotFolderList(wxArrayString& folders)
+HotFolderList LoadHotFolderList()
 {
-    const wxString listPath = GetListPath();
-    wxXmlDocument document;
-    if (!wxFile::Exists(listPath) || !document.Load(listPath, "UTF-8") || !document.GetRoot())
-        return;
-
-    PathSet known(folders.begin(), folders.end());
-    const wxXmlNode* element = FirstNamed(document.GetRoot()->GetChildren(), FolderElement);
+    HotFolderList list;
+    XmlFile file;
+    const wxString path = GetListPath();
+    list.state = file.Load(path, Links::Follow, path);
+    if (list.state != XmlFile::State::Loaded)
+        return list;
+    PathSet known;
+    const wxXmlNode* element = FirstNamed(file.GetRoot()->GetChildren(), FolderElement);
     for (; element; element = FirstNamed(element->GetNext(), FolderElement))
     {
-        const wxString path = ReadPath(*element);
-        if (!path.empty() && wxDirExists(path) && known.insert(path).second)
-            folders.Add(path);
+        const wxString folder = ReadPath(*element);
+        if (folder.empty())
+            continue;
+        if (!wxDirExists(folder))
+            list.missing.Add(folder);
+        else if (known.insert(folder).second)
+            list.folders.Add(folder);
+        else
+            list.repeated.Add(folder);
+    }
+    return list;
+}
+
+void ReadHotFolderList(wxArrayString& folders)
+{
+    PathSet known(folders.begin(), folders.end());
+    for (const wxString& folder : LoadHotFolderList().folders)
+    {
+        if (known.insert(folder).second)
+            folders.Add(folder);
     }
 }

@@ -1,6 +1,5 @@
 #include "store/xml_encoding.h"
 
-#include <wx/ffile.h>
 #include <wx/fontmap.h>
 #include <wx/strconv.h>
 
@@ -28,35 +27,60 @@ bool IsSingleByte(const wxString& encoding)
            (code >= wxFONTENCODING_CP1250 && code <= wxFONTENCODING_CP1258);
 }
 
-// The encoding that the file declares: UTF-8 without a declaration (as in UTF-16, which the parser
-// tells by itself), none when it cannot be read. The library's answer is no use where blanks stand
-// around the equals sign: it is UTF-8 or nonsense then, while its parser knows better.
-wxString DeclaredEncoding(const wxString& path)
+// The encoding that the document declares: UTF-8 without a declaration (as in UTF-16, which the parser
+// recognises by itself), none for an empty document. The library's answer is no use where white space
+// surrounds the equals sign: it is UTF-8 or nonsense then, while its parser knows better.
+wxString DeclaredEncoding(const std::string& document)
 {
-    wxFFile file(path, "rb");
-    std::array<char, 256> start{};
-    const size_t length = file.IsOpened() ? file.Read(start.data(), start.size()) : 0;
-    wxString declaration = wxString::From8BitData(start.data(), length).BeforeFirst('>');
+    constexpr size_t LongestDeclaration = 256;
+    wxString declaration =
+        wxString::From8BitData(document.data(), std::min(document.size(), LongestDeclaration)).BeforeFirst('>');
     if (declaration.StartsWith(L"\u00EF\u00BB\u00BF"))
         declaration.Remove(0, 3);
     const size_t name = declaration.find("encoding");
     if (!declaration.StartsWith("<?xml") || name == wxString::npos)
-        return length > 0 ? "UTF-8" : "";
+        return document.empty() ? "" : "UTF-8";
     const wxString value = declaration.Mid(name).AfterFirst('=').Trim(false);
     return value.Mid(1).BeforeFirst(value[0]);
 }
 
+// Where the library does not know the encoding at all, nothing is read as what it is.
+bool IsReadAsAscii(const std::string& document, const wxString& encoding)
+{
+    if (!wxCSConv(encoding).IsOk())
+        return false;
+    const EncodingMap map = GetEncodingMap(encoding);
+    return std::all_of(document.begin(), document.end(),
+                       [&](char byte)
+                       {
+                           const auto code = static_cast<unsigned char>(byte);
+                           return code < 0x80 && map[code] == code;
+                       });
+}
+
 } // namespace
 
-bool IsReadFaithfully(const wxString& path)
+EncodingMap GetEncodingMap(const wxString& encoding)
 {
-    const wxString encoding = DeclaredEncoding(path);
-    if (IsBuiltIn(encoding))
+    const wxCSConv conversion(encoding);
+    EncodingMap map{};
+    std::array<wchar_t, 10> wide{};
+    for (size_t i = 1; i < map.size(); ++i)
+    {
+        // A byte that has no meaning comes out as the character before it, as in the library.
+        const std::array<char, 2> narrow = {static_cast<char>(i), '\0'};
+        conversion.MB2WC(wide.data(), narrow.data(), 2);
+        map[i] = static_cast<int>(wide[0]);
+    }
+    return map;
+}
+
+bool IsReadFaithfully(const std::string& document)
+{
+    const wxString encoding = DeclaredEncoding(document);
+    if (IsBuiltIn(encoding) || IsReadAsAscii(document, encoding))
         return true;
-    if (!IsSingleByte(encoding))
-        return false;
     // A byte without a meaning in the encoding would come out as the character before it.
-    wxString text;
-    wxFFile file(path, "rb");
-    return file.IsOpened() && file.ReadAll(&text, wxCSConv(encoding)) && !text.empty();
+    return IsSingleByte(encoding) &&
+           !wxString(document.data(), wxCSConv(encoding), document.size()).empty();
 }

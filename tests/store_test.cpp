@@ -136,16 +136,13 @@ TEST_F(Store, WhatCannotBeLoadedLeavesTheValues)
     HotFolderSettings settings;
     settings.InputFormatsSummary.resize(1);
     wxXmlNode filter(wxXML_ELEMENT_NODE, "kept");
-    bool loaded = true;
-    EXPECT_EQ(-1, LoadHotFolderSettings(File("<r name='x'>"), settings, &loaded));
-    EXPECT_FALSE(loaded);
-    EXPECT_EQ(0, ReadFilterSetting(m_path, filter, &loaded));
-    EXPECT_EQ(0, LoadHotFolderSettings(m_path + "missing", settings, &loaded));
+    EXPECT_EQ(-1, LoadHotFolderSettings(File("<r name='x'>"), settings));
+    EXPECT_EQ(0, ReadFilterSetting(m_path, filter));
+    EXPECT_EQ(0, LoadHotFolderSettings(m_path + "missing", settings));
     EXPECT_EQ("", settings.name);
     EXPECT_EQ(1U, settings.InputFormatsSummary.size());
     EXPECT_EQ("kept", filter.GetName());
-    EXPECT_EQ(-1, LoadHotFolderSettings(File("<r/>"), settings, &loaded));
-    EXPECT_TRUE(loaded);
+    EXPECT_EQ(-1, LoadHotFolderSettings(File("<r/>"), settings));
     EXPECT_TRUE(settings.InputFormatsSummary.empty());
 }
 

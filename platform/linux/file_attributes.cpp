@@ -1,14 +1,17 @@
 // File attributes where the file system has none: READONLY of a file is its missing write
-// permission; every other one, and READONLY of a directory, stands as hexadecimal text in the
-// extended attribute in which Wine and Samba keep them.
+// permission; every other one, and READONLY of a directory, is kept as hexadecimal text in the extended
+// attribute in which Wine and Samba keep them.
 #include "platform/linux/native_path.h"
 #include "platform/system.h"
 
 #include <cerrno>
 #include <cstdio>
 #include <cstdlib>
+#include <fcntl.h>
+#include <string>
 #include <sys/stat.h>
 #include <sys/xattr.h>
+#include <unistd.h>
 
 namespace
 {
@@ -16,27 +19,57 @@ namespace
 const char* const AttributeName = "user.DOSATTRIB";
 constexpr mode_t AnyWrite = S_IWUSR | S_IWGRP | S_IWOTH;
 
-bool IsDirectory(const struct stat& status)
+// A file or directory that is looked at more than once, and is no link: as on Windows, attributes are
+// never those of what a link leads to.
+class Node
 {
-    return S_ISDIR(status.st_mode);
-}
+  public:
+    explicit Node(LPCWSTR path)
+        : m_descriptor(open(NativePath(path).c_str(), O_PATH | O_NOFOLLOW | O_CLOEXEC)),
+          m_path("/proc/self/fd/" + std::to_string(m_descriptor))
+    {
+    }
 
-DWORD ReadStored(const std::string& path)
-{
-    char text[256] = {}; // Samba puts more behind the text and a NUL
-    const ssize_t length = getxattr(path.c_str(), AttributeName, text, sizeof text - 1);
-    return length > 0 ? static_cast<DWORD>(std::strtoul(text, nullptr, 16)) : 0;
-}
+    ~Node()
+    {
+        if (m_descriptor >= 0)
+            close(m_descriptor);
+    }
 
-bool WriteStored(const std::string& path, DWORD attributes)
-{
-    if (attributes == 0)
-        return removexattr(path.c_str(), AttributeName) == 0 || errno == ENODATA ||
-               errno == ENOTSUP;
-    char text[16] = {};
-    const int length = std::snprintf(text, sizeof text, "0x%x", attributes);
-    return setxattr(path.c_str(), AttributeName, text, static_cast<size_t>(length), 0) == 0;
-}
+    Node(const Node&) = delete;
+    Node& operator=(const Node&) = delete;
+
+    bool GetStatus(struct stat& status) const
+    {
+        return m_descriptor >= 0 && fstat(m_descriptor, &status) == 0 && !S_ISLNK(status.st_mode);
+    }
+
+    bool ChangeMode(mode_t from, mode_t to) const
+    {
+        return from == to || chmod(m_path.c_str(), to & 07777) == 0;
+    }
+
+    DWORD ReadStored() const
+    {
+        char text[256] = {}; // Samba puts more after the text and a NUL
+        const ssize_t length = getxattr(m_path.c_str(), AttributeName, text, sizeof text - 1);
+        return length > 0 ? static_cast<DWORD>(std::strtoul(text, nullptr, 16)) : 0;
+    }
+
+    bool WriteStored(DWORD attributes) const
+    {
+        if (attributes == 0)
+            return removexattr(m_path.c_str(), AttributeName) == 0 || errno == ENODATA ||
+                   errno == ENOTSUP;
+        char text[16] = {};
+        const int length = std::snprintf(text, sizeof text, "0x%x", attributes);
+        return setxattr(m_path.c_str(), AttributeName, text, static_cast<size_t>(length), 0) == 0;
+    }
+
+  private:
+    const int m_descriptor;
+    const std::string m_path;
+};
 
 mode_t FileModeMask()
 {
@@ -55,21 +88,16 @@ mode_t Writable(mode_t mode)
     return mode | ((S_IRUSR | S_IWUSR | ((mode & (S_IRGRP | S_IROTH)) >> 1)) & ~FileModeMask());
 }
 
-bool ChangeMode(const std::string& path, mode_t from, mode_t to)
-{
-    return from == to || chmod(path.c_str(), to & 07777) == 0;
-}
-
 } // namespace
 
 DWORD GetFileAttributesW(LPCWSTR path)
 {
-    const std::string native = NativePath(path);
+    const Node node(path);
     struct stat status = {};
-    if (stat(native.c_str(), &status) != 0)
+    if (!node.GetStatus(status))
         return INVALID_FILE_ATTRIBUTES;
-    DWORD attributes = ReadStored(native) & ~(FILE_ATTRIBUTE_NORMAL | FILE_ATTRIBUTE_DIRECTORY);
-    if (IsDirectory(status))
+    DWORD attributes = node.ReadStored() & ~(FILE_ATTRIBUTE_NORMAL | FILE_ATTRIBUTE_DIRECTORY);
+    if (S_ISDIR(status.st_mode))
         return attributes | FILE_ATTRIBUTE_DIRECTORY;
     attributes &= ~FILE_ATTRIBUTE_READONLY;
     if ((status.st_mode & AnyWrite) == 0)
@@ -79,24 +107,24 @@ DWORD GetFileAttributesW(LPCWSTR path)
 
 BOOL SetFileAttributesW(LPCWSTR path, DWORD attributes)
 {
-    const std::string native = NativePath(path);
+    const Node node(path);
     struct stat status = {};
-    if (stat(native.c_str(), &status) != 0)
+    if (!node.GetStatus(status))
         return 0;
     DWORD stored = attributes & ~(FILE_ATTRIBUTE_NORMAL | FILE_ATTRIBUTE_DIRECTORY);
     mode_t mode = status.st_mode;
-    if (!IsDirectory(status))
+    if (!S_ISDIR(status.st_mode))
     {
         stored &= ~FILE_ATTRIBUTE_READONLY;
         const bool isReadOnly = (attributes & FILE_ATTRIBUTE_READONLY) != 0;
         const mode_t writable = (mode & AnyWrite) != 0 ? mode : Writable(mode);
         mode = isReadOnly ? mode & ~AnyWrite : writable;
     }
-    if (stored == ReadStored(native))
-        return ChangeMode(native, status.st_mode, mode) ? 1 : 0;
+    if (stored == node.ReadStored())
+        return node.ChangeMode(status.st_mode, mode) ? 1 : 0;
     // Not even its owner can change an extended attribute of a file without write permission.
     const mode_t between =
         (status.st_mode & S_IWUSR) != 0 ? status.st_mode : status.st_mode | S_IWUSR;
-    const bool done = ChangeMode(native, status.st_mode, between) && WriteStored(native, stored);
-    return ChangeMode(native, between, done ? mode : status.st_mode) && done ? 1 : 0;
+    const bool done = node.ChangeMode(status.st_mode, between) && node.WriteStored(stored);
+    return node.ChangeMode(between, done ? mode : status.st_mode) && done ? 1 : 0;
 }

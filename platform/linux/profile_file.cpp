@@ -2,16 +2,14 @@
 //
 // The text is handled in units, a byte each or, behind a UTF-16LE byte-order mark, two, so that
 // bytes of any encoding come out as they went in. Of a repeated section or key the first counts.
-#include "platform/linux/file_bytes.h"
 #include "platform/linux/native_path.h"
+#include "platform/regular_file.h"
 #include "platform/system.h"
 
 #include <wx/string.h>
 
 #include <algorithm>
 #include <string>
-#include <sys/stat.h>
-#include <unistd.h>
 
 namespace
 {
@@ -28,16 +26,6 @@ struct Text
     bool hasUtf8Mark = false;
     std::string rest; // half a unit at the end, if any
 };
-
-// The bytes of a file that can be written; none of one that is not there. False for a read-only
-// file, whoever asks, and for what cannot be read.
-bool ReadForWriting(const std::string& path, std::string& bytes)
-{
-    mode_t mode = 0;
-    if (!ReadFileBytes(path, bytes, &mode))
-        return access(path.c_str(), F_OK) != 0;
-    return (mode & (S_IWUSR | S_IWGRP | S_IWOTH)) != 0;
-}
 
 Text Decode(const std::string& bytes)
 {
@@ -192,6 +180,21 @@ void SkipBlanks(const Units& units, size_t& begin, size_t end)
         ++begin;
 }
 
+wxString NativeName(LPCWSTR path)
+{
+    return wxString::FromUTF8(NativePath(path));
+}
+
+// False for a read-only file, whoever asks; one that is not there is made.
+bool OpenForWriting(LPCWSTR path, RegularFile& file)
+{
+    const DWORD attributes = GetFileAttributesW(path);
+    if (attributes == INVALID_FILE_ATTRIBUTES)
+        return file.CreateNew(NativeName(path)) == RegularFile::Status::Open;
+    return (attributes & FILE_ATTRIBUTE_READONLY) == 0 &&
+           file.OpenForUpdate(NativeName(path), Links::Refuse) == RegularFile::Status::Open;
+}
+
 // Puts lines in at a place, behind a line end if the text before it lacks one.
 void Insert(Units& units, size_t at, const Units& lines)
 {
@@ -203,9 +206,9 @@ void Insert(Units& units, size_t at, const Units& lines)
 
 BOOL WritePrivateProfileStringW(LPCWSTR section, LPCWSTR key, LPCWSTR value, LPCWSTR path)
 {
-    const std::string native = NativePath(path);
+    RegularFile file;
     std::string bytes;
-    if (!ReadForWriting(native, bytes))
+    if (!OpenForWriting(path, file) || !file.Read(bytes))
         return 0;
     Text text = Decode(bytes);
     const Units newValue = ToUnits(value, text.isUtf16);
@@ -224,7 +227,7 @@ BOOL WritePrivateProfileStringW(LPCWSTR section, LPCWSTR key, LPCWSTR value, LPC
         Insert(text.units, text.units.size(),
                u"[" + sectionName + u"]" + LineEnd + keyName + u"=" + newValue);
     const std::string changed = Encode(text);
-    return changed == bytes || WriteFileBytes(native, changed) ? 1 : 0;
+    return changed == bytes || file.Rewrite(bytes, changed) ? 1 : 0;
 }
 
 DWORD GetPrivateProfileStringW(LPCWSTR section, LPCWSTR key, LPCWSTR defaultValue, LPWSTR buffer,
@@ -232,7 +235,9 @@ DWORD GetPrivateProfileStringW(LPCWSTR section, LPCWSTR key, LPCWSTR defaultValu
 {
     std::string bytes;
     wxString value = defaultValue;
-    if (ReadFileBytes(NativePath(path), bytes))
+    RegularFile file;
+    if (file.OpenForReading(NativeName(path), Links::Refuse) == RegularFile::Status::Open &&
+        file.Read(bytes))
     {
         const Text text = Decode(bytes);
         Place place = Find(text.units, ToUnits(section, text.isUtf16), ToUnits(key, text.isUtf16));

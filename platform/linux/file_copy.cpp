@@ -1,0 +1,23 @@
+#include "platform/file_copy.h"
+
+#include "platform/regular_file.h"
+
+#include <unistd.h>
+
+bool CopyOver(const wxString& source, const wxString& destination)
+{
+    RegularFile from;
+    RegularFile to;
+    std::string before;
+    std::string after;
+    if (from.OpenForReading(source, Links::Follow) != RegularFile::Status::Open || !from.Read(after))
+        return false;
+    RegularFile::Status status = to.OpenForUpdate(destination, Links::Refuse);
+    if (status == RegularFile::Status::Refused && unlink(destination.utf8_str()) == 0)
+        status = to.CreateNew(destination);
+    if (status != RegularFile::Status::Open || !to.Read(before) ||
+        !to.Rewrite(before, after, RegularFile::Wait::ForNothing))
+        return false;
+    to.TakeAttributes(from);
+    return true;
+}

@@ -1,0 +1,36 @@
+#include "platform/pinned_directory.h"
+
+#include <wx/filefn.h>
+
+#include <fcntl.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+bool IsLink(const wxString& path)
+{
+    struct stat status = {};
+    return lstat(path.utf8_str(), &status) == 0 && S_ISLNK(status.st_mode);
+}
+
+PinnedDirectory::PinnedDirectory(const wxString& path, Links links)
+    : m_descriptor(open(path.utf8_str(),
+                        O_PATH | O_DIRECTORY | O_CLOEXEC | (links == Links::Refuse ? O_NOFOLLOW : 0)))
+{
+}
+
+PinnedDirectory::~PinnedDirectory()
+{
+    if (IsOpen())
+        close(m_descriptor);
+}
+
+bool PinnedDirectory::IsOpen() const
+{
+    return m_descriptor >= 0;
+}
+
+wxString PinnedDirectory::Reach(const wxString& name) const
+{
+    // No descriptor has the number -1.
+    return "/proc/self/fd/" + std::to_string(m_descriptor) + "/" + name;
+}

@@ -1,0 +1,17 @@
+#include "platform/file_copy.h"
+
+#include "platform/regular_file.h"
+
+bool CopyOver(const wxString& source, const wxString& destination)
+{
+    RegularFile from;
+    RegularFile to;
+    std::string before;
+    std::string after;
+    if (from.OpenForReading(source, Links::Follow) != RegularFile::Status::Open ||
+        to.OpenForUpdate(destination, Links::Refuse) != RegularFile::Status::Open || !from.Read(after) ||
+        !to.Read(before) || !to.Rewrite(before, after, RegularFile::Wait::ForNothing))
+        return false;
+    to.TakeAttributes(from);
+    return true;
+}

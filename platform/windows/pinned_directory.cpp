@@ -1,0 +1,79 @@
+#include "platform/pinned_directory.h"
+
+#include "platform/system.h"
+
+#include <wx/filename.h>
+
+namespace
+{
+
+HANDLE Open(const wxString& path, DWORD access, Links links)
+{
+    const DWORD flags =
+        FILE_FLAG_BACKUP_SEMANTICS | (links == Links::Refuse ? FILE_FLAG_OPEN_REPARSE_POINT : 0);
+    return CreateFileW(path.wc_str(), access, FILE_SHARE_READ | FILE_SHARE_WRITE, nullptr,
+                       OPEN_EXISTING, flags, nullptr);
+}
+
+bool IsDirectory(HANDLE handle)
+{
+    BY_HANDLE_FILE_INFORMATION information = {};
+    return GetFileInformationByHandle(handle, &information) != 0 &&
+           (information.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY) != 0;
+}
+
+// Only a handle that may list the directory, or pass through it, keeps others from renaming it. Once
+// there is one, its name leads to the same directory or link, so the name can be asked about it.
+HANDLE Pin(const wxString& path, Links links)
+{
+    HANDLE handle = Open(path, FILE_LIST_DIRECTORY | FILE_READ_ATTRIBUTES, links);
+    if (handle == INVALID_HANDLE_VALUE)
+        handle = Open(path, FILE_TRAVERSE | FILE_READ_ATTRIBUTES, links);
+    if (handle == INVALID_HANDLE_VALUE ||
+        (IsDirectory(handle) && !(links == Links::Refuse && IsLink(path))))
+        return handle;
+    CloseHandle(handle);
+    return INVALID_HANDLE_VALUE;
+}
+
+} // namespace
+
+bool IsLink(const wxString& path)
+{
+    wxString name = path;
+    while (!name.empty() && wxFileName::IsPathSeparator(name.Last()))
+        name.RemoveLast();
+    WIN32_FIND_DATAW found = {};
+    const HANDLE search = FindFirstFileW(name.wc_str(), &found);
+    if (search == INVALID_HANDLE_VALUE)
+        return false;
+    FindClose(search);
+    // A tag of 0 is how Wine shows a symbolic link of the system below it; Windows has no such tag.
+    return (found.dwFileAttributes & FILE_ATTRIBUTE_REPARSE_POINT) != 0 &&
+           (found.dwReserved0 == 0 || IsReparseTagNameSurrogate(found.dwReserved0));
+}
+
+PinnedDirectory::PinnedDirectory(const wxString& path, Links links)
+    : m_handle(Pin(path, links)), m_path(path)
+{
+}
+
+PinnedDirectory::~PinnedDirectory()
+{
+    if (IsOpen())
+        CloseHandle(m_handle);
+}
+
+bool PinnedDirectory::IsOpen() const
+{
+    return m_handle != INVALID_HANDLE_VALUE;
+}
+
+wxString PinnedDirectory::Reach(const wxString& name) const
+{
+    if (!IsOpen())
+        return "?"; // in no file name
+    if (name.empty() || m_path.empty() || wxFileName::IsPathSeparator(m_path.Last()))
+        return m_path + name;
+    return m_path + wxFileName::GetPathSeparator() + name;
+}

@@ -1,0 +1,181 @@
+#include "platform/regular_file.h"
+
+#include "platform/system.h"
+
+#include <algorithm>
+#include <limits>
+
+namespace
+{
+
+// What the C library gives others when it opens a file, too: they may read and write it.
+constexpr DWORD Sharing = FILE_SHARE_READ | FILE_SHARE_WRITE;
+
+HANDLE OpenHandle(const wxString& path, DWORD access, DWORD flags)
+{
+    const HANDLE handle =
+        CreateFileW(path.wc_str(), access, Sharing, nullptr, OPEN_EXISTING, flags, nullptr);
+    return handle == INVALID_HANDLE_VALUE ? nullptr : handle;
+}
+
+bool IsReparsePoint(HANDLE handle)
+{
+    BY_HANDLE_FILE_INFORMATION information = {};
+    return GetFileInformationByHandle(handle, &information) != 0 &&
+           (information.dwFileAttributes & FILE_ATTRIBUTE_REPARSE_POINT) != 0;
+}
+
+// Why the file did not open. Keeps the error of the opening.
+RegularFile::Status ReasonNotOpen(const wxString& path)
+{
+    const DWORD error = GetLastError();
+    const DWORD attributes = GetFileAttributesW(path.wc_str());
+    SetLastError(error);
+    return attributes == INVALID_FILE_ATTRIBUTES || (attributes & FILE_ATTRIBUTE_DIRECTORY) != 0
+               ? RegularFile::Status::NotThere
+               : RegularFile::Status::Refused;
+}
+
+// Where a transfer that is longer than one call can be goes on.
+OVERLAPPED At(std::int64_t offset)
+{
+    OVERLAPPED place = {};
+    place.Offset = static_cast<DWORD>(offset & 0xFFFFFFFF);
+    place.OffsetHigh = static_cast<DWORD>(offset >> 32);
+    return place;
+}
+
+DWORD LengthOfCall(size_t rest)
+{
+    return static_cast<DWORD>(std::min<size_t>(rest, std::numeric_limits<int>::max()));
+}
+
+} // namespace
+
+// A link is opened as itself, so that it can be told from a file. While it, or the file, is open, the name
+// leads to nothing else; so a file whose content lies elsewhere (in a cloud) can be opened by it again.
+RegularFile::Status RegularFile::Open(const wxString& path, Links links, bool forUpdate)
+{
+    Close();
+    m_path = path;
+    const DWORD access = forUpdate ? GENERIC_READ | GENERIC_WRITE : GENERIC_READ;
+    const DWORD flags = links == Links::Refuse ? FILE_FLAG_OPEN_REPARSE_POINT : 0;
+    m_handle = OpenHandle(path, access, flags);
+    if (!m_handle)
+        return m_status = ReasonNotOpen(path);
+    m_status = Status::Open;
+    if (GetFileType(m_handle) != FILE_TYPE_DISK || (links == Links::Refuse && IsLink(path)))
+    {
+        Close();
+        m_status = Status::NotThere;
+    }
+    else if (flags != 0 && IsReparsePoint(m_handle))
+    {
+        const HANDLE content = OpenHandle(path, access, 0);
+        CloseHandle(m_handle);
+        m_handle = content;
+        m_status = content ? Status::Open : Status::Refused;
+    }
+    return m_status;
+}
+
+RegularFile::Status RegularFile::ReopenForUpdate()
+{
+    const HANDLE handle = ReOpenFile(m_handle, GENERIC_READ | GENERIC_WRITE, Sharing, 0);
+    if (handle == INVALID_HANDLE_VALUE)
+        return Status::Refused;
+    CloseHandle(m_handle);
+    m_handle = handle;
+    return Status::Open;
+}
+
+RegularFile::Status RegularFile::CreateNew(const wxString& path)
+{
+    Close();
+    m_path = path;
+    const HANDLE handle = CreateFileW(path.wc_str(), GENERIC_READ | GENERIC_WRITE, Sharing, nullptr,
+                                      CREATE_NEW, FILE_ATTRIBUTE_NORMAL, nullptr);
+    m_handle = handle == INVALID_HANDLE_VALUE ? nullptr : handle;
+    return m_status = m_handle ? Status::Open : Status::Refused;
+}
+
+bool RegularFile::Close()
+{
+    const bool isDone = !m_handle || CloseHandle(m_handle) != 0;
+    m_handle = nullptr;
+    m_status = Status::NotOpen;
+    return isDone;
+}
+
+std::int64_t RegularFile::Length() const
+{
+    LARGE_INTEGER length = {};
+    return GetFileSizeEx(m_handle, &length) != 0 ? length.QuadPart : -1;
+}
+
+bool RegularFile::Read(std::string& bytes) const
+{
+    const std::int64_t length = Length();
+    if (length < 0)
+        return false;
+    bytes.resize(static_cast<size_t>(length));
+    for (size_t done = 0; done < bytes.size();)
+    {
+        OVERLAPPED place = At(static_cast<std::int64_t>(done));
+        DWORD count = 0;
+        if (ReadFile(m_handle, &bytes[done], LengthOfCall(bytes.size() - done), &count, &place) == 0 ||
+            count == 0)
+            return false;
+        done += count;
+    }
+    return true;
+}
+
+bool RegularFile::Reserve(std::int64_t from, std::int64_t length)
+{
+    if (length == 0)
+        return true;
+    FILE_ALLOCATION_INFO room = {};
+    room.AllocationSize.QuadPart = from + length;
+    // Of what a file system that cannot do it says, only a full disk matters.
+    return SetFileInformationByHandle(m_handle, FileAllocationInfo, &room, sizeof room) != 0 ||
+           GetLastError() != ERROR_DISK_FULL;
+}
+
+bool RegularFile::Write(std::int64_t offset, const std::string& bytes)
+{
+    for (size_t done = 0; done < bytes.size();)
+    {
+        OVERLAPPED place = At(offset + static_cast<std::int64_t>(done));
+        DWORD count = 0;
+        if (WriteFile(m_handle, &bytes[done], LengthOfCall(bytes.size() - done), &count, &place) == 0 ||
+            count == 0)
+            return false;
+        done += count;
+    }
+    return true;
+}
+
+bool RegularFile::SetLength(std::int64_t length)
+{
+    FILE_END_OF_FILE_INFO end = {};
+    end.EndOfFile.QuadPart = length;
+    return SetFileInformationByHandle(m_handle, FileEndOfFileInfo, &end, sizeof end) != 0;
+}
+
+void RegularFile::WaitForDisk()
+{
+    FlushFileBuffers(m_handle);
+}
+
+void RegularFile::TakeAttributes(const RegularFile& source)
+{
+    FILE_BASIC_INFO information = {};
+    if (GetFileInformationByHandleEx(source.m_handle, FileBasicInfo, &information, sizeof information) == 0)
+        return;
+    // A time of 0 is left as it is.
+    information.CreationTime.QuadPart = 0;
+    information.LastAccessTime.QuadPart = 0;
+    information.ChangeTime.QuadPart = 0;
+    SetFileInformationByHandle(m_handle, FileBasicInfo, &information, sizeof information);
+}

@@ -1,0 +1,21 @@
+#include "store/hot_folder.h"
+
+#include <wx/filename.h>
+
+wxString PrivateDirPath(const wxString& hotFolder)
+{
+    wxFileName directory;
+    directory.AssignDir(hotFolder);
+    directory.AppendDir(PrivateDirName);
+    return directory.GetFullPath();
+}
+
+wxString FolderCfgPath(const wxString& hotFolder)
+{
+    return PrivateDirPath(hotFolder) + FolderCfgName;
+}
+
+PinnedHotFolder::PinnedHotFolder(const wxString& path)
+    : directory(path, Links::Follow), privateDir(directory.Reach(PrivateDirName), Links::Refuse)
+{
+}

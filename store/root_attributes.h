@@ -1,0 +1,44 @@
+// The attributes of Folder.cfg's root element: one table for all who read or write them.
+#pragma once
+
+#include "store/hot_folder_settings.h"
+#include "store/xml_lookup.h"
+
+#include <wx/string.h>
+
+#include <variant>
+#include <vector>
+
+/// How an attribute's text becomes its field's value.
+enum class AttributeForm
+{
+    Text,        // as it is
+    Number,      // base 10, up to the first character that is no digit; 0 without digits
+    NumericFlag, // such a number: whether it is not 0
+    TextFlag     // whether the text, less white space at its end, is exactly "1"
+};
+
+struct RootAttribute
+{
+    using Field = std::variant<wxString HotFolderSettings::*, std::int32_t HotFolderSettings::*,
+                               bool HotFolderSettings::*>;
+
+    const wchar_t* name;
+    AttributeForm form;
+    Field field;
+    int chainPlace; // its place in the chain in which the attributes are read, from 1
+
+    void Read(const wxString& text, HotFolderSettings& settings) const;
+    wxString Format(const HotFolderSettings& settings) const;
+};
+
+/// All of them, in the order in which they are written.
+const std::vector<RootAttribute>& RootAttributes();
+
+/// Reads the attributes as a chain, in the order of their places, up to the first that is absent: from there on
+/// all fields stay as they were. An absent number becomes -1 and does not end the chain. Gives the attribute
+/// at which the chain ended, or none.
+const RootAttribute* ReadRootAttributes(const AttributeMap& attributes, HotFolderSettings& settings);
+
+/// The place of the last attribute, "server_name", without which a Folder.cfg counts as not read.
+constexpr int LastRequiredPlace = 4;
