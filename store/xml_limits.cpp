@@ -79,7 +79,7 @@ class Look
     void Text(int length)
     {
         const std::uint64_t begin = Position();
-        const std::uint64_t end = begin + static_cast<std::uint64_t>(XML_GetCurrentByteCount(m_parser));
+        const std::uint64_t end = End();
         const std::uint64_t pieces = 1 + end / LibraryBuffer - begin / LibraryBuffer;
         m_lastEnd = end;
         m_memory += CharacterMemory * static_cast<std::uint64_t>(length) + (m_textLength == 0 ? NodeMemory : 0);
@@ -110,13 +110,14 @@ class Look
         m_isInDocumentType = false;
     }
 
-    // The document is not well-formed; it may break off in a tag that never ends.
+    // The document is not well-formed. It may break off in a tag that never ends, or what follows the last event
+    // may be one long token that has no place there.
     void Fail(size_t length)
     {
         const XML_Error error = XML_GetErrorCode(m_parser);
         const bool isUnfinished = error == XML_ERROR_UNCLOSED_TOKEN || error == XML_ERROR_PARTIAL_CHAR ||
-                                  error == XML_ERROR_UNCLOSED_CDATA_SECTION;
-        TakeToken(isUnfinished ? length : Position());
+                                  error == XML_ERROR_UNCLOSED_CDATA_SECTION || error == XML_ERROR_SYNTAX;
+        TakeToken(isUnfinished ? length : End());
         Judge();
     }
 
@@ -126,6 +127,11 @@ class Look
         return static_cast<std::uint64_t>(std::max<XML_Index>(XML_GetCurrentByteIndex(m_parser), 0));
     }
 
+    std::uint64_t End() const
+    {
+        return Position() + static_cast<std::uint64_t>(XML_GetCurrentByteCount(m_parser));
+    }
+
     void EndText()
     {
         m_textLength = 0;
@@ -133,7 +139,7 @@ class Look
 
     void TakeToken()
     {
-        TakeToken(Position() + static_cast<std::uint64_t>(XML_GetCurrentByteCount(m_parser)));
+        TakeToken(End());
     }
 
     void TakeToken(std::uint64_t end)
