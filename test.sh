@@ -81,6 +81,7 @@ windows() {
     quietly cmake --build --preset windows
     quietly cmake --preset native -DBUILD_TESTING=ON
     quietly cmake --build --preset native
+    part "Import tables" tests/import_tables.sh build/windows/FolderUpgrade.exe
     part "Scenarios and unit tests under Wine" tests/under_wine.sh build/windows build/native
 }
 

@@ -1,16 +1,18 @@
 # What a program for Windows needs beside its sources.
 
-# Resources: the icon, the manifest and the version; from the templates in DIRECTORY.
-function(add_windows_resources target directory icon)
+# Resources: the icon, the manifest and the version, which says DESCRIPTION and the target's name.
+function(add_windows_resources target description)
+    set(templates ${CMAKE_SOURCE_DIR}/cmake/windows)
+    set(icons ${CMAKE_SOURCE_DIR}/appearance/icons)
     set(output ${CMAKE_CURRENT_BINARY_DIR}/windows)
-    foreach(name folder_upgrade.rc folder_upgrade.manifest)
-        configure_file(${directory}/${name}.in ${output}/${name} @ONLY)
+    get_target_property(has_windows ${target} WIN32_EXECUTABLE)
+    foreach(kind rc manifest)
+        configure_file(${templates}/program.${kind}.in ${output}/${target}.${kind} @ONLY)
     endforeach()
-    cmake_path(GET icon PARENT_PATH icons)
     target_include_directories(${target} PRIVATE ${output} ${icons})
-    target_sources(${target} PRIVATE ${output}/folder_upgrade.rc)
-    set_source_files_properties(${output}/folder_upgrade.rc PROPERTIES
-        OBJECT_DEPENDS "${icon};${output}/folder_upgrade.manifest")
+    target_sources(${target} PRIVATE ${output}/${target}.rc)
+    set_source_files_properties(${output}/${target}.rc PROPERTIES
+        OBJECT_DEPENDS "${icons}/hf_folder.ico;${output}/${target}.manifest")
     if(MSVC)
         target_link_options(${target} PRIVATE /MANIFEST:NO) # it is among the resources
     endif()
@@ -18,7 +20,7 @@ endfunction()
 
 # The stack is for the XML library, which destroys a document by recursion: with these 64 MiB
 # elements nested 600,000 deep do no harm (1,000,000 do), with 2 MiB 60,000 end the run. Only what is
-# used of it takes memory.
+# used of it takes memory. What has to be so before main() comes with the module platform.
 function(harden_windows_program target)
     if(MSVC)
         target_link_options(${target} PRIVATE

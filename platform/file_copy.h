@@ -1,4 +1,4 @@
-// Copying a file over another one; one source for each system.
+// Copying a file over another one; one source for each system, and file_copy.cpp for what is the same on all.
 #pragma once
 
 #include <wx/string.h>
@@ -8,3 +8,9 @@
 /// written. Through a link in the destination's place nothing is written. False when that fails; a
 /// destination that was written in place then has its old content. Does not wait for the disk.
 bool CopyOver(const wxString& source, const wxString& destination);
+
+/// Whether CopyOver would be let at the destination, and could read the source. Changes nothing.
+bool MayCopyOver(const wxString& source, const wxString& destination);
+
+/// Whether the destination has the source's content and attributes already.
+bool IsCopy(const wxString& source, const wxString& destination);

@@ -3,6 +3,9 @@
 
 #include <wx/string.h>
 
+#include <cstdint>
+#include <utility>
+
 /// Whether the last part of a path may be a link: a symbolic link, on Windows any reparse point whose
 /// tag says that it names another file or directory. A cloud file's placeholder is no link.
 enum class Links
@@ -33,6 +36,10 @@ class PinnedDirectory
     /// the library. Not for people: on Linux it names the descriptor. Of a directory that is not open it leads
     /// nowhere.
     wxString Reach(const wxString& name) const;
+
+    /// What no other directory has while both are open: volume and file index, or device and inode. Two zeros
+    /// of one that is not open.
+    std::pair<std::uint64_t, std::uint64_t> Identity() const;
 
   private:
 #ifdef _WIN32

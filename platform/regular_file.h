@@ -68,6 +68,8 @@ class RegularFile
     /// Takes over what wxCopyFile takes over with the content. Windows: the attributes and the time of the last
     /// change. Elsewhere: the mode.
     void TakeAttributes(const RegularFile& source);
+    /// Whether that would leave read-only, hidden, system or the mode as they are.
+    bool HasAttributesOf(const RegularFile& source) const;
 
     /// Has the library report that the file could not be written, under that path and with the error of the call
     /// that failed.

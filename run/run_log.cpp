@@ -1,27 +1,13 @@
 #include "run/run_log.h"
 
-#include "platform/path_normal_form.h"
 #include "platform/regular_file.h"
-#include "platform/standard_folders.h"
 #include "platform/unicode_text.h"
-
-#include <wx/filename.h>
+#include "run/run_log_place.h"
 
 bool RunLogEnabled = true;
 
 namespace
 {
-
-const char* const LogDirName = "ORX_Installers";
-const char* const LogFileName = "UpgradeDowngrade.log";
-
-wxString LogDirPath()
-{
-    wxFileName directory(GetUserDataFolder() + wxFileName::GetPathSeparator());
-    directory.AppendDir(LogDirName);
-    directory.Normalize(NormalizeAll, wxString(), wxPATH_NATIVE);
-    return directory.GetPath(wxPATH_GET_VOLUME) + wxFileName::GetPathSeparator();
-}
 
 std::string FormatLine(const wxString& message, int count)
 {
@@ -33,7 +19,7 @@ std::string FormatLine(const wxString& message, int count)
 // The first line makes the file, or empties it, a byte-order mark included.
 RegularFile::Status OpenLog(RegularFile& file, const PinnedDirectory& directory, bool isFirstLine)
 {
-    const wxString path = directory.Reach(LogFileName);
+    const wxString path = directory.Reach(RunLogFileName);
     const RegularFile::Status status = file.OpenForUpdate(path, Links::Refuse);
     if (!isFirstLine)
         return status;
@@ -50,7 +36,7 @@ void RunLog(const wxString& message, int count)
 {
     if (!RunLogEnabled)
         return;
-    static const wxString directoryPath = LogDirPath();
+    static const wxString directoryPath = RunLogDirPath();
     static bool isFirstLine = true;
     static bool isReported = false;
     const PinnedDirectory directory(directoryPath, Links::Refuse);
@@ -60,8 +46,8 @@ void RunLog(const wxString& message, int count)
     if (status == RegularFile::Status::Open && file.Append(FormatLine(message, count)))
         return;
     if (status == RegularFile::Status::Open && !isReported)
-        file.ReportNotWritten(directoryPath + LogFileName);
+        file.ReportNotWritten(directoryPath + RunLogFileName);
     else if (status == RegularFile::Status::Refused && !isReported)
-        ReportNotOpened(directoryPath + LogFileName);
+        ReportNotOpened(directoryPath + RunLogFileName);
     isReported = isReported || status != RegularFile::Status::NotThere;
 }

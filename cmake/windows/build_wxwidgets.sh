@@ -17,8 +17,8 @@ options=(
     --prefix=/wxmsw --with-msw --disable-shared --disable-debug_flag --enable-repro-build --enable-pch
     --disable-dependency-tracking --disable-tests --without-subdirs --disable-sys-libs --with-expat=sys
     --without-{libpng,libjpeg,libtiff,zlib,regex,liblzma,opengl,nanosvg}
-    --disable-{aui,debugreport,docview,graphics_ctx,help,html,joystick,mdi,mediactrl,postscript,printarch,propgrid}
-    --disable-{ribbon,richtext,secretstore,sockets,sound,stc,svg,webrequest,webview,wizarddlg,xrc}
+    --disable-{accessibility,aui,debugreport,docview,graphics_ctx,help,html,joystick,mdi,mediactrl,postscript}
+    --disable-{printarch,propgrid,ribbon,richtext,secretstore,sockets,sound,stc,svg,webrequest,webview,wizarddlg,xrc}
 )
 
 say() { printf 'wxWidgets for Windows, %d s: %s\n' "$SECONDS" "$*" >&3; }

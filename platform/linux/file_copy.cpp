@@ -21,3 +21,16 @@ bool CopyOver(const wxString& source, const wxString& destination)
     to.TakeAttributes(from);
     return true;
 }
+
+bool MayCopyOver(const wxString& source, const wxString& destination)
+{
+    RegularFile from;
+    RegularFile to;
+    if (from.OpenForReading(source, Links::Follow) != RegularFile::Status::Open)
+        return false;
+    const RegularFile::Status status = to.OpenForUpdate(destination, Links::Refuse);
+    // What cannot be written is replaced.
+    return status == RegularFile::Status::Open ||
+           (status == RegularFile::Status::Refused &&
+            access(destination.BeforeLast('/').utf8_str(), W_OK | X_OK) == 0);
+}

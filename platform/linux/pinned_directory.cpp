@@ -34,3 +34,11 @@ wxString PinnedDirectory::Reach(const wxString& name) const
     // No descriptor has the number -1.
     return "/proc/self/fd/" + std::to_string(m_descriptor) + "/" + name;
 }
+
+std::pair<std::uint64_t, std::uint64_t> PinnedDirectory::Identity() const
+{
+    struct stat status = {};
+    if (!IsOpen() || fstat(m_descriptor, &status) != 0)
+        return {};
+    return {status.st_dev, status.st_ino};
+}

@@ -148,3 +148,11 @@ void RegularFile::TakeAttributes(const RegularFile& source)
     if (fstat(source.m_descriptor, &status) == 0)
         fchmod(m_descriptor, status.st_mode & 07777);
 }
+
+bool RegularFile::HasAttributesOf(const RegularFile& source) const
+{
+    struct stat ours = {};
+    struct stat theirs = {};
+    return fstat(m_descriptor, &ours) == 0 && fstat(source.m_descriptor, &theirs) == 0 &&
+           (ours.st_mode & 07777) == (theirs.st_mode & 07777);
+}

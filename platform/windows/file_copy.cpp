@@ -15,3 +15,11 @@ bool CopyOver(const wxString& source, const wxString& destination)
     to.TakeAttributes(from);
     return true;
 }
+
+bool MayCopyOver(const wxString& source, const wxString& destination)
+{
+    RegularFile from;
+    RegularFile to;
+    return from.OpenForReading(source, Links::Follow) == RegularFile::Status::Open &&
+           to.OpenForUpdate(destination, Links::Refuse) == RegularFile::Status::Open;
+}

@@ -77,3 +77,12 @@ wxString PinnedDirectory::Reach(const wxString& name) const
         return m_path + name;
     return m_path + wxFileName::GetPathSeparator() + name;
 }
+
+std::pair<std::uint64_t, std::uint64_t> PinnedDirectory::Identity() const
+{
+    BY_HANDLE_FILE_INFORMATION information = {};
+    if (!IsOpen() || GetFileInformationByHandle(m_handle, &information) == 0)
+        return {};
+    return {information.dwVolumeSerialNumber,
+            std::uint64_t{information.nFileIndexHigh} << 32 | information.nFileIndexLow};
+}

@@ -179,3 +179,13 @@ void RegularFile::TakeAttributes(const RegularFile& source)
     information.ChangeTime.QuadPart = 0;
     SetFileInformationByHandle(m_handle, FileBasicInfo, &information, sizeof information);
 }
+
+bool RegularFile::HasAttributesOf(const RegularFile& source) const
+{
+    constexpr DWORD Compared = FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_HIDDEN | FILE_ATTRIBUTE_SYSTEM;
+    BY_HANDLE_FILE_INFORMATION ours = {};
+    BY_HANDLE_FILE_INFORMATION theirs = {};
+    return GetFileInformationByHandle(m_handle, &ours) != 0 &&
+           GetFileInformationByHandle(source.m_handle, &theirs) != 0 &&
+           (ours.dwFileAttributes & Compared) == (theirs.dwFileAttributes & Compared);
+}

@@ -1,0 +1,15 @@
+#include "platform/attribute_rights.h"
+
+#include <sys/stat.h>
+#include <unistd.h>
+
+// The owner may change the mode. Attributes of a directory are extended ones only, for which the right to write
+// into it is enough.
+bool MayChangeAttributes(const wxString& path)
+{
+    struct stat status = {};
+    if (lstat(path.utf8_str(), &status) != 0 || S_ISLNK(status.st_mode))
+        return false;
+    return geteuid() == 0 || geteuid() == status.st_uid ||
+           (S_ISDIR(status.st_mode) && access(path.utf8_str(), W_OK) == 0);
+}

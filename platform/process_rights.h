@@ -1,0 +1,17 @@
+// Whose rights the process has; one source for each system.
+#pragma once
+
+#include <wx/string.h>
+
+/// Whether the process has an administrator's rights. Windows: its token is elevated, as that of
+/// SYSTEM is, too. Elsewhere: its effective user is root. Needs no static object to be ready.
+bool IsElevated();
+
+/// The account that the process runs as: the domain or the computer, a backslash, the user, for
+/// example "DESK7\anna" or "NT AUTHORITY\SYSTEM". Elsewhere: the host and the effective user, or
+/// the user's number if it has no name. Empty if the system does not say.
+wxString AccountName();
+
+/// Whether the process refuses to pass links that a process without administrator's rights has made: an
+/// elevated one on Windows 11 and Windows 10 22H2.
+bool RefusesLinksOfOthers();

@@ -1,0 +1,10 @@
+// Where the run log is.
+#pragma once
+
+#include <wx/string.h>
+
+constexpr const wchar_t* RunLogFileName = L"UpgradeDowngrade.log";
+
+/// The log's folder, ORX_Installers in the per-user application data folder, with a final separator. Whether it is
+/// there is not asked; the tool does not create it.
+wxString RunLogDirPath();
