@@ -165,27 +165,8 @@ constexpr bool HasSanitizer()
 #endif
 }
 
-} // namespace
-
-std::string NameOf(const testing::TestParamInfo<Scenario>& scenario)
+void RunAndCompare(const Scenario& scenario)
 {
-    return scenario.param.name.what;
-}
-
-void PrintTo(const Scenario& scenario, std::ostream* stream)
-{
-    *stream << scenario.name.what;
-}
-
-TEST_P(Workstations, IsAsExpectedAfterTheRun)
-{
-    const Scenario& scenario = GetParam();
-    std::string description = scenario.name.what + ": FolderUpgrade";
-    for (const std::string& argument : scenario.arguments)
-        description += " " + argument;
-    const testing::ScopedTrace trace(scenario.name.file, scenario.name.line, description);
-    if (IsWindowsProgram() && scenario.notUnderWine)
-        GTEST_SKIP() << scenario.notUnderWine;
     Workstation workstation(scenario.asOtherUser);
     workstation.LayOut(WorkstationBefore(scenario));
     const Files before = workstation.Snapshot();
@@ -211,4 +192,35 @@ TEST_P(Workstations, IsAsExpectedAfterTheRun)
         return;
     EXPECT_EQ(255, workstation.Start(scenario.arguments).process.exitStatus);
     Compare(FolderCfgsOf(after), FolderCfgsOf(workstation.Snapshot()), "after a second run");
+}
+
+} // namespace
+
+std::string NameOf(const testing::TestParamInfo<Scenario>& scenario)
+{
+    return scenario.param.name.what;
+}
+
+void PrintTo(const Scenario& scenario, std::ostream* stream)
+{
+    *stream << scenario.name.what;
+}
+
+TEST_P(Workstations, IsAsExpectedAfterTheRun)
+{
+    const Scenario& scenario = GetParam();
+    std::string description = scenario.name.what + ": FolderUpgrade";
+    for (const std::string& argument : scenario.arguments)
+        description += " " + argument;
+    const testing::ScopedTrace trace(scenario.name.file, scenario.name.line, description);
+    if (IsWindowsProgram() && scenario.notUnderWine)
+        GTEST_SKIP() << scenario.notUnderWine;
+    try
+    {
+        RunAndCompare(scenario);
+    }
+    catch (const std::exception& exception)
+    {
+        FAIL() << exception.what();
+    }
 }
