@@ -36,10 +36,7 @@ namespace
 ProcessResult RunToTheEnd(const Process& process, const std::function<void(double)>& meanwhile)
 {
     const auto start = std::chrono::steady_clock::now();
-    const auto elapsed = [&]()
-    {
-        return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
-    };
+    const auto elapsed = [&]() { return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count(); };
     std::fflush(nullptr); // or the child writes it a second time
     const pid_t child = fork();
     if (child == 0)

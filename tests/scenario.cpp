@@ -3,61 +3,10 @@
 #include "tests/scenarios/texts.h"
 #include "tests/text_files.h"
 
-const char* const Removed = "(not there)";
-
-Scenario& Scenario::Before(const Files& files)
+Scenario& Scenario::Add(Files& to, const Files& files)
 {
     for (const auto& [place, text] : files)
-        before[place] = text;
-    return *this;
-}
-
-Scenario& Scenario::FolderCfg(const Text& text)
-{
-    before[CfgPlace] = text;
-    return *this;
-}
-
-Scenario& Scenario::FolderCfg(const Text& text, const Text& textAfter)
-{
-    after[CfgPlace] = textAfter;
-    return FolderCfg(text);
-}
-
-Scenario& Scenario::Preset(const Text& text)
-{
-    before[PresetPlace] = text;
-    return *this;
-}
-
-Scenario& Scenario::Preset(const Text& text, const Text& textAfter)
-{
-    after[PresetPlace] = textAfter;
-    return Preset(text);
-}
-
-Scenario& Scenario::AsOtherUser()
-{
-    asOtherUser = true;
-    return *this;
-}
-
-Scenario& Scenario::Run(const std::vector<Text>& theArguments)
-{
-    arguments = theArguments;
-    return *this;
-}
-
-Scenario& Scenario::After(const Files& files)
-{
-    for (const auto& [place, text] : files)
-        after[place] = text;
-    return *this;
-}
-
-Scenario& Scenario::WholeLog(const Text& text)
-{
-    log = text;
+        to[place] = text;
     return *this;
 }
 
@@ -68,38 +17,19 @@ Scenario& Scenario::Log(const Text& folders, const Text& presets)
                     "End: Updating Impose path for JP Presets\n");
 }
 
-Scenario& Scenario::LogOfA(const Text& impose, const Text& presets)
+Scenario& Scenario::LogOfA(const Text& impose, const Text& presets, const Text& icon)
 {
-    return Log(FolderLines("A", 1, NoIcon("hf_folder"), impose), presets);
+    return Log(FolderLines("A", 1, NoIcon(icon), impose), presets);
 }
 
 Scenario& Scenario::LogOfDisabledA(const Text& impose, const Text& presets)
 {
-    return Log(FolderLines("A", 1, NoIcon("hf_folder_disabled"), impose), presets);
+    return LogOfA(impose, presets, "hf_folder_disabled");
 }
 
 Scenario& Scenario::LogOfPreset(const Text& line)
 {
     return Log("", PresetLine(line));
-}
-
-Scenario& Scenario::LibraryReports()
-{
-    libraryReports = true;
-    return *this;
-}
-
-Scenario& Scenario::Within(double theSeconds, long theMegabytes)
-{
-    seconds = theSeconds;
-    megabytes = theMegabytes;
-    return *this;
-}
-
-Scenario& Scenario::NotUnderWine(const char* reason)
-{
-    notUnderWine = reason;
-    return *this;
 }
 
 Files WorkstationBefore(const Scenario& scenario)

@@ -14,7 +14,11 @@
 #include <vector>
 
 /// In Before: the usual file is not there.
-extern const char* const Removed;
+inline const char* const Removed = "(not there)";
+
+inline const char* const ListPlace = "machine/hotfolder/HotFolderList.cfg";
+inline const std::string CfgPlace = "hot/A/[P]/Folder.cfg";
+inline const std::string PresetPlace = "user/ORX/JPData/.P/Presets/presets.xml";
 
 /// What should happen, and where the scenario is in the source, which comes along with the literal.
 struct Name
@@ -30,45 +34,44 @@ struct Name
     int line;
 };
 
-struct Scenario
+class Scenario
 {
-    explicit Scenario(const Name& itsName) : name(itsName)
-    {
-    }
+  public:
+    explicit Scenario(const Name& itsName) : name(itsName) {}
 
     /// Files beside the usual ones, or in their place. The usual ones are the log of an earlier run, a
     /// hive for each of the two template folders, a directory for presets without any, and
     /// HotFolderList.cfg, which lists every NAME of the places hot/NAME/... in their order.
-    Scenario& Before(const Files& files);
+    Scenario& Before(const Files& files) { return Add(before, files); }
     /// The Folder.cfg of the hot folder A, and what it becomes; the same, if that is not given.
-    Scenario& FolderCfg(const std::string& text);
-    Scenario& FolderCfg(const std::string& text, const std::string& after);
+    Scenario& FolderCfg(const std::string& text) { return Before({{CfgPlace, text}}); }
+    Scenario& FolderCfg(const std::string& text, const std::string& becomes) { return FolderCfg(text).After({{CfgPlace, becomes}}); }
     /// The same for presets.xml of the one directory with presets.
-    Scenario& Preset(const std::string& text);
-    Scenario& Preset(const std::string& text, const std::string& after);
+    Scenario& Preset(const std::string& text) { return Before({{PresetPlace, text}}); }
+    Scenario& Preset(const std::string& text, const std::string& becomes) { return Preset(text).After({{PresetPlace, becomes}}); }
     /// For refusals, which would not stop root.
-    Scenario& AsOtherUser();
+    Scenario& AsOtherUser() { return Set(asOtherUser, true); }
 
     /// The arguments of the command line; {"I"}, if not given.
-    Scenario& Run(const std::vector<std::string>& arguments);
+    Scenario& Run(const std::vector<std::string>& given) { return Set(arguments, given); }
 
     /// Files that change. Every other file and attribute has to stay as it is.
-    Scenario& After(const Files& files);
+    Scenario& After(const Files& files) { return Add(after, files); }
     /// The whole log, with LF for CR LF; if no log is given, that of the earlier run stays.
-    Scenario& WholeLog(const std::string& text);
+    Scenario& WholeLog(const std::string& text) { return Set(log, text); }
     /// The log of a run with these lines about the hot folders and the presets.
     Scenario& Log(const std::string& folders, const std::string& presets = "");
     /// The same, where A is the only hot folder, has no icon to replace, and these lines about its template.
-    Scenario& LogOfA(const std::string& impose, const std::string& presets = "");
+    Scenario& LogOfA(const std::string& impose, const std::string& presets = "", const std::string& icon = "hf_folder");
     Scenario& LogOfDisabledA(const std::string& impose, const std::string& presets = "");
     /// The same, where there are no hot folders and one preset, with this line.
     Scenario& LogOfPreset(const std::string& line);
     /// The library itself reports an error, on Windows in a message box.
-    Scenario& LibraryReports();
+    Scenario& LibraryReports() { return Set(libraryReports, true); }
     /// Limits of the run; that on memory is for this machine only, and neither is for a build with sanitizers.
-    Scenario& Within(double seconds, long megabytes);
+    Scenario& Within(double most, long mostMegabytes) { return Set(seconds, most).Set(megabytes, mostMegabytes); }
     /// Why it cannot hold there.
-    Scenario& NotUnderWine(const char* reason);
+    Scenario& NotUnderWine(const std::string& reason) { return Set(notUnderWine, reason); }
 
     Name name;
     Files before;
@@ -77,9 +80,19 @@ struct Scenario
     std::string log; // empty for that of the earlier run
     bool libraryReports = false;
     bool asOtherUser = false;
-    const char* notUnderWine = nullptr;
+    std::string notUnderWine;
     double seconds = 0; // 0 for no limit
     long megabytes = 0;
+
+  private:
+    template <typename Field>
+    Scenario& Set(Field& field, const Field& value)
+    {
+        field = value;
+        return *this;
+    }
+
+    Scenario& Add(Files& to, const Files& files);
 };
 
 /// Everything on the workstation before the run, the usual files included.

@@ -3,6 +3,7 @@
 
 #include <algorithm>
 #include <cctype>
+#include <iomanip>
 #include <sstream>
 
 namespace
@@ -49,55 +50,50 @@ std::string Meaning(const std::string& profile)
     return meaning;
 }
 
-// Every byte that is not a character of ASCII as an escape; of a long line the start.
-std::string Printable(const std::string& line)
-{
-    constexpr size_t Limit = 300;
-    std::ostringstream text;
-    text << std::hex << std::uppercase;
-    for (const char character : line.substr(0, Limit))
-    {
-        if (character >= ' ' && character <= '~')
-            text << character;
-        else if (character == '\r')
-            text << "\\r";
-        else
-            text << "\\x" << (static_cast<unsigned char>(character) >> 4) << (static_cast<unsigned char>(character) & 15);
-    }
-    return text.str() + (line.size() > Limit ? "... (" + std::to_string(line.size()) + " bytes)" : "");
-}
-
+// The lines of a text with their ends, long ones in pieces.
 std::vector<std::string> Lines(const std::string& text)
 {
+    constexpr size_t Longest = 200;
     std::vector<std::string> lines;
-    std::istringstream stream(text);
-    for (std::string line; std::getline(stream, line);)
-        lines.push_back(line + (stream.eof() ? "(no line end)" : ""));
+    for (size_t at = 0; at < text.size(); at += lines.back().size())
+        lines.push_back(text.substr(at, std::min(text.find('\n', at), at + Longest - 1) - at + 1));
     return lines;
+}
+
+std::string Printable(const std::string& text)
+{
+    std::ostringstream result;
+    for (const char character : text)
+    {
+        if (character >= ' ' && character <= '~')
+            result << character;
+        else if (character == '\r' || character == '\n')
+            result << (character == '\r' ? "\\r" : "\\n");
+        else
+            result << "\\x" << std::hex << std::setw(2) << std::setfill('0') << (character & 0xFF);
+    }
+    return result.str();
 }
 
 // The lines from the first to the last that differ, with one more on both sides.
 std::string Difference(const std::string& expected, const std::string& actual)
 {
-    const std::vector<std::string> before = Lines(expected);
-    const std::vector<std::string> after = Lines(actual);
-    const auto [firstBefore, firstAfter] = std::mismatch(before.begin(), before.end(), after.begin(), after.end());
-    const auto [lastBefore, lastAfter] =
-        std::mismatch(before.rbegin(), std::make_reverse_iterator(firstBefore), after.rbegin(), std::make_reverse_iterator(firstAfter));
-    std::string text = "--- expected\n+++ actual\n@@ line " + std::to_string(firstBefore - before.begin() + 1) + " @@\n";
-    const auto add = [&](const std::string& sign, auto from, auto to)
+    const std::vector<std::string> left = Lines(expected);
+    const std::vector<std::string> right = Lines(actual);
+    const auto [leftBegin, rightBegin] = std::mismatch(left.begin(), left.end(), right.begin(), right.end());
+    const auto [leftEnd, rightEnd] =
+        std::mismatch(left.rbegin(), std::make_reverse_iterator(leftBegin), right.rbegin(), std::make_reverse_iterator(rightBegin));
+    std::string text = "--- expected\n+++ actual\n@@ line " + std::to_string(leftBegin - left.begin() + 1) + " @@\n";
+    const auto add = [&](char sign, auto from, auto to)
     {
-        constexpr int Limit = 20;
-        for (int count = 0; from != to; ++from, ++count)
-        {
-            if (count < Limit)
-                text += sign + Printable(*from) + "\n";
-        }
+        constexpr int Most = 20;
+        for (int count = 0; from != to && count < Most; ++from, ++count)
+            text += sign + Printable(*from) + "\n";
     };
-    add(" ", firstBefore == before.begin() ? firstBefore : firstBefore - 1, firstBefore);
-    add("-", firstBefore, lastBefore.base());
-    add("+", firstAfter, lastAfter.base());
-    add(" ", lastBefore.base(), lastBefore == before.rbegin() ? before.end() : lastBefore.base() + 1);
+    add(' ', leftBegin - (leftBegin == left.begin() ? 0 : 1), leftBegin);
+    add('-', leftBegin, leftEnd.base());
+    add('+', rightBegin, rightEnd.base());
+    add(' ', leftEnd.base(), leftEnd.base() + (leftEnd == left.rbegin() ? 0 : 1));
     return text;
 }
 
@@ -143,15 +139,11 @@ void Compare(const Files& expected, const Files& actual, const std::string& when
     }
 }
 
-Files FolderCfgsOf(const Files& files)
+Files FolderCfgsOf(Files files)
 {
-    Files cfgs;
-    for (const auto& [place, text] : files)
-    {
-        if (place.find("Folder.cfg") != std::string::npos)
-            cfgs[place] = text;
-    }
-    return cfgs;
+    for (auto file = files.begin(); file != files.end();)
+        file = file->first.find("Folder.cfg") == std::string::npos ? files.erase(file) : std::next(file);
+    return files;
 }
 
 constexpr bool HasSanitizer()
@@ -212,9 +204,9 @@ TEST_P(Workstations, IsAsExpectedAfterTheRun)
     std::string description = scenario.name.what + ": FolderUpgrade";
     for (const std::string& argument : scenario.arguments)
         description += " " + argument;
-    const testing::ScopedTrace trace(scenario.name.file, scenario.name.line, description);
-    if (IsWindowsProgram() && scenario.notUnderWine)
+    if (IsWindowsProgram() && !scenario.notUnderWine.empty())
         GTEST_SKIP() << scenario.notUnderWine;
+    const testing::ScopedTrace trace(scenario.name.file, scenario.name.line, description);
     try
     {
         RunAndCompare(scenario);

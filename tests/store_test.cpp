@@ -18,14 +18,9 @@ namespace
 class Store : public testing::Test
 {
   protected:
-    Store() : m_path(wxFileName::CreateTempFileName("store"))
-    {
-    }
+    Store() : m_path(wxFileName::CreateTempFileName("store")) {}
 
-    ~Store() override
-    {
-        wxRemoveFile(m_path);
-    }
+    ~Store() override { wxRemoveFile(m_path); }
 
     const wxString& File(const wxString& text)
     {

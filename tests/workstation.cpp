@@ -185,10 +185,7 @@ void Workstation::SetAttributes(const std::string& place, const std::string& let
 {
     const fs::path path = HostPath(place);
     const bool isDirectory = fs::is_directory(path);
-    const auto has = [&](char letter)
-    {
-        return letters.find(letter) != std::string::npos;
-    };
+    const auto has = [&](char letter) { return letters.find(letter) != std::string::npos; };
     const unsigned stored = (has('H') ? 2U : 0U) | (has('S') ? 4U : 0U) | (has('R') && isDirectory ? 1U : 0U);
     const std::string text = "0x" + std::to_string(stored);
     if (stored != 0 && setxattr(path.c_str(), AttributeName, text.data(), text.size(), 0) != 0)

@@ -37,12 +37,8 @@ std::vector<Scenario> FolderCfgs()
     const Text found = Found(MovedFrom);
     const Text written = MinimalWritten(MovedTo);
     const Text mixed = Filter("t\n    <x>u\n      <y/>v</x>\n    <![CDATA[<w>]]>z\n    <!--c-->\n  ");
-    const auto elsewhere = [](const Name& name, const Text& path)
-    {
-        return Scenario(name).FolderCfg(Written(path)).LogOfA(Found(path));
-    };
-    const auto nested = [&](const Name& name, int levels)
-    {
+    const auto elsewhere = [](const Name& name, const Text& path) { return Scenario(name).FolderCfg(Written(path)).LogOfA(Found(path)); };
+    const auto nested = [&](const Name& name, int levels) {
         return Scenario(name)
             .FolderCfg(Written(MovedFrom, Filter(Chain(levels))))
             .LogOfA(found + Untouched("filter setting nested too deep"));

@@ -11,8 +11,7 @@ Text Lines(const Text& name, int position)
 
 std::vector<Scenario> Lists()
 {
-    const auto listed = [](const Name& name, const Text& list)
-    {
+    const auto listed = [](const Name& name, const Text& list) {
         return Scenario(name).Before({{"hot/A/", ""}, {"hot/b ü 漢/", ""}, {"hot/C/", ""}, {"hot/file", "x"}, {ListPlace, list}});
     };
     return {

@@ -12,13 +12,9 @@ std::vector<Scenario> Presets()
     const Text from = Stored(MovedFrom);
     const Text to = Stored(MovedTo);
     const auto updated = [](const Name& name, const Text& before, const Text& after)
-    {
-        return Scenario(name).Preset(before, after).LogOfPreset(Updated);
-    };
+    { return Scenario(name).Preset(before, after).LogOfPreset(Updated); };
     const auto left = [](const Name& name, const Text& preset, const Text& reason)
-    {
-        return Scenario(name).Preset(preset).LogOfPreset("preset.xml left as it is (" + reason + "): ");
-    };
+    { return Scenario(name).Preset(preset).LogOfPreset("preset.xml left as it is (" + reason + "): "); };
     return {
         updated("EveryPathInTheFolderMoves", "\r\n" + from + near + "\r\n" + Stored("{previous}{/}Sub{/}x") + Stored("{previous}") + near,
                 "\r\n" + to + near + "\r\n" + Stored("{default}{/}Sub{/}x") + Stored("{default}") + near),

@@ -10,8 +10,7 @@ std::vector<Scenario> Refusals()
 {
     const Text found = Found(MovedFrom);
     const Text cfg = Written(MovedFrom);
-    const auto refused = [](const Name& name, const Text& place, const Text& attributes)
-    {
+    const auto refused = [](const Name& name, const Text& place, const Text& attributes) {
         return Scenario(name).Before({{place + "#", attributes}}).AsOtherUser().LibraryReports();
     };
     return {

@@ -5,10 +5,6 @@
 
 using Text = std::string;
 
-inline const char* const ListPlace = "machine/hotfolder/HotFolderList.cfg";
-inline const Text CfgPlace = "hot/A/[P]/Folder.cfg";
-inline const Text PresetPlace = "user/ORX/JPData/.P/Presets/presets.xml";
-
 inline const Text MovedFrom = "{previous}{/}Booklet.tpl";
 inline const Text MovedTo = "{default}{/}Booklet.tpl";
 
