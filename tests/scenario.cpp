@@ -22,15 +22,9 @@ Scenario& Scenario::LogOfA(const Text& impose, const Text& presets, const Text& 
     return Log(FolderLines("A", 1, NoIcon(icon), impose), presets);
 }
 
-Scenario& Scenario::LogOfDisabledA(const Text& impose, const Text& presets)
-{
-    return LogOfA(impose, presets, "hf_folder_disabled");
-}
+Scenario& Scenario::LogOfDisabledA(const Text& impose, const Text& presets) { return LogOfA(impose, presets, "hf_folder_disabled"); }
 
-Scenario& Scenario::LogOfPreset(const Text& line)
-{
-    return Log("", PresetLine(line));
-}
+Scenario& Scenario::LogOfPreset(const Text& line) { return Log("", PresetLine(line)); }
 
 Files WorkstationBefore(const Scenario& scenario)
 {

@@ -188,15 +188,9 @@ void RunAndCompare(const Scenario& scenario)
 
 } // namespace
 
-std::string NameOf(const testing::TestParamInfo<Scenario>& scenario)
-{
-    return scenario.param.name.what;
-}
+std::string NameOf(const testing::TestParamInfo<Scenario>& scenario) { return scenario.param.name.what; }
 
-void PrintTo(const Scenario& scenario, std::ostream* stream)
-{
-    *stream << scenario.name.what;
-}
+void PrintTo(const Scenario& scenario, std::ostream* stream) { *stream << scenario.name.what; }
 
 TEST_P(Workstations, IsAsExpectedAfterTheRun)
 {

@@ -36,10 +36,7 @@ std::string TextIfThere(const fs::path& path)
 
 } // namespace
 
-fs::path WindowsProgram()
-{
-    return FromEnvironment("FOLDER_UPGRADE_WINDOWS_PROGRAM");
-}
+fs::path WindowsProgram() { return FromEnvironment("FOLDER_UPGRADE_WINDOWS_PROGRAM"); }
 
 Wine::Wine(bool asOtherUser, const fs::path& driveH)
     : m_asOtherUser(asOtherUser),
@@ -53,25 +50,13 @@ Wine::Wine(bool asOtherUser, const fs::path& driveH)
         fs::remove_all(left);
 }
 
-std::string Wine::UserName() const
-{
-    return m_asOtherUser ? "nobody" : "root";
-}
+std::string Wine::UserName() const { return m_asOtherUser ? "nobody" : "root"; }
 
-fs::path Wine::UserDataDir() const
-{
-    return m_prefix / "drive_c/users" / UserName() / "AppData/Roaming";
-}
+fs::path Wine::UserDataDir() const { return m_prefix / "drive_c/users" / UserName() / "AppData/Roaming"; }
 
-fs::path Wine::MachineDataDir() const
-{
-    return m_prefix / "drive_c/ProgramData";
-}
+fs::path Wine::MachineDataDir() const { return m_prefix / "drive_c/ProgramData"; }
 
-std::string Wine::UserDataPath() const
-{
-    return std::string("C:\\users\\") + UserName() + "\\AppData\\Roaming";
-}
+std::string Wine::UserDataPath() const { return std::string("C:\\users\\") + UserName() + "\\AppData\\Roaming"; }
 
 void Wine::ImportHives(const std::string& machineHive, const std::string& userHive) const
 {

@@ -55,10 +55,7 @@ bool IsOurs(const std::string& path)
     return top == "ORX" || top == "ORX_Installers" || top == "hotfolder" || top == "registry";
 }
 
-std::string ProgramFile(const std::string& program)
-{
-    return IsWindowsProgram() ? program + ".exe" : program;
-}
+std::string ProgramFile(const std::string& program) { return IsWindowsProgram() ? program + ".exe" : program; }
 
 void GiveAway(const fs::path& path)
 {
@@ -78,10 +75,7 @@ const char* const LogPlace = "user/ORX_Installers/UpgradeDowngrade.log";
 const char* const MachineHive = "machine/registry/HKEY_LOCAL_MACHINE.reg";
 const char* const UserHive = "user/registry/HKEY_CURRENT_USER.reg";
 
-bool IsWindowsProgram()
-{
-    return !WindowsProgram().empty();
-}
+bool IsWindowsProgram() { return !WindowsProgram().empty(); }
 
 Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser)
 {
@@ -134,12 +128,6 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser)
 Workstation::~Workstation()
 {
     std::error_code ignored;
-    for (auto entry = fs::recursive_directory_iterator(m_root, ignored); entry != fs::recursive_directory_iterator();
-         entry.increment(ignored))
-    {
-        if (entry->is_directory(ignored))
-            fs::permissions(entry->path(), fs::perms::owner_all, fs::perm_options::add, ignored);
-    }
     fs::remove_all(m_root, ignored);
 }
 

@@ -4,10 +4,7 @@
 namespace
 {
 
-Text Filter(const Text& content)
-{
-    return "  <FilterSetting>" + content + "</FilterSetting>\n";
-}
+Text Filter(const Text& content) { return "  <FilterSetting>" + content + "</FilterSetting>\n"; }
 
 // A chain of elements, as the library writes it: one below the other, the levels counted from 1.
 Text Nested(int levels)

@@ -8,20 +8,11 @@ const Text Ini = "hot/A/Desktop.ini";
 const Text Header = "[.ShellClassInfo]\r\n";
 const Text InfoTip = "InfoTip=This folder has been configured as an ORX hot folder.\r\n";
 
-Text Icon(const Text& name)
-{
-    return "hot/A/[P]/" + name + ".ico";
-}
+Text Icon(const Text& name) { return "hot/A/[P]/" + name + ".ico"; }
 
-Text IconFile(const Text& name)
-{
-    return "IconFile=.\\[_ORX_HotFolder_]\\" + name + ".ico\r\n";
-}
+Text IconFile(const Text& name) { return "IconFile=.\\[_ORX_HotFolder_]\\" + name + ".ico\r\n"; }
 
-Text Cfg(const Text& enabled)
-{
-    return "<H name='' description='' server_ip='' server_name='' Enable='" + enabled + "'/>";
-}
+Text Cfg(const Text& enabled) { return "<H name='' description='' server_ip='' server_name='' Enable='" + enabled + "'/>"; }
 
 std::vector<Scenario> Icons()
 {

@@ -4,10 +4,7 @@
 namespace
 {
 
-Text Lines(const Text& name, int position)
-{
-    return FolderLines(name, position, NoIcon("hf_folder_disabled"), NoCfg(name));
-}
+Text Lines(const Text& name, int position) { return FolderLines(name, position, NoIcon("hf_folder_disabled"), NoCfg(name)); }
 
 std::vector<Scenario> Lists()
 {

@@ -24,15 +24,9 @@ Scenario Both(const Name& name, const Text& letter, const Files& hives)
     return Scenario(name).Before(hives).FolderCfg(Written(path)).Preset(Stored(path)).Run({letter});
 }
 
-Scenario WithPrevious(const Name& name, const Text& value)
-{
-    return Both(name, "I", {{UserHive, UserValue(value)}});
-}
+Scenario WithPrevious(const Name& name, const Text& value) { return Both(name, "I", {{UserHive, UserValue(value)}}); }
 
-Scenario WithInstalled(const Name& name, const Text& value)
-{
-    return Both(name, "I", {{MachineHive, MachineValue(value)}});
-}
+Scenario WithInstalled(const Name& name, const Text& value) { return Both(name, "I", {{MachineHive, MachineValue(value)}}); }
 
 std::vector<Scenario> Registry()
 {
