@@ -1,12 +1,11 @@
 #!/usr/bin/env python3
-"""Plants small faults in copies of the product, one at a time, and shows which of them the tests find.
+"""Plants small faults in a copy of the product, one at a time, and shows which of them the tests find.
 
-    tests/plant_faults.py [NUMBER [SEED [WORKERS]]]
+    tests/plant_faults.py [NUMBER [SEED]]
 
-A fault that does not compile is drawn again. The list of faults depends on the seed alone, as long as
-the sources are the same. The share found is printed last; the faults that survive are what to read.
+In place of a fault that does not compile another one is drawn. The same seed gives the same faults, as
+long as the sources are the same. A survivor is either a missing test or a fault that changes nothing.
 """
-import concurrent.futures
 import os
 import pathlib
 import random
@@ -17,7 +16,6 @@ import signal
 import subprocess
 import sys
 import tempfile
-import threading
 
 ROOT = pathlib.Path(__file__).resolve().parents[1]
 MODULES = ("app", "check", "run", "store", "migrate", "appearance", "platform")
@@ -69,70 +67,51 @@ def faults():
                         yield name, number, line, code[:match.start()] + change(match) + code[match.end():]
 
 
-class Copy:
-    """A copy of the sources with its own build."""
+def passes(root):
+    """Whether all tests pass in this copy of the project."""
+    scratch = root / "scratch"
+    scratch.mkdir(mode=0o755)
+    memory = 4 << 30  # some faults make a loop that never stops allocating
+    passed = all(run([root / "build/tests" / test, "--gtest_fail_fast"], cwd=scratch, env={**os.environ, "TMPDIR": str(scratch)},
+                     preexec_fn=lambda: resource.setrlimit(resource.RLIMIT_AS, (memory, memory)))
+                 for test in ("scenario_test", "unit_test"))
+    shutil.rmtree(scratch)
+    return passed
 
-    def __init__(self, parent):
-        self.root = pathlib.Path(tempfile.mkdtemp(dir=parent))
-        self.root.chmod(0o755)  # some scenarios run as another user
-        for name in files():
-            (self.root / name).parent.mkdir(parents=True, exist_ok=True)
-            shutil.copy(ROOT / name, self.root / name)
-        self.build = self.root / "build"
-        self.scratch = self.root / "scratch"
-        subprocess.check_call(["cmake", "-S", self.root, "-B", self.build, "-G", "Ninja", "-DCMAKE_BUILD_TYPE=Debug",
-                               "-DCMAKE_CXX_FLAGS_DEBUG=-O0 -DNDEBUG -w",
-                               "-DCMAKE_GTEST_DISCOVER_TESTS_DISCOVERY_MODE=PRE_TEST"], stdout=subprocess.DEVNULL)
-        subprocess.check_call(["ninja", "-C", self.build], stdout=subprocess.DEVNULL)
-        if not self.passes():
-            sys.exit("without any fault the tests fail")
 
-    def passes(self):
-        self.scratch.mkdir(mode=0o755)
-        limit = 4 << 30  # some faults make a loop that never stops allocating
-        passed = all(run([self.build / "tests" / test, "--gtest_fail_fast"], cwd=self.scratch,
-                         env={**os.environ, "TMPDIR": str(self.scratch)},
-                         preexec_fn=lambda: resource.setrlimit(resource.RLIMIT_AS, (limit, limit)))
-                     for test in ("scenario_test", "unit_test"))
-        shutil.rmtree(self.scratch)
-        return passed
-
-    def survives(self, fault):
-        """True, False, or None when the fault does not compile."""
-        name, number, _, changed = fault
-        original = (self.root / name).read_text()
+def plant_all(root, drawn, wanted):
+    build = ["ninja", "-C", root / "build"]
+    for name in files():
+        (root / name).parent.mkdir(parents=True, exist_ok=True)
+        shutil.copy(ROOT / name, root / name)
+    root.chmod(0o755)  # some scenarios run as another user
+    subprocess.check_call(["cmake", "-S", root, "-B", root / "build", "-G", "Ninja", "-DCMAKE_BUILD_TYPE=Debug",
+                           "-DCMAKE_CXX_FLAGS_DEBUG=-O0 -DNDEBUG -w", "-DCMAKE_GTEST_DISCOVER_TESTS_DISCOVERY_MODE=PRE_TEST"],
+                          stdout=subprocess.DEVNULL)
+    subprocess.check_call(build, stdout=subprocess.DEVNULL)
+    if not passes(root):
+        sys.exit("without any fault the tests fail")
+    counts = {"found": 0, "SURVIVED": 0, "did not compile": 0}
+    for name, number, line, changed in drawn:
+        if counts["found"] + counts["SURVIVED"] == wanted:
+            break
+        original = (root / name).read_text()
         lines = original.split("\n")
         lines[number] = changed
-        (self.root / name).write_text("\n".join(lines))
-        try:
-            return self.passes() if run(["ninja", "-C", self.build]) else None
-        finally:
-            (self.root / name).write_text(original)
+        (root / name).write_text("\n".join(lines))
+        outcome = "did not compile" if not run(build) else "SURVIVED" if passes(root) else "found"
+        (root / name).write_text(original)
+        counts[outcome] += 1
+        print(f"{outcome} {name}:{number + 1}\n  - {line}\n  + {changed}", flush=True)
+    return counts
 
 
 def main():
-    wanted, seed, workers = (int(text) for text in (sys.argv[1:] + ["150", "1", "1"][len(sys.argv) - 1:])[:3])
+    wanted, seed = (int(text) for text in (sys.argv[1:] + ["150", "1"][len(sys.argv) - 1:])[:2])
     drawn = sorted(faults())
     random.Random(seed).shuffle(drawn)
-    results, lock, local = [], threading.Lock(), threading.local()
-
-    def judge(fault):
-        if sum(survived is not None for survived in results) >= wanted:
-            return
-        if not hasattr(local, "copy"):
-            local.copy = Copy(parent)
-        survived = local.copy.survives(fault)
-        with lock:
-            results.append(survived)
-            if survived is not None:
-                name, number, line, changed = fault
-                print("SURVIVED" if survived else "found", f"{name}:{number + 1}", f"\n  - {line}\n  + {changed}", flush=True)
-
-    with tempfile.TemporaryDirectory() as parent, concurrent.futures.ThreadPoolExecutor(workers) as pool:
-        os.chmod(parent, 0o755)
-        list(pool.map(judge, drawn))
-    found, survived = results.count(False), results.count(True)
-    print(f"seed {seed}: {found} of {found + survived} found, {results.count(None)} did not compile")
+    with tempfile.TemporaryDirectory() as root:
+        print(f"seed {seed}:", plant_all(pathlib.Path(root), drawn, wanted))
 
 
 if __name__ == "__main__":

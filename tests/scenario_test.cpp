@@ -11,8 +11,7 @@ namespace
 
 std::string Lower(std::string text)
 {
-    for (char& character : text)
-        character = static_cast<char>(std::tolower(static_cast<unsigned char>(character)));
+    std::transform(text.begin(), text.end(), text.begin(), ::tolower);
     return text;
 }
 
@@ -83,10 +82,11 @@ std::string Difference(const std::string& expected, const std::string& actual)
     const auto [leftBegin, rightBegin] = std::mismatch(left.begin(), left.end(), right.begin(), right.end());
     const auto [leftEnd, rightEnd] =
         std::mismatch(left.rbegin(), std::make_reverse_iterator(leftBegin), right.rbegin(), std::make_reverse_iterator(rightBegin));
-    std::string text = "--- expected\n+++ actual\n@@ line " + std::to_string(leftBegin - left.begin() + 1) + " @@\n";
+    const auto number = 1 + std::count_if(left.begin(), leftBegin, [](const std::string& line) { return line.back() == '\n'; });
+    std::string text = "--- expected\n+++ actual\n@@ line " + std::to_string(number) + " @@\n";
     const auto add = [&](char sign, auto from, auto to)
     {
-        constexpr int Most = 20;
+        constexpr int Most = 10;
         for (int count = 0; from != to && count < Most; ++from, ++count)
             text += sign + Printable(*from) + "\n";
     };

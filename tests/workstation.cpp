@@ -3,9 +3,11 @@
 #include "tests/text_files.h"
 #include "tests/wine.h"
 
+#include <algorithm>
 #include <array>
 #include <cctype>
 #include <cstdlib>
+#include <sstream>
 #include <stdexcept>
 #include <sys/stat.h>
 #include <sys/xattr.h>
@@ -20,15 +22,8 @@ const char* const AttributeName = "user.DOSATTRIB";
 const std::string Link = "{link:";
 const std::string Fifo = "{fifo}";
 
-std::string WithDoubled(const std::string& text, char character)
-{
-    std::string result;
-    for (const char each : text)
-        result += std::string(each == character ? 2 : 1, each);
-    return result;
-}
-
-std::string Letters(const fs::path& path)
+// The letters of a file or directory, and its mode where that is asked for.
+std::string Attributes(const fs::path& path, bool withMode)
 {
     struct stat status = {};
     stat(path.c_str(), &status);
@@ -36,16 +31,11 @@ std::string Letters(const fs::path& path)
     getxattr(path.c_str(), AttributeName, text.data(), text.size() - 1);
     const unsigned long stored = std::strtoul(text.data(), nullptr, 16);
     const bool isReadOnly = S_ISDIR(status.st_mode) ? (stored & 1) != 0 : (status.st_mode & 0222) == 0;
-    return std::string(isReadOnly ? "R" : "") + ((stored & 2) != 0 ? "H" : "") + ((stored & 4) != 0 ? "S" : "");
-}
-
-std::string Mode(const fs::path& path)
-{
-    struct stat status = {};
-    stat(path.c_str(), &status);
-    std::array<char, 16> text{};
-    std::snprintf(text.data(), text.size(), "%o", status.st_mode & 07777U);
-    return " mode " + std::string(text.data());
+    std::ostringstream attributes;
+    attributes << (isReadOnly ? "R" : "") << ((stored & 2) != 0 ? "H" : "") << ((stored & 4) != 0 ? "S" : "");
+    if (withMode)
+        attributes << " mode " << std::oct << (status.st_mode & 07777U);
+    return attributes.str();
 }
 
 // Whether a path in an application data folder, which others use too, belongs to a scenario.
@@ -70,10 +60,6 @@ std::string ExpandedAt(const Workstation& workstation, const Files& files, const
 }
 
 } // namespace
-
-const char* const LogPlace = "user/ORX_Installers/UpgradeDowngrade.log";
-const char* const MachineHive = "machine/registry/HKEY_LOCAL_MACHINE.reg";
-const char* const UserHive = "user/registry/HKEY_CURRENT_USER.reg";
 
 bool IsWindowsProgram() { return !WindowsProgram().empty(); }
 
@@ -107,10 +93,9 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser)
     // In capitals as the registry editor's text has them.
     for (const auto& [token, value] : Files(m_tokens))
     {
-        std::string capitals = token;
-        for (char& character : capitals)
-            character = static_cast<char>(std::toupper(static_cast<unsigned char>(character)));
-        m_tokens[token == "{/}" ? "{/2}" : capitals] = WithDoubled(value, '\\');
+        std::string capitals = token == "{/}" ? "{/2}" : token;
+        std::transform(capitals.begin(), capitals.end(), capitals.begin(), ::toupper);
+        ReplaceAll(m_tokens[capitals] = value, "\\", "\\\\");
     }
 
     const fs::path built = TOOL_DIR;
@@ -285,7 +270,7 @@ Files Workstation::Snapshot() const
                 files[place + end] = Link + PlaceOf(fs::read_symlink(path)) + "}";
                 return;
             }
-            const std::string attributes = Letters(path) + (StartsWith(place, "elsewhere/") ? Mode(path) : "");
+            const std::string attributes = Attributes(path, StartsWith(place, "elsewhere/"));
             if (!attributes.empty())
                 files[place + "#"] = attributes;
             if (entry.is_fifo())

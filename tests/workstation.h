@@ -4,7 +4,7 @@
 //   hot/NAME/...    the hot folder of that name, [P] is its private directory
 //   user/...        the per-user application data folder; machine/... the machine-wide one
 //   tool/...        the folder of the executable
-//   elsewhere/...   files that are none of the workstation's business, as targets of links
+//   elsewhere/...   files that the tool has no reason to touch, as targets of links
 // A place that ends in a slash is a directory. One that ends in '#' is the attributes of the file or
 // directory before it, as letters: R read-only, H hidden, S system, X another user's, 0 no permission
 // at all ("hot/A/Desktop.ini#" -> "RS"). A snapshot of elsewhere/ has its modes there as well ("R mode 444").
@@ -38,9 +38,9 @@ struct RunResult
 
 class Wine;
 
-extern const char* const LogPlace;
-extern const char* const MachineHive;
-extern const char* const UserHive;
+inline const char* const LogPlace = "user/ORX_Installers/UpgradeDowngrade.log";
+inline const char* const MachineHive = "machine/registry/HKEY_LOCAL_MACHINE.reg";
+inline const char* const UserHive = "user/registry/HKEY_CURRENT_USER.reg";
 
 class Workstation
 {
