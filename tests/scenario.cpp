@@ -3,6 +3,8 @@
 #include "tests/scenarios/texts.h"
 #include "tests/text_files.h"
 
+#include <set>
+
 Scenario& Scenario::Add(Files& to, const Files& files)
 {
     for (const auto& [place, text] : files)
@@ -30,13 +32,12 @@ Files WorkstationBefore(const Scenario& scenario)
 {
     Files files = scenario.before;
     Text list = "<HotFolders>";
-    Text last;
+    std::set<Text> names;
     for (const auto& [place, text] : scenario.before)
     {
-        const Text name = StartsWith(place, "hot/") ? place.substr(4, place.find('/', 4) - 4) : "";
-        if (!name.empty() && name != last)
-            list += "<HotFolder path=\"{hot}{/}" + name + "\"/>";
-        last = name.empty() ? last : name;
+        const size_t end = place.find('/', 4);
+        if (StartsWith(place, "hot/") && end != Text::npos && names.insert(place.substr(4, end - 4)).second)
+            list += "<HotFolder path=\"{hot}{/}" + place.substr(4, end - 4) + "\"/>";
     }
     files.insert({{ListPlace, list + "</HotFolders>"},
                   {LogPlace, "The log of an earlier run\r\n"},

@@ -6,6 +6,7 @@ namespace
 
 const Text Ini = "hot/A/Desktop.ini";
 const Text Header = "[.ShellClassInfo]\r\n";
+const char* const WineLosesSystem = "Wine loses SYSTEM on a read-only file of a user who is not root";
 const Text InfoTip = "InfoTip=This folder has been configured as an ORX hot folder.\r\n";
 
 Text Icon(const Text& name) { return "hot/A/[P]/" + name + ".ico"; }
@@ -78,6 +79,20 @@ std::vector<Scenario> DesktopInis()
         refresh("AUtf16DesktopIniStaysUtf16", "{utf16}" + Header + "IconFile=ü.ico\r\nInfoTip=old\r\n", "RS",
                 "{utf16}" + Header + disabled + InfoTip),
         refresh("AnEmptyDesktopIniIsFilled", "", "RS", Header + InfoTip + disabled),
+        refresh("AReadOnlyDesktopIniOfTheUsersIsWritten", "", "RS", Header + InfoTip + disabled)
+            .AsOtherUser()
+            .NotUnderWine(WineLosesSystem),
+        refresh("AnothersDesktopIniStays", "[x]\r\n", "X", "[x]\r\n").After({{Ini + "#", ""}}).AsOtherUser().NotUnderWine(WineLosesSystem),
+        refresh("AReadOnlyIconIsReplaced", Header + InfoTip + disabled, "", Header + InfoTip + disabled)
+            .Before({{Icon("hf_folder_disabled") + "#", "R"}})
+            .After({{Icon("hf_folder_disabled") + "#", ""}})
+            .AsOtherUser()
+            .NotUnderWine("Wine refuses another user than root to replace it, as Windows does"),
+        Scenario("AnothersFolderStays")
+            .Before({{Icon("hf_folder_disabled"), "old"}, {Icon("hf_folder_disabled") + "#", "X"}, {"hot/A#", "X"}, {"hot/A/[P]#", "X"}})
+            .AsOtherUser()
+            .Log(FolderLines("A", 1, Copied("hf_folder_disabled"), NoCfg()))
+            .LibraryReports(),
     };
 }
 
