@@ -68,7 +68,8 @@ class Scenario
     Scenario& LogOfPreset(const std::string& line);
     /// The library itself reports an error, on Windows in a message box.
     Scenario& LibraryReports() { return Set(libraryReports, true); }
-    /// Limits of the run; that on memory is for this machine only, and neither is for a build with sanitizers.
+    /// Limits of the run; none in a build with sanitizers, and none on memory under Wine. What this
+    /// program holds when it starts the run, about 25 megabytes, is the least that is measured.
     Scenario& Within(double most, long mostMegabytes) { return Set(seconds, most).Set(megabytes, mostMegabytes); }
     /// Why it cannot hold there.
     Scenario& NotUnderWine(const std::string& reason) { return Set(notUnderWine, reason); }
