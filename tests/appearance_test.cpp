@@ -21,20 +21,11 @@ class Appearance : public testing::Test
         ShellVersionResult = 0;
     }
 
-    ~Appearance() override
-    {
-        wxFileName::Rmdir(m_folder, wxPATH_RMDIR_RECURSIVE);
-    }
+    ~Appearance() override { wxFileName::Rmdir(m_folder, wxPATH_RMDIR_RECURSIVE); }
 
-    wxString Ini() const
-    {
-        return m_folder + "/Desktop.ini";
-    }
+    wxString Ini() const { return m_folder + "/Desktop.ini"; }
 
-    void WriteIni(const wxString& text) const
-    {
-        wxFFile(Ini(), "wb").Write(text);
-    }
+    void WriteIni(const wxString& text) const { wxFFile(Ini(), "wb").Write(text); }
 
     wxString Text() const
     {
@@ -43,10 +34,7 @@ class Appearance : public testing::Test
         return text;
     }
 
-    static std::vector<std::string> Version()
-    {
-        return {"load shell32.dll", "find DllGetVersion", "free"};
-    }
+    static std::vector<std::string> Version() { return {"load shell32.dll", "find DllGetVersion", "free"}; }
 
     std::vector<std::string> Calls(bool isForced, const std::string& iconFile) const
     {

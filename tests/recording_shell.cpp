@@ -19,10 +19,7 @@ HRESULT GetVersion(DLLVERSIONINFO* version)
     return ShellVersionResult;
 }
 
-void Record(const wxString& call)
-{
-    ShellCalls.push_back(call.utf8_string());
-}
+void Record(const wxString& call) { ShellCalls.push_back(call.utf8_string()); }
 
 } // namespace
 

@@ -1,24 +1,113 @@
-// The table of end-to-end scenarios: a workstation before, the arguments, the workstation after.
+// The end-to-end scenarios: a workstation before, the command line, the workstation after.
+//
+//     Scenario("ADowngradeMovesTheTemplateBack").FolderCfg(Written(MovedTo), Written(MovedFrom)).Run({"U"}).LogOfA(Found(MovedTo))
+//
+// What a scenario does not mention has its usual value. In tests/scenarios/ there is one file for each
+// subject, and texts.h with the files and log lines that they are made of.
 #pragma once
 
 #include "tests/workstation.h"
 
+#include <gtest/gtest.h>
+
 #include <string>
 #include <vector>
 
-struct Scenario
+/// In Before: the usual file is not there.
+inline const char* const Removed = "(not there)";
+
+inline const char* const ListPlace = "machine/hotfolder/HotFolderList.cfg";
+inline const std::string CfgPlace = "hot/A/[P]/Folder.cfg";
+inline const std::string PresetPlace = "user/ORX/JPData/.P/Presets/presets.xml";
+
+/// What should happen, and where the scenario is in the source, which comes along with the literal.
+struct Name
 {
-    std::string name; // what should happen
-    Files before;
-    std::vector<std::string> arguments;
-    Files after;                        // what changes; every other file and attribute stays
-    std::string log;                    // the whole run log, with LF for CR LF; OldLog for one left alone
-    bool libraryLogs = false;           // the library itself reports an error, on Windows in a message box
-    bool asOtherUser = false;           // what is tested would not stop root
-    const char* notUnderWine = nullptr; // why the row cannot hold there
+    template <typename Text>
+    Name(const Text& text, const char* textFile = __builtin_FILE(), int textLine = __builtin_LINE())
+        : what(text), file(textFile), line(textLine)
+    {
+    }
+
+    std::string what;
+    const char* file;
+    int line;
 };
 
-/// Stands for the log of an earlier run, which every workstation has.
-extern const std::string OldLog;
+class Scenario
+{
+  public:
+    explicit Scenario(const Name& itsName) : name(itsName) {}
 
-std::vector<Scenario> Scenarios();
+    /// Files beside the usual ones, or in their place. The usual ones are the log of an earlier run, a
+    /// hive for each of the two template folders, a directory for presets without any, and
+    /// HotFolderList.cfg, which lists every NAME of the places hot/NAME/... in their order.
+    Scenario& Before(const Files& files) { return Add(before, files); }
+    /// The Folder.cfg of the hot folder A, and what it becomes; the same, if that is not given.
+    Scenario& FolderCfg(const std::string& text) { return Before({{CfgPlace, text}}); }
+    Scenario& FolderCfg(const std::string& text, const std::string& becomes) { return FolderCfg(text).After({{CfgPlace, becomes}}); }
+    /// The same for presets.xml of the one directory with presets.
+    Scenario& Preset(const std::string& text) { return Before({{PresetPlace, text}}); }
+    Scenario& Preset(const std::string& text, const std::string& becomes) { return Preset(text).After({{PresetPlace, becomes}}); }
+    /// For refusals, which would not stop root.
+    Scenario& AsOtherUser() { return Set(asOtherUser, true); }
+
+    /// The arguments of the command line; {"I"}, if not given.
+    Scenario& Run(const std::vector<std::string>& given) { return Set(arguments, given); }
+
+    /// Files that change. Every other file and attribute has to stay as it is.
+    Scenario& After(const Files& files) { return Add(after, files); }
+    /// The whole log, with LF for CR LF; if no log is given, that of the earlier run stays.
+    Scenario& WholeLog(const std::string& text) { return Set(log, text); }
+    /// The log of a run with these lines about the hot folders and the presets.
+    Scenario& Log(const std::string& folders, const std::string& presets = "");
+    /// The same, where A is the only hot folder, has no icon to replace, and these lines about its template.
+    Scenario& LogOfA(const std::string& impose, const std::string& presets = "", const std::string& icon = "hf_folder");
+    Scenario& LogOfDisabledA(const std::string& impose, const std::string& presets = "");
+    /// The same, where there are no hot folders and one preset, with this line.
+    Scenario& LogOfPreset(const std::string& line);
+    /// The library itself reports an error, on Windows in a message box.
+    Scenario& LibraryReports() { return Set(libraryReports, true); }
+    /// Limits of the run; none in a build with sanitizers, and none on memory under Wine. What this
+    /// program holds when it starts the run, about 25 megabytes, is the least that is measured.
+    Scenario& Within(double most, long mostMegabytes) { return Set(seconds, most).Set(megabytes, mostMegabytes); }
+    /// Why it cannot hold there.
+    Scenario& NotUnderWine(const std::string& reason) { return Set(notUnderWine, reason); }
+
+    Name name;
+    Files before;
+    std::vector<std::string> arguments = {"I"};
+    Files after;
+    std::string log; // empty for that of the earlier run
+    bool libraryReports = false;
+    bool asOtherUser = false;
+    std::string notUnderWine;
+    double seconds = 0; // 0 for no limit
+    long megabytes = 0;
+
+  private:
+    template <typename Field>
+    Scenario& Set(Field& field, const Field& value)
+    {
+        field = value;
+        return *this;
+    }
+
+    Scenario& Add(Files& to, const Files& files);
+};
+
+/// Everything on the workstation before the run, the usual files included.
+Files WorkstationBefore(const Scenario& scenario);
+/// The whole log after the run; empty for that of the earlier run.
+std::string LogAfter(const Scenario& scenario);
+
+class Workstations : public testing::TestWithParam<Scenario>
+{
+};
+
+std::string NameOf(const testing::TestParamInfo<Scenario>& scenario);
+/// What GoogleTest prints in place of the scenario's bytes.
+void PrintTo(const Scenario& scenario, std::ostream* stream);
+
+/// Makes the scenarios of the function tests of the same name.
+#define TEST_SCENARIOS(function) INSTANTIATE_TEST_SUITE_P(function, Workstations, testing::ValuesIn(function()), NameOf)

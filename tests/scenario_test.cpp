@@ -1,43 +1,25 @@
 #include "tests/scenario.h"
-
-#include <gtest/gtest.h>
+#include "tests/text_files.h"
 
 #include <algorithm>
 #include <cctype>
+#include <iomanip>
 #include <sstream>
 
 namespace
 {
 
-class Workstations : public testing::TestWithParam<Scenario>
-{
-};
-
 std::string Lower(std::string text)
 {
-    for (char& character : text)
-        character = static_cast<char>(std::tolower(static_cast<unsigned char>(character)));
+    std::transform(text.begin(), text.end(), text.begin(), ::tolower);
     return text;
 }
 
-std::string WithLineEnds(const std::string& text)
+std::string WithLineEnds(std::string text)
 {
-    std::string result;
-    for (const char character : text)
-        result += character == '\n' ? std::string("\r\n") : std::string(1, character);
-    return result;
-}
-
-Files Expected(const Workstation& workstation, const Files& before, const Scenario& scenario)
-{
-    Files expected = before;
-    for (const auto& [place, text] : scenario.after)
-        expected[place] = place.back() == '#' ? text : workstation.Expand(text);
-    for (auto entry = expected.begin(); entry != expected.end();)
-        entry = entry->first.back() == '#' && entry->second.empty() ? expected.erase(entry) : std::next(entry);
-    if (scenario.log != OldLog)
-        expected[LogPlace] = workstation.Expand(WithLineEnds(scenario.log));
-    return expected;
+    for (size_t at = text.find('\n'); at != std::string::npos; at = text.find('\n', at + 2))
+        text.insert(at, 1, '\r');
+    return text;
 }
 
 // The sections, keys and values of a profile file, which Wine rewrites whole; it also adds a key of
@@ -45,7 +27,7 @@ Files Expected(const Workstation& workstation, const Files& before, const Scenar
 std::string Meaning(const std::string& profile)
 {
     std::map<std::string, std::string> values;
-    const bool isUtf16 = profile.compare(0, 2, "\xFF\xFE") == 0;
+    const bool isUtf16 = StartsWith(profile, "\xFF\xFE");
     std::string text = profile.substr(isUtf16 ? 2 : 0);
     text.erase(std::remove(text.begin(), text.end(), '\0'), text.end()); // what is UTF-16 here is of ASCII
     std::istringstream lines(text);
@@ -67,72 +49,164 @@ std::string Meaning(const std::string& profile)
     return meaning;
 }
 
-void ExpectText(const std::string& expected, const std::string& actual, const std::string& place, const char* when)
+// The lines of a text with their ends, long ones in pieces.
+std::vector<std::string> Lines(const std::string& text)
 {
-    if (IsWindowsProgram() && place.find("Desktop.ini") != std::string::npos && place.back() != '#')
-        EXPECT_EQ(Meaning(expected), Meaning(actual)) << when << ": " << place;
-    else
-        EXPECT_EQ(expected, actual) << when << ": " << place;
+    constexpr size_t Longest = 200;
+    std::vector<std::string> lines;
+    for (size_t at = 0; at < text.size(); at += lines.back().size())
+        lines.push_back(text.substr(at, std::min(text.find('\n', at), at + Longest - 1) - at + 1));
+    return lines;
 }
 
-void Compare(const Files& expected, const Files& actual, const char* when)
+std::string Printable(const std::string& text)
+{
+    std::ostringstream result;
+    for (const char character : text)
+    {
+        if (character >= ' ' && character <= '~')
+            result << character;
+        else if (character == '\r' || character == '\n')
+            result << (character == '\r' ? "\\r" : "\\n");
+        else
+            result << "\\x" << std::hex << std::setw(2) << std::setfill('0') << (character & 0xFF);
+    }
+    return result.str();
+}
+
+// The lines from the first to the last that differ, with one more on both sides.
+std::string Difference(const std::string& expected, const std::string& actual)
+{
+    const std::vector<std::string> left = Lines(expected);
+    const std::vector<std::string> right = Lines(actual);
+    const auto [leftBegin, rightBegin] = std::mismatch(left.begin(), left.end(), right.begin(), right.end());
+    const auto [leftEnd, rightEnd] =
+        std::mismatch(left.rbegin(), std::make_reverse_iterator(leftBegin), right.rbegin(), std::make_reverse_iterator(rightBegin));
+    const auto number = 1 + std::count_if(left.begin(), leftBegin, [](const std::string& line) { return line.back() == '\n'; });
+    std::string text = "--- expected\n+++ actual\n@@ line " + std::to_string(number) + " @@\n";
+    const auto add = [&](char sign, auto from, auto to)
+    {
+        constexpr int Most = 10;
+        for (int count = 0; from != to && count < Most; ++from, ++count)
+            text += sign + Printable(*from) + "\n";
+    };
+    add(' ', leftBegin - (leftBegin == left.begin() ? 0 : 1), leftBegin);
+    add('-', leftBegin, leftEnd.base());
+    add('+', rightBegin, rightEnd.base());
+    add(' ', leftEnd.base(), leftEnd.base() + (leftEnd == left.rbegin() ? 0 : 1));
+    return text;
+}
+
+Files Expected(const Workstation& workstation, const Files& before, const Scenario& scenario)
+{
+    Files expected = before;
+    for (const auto& [place, text] : scenario.after)
+        expected[place] = place.back() == '#' ? text : workstation.Expand(text);
+    if (!scenario.log.empty())
+        expected[LogPlace] = workstation.Expand(WithLineEnds(LogAfter(scenario)));
+    for (auto entry = expected.begin(); entry != expected.end();)
+    {
+        workstation.HostPath(entry->first);
+        const std::string owner = entry->first.substr(0, entry->first.size() - 1);
+        const bool isAttributes = entry->first.back() == '#';
+        if (isAttributes && expected.count(owner) + expected.count(owner + "/") == 0)
+            ADD_FAILURE() << entry->first << " has the attributes of nothing";
+        entry = isAttributes && entry->second.empty() ? expected.erase(entry) : std::next(entry);
+    }
+    return expected;
+}
+
+void Compare(const Files& expected, const Files& actual, const std::string& when)
 {
     for (const auto& [place, text] : expected)
     {
-        if (actual.count(place) == 0)
-            ADD_FAILURE() << when << ": " << place << " is missing";
-        else
-            ExpectText(text, actual.at(place), place, when);
+        const auto found = actual.find(place);
+        if (found == actual.end())
+        {
+            ADD_FAILURE() << place << " is missing " << when;
+            continue;
+        }
+        const bool isMeaning = IsWindowsProgram() && place.find("Desktop.ini") != std::string::npos && place.back() != '#';
+        const std::string& wanted = isMeaning ? Meaning(text) : text;
+        const std::string& got = isMeaning ? Meaning(found->second) : found->second;
+        if (wanted != got)
+            ADD_FAILURE() << place << " " << when << ":\n" << Difference(wanted, got);
     }
     for (const auto& [place, text] : actual)
     {
-        EXPECT_EQ(1U, expected.count(place)) << when << ": " << place << " is new:\n" << text;
+        if (expected.count(place) == 0)
+            ADD_FAILURE() << place << " is new " << when << ":\n" << Difference("", text);
     }
 }
 
-// A second run in the same direction finds nothing to move.
-void CompareFolderCfgs(const Files& first, const Files& second)
+Files FolderCfgsOf(Files files)
 {
-    for (const auto& [place, text] : first)
-    {
-        if (place.find("Folder.cfg") != std::string::npos)
-        {
-            EXPECT_EQ(text, second.at(place)) << "after a second run: " << place;
-        }
-    }
+    for (auto file = files.begin(); file != files.end();)
+        file = file->first.find("Folder.cfg") == std::string::npos ? files.erase(file) : std::next(file);
+    return files;
 }
 
-std::string NameOf(const testing::TestParamInfo<Scenario>& info)
+constexpr bool HasSanitizer()
 {
-    return info.param.name;
+#if defined(__SANITIZE_ADDRESS__)
+    return true;
+#elif defined(__has_feature)
+    return __has_feature(address_sanitizer);
+#else
+    return false;
+#endif
 }
 
-} // namespace
-
-TEST_P(Workstations, IsAsExpectedAfterTheRun)
+void RunAndCompare(const Scenario& scenario)
 {
-    const Scenario& scenario = GetParam();
-    if (IsWindowsProgram() && scenario.notUnderWine)
-        GTEST_SKIP() << scenario.notUnderWine;
     Workstation workstation(scenario.asOtherUser);
-    workstation.LayOut(scenario.before);
+    workstation.LayOut(WorkstationBefore(scenario));
     const Files before = workstation.Snapshot();
 
     const RunResult run = workstation.Start(scenario.arguments);
-    EXPECT_EQ(255, run.exitStatus) << run.libraryLog;
-    EXPECT_EQ(scenario.libraryLogs, !run.libraryLog.empty()) << run.libraryLog;
+    EXPECT_EQ(255, run.process.exitStatus) << run.libraryLog;
+    EXPECT_EQ(scenario.libraryReports, !run.libraryLog.empty()) << run.libraryLog;
+    if (scenario.seconds > 0 && !HasSanitizer())
+    {
+        EXPECT_LE(run.process.seconds, scenario.seconds);
+        EXPECT_TRUE(IsWindowsProgram() || run.process.megabytes <= scenario.megabytes) << run.process.megabytes << " megabytes";
+    }
     const Files after = workstation.Snapshot();
-    if (IsWindowsProgram() && scenario.libraryLogs)
+    if (IsWindowsProgram() && scenario.libraryReports)
     {
         // One box, after everything was done.
         EXPECT_EQ("A message box, with the run log\n" + after.at(LogPlace), run.libraryLog);
     }
     Compare(Expected(workstation, before, scenario), after, "after the run");
 
+    // A second run in the same direction finds nothing to move.
     if (IsWindowsProgram())
         return;
-    EXPECT_EQ(255, workstation.Start(scenario.arguments).exitStatus);
-    CompareFolderCfgs(after, workstation.Snapshot());
+    EXPECT_EQ(255, workstation.Start(scenario.arguments).process.exitStatus);
+    Compare(FolderCfgsOf(after), FolderCfgsOf(workstation.Snapshot()), "after a second run");
 }
 
-INSTANTIATE_TEST_SUITE_P(All, Workstations, testing::ValuesIn(Scenarios()), NameOf);
+} // namespace
+
+std::string NameOf(const testing::TestParamInfo<Scenario>& scenario) { return scenario.param.name.what; }
+
+void PrintTo(const Scenario& scenario, std::ostream* stream) { *stream << scenario.name.what; }
+
+TEST_P(Workstations, IsAsExpectedAfterTheRun)
+{
+    const Scenario& scenario = GetParam();
+    std::string description = scenario.name.what + ": FolderUpgrade";
+    for (const std::string& argument : scenario.arguments)
+        description += " " + argument;
+    if (IsWindowsProgram() && !scenario.notUnderWine.empty())
+        GTEST_SKIP() << scenario.notUnderWine;
+    const testing::ScopedTrace trace(scenario.name.file, scenario.name.line, description);
+    try
+    {
+        RunAndCompare(scenario);
+    }
+    catch (const std::exception& exception)
+    {
+        FAIL() << exception.what();
+    }
+}

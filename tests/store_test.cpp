@@ -5,6 +5,7 @@
 #include "store/xml_tree.h"
 
 #include <gtest/gtest.h>
+#include <wx/arrstr.h>
 #include <wx/ffile.h>
 #include <wx/filename.h>
 #include <wx/log.h>
@@ -18,14 +19,9 @@ namespace
 class Store : public testing::Test
 {
   protected:
-    Store() : m_path(wxFileName::CreateTempFileName("store"))
-    {
-    }
+    Store() : m_path(wxFileName::CreateTempFileName("store")) {}
 
-    ~Store() override
-    {
-        wxRemoveFile(m_path);
-    }
+    ~Store() override { wxRemoveFile(m_path); }
 
     const wxString& File(const wxString& text)
     {
@@ -59,27 +55,11 @@ class Store : public testing::Test
 TEST_F(Store, TheChainOfAttributesEndsAtTheFirstGap)
 {
     // The chain in the order in which it is read; server_version stands outside it.
-    const std::vector<wxString> chain = {"name",
-                                         "description",
-                                         "server_ip",
-                                         "server_name",
-                                         "Enable",
-                                         "BaseVirtualPrinter",
-                                         "BaseVirtualPrinterName",
-                                         "BaseVirtualPrinterDisplayName",
-                                         "HFPresetName",
-                                         "Centralized",
-                                         "Isjobpresetattached",
-                                         "IsCustomInterval",
-                                         "TimeInterval",
-                                         "PPDVersion",
-                                         "ServerTypeAndJPDefaultKeyInfo",
-                                         "server_textversion",
-                                         "server_type",
-                                         "Quickset",
-                                         "Quickset_Supported",
-                                         "Quickset_Enabled",
-                                         "IsWidthBased"};
+    const wxArrayString chain =
+        wxSplit("name description server_ip server_name Enable BaseVirtualPrinter BaseVirtualPrinterName BaseVirtualPrinterDisplayName "
+                "HFPresetName Centralized Isjobpresetattached IsCustomInterval TimeInterval PPDVersion ServerTypeAndJPDefaultKeyInfo "
+                "server_textversion server_type Quickset Quickset_Supported Quickset_Enabled IsWidthBased",
+                ' ');
     for (size_t gap = 0; gap <= chain.size(); ++gap)
     {
         wxString attributes;

@@ -1,14 +1,11 @@
 #include "tests/wine.h"
 
-#include "tests/process.h"
 #include "tests/text_files.h"
 
-#include <chrono>
 #include <cstdlib>
+#include <fstream>
+#include <iterator>
 #include <stdexcept>
-#include <sys/wait.h>
-#include <thread>
-#include <unistd.h>
 
 namespace fs = std::filesystem;
 
@@ -30,12 +27,16 @@ bool PressButton()
                        ">/dev/null 2>&1") == 0;
 }
 
+// Empty while the run is replacing the file.
+std::string TextIfThere(const fs::path& path)
+{
+    std::ifstream file(path, std::ios::binary);
+    return {std::istreambuf_iterator<char>(file), {}};
+}
+
 } // namespace
 
-fs::path WindowsProgram()
-{
-    return FromEnvironment("FOLDER_UPGRADE_WINDOWS_PROGRAM");
-}
+fs::path WindowsProgram() { return FromEnvironment("FOLDER_UPGRADE_WINDOWS_PROGRAM"); }
 
 Wine::Wine(bool asOtherUser, const fs::path& driveH)
     : m_asOtherUser(asOtherUser),
@@ -49,20 +50,13 @@ Wine::Wine(bool asOtherUser, const fs::path& driveH)
         fs::remove_all(left);
 }
 
-fs::path Wine::UserDataDir() const
-{
-    return m_prefix / "drive_c/users" / (m_asOtherUser ? "nobody" : "root") / "AppData/Roaming";
-}
+std::string Wine::UserName() const { return m_asOtherUser ? "nobody" : "root"; }
 
-fs::path Wine::MachineDataDir() const
-{
-    return m_prefix / "drive_c/ProgramData";
-}
+fs::path Wine::UserDataDir() const { return m_prefix / "drive_c/users" / UserName() / "AppData/Roaming"; }
 
-std::string Wine::UserDataPath() const
-{
-    return std::string("C:\\users\\") + (m_asOtherUser ? "nobody" : "root") + "\\AppData\\Roaming";
-}
+fs::path Wine::MachineDataDir() const { return m_prefix / "drive_c/ProgramData"; }
+
+std::string Wine::UserDataPath() const { return std::string("C:\\users\\") + UserName() + "\\AppData\\Roaming"; }
 
 void Wine::ImportHives(const std::string& machineHive, const std::string& userHive) const
 {
@@ -80,41 +74,26 @@ void Wine::ImportHives(const std::string& machineHive, const std::string& userHi
         return;
     WriteFile(m_driveH / "hives.reg", ToUtf16(text));
     std::vector<std::string> boxes;
-    if (Start({"regedit", "/S", "H:\\hives.reg"}, m_driveH / "hives.reg", boxes) != 0)
+    if (Start({"regedit", "/S", "H:\\hives.reg"}, "/dev/null", m_driveH / "hives.reg", boxes).exitStatus != 0)
         throw std::runtime_error("the hives were not imported");
     imported[m_asOtherUser] = text;
     fs::remove(m_driveH / "hives.reg");
 }
 
-int Wine::Start(const std::vector<std::string>& commandLine, const fs::path& watched, std::vector<std::string>& boxes) const
+ProcessResult Wine::Start(const std::vector<std::string>& commandLine, const fs::path& output, const fs::path& watched,
+                          std::vector<std::string>& boxes) const
 {
-    const pid_t child = fork();
-    if (child == 0)
-    {
-        setenv("WINEPREFIX", m_prefix.c_str(), 1);
-        setenv("HOME", m_prefix.c_str(), 1);
-        setenv("LC_ALL", "C.UTF-8", 1);
-        setenv("USER", m_asOtherUser ? "nobody" : "root", 1);
-        std::vector<std::string> arguments = {Loader};
-        arguments.insert(arguments.end(), commandLine.begin(), commandLine.end());
-        Become(arguments, m_asOtherUser);
-    }
-    int status = 0;
-    const auto start = std::chrono::steady_clock::now();
-    const auto elapsed = [&]()
-    {
-        return std::chrono::steady_clock::now() - start;
-    };
-    while (waitpid(child, &status, WNOHANG) == 0)
-    {
-        std::this_thread::sleep_for(std::chrono::milliseconds(elapsed() < std::chrono::seconds(1) ? 10 : 100));
-        if (elapsed() > std::chrono::seconds(1))
-        {
-            const std::string text = ReadFile(watched);
-            // One box may have to be pressed more than once.
-            if (PressButton() && (boxes.empty() || boxes.back() != text))
-                boxes.push_back(text);
-        }
-    }
-    return WIFEXITED(status) ? WEXITSTATUS(status) : -WTERMSIG(status);
+    Process process = {
+        {Loader}, {{"WINEPREFIX", m_prefix}, {"HOME", m_prefix}, {"LC_ALL", "C.UTF-8"}, {"USER", UserName()}}, m_asOtherUser, output, {}};
+    process.commandLine.insert(process.commandLine.end(), commandLine.begin(), commandLine.end());
+    return RunToTheEnd(process,
+                       [&](double seconds)
+                       {
+                           if (seconds <= 1)
+                               return;
+                           const std::string text = TextIfThere(watched);
+                           // One box may have to be pressed more than once.
+                           if (PressButton() && (boxes.empty() || boxes.back() != text))
+                               boxes.push_back(text);
+                       });
 }

@@ -2,6 +2,8 @@
 // Wine provides. Two prefixes serve, root's and another user's, since Wine refuses root nothing.
 #pragma once
 
+#include "tests/process.h"
+
 #include <filesystem>
 #include <string>
 #include <vector>
@@ -22,12 +24,14 @@ class Wine
     /// Makes the keys of the two hives in the registry editor's text form the only ones.
     void ImportHives(const std::string& machineHive, const std::string& userHive) const;
 
-    /// Starts a program and presses the button of every message box. Gives the exit status as a
-    /// shell sees it; the text of the watched file while a box is there goes into boxes, once for
-    /// as long as it stays the same.
-    int Start(const std::vector<std::string>& commandLine, const std::filesystem::path& watched, std::vector<std::string>& boxes) const;
+    /// Starts a program and presses the button of every message box. The text of the watched file
+    /// while a box is there goes into boxes, once for as long as it stays the same.
+    ProcessResult Start(const std::vector<std::string>& commandLine, const std::filesystem::path& output,
+                        const std::filesystem::path& watched, std::vector<std::string>& boxes) const;
 
   private:
+    std::string UserName() const;
+
     bool m_asOtherUser;
     std::filesystem::path m_prefix;
     std::filesystem::path m_driveH;

@@ -1,17 +1,15 @@
 #include "tests/workstation.h"
 
-#include "tests/process.h"
 #include "tests/text_files.h"
 #include "tests/wine.h"
 
+#include <algorithm>
 #include <array>
 #include <cctype>
-#include <cstdio>
 #include <cstdlib>
-#include <fcntl.h>
+#include <sstream>
 #include <stdexcept>
 #include <sys/stat.h>
-#include <sys/wait.h>
 #include <sys/xattr.h>
 #include <unistd.h>
 
@@ -21,30 +19,23 @@ namespace
 {
 
 const char* const AttributeName = "user.DOSATTRIB";
+const std::string Link = "{link:";
+const std::string Fifo = "{fifo}";
 
-std::string WithDoubled(const std::string& text, char character)
-{
-    std::string result;
-    for (const char each : text)
-        result += std::string(each == character ? 2 : 1, each);
-    return result;
-}
-
-unsigned long StoredAttributes(const fs::path& path)
-{
-    std::array<char, 16> text{};
-    getxattr(path.c_str(), AttributeName, text.data(), text.size() - 1);
-    return std::strtoul(text.data(), nullptr, 16);
-}
-
-std::string Letters(const fs::path& path)
+// The letters of a file or directory, and its mode where that is asked for.
+std::string Attributes(const fs::path& path, bool withMode)
 {
     struct stat status = {};
     stat(path.c_str(), &status);
-    const unsigned long stored = StoredAttributes(path);
-    const bool isDirectory = S_ISDIR(status.st_mode);
-    const bool isReadOnly = isDirectory ? (stored & 1) != 0 : (status.st_mode & 0222) == 0;
-    return std::string(isReadOnly ? "R" : "") + ((stored & 2) != 0 ? "H" : "") + ((stored & 4) != 0 ? "S" : "");
+    std::array<char, 16> text{};
+    getxattr(path.c_str(), AttributeName, text.data(), text.size() - 1);
+    const unsigned long stored = std::strtoul(text.data(), nullptr, 16);
+    const bool isReadOnly = S_ISDIR(status.st_mode) ? (stored & 1) != 0 : (status.st_mode & 0222) == 0;
+    std::ostringstream attributes;
+    attributes << (isReadOnly ? "R" : "") << ((stored & 2) != 0 ? "H" : "") << ((stored & 4) != 0 ? "S" : "");
+    if (withMode)
+        attributes << " mode " << std::oct << (status.st_mode & 07777U);
+    return attributes.str();
 }
 
 // Whether a path in an application data folder, which others use too, belongs to a scenario.
@@ -53,6 +44,8 @@ bool IsOurs(const std::string& path)
     const std::string top = path.substr(0, path.find('/'));
     return top == "ORX" || top == "ORX_Installers" || top == "hotfolder" || top == "registry";
 }
+
+std::string ProgramFile(const std::string& program) { return IsWindowsProgram() ? program + ".exe" : program; }
 
 void GiveAway(const fs::path& path)
 {
@@ -68,14 +61,7 @@ std::string ExpandedAt(const Workstation& workstation, const Files& files, const
 
 } // namespace
 
-const char* const LogPlace = "user/ORX_Installers/UpgradeDowngrade.log";
-const char* const MachineHive = "machine/registry/HKEY_LOCAL_MACHINE.reg";
-const char* const UserHive = "user/registry/HKEY_CURRENT_USER.reg";
-
-bool IsWindowsProgram()
-{
-    return !WindowsProgram().empty();
-}
+bool IsWindowsProgram() { return !WindowsProgram().empty(); }
 
 Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser)
 {
@@ -87,7 +73,8 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser)
     m_hostDirs = {{"hot", m_root / "Hot Folders"},
                   {"user", m_root / "user data"},
                   {"machine", m_root / "machine data"},
-                  {"tool", m_root / "Tool Größe"}};
+                  {"tool", m_root / "Tool Größe"},
+                  {"elsewhere", m_root / "elsewhere"}};
     if (IsWindowsProgram())
     {
         m_wine = std::make_unique<Wine>(asOtherUser, m_root);
@@ -106,16 +93,18 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser)
     // In capitals as the registry editor's text has them.
     for (const auto& [token, value] : Files(m_tokens))
     {
-        std::string capitals = token;
-        for (char& character : capitals)
-            character = static_cast<char>(std::toupper(static_cast<unsigned char>(character)));
-        m_tokens[token == "{/}" ? "{/2}" : capitals] = WithDoubled(value, '\\');
+        std::string capitals = token == "{/}" ? "{/2}" : token;
+        std::transform(capitals.begin(), capitals.end(), capitals.begin(), ::toupper);
+        ReplaceAll(m_tokens[capitals] = value, "\\", "\\\\");
     }
 
     const fs::path built = TOOL_DIR;
+    const fs::path programs = IsWindowsProgram() ? WindowsProgram().parent_path() : built;
     fs::create_directories(m_hostDirs["tool"]);
     fs::create_directories(m_root / "Vorige 版");
-    fs::copy(IsWindowsProgram() ? WindowsProgram() : built / "FolderUpgrade", m_hostDirs["tool"]);
+    fs::copy(programs / ProgramFile("FolderUpgrade"), m_hostDirs["tool"]);
+    if (fs::exists(programs / ProgramFile("FolderUpgradeCheck")))
+        fs::copy(programs / ProgramFile("FolderUpgradeCheck"), m_hostDirs["tool"]);
     fs::copy(built / "BundleIcons", m_hostDirs["tool"] / "BundleIcons");
     for (const auto& icon : fs::directory_iterator(built / "BundleIcons"))
         fs::copy(icon, m_hostDirs["tool"]);
@@ -124,21 +113,32 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser)
 Workstation::~Workstation()
 {
     std::error_code ignored;
-    for (auto entry = fs::recursive_directory_iterator(m_root, ignored); entry != fs::recursive_directory_iterator();
-         entry.increment(ignored))
-    {
-        if (entry->is_directory(ignored))
-            fs::permissions(entry->path(), fs::perms::owner_all, fs::perm_options::add, ignored);
-    }
     fs::remove_all(m_root, ignored);
 }
 
 fs::path Workstation::HostPath(const std::string& place) const
 {
     const size_t slash = place.find('/');
+    const auto top = m_hostDirs.find(place.substr(0, slash));
+    if (slash == std::string::npos || slash + 1 == place.size() || top == m_hostDirs.end())
+        throw std::runtime_error("\"" + place + "\" is no place on the workstation");
     std::string rest = place.substr(slash + 1);
     ReplaceAll(rest, "[P]", "[_ORX_HotFolder_]");
-    return m_hostDirs.at(place.substr(0, slash)) / rest;
+    return top->second / rest;
+}
+
+// The place of a path, and the path itself where it has none.
+std::string Workstation::PlaceOf(const fs::path& path) const
+{
+    for (const auto& [name, directory] : m_hostDirs)
+    {
+        if (!StartsWith(path.string(), directory.string() + "/"))
+            continue;
+        std::string place = name + path.string().substr(directory.string().size());
+        ReplaceAll(place, "[_ORX_HotFolder_]", "[P]");
+        return place;
+    }
+    return path.string();
 }
 
 std::string Workstation::Expand(std::string text) const
@@ -146,7 +146,7 @@ std::string Workstation::Expand(std::string text) const
     for (const auto& [token, value] : m_tokens)
         ReplaceAll(text, token, value);
     const std::string utf16 = "{utf16}";
-    if (text.compare(0, utf16.size(), utf16) == 0)
+    if (StartsWith(text, utf16))
         return ToUtf16(text.substr(utf16.size()));
     const size_t icon = text.find("{icon:");
     if (icon != std::string::npos)
@@ -158,10 +158,7 @@ void Workstation::SetAttributes(const std::string& place, const std::string& let
 {
     const fs::path path = HostPath(place);
     const bool isDirectory = fs::is_directory(path);
-    const auto has = [&](char letter)
-    {
-        return letters.find(letter) != std::string::npos;
-    };
+    const auto has = [&](char letter) { return letters.find(letter) != std::string::npos; };
     const unsigned stored = (has('H') ? 2U : 0U) | (has('S') ? 4U : 0U) | (has('R') && isDirectory ? 1U : 0U);
     const std::string text = "0x" + std::to_string(stored);
     if (stored != 0 && setxattr(path.c_str(), AttributeName, text.data(), text.size(), 0) != 0)
@@ -181,25 +178,39 @@ void Workstation::ForEachEntry(Visit visit) const
     {
         if (!fs::exists(directory))
             continue;
+        const bool isShared = name == "user" || name == "machine";
         for (const auto& entry : fs::recursive_directory_iterator(directory))
         {
-            const std::string path = fs::relative(entry.path(), directory).string();
-            std::string place = name + "/" + path;
-            ReplaceAll(place, "[_ORX_HotFolder_]", "[P]");
-            if (name == "hot" || name == "tool" || IsOurs(path))
-                visit(place, entry);
+            if (!isShared || IsOurs(fs::relative(entry.path(), directory).string()))
+                visit(PlaceOf(entry.path()), entry);
         }
     }
+}
+
+void Workstation::Put(const std::string& place, const std::string& text) const
+{
+    const bool isDirectory = place.back() == '/';
+    const fs::path path = HostPath(isDirectory ? place.substr(0, place.size() - 1) : place);
+    fs::create_directories(path.parent_path());
+    if (StartsWith(text, Link))
+    {
+        const std::string target = Expand(text.substr(Link.size(), text.rfind('}') - Link.size()));
+        fs::create_symlink(target[0] == '/' ? fs::path(target) : HostPath(target), path);
+    }
+    else if (isDirectory)
+        fs::create_directories(path);
+    else if (text != Fifo)
+        WriteFile(path, Expand(text));
+    else if (mkfifo(path.c_str(), 0644) != 0)
+        throw std::runtime_error("no FIFO at " + place);
 }
 
 void Workstation::LayOut(const Files& files)
 {
     for (const auto& [place, text] : files)
     {
-        if (place.back() == '/')
-            fs::create_directories(HostPath(place));
-        else if (place.back() != '#')
-            WriteFile(HostPath(place), Expand(text));
+        if (place.back() != '#')
+            Put(place, text);
     }
     if (geteuid() == 0 && m_asOtherUser)
     {
@@ -216,36 +227,33 @@ void Workstation::LayOut(const Files& files)
     }
 }
 
-RunResult Workstation::Start(const std::vector<std::string>& arguments)
+RunResult Workstation::Start(const std::vector<std::string>& arguments, const std::string& program)
 {
     RunResult run;
+    const fs::path output = m_root / "output";
+    std::vector<std::string> commandLine = {(m_wine ? m_tokens["{tool}"] + "\\" : m_hostDirs["tool"].string() + "/") +
+                                            ProgramFile(program)};
+    commandLine.insert(commandLine.end(), arguments.begin(), arguments.end());
     if (m_wine)
     {
-        std::vector<std::string> commandLine = {m_tokens["{tool}"] + "\\FolderUpgrade.exe"};
-        commandLine.insert(commandLine.end(), arguments.begin(), arguments.end());
         std::vector<std::string> boxes;
-        run.exitStatus = m_wine->Start(commandLine, HostPath(LogPlace), boxes);
+        run.process = m_wine->Start(commandLine, output, HostPath(LogPlace), boxes);
         for (const std::string& logAtBox : boxes)
             run.libraryLog += "A message box, with the run log\n" + logAtBox;
-        return run;
     }
-    const fs::path errors = m_root / "errors";
-    std::vector<std::string> commandLine = {m_hostDirs["tool"] / "FolderUpgrade"};
-    commandLine.insert(commandLine.end(), arguments.begin(), arguments.end());
-    const pid_t child = fork();
-    if (child == 0)
+    else
     {
-        setenv("XDG_CONFIG_HOME", m_hostDirs["user"].c_str(), 1);
-        setenv("XDG_CONFIG_DIRS", (m_hostDirs["machine"].string() + ":/nowhere").c_str(), 1);
-        setenv("LC_ALL", "C", 1);
-        if (!std::freopen(errors.c_str(), "w", stderr))
-            _exit(125);
-        Become(commandLine, m_asOtherUser);
+        const fs::path errors = m_root / "errors";
+        run.process = RunToTheEnd({commandLine,
+                                   {{"XDG_CONFIG_HOME", m_hostDirs["user"].string()},
+                                    {"XDG_CONFIG_DIRS", m_hostDirs["machine"].string() + ":/nowhere"},
+                                    {"LC_ALL", "C"}},
+                                   m_asOtherUser,
+                                   output,
+                                   errors});
+        run.libraryLog = ReadFile(errors);
     }
-    int status = 0;
-    waitpid(child, &status, 0);
-    run.exitStatus = WIFEXITED(status) ? WEXITSTATUS(status) : -WTERMSIG(status);
-    run.libraryLog = ReadFile(errors);
+    run.output = ReadFile(output);
     return run;
 }
 
@@ -255,13 +263,22 @@ Files Workstation::Snapshot() const
     ForEachEntry(
         [&](const std::string& place, const fs::directory_entry& entry)
         {
-            const std::string letters = Letters(entry.path());
-            if (!letters.empty())
-                files[place + "#"] = letters;
-            if (entry.is_directory())
-                files[place + "/"];
+            const fs::path& path = entry.path();
+            const std::string end = entry.is_directory() ? "/" : "";
+            if (entry.is_symlink())
+            {
+                files[place + end] = Link + PlaceOf(fs::read_symlink(path)) + "}";
+                return;
+            }
+            const std::string attributes = Attributes(path, StartsWith(place, "elsewhere/"));
+            if (!attributes.empty())
+                files[place + "#"] = attributes;
+            if (entry.is_fifo())
+                files[place] = Fifo;
+            else if (entry.is_directory() || access(path.c_str(), R_OK) != 0)
+                files[place + end];
             else
-                files[place] = ReadFile(entry.path());
+                files[place] = ReadFile(path);
         });
     return files;
 }

@@ -1,15 +1,25 @@
 // A throw-away workstation on which a scenario starts the real executable.
 //
 // A scenario speaks of places on the workstation, not of paths:
-//   hot/NAME/...    the hot folder of that name, [P] standing for its private directory
+//   hot/NAME/...    the hot folder of that name, [P] is its private directory
 //   user/...        the per-user application data folder; machine/... the machine-wide one
 //   tool/...        the folder of the executable
-// and its texts hold what differs between systems as {hot}, {user}, {tool}, {app}, {previous},
+//   elsewhere/...   files that the tool has no reason to touch, as targets of links
+// A place that ends in a slash is a directory. One that ends in '#' is the attributes of the file or
+// directory before it, as letters: R read-only, H hidden, S system, X another user's, 0 no permission
+// at all ("hot/A/Desktop.ini#" -> "RS"). A snapshot of elsewhere/ has its modes there as well ("R mode 444").
+//
+// The texts contain what differs between systems as {hot}, {user}, {tool}, {app}, {previous},
 // {default} (each as the tool sees it) and {/}, the path separator; in capitals, {HOT} or {/2}, as
-// the registry editor's text has them. A text that begins with {utf16} is one in that encoding.
-// A place that ends in a slash is a directory; one that ends in '#' stands for the attributes of
-// the file or directory before it: R read-only, H hidden, S system, X another user's, 0 no permission at all.
+// the registry editor's text has them. A whole text can also be
+//   {utf16}TEXT     the text in UTF-16 with a byte-order mark
+//   {icon:NAME}     the bytes of a shipped icon
+//   {link:TARGET}   a symbolic link to another place or to an absolute path; to a directory, if its
+//                   own place ends in a slash. Links to files and dangling ones are for this machine only.
+//   {fifo}          a FIFO, for this machine only
 #pragma once
+
+#include "tests/process.h"
 
 #include <filesystem>
 #include <map>
@@ -21,15 +31,16 @@ using Files = std::map<std::string, std::string>; // place -> text
 
 struct RunResult
 {
-    int exitStatus = 0;     // as a shell sees it
+    ProcessResult process;
+    std::string output;     // its standard output
     std::string libraryLog; // what the library reported by itself, on Windows in message boxes
 };
 
 class Wine;
 
-extern const char* const LogPlace;
-extern const char* const MachineHive;
-extern const char* const UserHive;
+inline const char* const LogPlace = "user/ORX_Installers/UpgradeDowngrade.log";
+inline const char* const MachineHive = "machine/registry/HKEY_LOCAL_MACHINE.reg";
+inline const char* const UserHive = "user/registry/HKEY_CURRENT_USER.reg";
 
 class Workstation
 {
@@ -41,14 +52,18 @@ class Workstation
     Workstation& operator=(const Workstation&) = delete;
 
     void LayOut(const Files& files);
-    RunResult Start(const std::vector<std::string>& arguments);
-    /// Every file with its text, every directory and every attribute that is set.
+    /// Runs a program of the tool's folder to its end.
+    RunResult Start(const std::vector<std::string>& arguments, const std::string& program = "FolderUpgrade");
+    /// Every file with its text, every link, every directory and every attribute that is set. Links are not followed.
     Files Snapshot() const;
-    /// The text with everything in braces replaced; {icon:NAME} by the bytes of a shipped icon.
+    /// The text with everything in braces replaced, but for a link or a FIFO.
     std::string Expand(std::string text) const;
+    /// Throws, with its name, for what is no place.
+    std::filesystem::path HostPath(const std::string& place) const;
 
   private:
-    std::filesystem::path HostPath(const std::string& place) const;
+    std::string PlaceOf(const std::filesystem::path& path) const;
+    void Put(const std::string& place, const std::string& text) const;
     void SetAttributes(const std::string& place, const std::string& letters) const;
 
     template <typename Visit>

@@ -1,0 +1,118 @@
+#!/usr/bin/env python3
+"""Plants small faults in a copy of the product, one at a time, and shows which of them the tests find.
+
+    tests/plant_faults.py [NUMBER [SEED]]
+
+In place of a fault that does not compile another one is drawn. The same seed gives the same faults, as
+long as the sources are the same. A survivor is either a missing test or a fault that changes nothing.
+"""
+import os
+import pathlib
+import random
+import re
+import resource
+import shutil
+import signal
+import subprocess
+import sys
+import tempfile
+
+ROOT = pathlib.Path(__file__).resolve().parents[1]
+MODULES = ("app", "check", "run", "store", "migrate", "appearance", "platform")
+TIME_LIMIT = 120  # seconds for all tests of one fault
+STRING = r'"(?:[^"\\]|\\.)*"'
+NEXT = {"true": "false", "==": "!=", "&&": "||", "<": "<=", ">": ">=", "+": "-", "++": "--", "&": "|"}
+NEXT.update({value: key for key, value in NEXT.items()})
+# What is looked for in a line of code, and what it becomes.
+RULES = (
+    (r"\b(?:true|false)\b| (?:==|!=|&&|\|\||<=?|>=?|[+&|-]) |\+\+|--", lambda m: re.sub(r"\S+", lambda sign: NEXT[sign[0]], m[0])),
+    (r"(?<=\bif \().+(?=\)$)|(?<=\bwhile \().+(?=\)$)", lambda m: f"!({m[0]})"),
+    (r"!(?=[\w(])", lambda m: ""),
+    (r"\b(?:0x[0-9A-Fa-f]+|\d+)(?=[uUlL]*\b)", lambda m: f"({m[0]} + 1)"),
+    (STRING, lambda m: '"' + ("x" if m[0] == '""' else "~" + m[0][1:-1]) + '"'),
+    (r"(?<=\breturn )(?!0;|nullptr;|\{\};|true;|false;).+(?=;$)", lambda m: "{}"),
+    (r"^\s+(?:(?!return\b)[\w:>.*\[\]-]+(?:\(.*\)| [-+|&]?= .+)|continue|break|return);$", lambda m: ";"),
+)
+
+
+def run(command, **options):
+    """Whether the command succeeds; everything that it started is gone afterwards."""
+    process = subprocess.Popen(command, stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL, start_new_session=True, **options)
+    try:
+        return process.wait(TIME_LIMIT) == 0
+    except subprocess.TimeoutExpired:
+        os.killpg(process.pid, signal.SIGKILL)
+        process.wait()
+        return False
+
+
+def files(*places):
+    return subprocess.check_output(["git", "ls-files", "-z", *places], cwd=ROOT, text=True).split("\0")[:-1]
+
+
+def faults():
+    """Every fault that could be planted: file, number of the line, the line, the line with the fault."""
+    for name in files(*MODULES):
+        if not name.endswith(".cpp") or name.startswith("platform/windows/"):
+            continue
+        for number, line in enumerate((ROOT / name).read_text().split("\n")):
+            code = re.split(r"\s*//", re.sub(STRING, lambda m: m[0].replace("/", "\0"), line))[0].replace("\0", "/")
+            if code.lstrip().startswith("#"):
+                continue
+            strings = [match.span() for match in re.finditer(STRING, code)]
+            for pattern, change in RULES:
+                for match in re.finditer(pattern, code):
+                    inside = any(start < match.start() < end or start < match.end() < end for start, end in strings)
+                    if not inside:
+                        yield name, number, line, code[:match.start()] + change(match) + code[match.end():]
+
+
+def passes(root):
+    """Whether all tests pass in this copy of the project."""
+    scratch = root / "scratch"
+    scratch.mkdir(mode=0o755)
+    memory = 4 << 30  # some faults make a loop that never stops allocating
+    passed = all(run([root / "build/tests" / test, "--gtest_fail_fast"], cwd=scratch, env={**os.environ, "TMPDIR": str(scratch)},
+                     preexec_fn=lambda: resource.setrlimit(resource.RLIMIT_AS, (memory, memory)))
+                 for test in ("scenario_test", "unit_test"))
+    shutil.rmtree(scratch)
+    return passed
+
+
+def plant_all(root, drawn, wanted):
+    build = ["ninja", "-C", root / "build"]
+    for name in files():
+        (root / name).parent.mkdir(parents=True, exist_ok=True)
+        shutil.copy(ROOT / name, root / name)
+    root.chmod(0o755)  # some scenarios run as another user
+    subprocess.check_call(["cmake", "-S", root, "-B", root / "build", "-G", "Ninja", "-DCMAKE_BUILD_TYPE=Debug",
+                           "-DCMAKE_CXX_FLAGS_DEBUG=-O0 -DNDEBUG -w", "-DCMAKE_GTEST_DISCOVER_TESTS_DISCOVERY_MODE=PRE_TEST"],
+                          stdout=subprocess.DEVNULL)
+    subprocess.check_call(build, stdout=subprocess.DEVNULL)
+    if not passes(root):
+        sys.exit("without any fault the tests fail")
+    counts = {"found": 0, "SURVIVED": 0, "did not compile": 0}
+    for name, number, line, changed in drawn:
+        if counts["found"] + counts["SURVIVED"] == wanted:
+            break
+        original = (root / name).read_text()
+        lines = original.split("\n")
+        lines[number] = changed
+        (root / name).write_text("\n".join(lines))
+        outcome = "did not compile" if not run(build) else "SURVIVED" if passes(root) else "found"
+        (root / name).write_text(original)
+        counts[outcome] += 1
+        print(f"{outcome} {name}:{number + 1}\n  - {line}\n  + {changed}", flush=True)
+    return counts
+
+
+def main():
+    wanted, seed = (int(text) for text in (sys.argv[1:] + ["150", "1"][len(sys.argv) - 1:])[:2])
+    drawn = sorted(faults())
+    random.Random(seed).shuffle(drawn)
+    with tempfile.TemporaryDirectory() as root:
+        print(f"seed {seed}:", plant_all(pathlib.Path(root), drawn, wanted))
+
+
+if __name__ == "__main__":
+    main()

@@ -1,0 +1,102 @@
+// Folder.cfg: what is read, what moves, and the form in which it is written again.
+#include "tests/scenarios/texts.h"
+
+namespace
+{
+
+Text Filter(const Text& content) { return "  <FilterSetting>" + content + "</FilterSetting>\n"; }
+
+// A chain of elements, as the library writes it: one below the other, the levels counted from 1.
+Text Nested(int levels)
+{
+    Text opened;
+    Text closed;
+    for (int level = 1; level <= levels; ++level)
+    {
+        const Text indentation = "\n" + Text(static_cast<size_t>(2 * level + 2), ' ');
+        opened += indentation + (level < levels ? "<e>" : "<e/>");
+        closed = (level < levels ? indentation + "</e>" : "") + closed;
+    }
+    return opened + closed + "\n  ";
+}
+
+// The same in one line.
+Text Chain(int levels)
+{
+    Text text;
+    for (int level = 0; level < 2 * levels; ++level)
+        text += level < levels ? "<e>" : "</e>";
+    return text;
+}
+
+std::vector<Scenario> FolderCfgs()
+{
+    const Text found = Found(MovedFrom);
+    const Text written = MinimalWritten(MovedTo);
+    const Text mixed = Filter("t\n    <x>u\n      <y/>v</x>\n    <![CDATA[<w>]]>z\n    <!--c-->\n  ");
+    const auto elsewhere = [](const Name& name, const Text& path) { return Scenario(name).FolderCfg(Written(path)).LogOfA(Found(path)); };
+    const auto nested = [&](const Name& name, int levels) {
+        return Scenario(name)
+            .FolderCfg(Written(MovedFrom, Filter(Chain(levels))))
+            .LogOfA(found + Untouched("filter setting nested too deep"));
+    };
+    return {
+        Scenario("AForeignFolderCfgIsRewrittenInTheToolsForm").FolderCfg(Foreign(MovedFrom), Written(MovedTo)).LogOfA(found),
+        Scenario("AnIncompleteChainIsRewrittenWithDefaults").FolderCfg(Minimal(MovedFrom), written).LogOfDisabledA(found),
+        Scenario("ADocumentTypeIsNotCarriedOver")
+            .FolderCfg(Minimal(MovedFrom, "<!DOCTYPE h [<!ENTITY e 'x'>]>", "&e;"), MinimalWritten(MovedTo, "x"))
+            .LogOfDisabledA(found),
+        Scenario("AByteOrderMarkGoesFromFolderCfg")
+            .FolderCfg("\xEF\xBB\xBF" + Minimal(MovedFrom, "<?xml version='1.0' encoding='utf-8'?>"), written)
+            .LogOfDisabledA(found),
+        Scenario("AUtf16FolderCfgComesOutInUtf8").FolderCfg("{utf16}" + Minimal(MovedFrom), written).LogOfDisabledA(found),
+        elsewhere("ATemplateInASubfolderStays", "{previous}{/}Sub{/}x"),
+        elsewhere("ATemplateElsewhereStays", "{previous}2{/}x"),
+        Scenario("AnEmptyFolderCfgStays").FolderCfg("").LogOfDisabledA("").LibraryReports(),
+        Scenario("ATruncatedFolderCfgStays").FolderCfg(Foreign(MovedFrom).substr(0, 700)).LogOfDisabledA("").LibraryReports(),
+        Scenario("WithoutImposeSettingNothingIsLogged").FolderCfg("<HotFolder/>").LogOfDisabledA(""),
+        Scenario("WithoutTheTemplateKeyNothingMoves")
+            .FolderCfg("<H><ImposeSetting><K k='orximposetemplate' v='" + MovedFrom + "'/></ImposeSetting></H>")
+            .LogOfDisabledA(Found("")),
+        Scenario("MixedContentIsIndented")
+            .FolderCfg(Written(MovedFrom, Filter("\n \nt<x>u<y/>v</x><![CDATA[<w>]]>z<!--c-->")), Written(MovedTo, mixed))
+            .LogOfA(found),
+        Scenario("MixedContentIsIndentedOnceOnly").FolderCfg(Written(MovedFrom, mixed), Written(MovedTo, mixed)).LogOfA(found),
+        Scenario("AFilterOf1024LevelsIsSaved")
+            .FolderCfg(Written(MovedFrom, Filter(Nested(1024))), Written(MovedTo, Filter(Nested(1024))))
+            .LogOfA(found),
+        nested("AFilterOf1025LevelsStays", 1025),
+        nested("AFilterOf60000LevelsStays", 60000),
+        Scenario("ADotInTheStoredPathDoesNotMatter")
+            .FolderCfg(Written("{app}{/}.{/}template{/}x"), Written("{previous}{/}x"))
+            .Run({"U"})
+            .LogOfA(Found("{app}{/}.{/}template{/}x")),
+        Scenario("NoFolderCfgIsLogged").Before({{"hot/A/[P]/", ""}}).LogOfDisabledA(NoCfg()),
+    };
+}
+
+// In these encodings only folders with ASCII names can be told apart.
+std::vector<Scenario> Encodings()
+{
+    const auto declared = [](const Name& name, const Text& encoding, const Text& folder)
+    {
+        return Scenario(name)
+            .Before({{MachineHive, MachineValue("\"InstallPath\"=\"{HOT}\"")}, {UserHive, UserValue("\"Path\"=\"{HOT}\"")}})
+            .FolderCfg(Minimal("{hot}{/}x", "<?xml version='1.0' encoding" + encoding + "?>", folder))
+            .LogOfDisabledA(Found("{hot}{/}x") + Untouched("unknown encoding"));
+    };
+    return {
+        declared("AWindows1252FolderCfgComesOutInUtf8", "='windows-1252'", "\x80\xE4")
+            .After({{CfgPlace, MinimalWritten("{hot}{/}template{/}x", "€ä")}})
+            .LogOfDisabledA(Found("{hot}{/}x")),
+        declared("AFolderCfgInWindows1253Stays", "='windows-1253'", "\xE1\xD2"),
+        declared("AFolderCfgInShiftJisStays", "='Shift_JIS'", "\x93\xFA\x96\x7B"),
+        declared("ShiftJisStaysWithSpacesInItsDeclaration", " = 'Shift_JIS'", "\x93\xFA"),
+        declared("AFolderCfgInAnEncodingOfItsOwnStays", "='x-own'", "x"),
+    };
+}
+
+TEST_SCENARIOS(FolderCfgs);
+TEST_SCENARIOS(Encodings);
+
+} // namespace

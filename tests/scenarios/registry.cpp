@@ -1,0 +1,73 @@
+// The two template folders in the registry, and what happens where they are missing or unusable.
+#include "tests/scenarios/texts.h"
+
+namespace
+{
+
+Text Bytes(const Text& name, const Text& type, const Text& bytes)
+{
+    static const char* const digits = "0123456789abcdef";
+    Text value = "\"" + name + "\"=hex" + type + ":";
+    for (const char byte : bytes)
+    {
+        const auto number = static_cast<unsigned char>(byte);
+        value += Text(1, digits[number / 16]) + digits[number % 16] + ",";
+    }
+    value.pop_back();
+    return value;
+}
+
+// A hot folder and a preset that would move, and such a value of the key.
+Scenario Both(const Name& name, const Text& letter, const Files& hives)
+{
+    const Text path = letter == "I" ? MovedFrom : MovedTo;
+    return Scenario(name).Before(hives).FolderCfg(Written(path)).Preset(Stored(path)).Run({letter});
+}
+
+Scenario WithPrevious(const Name& name, const Text& value) { return Both(name, "I", {{UserHive, UserValue(value)}}); }
+
+Scenario WithInstalled(const Name& name, const Text& value) { return Both(name, "I", {{MachineHive, MachineValue(value)}}); }
+
+std::vector<Scenario> Registry()
+{
+    const Text found = Found(MovedFrom);
+    const Text foundNew = Found(MovedTo);
+    const Text updated = PresetLine(Updated);
+    const Text unstorable = found + Untouched("new path holds a character that XML cannot store");
+    return {
+        Both("WithoutAnyHiveNothingMoves", "I", {{MachineHive, Removed}, {UserHive, Removed}})
+            .LogOfA(found + NoPrevious, NoDefault + NoPrevious),
+        WithInstalled("WithoutADefaultFolderAnUpgradeMovesNothing", "\"x\"=\"y\"").LogOfA(found + NoDefault, NoDefault),
+        Both("WithoutAPreviousFolderADowngradeMovesNothing", "U", {{UserHive, UserValue("\"x\"=\"y\"")}})
+            .LogOfA(foundNew + NoPreviousTo, NoPrevious),
+        WithPrevious("A32BitKeyHidesTheOtherEvenWithoutAValue",
+                     "\"Path\"=\"{PREVIOUS}\"\r\n\r\n[HKEY_CURRENT_USER\\software\\wow6432node\\hf]")
+            .LogOfA(found + NoPrevious, NoPrevious),
+        WithPrevious("A32BitKeyComesFirst", "\"Path\"=\"x\"\r\n[HKEY_CURRENT_USER\\SOFTWARE\\Wow6432Node\\HF]\r\n\"PATH\"=\"{PREVIOUS}\"")
+            .Before({{MachineHive, MachineValue("\"InstallPath\"=\"x\"\r\n[HKEY_LOCAL_MACHINE\\SOFTWARE\\Wow6432Node\\Vantorix\\QZA]\r\n"
+                                                "\"InstallPath\"=\"{APP}\"")}})
+            .After({{CfgPlace, Written(MovedTo)}, {PresetPlace, Stored(MovedTo)}})
+            .LogOfA(found, updated),
+        WithPrevious("ATextOf258CharactersIsTooLong", "\"Path\"=\"" + Text(258, 'x') + "\"").LogOfA(found + NoPrevious, NoPrevious),
+        WithPrevious("ATextOf257CharactersIsRead", "\"Path\"=\"" + Text(257, 'x') + "\"").LogOfA(found, updated),
+        WithInstalled("ANumberIsNoFolderThatCanBeStored", "\"InstallPath\"=dword:00000001").LogOfA(unstorable, updated),
+        WithInstalled("ALoneSurrogateIsNoFolderThatCanBeStored", Bytes("InstallPath", "", Text("C\0\0\xD8:\0\0\0", 8)))
+            .LogOfA(unstorable, updated),
+        WithPrevious("AnUnterminatedOddValueIsReadToItsLastWholeUnit", Bytes("Path", "(2)", Text("x\0y\0z", 5))).LogOfA(found, updated),
+        WithPrevious("AFinalSeparatorMovesPresetsOnly", "\"Path\"=\"{PREVIOUS}{/2}\"")
+            .After({{PresetPlace, Stored(MovedTo)}})
+            .LogOfA(found, updated),
+        Both("AFinalSeparatorIsDoubledInFolderCfgOnly", "U", {{UserHive, UserValue("\"Path\"=\"{PREVIOUS}{/2}\"")}})
+            .After({{CfgPlace, Written("{previous}{/}{/}Booklet.tpl")}, {PresetPlace, Stored(MovedFrom)}})
+            .LogOfA(foundNew, updated),
+        WithPrevious("AnEmptyPreviousFolderReplacesNothing", "\"Path\"=\"\"").LogOfA(found, updated),
+        Scenario("WithoutTheEntryNoFolderIsLookedUp")
+            .Before({{MachineHive, Removed}, {UserHive, "garbage"}})
+            .FolderCfg("<H><ImposeSetting/></H>")
+            .LogOfDisabledA(Found(""), NoDefault + NoPrevious),
+    };
+}
+
+TEST_SCENARIOS(Registry);
+
+} // namespace

@@ -1,0 +1,10 @@
+#!/usr/bin/env bash
+# Prints how many lines the product and its tests have, blank ones left out, and the share of the tests.
+set -euo pipefail
+cd "$(dirname "$0")/.."
+count() {
+    git ls-files "${@:2}" | grep -E "$1" | tr '\n' '\0' | xargs -0 cat | grep -c '[^[:space:]]'
+}
+product=$(count '\.(cpp|h|sh|in|rc|def)$|CMakeLists\.txt$' app check run store migrate appearance platform)
+tests=$(count '\.(cpp|h|sh|py)$' tests fuzz)
+awk -v p="$product" -v t="$tests" 'BEGIN { printf "product %d, tests %d: %.1f %%\n", p, t, 100 * t / (p + t) }'
