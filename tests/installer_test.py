@@ -132,9 +132,9 @@ class Workstation:
             self.wine("reg", "add", r"HKCU\SOFTWARE\HF", "/v", "Path", "/d", previous, "/f")
 
     def look(self):
-        """The hot folders' and presets' files; Desktop.ini, which Wine and Windows write differently, apart."""
-        return {name: text for name, text in files_below(self.drive).items()
-                if re.match(r"Hot Folders/|users/.*/ORX/", name) and not name.endswith("Desktop.ini")}
+        """The hot folders' and presets' files, less what Wine makes of Desktop.ini."""
+        return {str(path.relative_to(self.drive)): path.read_bytes() for folder in (self.drive / "Hot Folders", self.user / "ORX")
+                for path in folder.rglob("*") if path.is_file() and path.name != "Desktop.ini"}
 
     def registry(self):
         with tempfile.TemporaryFile("w+") as output:
@@ -171,6 +171,8 @@ def log_lines(user, switch, icon_dir, stored, complaint=None):
 def build_msi(scratch, version):
     msi = scratch / f"{version}.msi"
     run("wixl", "-a", "x64", "-D", f"Version={version}", "-o", msi, ROOT / "samples/installer.wxs", cwd=scratch / "package")
+    actions = re.findall(r"^\w+grade\w*\t(\d+)\t", run("msiinfo", "export", msi, "CustomAction", text=True), re.MULTILINE)
+    check("8 actions of the MSI run as the user, their status ignored", [int(kind) & 0x840 for kind in actions], [0x40] * 8)
     path = "Z:" + str(msi).replace("/", "\\")
     return [["msiexec", option, path, "/qn"] for option in ("/i", "/x")]
 
@@ -236,7 +238,7 @@ def try_installer(name, build_installer, scratch, station):
 def main():
     if not os.environ.get("INSTALLER_TEST_DISPLAY"):
         os.environ["INSTALLER_TEST_DISPLAY"] = "1"
-        os.execvp("xvfb-run", ["xvfb-run", "-a", *sys.argv])
+        os.execvp("xvfb-run", ["xvfb-run", "-a", sys.executable, *sys.argv])
     with tempfile.TemporaryDirectory() as folder:
         scratch = pathlib.Path(folder)
         try_signing(pathlib.Path(sys.argv[1]).resolve(), scratch)
