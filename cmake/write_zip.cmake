@@ -20,7 +20,7 @@ function(run)
                     COMMAND_ERROR_IS_FATAL ANY)
 endfunction()
 
-if(CPACK_FOLDER_UPGRADE_SIGN_COMMAND)
+if(NOT "${CPACK_FOLDER_UPGRADE_SIGN_COMMAND}" STREQUAL "")
     file(GLOB programs ${CPACK_TEMPORARY_DIRECTORY}/*.exe)
     if(NOT programs)
         message(FATAL_ERROR "FOLDER_UPGRADE_SIGN_COMMAND is given, but no program for Windows is packed")

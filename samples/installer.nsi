@@ -68,13 +68,13 @@ Section
     SetRegView 64 ; the tool looks into the 32-bit view first: a client that once wrote there has to remove its key
     ReadRegStr $1 HKLM "${KEY}" "Version" ; before it is overwritten
 
-    SetOutPath "$INSTDIR"
+    SetOutPath "$INSTDIR\BundleIcons"
+    File "${PACKAGE}/BundleIcons/hf_*.ico" ; the previous version's, which a downgrade copies
+    SetOutPath "$INSTDIR" ; last: the programs start there
     File "${PACKAGE}/FolderUpgrade.exe"
     File "${PACKAGE}/FolderUpgradeCheck.exe"
     File "${PACKAGE}/THIRD-PARTY-NOTICES.txt"
     File "${PACKAGE}/hf_*.ico" ; this version's, which an upgrade copies
-    SetOutPath "$INSTDIR\BundleIcons"
-    File "${PACKAGE}/BundleIcons/hf_*.ico" ; the previous version's, which a downgrade copies
 
     WriteRegStr HKLM "${KEY}" "InstallPath" "$INSTDIR" ; NSIS has cut off a final separator: the tool adds "\template"
     WriteRegStr HKLM "${KEY}" "Version" "${VERSION}"
