@@ -10,7 +10,7 @@
 ; What runs when:
 ;
 ;     first installation               I, once
-;     a newer version over an older    I of the newer one; the older one's uninstaller is replaced, not run
+;     another version over it          I of that version; the installed uninstaller is replaced, not run
 ;     the same version again           nothing; the files are put back
 ;     removal                          U, once
 ;

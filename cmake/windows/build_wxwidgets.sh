@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
 # Builds wxWidgets' Windows port and expat as static libraries for 64-bit Windows, from Debian's source packages (Debian
-# has no such package ready made), and prints the folder they are in: bin/wx-config, include, lib, licences, and BUILD, which
-# tells the versions and flags. The result is kept, so that only the first run takes minutes and needs the network.
+# has no such package ready made), and prints the folder they are in: bin/wx-config, include, lib, licences, and BUILD,
+# which tells the versions and flags. The result is kept, so that only the first run takes minutes and needs the network.
 set -euo pipefail
 export LC_ALL=C DEBIAN_FRONTEND=noninteractive
 
