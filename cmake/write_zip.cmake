@@ -19,6 +19,17 @@ function(run)
     execute_process(COMMAND ${ARGV} WORKING_DIRECTORY ${CPACK_TEMPORARY_DIRECTORY}
                     COMMAND_ERROR_IS_FATAL ANY)
 endfunction()
+
+if(NOT "${CPACK_FOLDER_UPGRADE_SIGN_COMMAND}" STREQUAL "")
+    file(GLOB programs ${CPACK_TEMPORARY_DIRECTORY}/*.exe)
+    if(NOT programs)
+        message(FATAL_ERROR "FOLDER_UPGRADE_SIGN_COMMAND is given, but no program for Windows is packed")
+    endif()
+    foreach(program IN LISTS programs)
+        run(${CPACK_FOLDER_UPGRADE_SIGN_COMMAND} ${program})
+    endforeach()
+endif()
+
 if(zip AND touch)
     run(${touch} --date=@${date} ${files})
     run(${zip} -X -q ${package} ${files})

@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
 # Builds wxWidgets' Windows port and expat as static libraries for 64-bit Windows, from Debian's source packages (Debian
-# has no such package ready made), and prints the folder they are in: bin/wx-config, include, lib, and BUILD, which tells
-# the versions and flags. The result is kept, so that only the first run takes minutes and needs the network.
+# has no such package ready made), and prints the folder they are in: bin/wx-config, include, lib, licences, and BUILD,
+# which tells the versions and flags. The result is kept, so that only the first run takes minutes and needs the network.
 set -euo pipefail
 export LC_ALL=C DEBIAN_FRONTEND=noninteractive
 
@@ -125,6 +125,9 @@ install_wx() {
     sed -i -e "s| *-L$work/dest/wxmsw/lib||" \
         -e 's|^prefix=.*|prefix=${input_option_prefix-$(cd "$(dirname "$(readlink -f "$0")")/../../.." \&\& pwd)}|' "$config"
     ln -sf "../$config" bin/wx-config
+    mkdir licences # for the notices in the package
+    cat "$work"/wxwidgets3.2/{debian/copyright,docs/licence.txt} >licences/wxwidgets3.2
+    cp "$work/expat/debian/copyright" licences/expat
 }
 
 exec 3>&2
