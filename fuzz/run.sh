@@ -11,7 +11,7 @@ cd "$(dirname "${BASH_SOURCE[0]}")/.."
 seconds=${1-20}
 findings=build/fuzz/findings
 # The target, and those files of the sample workstation that are its seeds as well.
-declare -A samples=([folder_cfg]=Folder.cfg [hive]='*.reg' [preset_text]='' [profile]=Desktop.ini)
+declare -A samples=([folder_cfg]=Folder.cfg [preset_text]='' [profile]=Desktop.ini)
 
 # In memory where there is such a place, since every input is a file.
 scratch=$(mktemp -d -p "$([ -w /dev/shm ] && echo /dev/shm || echo "${TMPDIR:-/tmp}")")
