@@ -14,7 +14,7 @@
 struct RegistryKey
 {
     std::string hive;
-    const char* lines; // of the key, in the hive
+    const char* lines = nullptr; // of the key, in the hive
 };
 
 LSTATUS RegOpenKeyExW(HKEY hive, LPCWSTR path, DWORD /*options*/, REGSAM /*access*/, HKEY* key)
