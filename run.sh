@@ -13,7 +13,7 @@ set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")"
 
 workstation="$PWD/build/sample workstation"
-tool=build/native/FolderUpgrade
+tool=build/program/FolderUpgrade
 log="$workstation/user/ORX_Installers/UpgradeDowngrade.log"
 finished=255 # the tool's exit status of -1, on every path
 
@@ -110,9 +110,9 @@ esac
 
 scratch=$(mktemp -d)
 trap 'rm -rf "$scratch"' EXIT
-cmake/install_packages.sh g++ cmake ninja-build libwxgtk3.2-dev attr
-quietly cmake --preset native -DBUILD_TESTING=OFF
-quietly cmake --build --preset native
+cmake/install_packages.sh build sample
+quietly cmake --preset program
+quietly cmake --build --preset program
 if [ "$fresh" = yes ]; then
     samples/lay_out.sh --fresh "$workstation"
 elif [ ! -e "$workstation" ]; then

@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
-# Builds and runs the tests and closes with their count.
+# Installs what the tests need, builds and runs them, and closes with their count.
 #
-#     ./test.sh             every test of this machine's program, with the sanitizers, fuzzing and faults
+#     ./test.sh             every test of this machine's program, with the sanitizers, fuzzing, faults and checks
 #     ./test.sh windows     the same table of scenarios against the Windows program, under Wine
 #     ./test.sh coverage    the lines of the program that the tests run
 #     ./test.sh checks      format and static checks alone
@@ -29,88 +29,88 @@ quietly() {
     fi
 }
 
-# Runs a part of the tests whose output closes with a line 'N passed, N failed'.
-part() {
-    say "$1"
-    shift
-    local log counts
-    log=$(mktemp)
-    if ! "$@" >"$log" 2>&1; then
-        cat "$log"
-    fi
-    counts=$(grep -oE '^[0-9]+ passed, [0-9]+ failed' "$log" | tail -n 1) || counts="0 passed, 1 failed"
-    grep '^skipped ' "$log" || true
-    tail -n 1 "$log"
-    skipped=$((skipped + $(grep -c '^skipped ' "$log" || true)))
-    rm -f "$log"
-    passed=$((passed + ${counts%% *}))
-    counts=${counts#*, }
-    failed=$((failed + ${counts%% *}))
+build() {
+    say "Building the preset $1"
+    quietly cmake --preset "$1"
+    quietly cmake --build --preset "$1"
 }
 
-# Turns CTest's closing words into the one line that part() reads.
-run_ctest() {
-    local out=0 total failures
-    ctest --preset "$1" --parallel "$(nproc)" --no-tests=error >"build/$1/ctest.txt" 2>&1 || out=$?
-    total=$(sed -n 's/.* tests failed out of \([0-9]*\)$/\1/p' "build/$1/ctest.txt")
-    failures=$(sed -n 's/.*, \([0-9]*\) tests failed out of .*/\1/p' "build/$1/ctest.txt")
-    [ "$out" = 0 ] || grep -vE ' Passed | Start ' "build/$1/ctest.txt" || true
-    echo "$((${total:-0} - ${failures:-1})) passed, ${failures:-1} failed"
-    return "$out"
+# Reads what CTest wrote about its tests: prints the skipped ones and the line 'N passed, N failed, N skipped'. A test
+# whose own output closes with such a line is as many as that says.
+count() {
+    awk '
+        /<testcase / { status = $0; sub(/.* status="/, "", status); sub(/".*/, "", status); own = "" }
+        /^skipped / { print }
+        /^[0-9]+ passed, [0-9]+ failed, [0-9]+ skipped$/ { own = $0 }
+        /<skipped message/ { status = "skipped" }
+        /<\/testcase>/ {
+            if (split(own, number, " ")) { passed += number[1]; failed += number[3]; skipped += number[5] }
+            else if (status == "run") ++passed
+            else if (status == "skipped") ++skipped
+            else ++failed
+        }
+        END { printf "%d passed, %d failed, %d skipped\n", passed, failed, skipped }' "$1"
+}
+
+# Runs all tests of a preset.
+run_tests() {
+    local results=$PWD/build/$1/ctest.xml log=build/$1/ctest.txt outcome=0 number
+    say "Testing the preset $1"
+    rm -f "$results"
+    ctest --preset "$1" --parallel "$(nproc)" --test-output-size-passed 100000 --output-junit "$results" \
+        >"$log" 2>&1 || outcome=$?
+    [ "$outcome" = 0 ] || grep -vE ' Passed | Start ' "$log" || true
+    count "$results" | tee "build/$1/count.txt"
+    read -ra number < <(tail -n 1 "build/$1/count.txt")
+    [ "$outcome" = 0 ] || [ "${number[2]}" != 0 ] || number[2]=1
+    passed=$((passed + number[0]))
+    failed=$((failed + number[2]))
+    skipped=$((skipped + number[4]))
 }
 
 native() {
-    cmake/install_packages.sh g++ cmake ninja-build libwxgtk3.2-dev libgtest-dev
-    say "Building with the sanitizers"
-    quietly cmake --preset sanitize
-    quietly cmake --build --preset sanitize
-    part "Scenarios and unit tests" run_ctest sanitize
-    cmake/install_packages.sh clang libclang-rt-dev python3
-    part "Fuzzing, each corpus and 20 s of each target" fuzz/run.sh 20
-    part "Faults, each call of a run failing once with each of four errors" tests/faults/run.py
+    cmake/install_packages.sh build test fuzz bench
+    build sanitize
+    run_tests sanitize
+    build fuzz
+    run_tests fuzz
+    build bench
+    run_tests bench
     checks
 }
 
 windows() {
-    cmake/install_packages.sh g++ cmake ninja-build libwxgtk3.2-dev libgtest-dev googletest \
-        g++-mingw-w64-x86-64-posix wine64 xvfb xauth xdotool zip
+    cmake/install_packages.sh build test mingw windows
     say "Building wxWidgets for Windows, unless it is there"
     cmake/windows/build_wxwidgets.sh
-    say "Building the Windows program and this machine's"
-    quietly cmake --preset windows
-    quietly cmake --build --preset windows
-    quietly cmake --preset native -DBUILD_TESTING=ON
-    quietly cmake --build --preset native
-    part "Import tables" tests/import_tables.sh build/windows/FolderUpgrade.exe
-    part "Scenarios and unit tests under Wine" tests/under_wine.sh build/windows build/native
+    build windows
+    build native
+    run_tests windows
 }
 
 # The counters go where the runs of another user can write them, too.
 coverage() {
     local counters file
-    cmake/install_packages.sh g++ cmake ninja-build libwxgtk3.2-dev libgtest-dev gcovr python3
-    say "Building with counters"
-    quietly cmake --preset coverage
-    quietly cmake --build --preset coverage
+    cmake/install_packages.sh build test coverage
+    build coverage
     counters=$(mktemp -d)
     chmod a+x "$counters"
     find "$PWD/build/coverage" -name '*.gcda' -delete
     while read -r file; do
         install -D -m 666 /dev/null "$counters${file%.gcno}.gcda"
     done < <(find "$PWD/build/coverage" -name '*.gcno')
-    GCOV_PREFIX=$counters part "Scenarios and unit tests" run_ctest coverage
+    GCOV_PREFIX=$counters run_tests coverage
     find "$counters" -name '*.gcda' -empty -delete
     cp -r "$counters$PWD/build/coverage/." build/coverage/
     rm -r "$counters"
-    gcovr --root . --filter '(app|store|migrate|appearance|platform)/' --exclude-throw-branches \
-        --fail-under-line 95 --json build/coverage.json --txt - build/coverage || failed=$((failed + 1))
-    tests/uncovered.py <build/coverage.json || failed=$((failed + 1))
+    gcovr --root . --filter '(app|appearance|check|migrate|platform|run|store)/' --exclude-throw-branches \
+        --fail-under-line 95 --txt - build/coverage || failed=$((failed + 1))
 }
 
 checks() {
-    cmake/install_packages.sh g++ cmake ninja-build libwxgtk3.2-dev libgtest-dev clang-format \
-        clang-tidy cppcheck shellcheck
-    part "Format, clang-tidy, cppcheck and shellcheck" tests/static_checks.sh
+    cmake/install_packages.sh build checks
+    quietly cmake --preset checks
+    run_tests checks
 }
 
 case ${1:-} in

@@ -24,7 +24,7 @@ machine() {
         "$(df --output=fstype "${TMPDIR:-/tmp}" | tail -n 1), load $(cut -d ' ' -f 1 /proc/loadavg) at the start"
 }
 
-cmake/install_packages.sh g++ cmake ninja-build libwxgtk3.2-dev libbenchmark-dev python3 python3-lxml
+cmake/install_packages.sh build bench
 mkdir -p "$build"
 { cmake --preset bench && cmake --build --preset bench; } >"$build/build.log" || {
     cat "$build/build.log"

@@ -1,19 +1,41 @@
 #!/usr/bin/env bash
-# Installs those of the named Debian packages that are missing:
+# Installs those Debian packages that are missing for a purpose:
 #
-#     cmake/install_packages.sh PACKAGE...
+#     cmake/install_packages.sh GROUP...
 #
-# With apt-get, as root or by sudo without a password; where neither can be, it says what is missing and fails.
-# When nothing is missing, nothing is asked of the network.
+# The groups are the names in packages(), below. With apt-get, as root or by sudo without a password; where neither can
+# be, it says what is missing and fails. When nothing is missing, nothing is asked of the network.
 set -euo pipefail
 
+packages() {
+    case $1 in
+        build) echo g++ cmake ninja-build libwxgtk3.2-dev libexpat1-dev ;;
+        sample) echo attr ;;
+        test) echo libgtest-dev ;;
+        fuzz) echo clang libclang-rt-dev python3 ;;
+        checks) echo clang-format clang-tidy cppcheck shellcheck python3 ;;
+        coverage) echo gcovr ;;
+        bench) echo libbenchmark-dev python3 python3-lxml ;;
+        mingw) echo g++-mingw-w64-x86-64-posix dpkg-dev make ;;
+        windows) echo googletest wine64 xvfb xauth xdotool zip wixl msitools nsis osslsigncode openssl python3 ;;
+        *) echo "No such group of packages: $1" >&2; return 2 ;;
+    esac
+}
+
+wanted=()
+for group in "$@"; do
+    names=$(packages "$group")
+    read -ra names <<<"$names"
+    wanted+=("${names[@]}")
+done
+
 if ! command -v dpkg-query >/dev/null; then
-    echo "Not a Debian system; the counterparts of these packages have to be there: $*" >&2
+    echo "Not a Debian system; the counterparts of these packages have to be there: ${wanted[*]}" >&2
     exit 0
 fi
 
 missing=()
-for package in "$@"; do
+for package in "${wanted[@]}"; do
     state=$(dpkg-query -W -f '${db:Status-Status}' "$package" 2>/dev/null) || true
     [ "$state" = installed ] || missing+=("$package")
 done
@@ -32,7 +54,7 @@ fi
 log=$(mktemp)
 trap 'rm -f "$log"' EXIT
 apt() {
-    "${as_root[@]}" apt-get -qy -o DPkg::Lock::Timeout=120 "$@" >>"$log" 2>&1 </dev/null
+    "${as_root[@]}" apt-get -qy -o DPkg::Lock::Timeout=600 "$@" >>"$log" 2>&1 </dev/null
 }
 echo "Installing ${missing[*]}"
 if ! apt update || ! apt install --no-install-recommends "${missing[@]}"; then

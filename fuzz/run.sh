@@ -1,59 +1,38 @@
 #!/usr/bin/env bash
-# Runs the fuzz targets: each over its whole corpus, and then for a time over what it makes of it.
+# Runs a fuzz target, as a test:
 #
-#     fuzz/run.sh [SECONDS]
+#     fuzz/run.sh corpus|fuzz PROGRAM [SAMPLES]
 #
-# SECONDS for each target, 20 if not given; with 0 the corpora alone. An input that breaks a promise is kept in
-# build/fuzz/findings; once mended, it goes into the target's corpus and stays a test.
+#     corpus   over its corpus, and over those files of the sample workstation whose name is SAMPLES
+#     fuzz     over what it makes of them, for FUZZ_SECONDS (20)
+#
+# An input that breaks a promise is kept in findings/ beside the program; once fixed, it goes into the target's corpus
+# and stays a test.
 set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")/.."
 
-seconds=${1-20}
-findings=build/fuzz/findings
-# The target, and those files of the sample workstation that are its seeds as well.
-declare -A samples=([folder_cfg]=Folder.cfg [hive]='*.reg' [preset_text]='' [profile]=Desktop.ini)
-
+program=$2
+target=${program##*/fuzz_}
+findings=${program%/*}/findings
 # In memory where there is such a place, since every input is a file.
-scratch=$(mktemp -d -p "$([ -w /dev/shm ] && echo /dev/shm || echo "${TMPDIR:-/tmp}")")
-trap 'rm -rf "$scratch"' EXIT
+TMPDIR=$(mktemp -d -p "$([ -w /dev/shm ] && echo /dev/shm || echo "${TMPDIR:-/tmp}")")
+export TMPDIR
+trap 'rm -rf "$TMPDIR"' EXIT
 
-fuzz() {
-    local program=build/fuzz/fuzz/fuzz_$1 sample number=0
-    local options=(-dict=fuzz/"$1".dict -artifact_prefix="$findings/$1-" -timeout=10 -print_final_stats=1)
-    export TMPDIR=$scratch/$1
-    mkdir -p "$TMPDIR"/{found,samples}
-    find samples/workstation -name "${samples[$1]}" -print0 | while IFS= read -r -d '' sample; do
-        cp "$sample" "$TMPDIR/samples/$((number += 1))"
-    done
-    "$program" "${options[@]}" -runs=0 fuzz/corpus/"$1" "$TMPDIR/samples" || return
-    [ "$seconds" = 0 ] || "$program" "${options[@]}" -max_len=16384 -max_total_time="$seconds" \
-        "$TMPDIR/found" fuzz/corpus/"$1" "$TMPDIR/samples"
+mkdir -p "$findings" "$TMPDIR"/{found,samples}
+number=0
+while IFS= read -r -d '' sample; do
+    cp "$sample" "$TMPDIR/samples/$((number += 1))"
+done < <(find samples/workstation -name "${3-}" -print0)
+inputs=(fuzz/corpus/"$target" "$TMPDIR/samples")
+limits=(-runs=0)
+if [ "$1" = fuzz ]; then
+    inputs=("$TMPDIR/found" "${inputs[@]}") # the first is where new ones go
+    limits=(-max_len=16384 -max_total_time="${FUZZ_SECONDS:-20}")
+fi
+"$program" -dict=fuzz/"$target".dict -artifact_prefix="$findings/$target-" -timeout=10 -print_final_stats=1 \
+    "${limits[@]}" "${inputs[@]}" >"$TMPDIR/log" 2>&1 || {
+    tail -n 60 "$TMPDIR/log"
+    exit 1
 }
-
-cmake/install_packages.sh g++ clang libclang-rt-dev cmake ninja-build libwxgtk3.2-dev
-{ cmake --preset fuzz && cmake --build --preset fuzz; } >"$scratch/build" 2>&1 || { cat "$scratch/build" >&2; exit 1; }
-mkdir -p "$findings"
-passed=0 failed=0
-declare -A running=()
-finish() {
-    local target
-    for target in "${!running[@]}"; do
-        if wait "${running[$target]}"; then
-            passed=$((passed + 1))
-            echo "$target: $(awk '/number_of_executed_units/ { n += $2 } END { print n }' "$scratch/$target.log") inputs"
-        else
-            failed=$((failed + 1))
-            tail -n 60 "$scratch/$target.log" >&2
-            echo "$target: FAILED"
-        fi
-    done
-    running=()
-}
-for target in "${!samples[@]}"; do
-    fuzz "$target" >"$scratch/$target.log" 2>&1 &
-    running[$target]=$!
-    [ ${#running[@]} -lt "$(nproc)" ] || finish
-done
-finish
-echo "$passed passed, $failed failed"
-[ "$failed" = 0 ]
+grep number_of_executed_units "$TMPDIR/log"

@@ -1,49 +1,52 @@
-// The forms of the registry editor's text that no workstation of the scenarios has.
-#include "platform/system.h"
-#include "platform/unicode_text.h"
+// What an export can hold that no workstation of the scenarios has.
+#include "platform/linux/registry_export.h"
 
 #include <gtest/gtest.h>
-#include <wx/ffile.h>
-#include <wx/filename.h>
 
-#include <array>
+#include <iomanip>
+#include <sstream>
 
-TEST(Registry, EveryFormOfAValueIsRead)
+TEST(Registry, AnExportIsReadAsTheRegistryGivesIt)
 {
-    const wxString folder = wxFileName::CreateTempFileName("hive");
-    wxRemoveFile(folder);
-    wxFileName::Mkdir(folder + "/registry", wxS_DIR_DEFAULT, wxPATH_MKDIR_FULL);
-    setenv("XDG_CONFIG_HOME", folder.utf8_str(), 1);
-    struct Form
+    using Bytes = std::string;
+    const Bytes heading = "Windows Registry Editor Version 5.00\r\n\r\n";
+    const Bytes key = heading + "[HKEY_CURRENT_USER\\A\\K]\r\n";
+    const auto inUtf16 = [](const Bytes& text)
     {
-        const char* text;     // behind the key's line
-        const wchar_t* value; // none: not there
-        DWORD size;           // bytes
+        Bytes units = "\xFF\xFE";
+        for (const char character : text)
+            units += {character, '\0'};
+        return units;
     };
-    const wchar_t* const none = nullptr;
-    for (const Form& form :
-         {Form{"\"v\"=\"C:\\\\a \\\"b\\\"\"", L"C:\\a \"b\"", 18}, Form{" \"V\" = \"x\" ", L"x", 4}, Form{"@=\"x\"\n\"v\"=\"y\"", L"y", 4},
-          Form{"\"v\"=hex(2):78,00,\\\n  79,00", L"xy", 6}, Form{"\"v\"=hex:78, 00", L"x", 2}, Form{"\"v\"=hex(1):78,00,79", L"x", 3},
-          Form{"\"v\"=dword:00000078", L"x", 4}, Form{"\"v\"=\"x\"\n\"v\"=-", none, 0}, Form{"\"v\"=\"x\"\n\"v\"=\"y\"", L"y", 4},
-          Form{"\"v\"=\"x\"\n[-HKEY_CURRENT_USER\\K]\n[HKEY_CURRENT_USER\\k]", none, 0}, Form{";\"v\"=\"x\"", none, 0},
-          Form{"\"v\"=hex:7x\n\"v\"=hex(g):78\n\"v\"=dword:g\n\"v\"x\n\"v", none, 0}, Form{"\"v\"=\"\U0001F600\"", L"\U0001F600", 6},
-          Form{"\"v\"=hex:3d,d8,00,de", L"\U0001F600", 4}})
+    const char* const none = nullptr;
+    struct Export
     {
-        wxFFile(folder + "/registry/HKEY_CURRENT_USER.reg", "wb")
-            .Write("Windows Registry Editor Version 5.00\n\n[HKEY_CURRENT_USER\\K]\n" + wxString(form.text));
-        HKEY key = nullptr;
-        ASSERT_EQ(ERROR_SUCCESS, RegOpenKeyExW(HKEY_CURRENT_USER, L"k", 0, KEY_READ, &key)) << form.text;
-        std::array<BYTE, 64> data{};
-        DWORD type = 0;
-        DWORD size = data.size();
-        const LSTATUS status = RegQueryValueExW(key, L"v", nullptr, &type, data.data(), &size);
-        EXPECT_EQ(form.value == none ? ERROR_FILE_NOT_FOUND : ERROR_SUCCESS, status) << form.text;
-        if (form.value != none)
-        {
-            EXPECT_EQ(form.size, size) << form.text;
-            EXPECT_EQ(wxString(form.value), FromUtf16Bytes(data.data(), size)) << form.text;
-        }
-        RegCloseKey(key);
+        Bytes bytes;
+        const char* value; // in hexadecimal, after its type; none: not there
+    };
+    for (const auto& [bytes, expected] :
+         {Export{key + "\"v\"=\"a\\\\b \\\"c\\\"\"", "1:61005c0062002000220063002200"
+                                                     "0000"},
+          Export{key + "\"v\"=\"\U0001F600\"", "1:3dd800de0000"}, Export{"\xEF\xBB\xBF" + key + "\"V\"=\"x\"", "1:78000000"},
+          Export{inUtf16(key + "\"v\"=\"x\""), "1:78000000"}, Export{key + "@=\"x\"\r\n\"vv\"=\"x\"\r\n\"v\"=\"y\"", "1:79000000"},
+          Export{key + "\"v\"=hex(2):78,00,\\\r\n  79,00,00,00\r\n\"w\"=\"x\"", "2:780079000000"},
+          Export{key + "\"v\"=hex(2):78,00", "2:78000000"}, Export{key + "\"v\"=hex(1):78,00,79", "1:780079"},
+          Export{key + "\"v\"=hex(1):", "1:0000"}, Export{key + "\"v\"=hex(7):78,00", "7:7800"}, Export{key + "\"v\"=hex:78,00", "3:7800"},
+          Export{key + "\"v\"=hex:\r\n\"w\"=\"x\"", "3:"}, Export{key + "\"v\"=dword:01020378", "4:78030201"},
+          Export{key + "\"v\"=-", none}, Export{key + "\r\n[HKEY_CURRENT_USER\\A\\K\\L]\r\n\"v\"=\"x\"", none},
+          Export{heading + "[HKEY_CURRENT_USER\\A\\K\\L]\r\n\"v\"=\"x\"", none},
+          Export{heading + "[HKEY_CURRENT_USER\\A\\KL]\r\n\r\n[hkey_current_user\\a\\k]\r\n\"v\"=\"x\"", "1:78000000"}})
+    {
+        const std::string hive = DecodeRegistryExport(bytes);
+        const char* const lines = FindRegistryKey(hive, "HKEY_CURRENT_USER\\a\\K");
+        ASSERT_NE(nullptr, lines) << bytes;
+        const auto value = FindRegistryValue(lines, "v");
+        ASSERT_EQ(expected != none, value.has_value()) << bytes;
+        std::ostringstream found;
+        for (const int byte : value ? value->data : std::vector<BYTE>())
+            found << std::hex << std::setfill('0') << std::setw(2) << byte;
+        EXPECT_EQ(expected ? expected : ":", (value ? std::to_string(value->type) : "") + ":" + found.str()) << bytes;
     }
-    wxFileName::Rmdir(folder, wxPATH_RMDIR_RECURSIVE);
+    for (const Bytes& bytes : {heading + "[HKEY_CURRENT_USER\\A\\KL]\r\n", "REGEDIT4\r\n" + key.substr(heading.size()), Bytes()})
+        EXPECT_EQ(nullptr, FindRegistryKey(DecodeRegistryExport(bytes), "HKEY_CURRENT_USER\\A\\K")) << bytes;
 }

@@ -6,7 +6,7 @@ set -euo pipefail
 export LC_ALL=C DEBIAN_FRONTEND=noninteractive
 
 host=x86_64-w64-mingw32
-packages=(dpkg-dev make g++-mingw-w64-x86-64-posix)
+install_packages=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)/install_packages.sh
 cache=${FOLDER_UPGRADE_CACHE:-${XDG_CACHE_HOME:-$HOME/.cache}/folder-upgrade}
 
 flags=(-O2 -DNDEBUG -ffunction-sections -fdata-sections)
@@ -52,11 +52,6 @@ finish() {
     [ -z "${beat:-}" ] || kill "$beat" 2>/dev/null || true
     [ "$code" = 0 ] || { tail -n 30 "$work/log" >&2 && say "failed"; } || true
     rm -rf "$work"
-}
-
-install_packages() {
-    apt-get -q update
-    apt-get -qy -o DPkg::Lock::Timeout=600 install --no-install-recommends "$@"
 }
 
 # The machine's apt sources need not include source packages, and are not to be changed: the places of Debian's own
@@ -150,16 +145,7 @@ work=$(mktemp -d "$cache/build-XXXXXX")
 touch "$work/log"
 trap finish EXIT
 
-missing=()
-for package in "${packages[@]}"; do
-    # shellcheck disable=SC2016
-    [ "$(dpkg-query -W -f '${db:Status-Status}' "$package" 2>/dev/null)" = installed ] || missing+=("$package")
-done
-if [ ${#missing[@]} -gt 0 ]; then
-    [ "$(id -u)" = 0 ] || die "these Debian packages are missing: ${missing[*]}"
-    stage "installing ${missing[*]}" install_packages "${missing[@]}"
-fi
-
+stage "installing what is missing of Debian's packages" "$install_packages" mingw
 stage "looking up the source packages" update_sources
 stage "downloading wxWidgets" fetch wxwidgets3.2
 stage "downloading expat" fetch expat

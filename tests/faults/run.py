@@ -1,12 +1,14 @@
 #!/usr/bin/env python3
 """Runs the tool over and over on a small workstation, and each time another of its calls fails.
 
-Whichever call it is (see failing_calls.cpp), with each of four errors: the run ends with -1 and no
-report of a sanitizer, only what the call concerned differs from a run without a fault, and no file
-that is only read has changed.
+    tests/faults/run.py ERROR PROGRAM FAILING_CALLS
+
+Whichever call it is (see failing_calls.cpp, which FAILING_CALLS is built of), with an ERROR such as
+ENOSPC: the run ends with -1 and no report of a sanitizer, only what the call concerned differs from
+a run without a fault, and no file that is only read has changed.
 """
-import concurrent.futures
 import errno
+import itertools
 import os
 import pathlib
 import shutil
@@ -14,10 +16,7 @@ import subprocess
 import sys
 import tempfile
 
-ERRORS = (errno.ENOSPC, errno.EIO, errno.EACCES, errno.EINTR)
-WORKERS = os.cpu_count() or 1
 FINISHED = 255  # the tool's exit status of -1, on every path
-BUILD = pathlib.Path(__file__).resolve().parents[2] / "build/fuzz"
 ATTRIBUTES = "user.DOSATTRIB"
 LOG = "user/ORX_Installers"
 
@@ -75,7 +74,8 @@ def judge(hit, before, after, now):
 
 
 class Workstation:
-    def __init__(self, folder):
+    def __init__(self, folder, program, failing_calls):
+        self.failing_calls = failing_calls
         self.root, self.original, self.report = folder / "work station", folder / "original", folder / "report"
         for name, text in FILES.items():
             path = self.original / name
@@ -84,7 +84,7 @@ class Workstation:
         os.setxattr(self.original / "Hot Folders/B/Desktop.ini", ATTRIBUTES, b"0x4")
         (self.original / "Hot Folders/B/Desktop.ini").chmod(0o444)
         (self.root / "program").mkdir(parents=True)
-        for file in [BUILD / "FolderUpgrade", *BUILD.glob("*.ico")]:
+        for file in [program, *program.parent.glob("*.ico")]:
             shutil.copy2(file, self.root / "program")
 
     def run(self, number, error):
@@ -97,45 +97,41 @@ class Workstation:
         process = subprocess.run(
             [self.root / "program/FolderUpgrade", "I"], capture_output=True, text=True, timeout=60, check=False,
             env={**os.environ, "XDG_CONFIG_DIRS": f"{self.root}/machine", "XDG_CONFIG_HOME": f"{self.root}/user",
-                 "LD_PRELOAD": f"{BUILD}/tests/faults/libfailing_calls.so", "FAULT_ROOT": str(self.root),
+                 "LD_PRELOAD": self.failing_calls, "FAULT_ROOT": str(self.root),
                  "FAULT_NUMBER": str(number), "FAULT_ERROR": str(error), "FAULT_REPORT": str(self.report)})
         return process, self.report.read_text().split("\t") if self.report.exists() else [None, None]
 
 
-def try_faults(worker):
-    """With every error, each call whose turn this worker has: the number of good runs, and the others."""
+def try_faults(station, error):
+    """With every call failing in its turn: the number of good runs, and what was wrong with the others."""
     passed, failures = 0, []
+    station.run(0, 0)
+    after = look(station.root)
+    before = look(station.original)
+    if len({part(name) for name in before if after[name] != before[name]}) != 5:
+        return 0, ["without a fault not all 3 hot folders and 2 job presets change"]
+    for number in itertools.count(1):
+        process, (call, path) = station.run(number, error)
+        if not call:
+            return passed, failures
+        hit = os.path.relpath(path, station.root)
+        wrong = judge(hit, before, after, look(station.root))
+        if process.returncode != FINISHED or "Sanitizer" in process.stderr or "runtime error" in process.stderr:
+            wrong.add(f"exit status {process.returncode}, {process.stderr}")
+        passed += not wrong
+        if wrong:
+            failures.append(f"{call} number {number} fails, {hit}: {wrong}")
+
+
+def main():
+    error, program, failing_calls = sys.argv[1:]
     with tempfile.TemporaryDirectory() as folder:
-        station = Workstation(pathlib.Path(folder))
-        station.run(0, 0)
-        after = look(station.root)
-        before = look(station.original)
-        if len({part(name) for name in before if after[name] != before[name]}) != 5:
-            return 0, ["without a fault not all 3 hot folders and 2 job presets change"]
-        for error in ERRORS:
-            number = 1 + worker
-            process, (call, path) = station.run(number, error)
-            while call:
-                hit = os.path.relpath(path, station.root)
-                wrong = judge(hit, before, after, look(station.root))
-                if process.returncode != FINISHED or "Sanitizer" in process.stderr or "runtime error" in process.stderr:
-                    wrong.add(f"exit status {process.returncode}, {process.stderr}")
-                passed += not wrong
-                if wrong:
-                    failures.append(f"{call} number {number} fails with {errno.errorcode[error]}, {hit}: {wrong}")
-                number += WORKERS
-                process, (call, path) = station.run(number, error)
-    return passed, failures
+        station = Workstation(pathlib.Path(folder), pathlib.Path(program), failing_calls)
+        passed, failures = try_faults(station, getattr(errno, error))
+    print(*failures, sep="\n", end="\n" * bool(failures))
+    print(f"{passed} passed, {len(failures)} failed, 0 skipped")
+    return bool(failures) or not passed
 
 
 if __name__ == "__main__":
-    packages = ["g++", "clang", "libclang-rt-dev", "cmake", "ninja-build", "libwxgtk3.2-dev"]
-    build = ["cmake", "--build", "--preset", "fuzz"]
-    for step in (["cmake/install_packages.sh", *packages], ["cmake", "--preset", "fuzz"], build):
-        subprocess.run(step, cwd=BUILD.parents[1], check=True, stdout=subprocess.DEVNULL)
-    with concurrent.futures.ProcessPoolExecutor(WORKERS) as pool:
-        results = list(pool.map(try_faults, range(WORKERS)))
-    failed = [failure for _, failures in results for failure in failures]
-    print(*failed, sep="\n", end="\n" * bool(failed), file=sys.stderr)
-    print(f"{sum(passed for passed, _ in results)} passed, {len(failed)} failed")
-    sys.exit(bool(failed))
+    sys.exit(main())

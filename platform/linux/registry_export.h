@@ -1,0 +1,24 @@
+// A hive in the text form that the registry editor exports.
+#pragma once
+
+#include "platform/system.h"
+
+#include <optional>
+#include <string>
+#include <vector>
+
+struct RegistryValue
+{
+    DWORD type;
+    std::vector<BYTE> data;
+};
+
+/// The text, in UTF-8, of an export in UTF-8 or UTF-16; empty when the bytes are none.
+std::string DecodeRegistryExport(std::string bytes);
+
+/// The first line after that of a key; null when neither the key nor one below it is there. The
+/// path begins with the hive's full name. Names of keys and values are of ASCII, in any case.
+const char* FindRegistryKey(const std::string& hive, const std::string& path);
+
+/// The value of that name in the lines of a key.
+std::optional<RegistryValue> FindRegistryValue(const char* lines, const std::string& name);
