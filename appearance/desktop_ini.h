@@ -14,8 +14,8 @@ struct DesktopIniKey
     wxString value;
 };
 
-/// The keys that are written, in their order: all for a Desktop.ini that is not there yet, else those that show
-/// the icon and the info tip.
+/// The keys that are written, in their order: all for a Desktop.ini that is not there yet, else
+/// those that show the icon and the info tip.
 std::vector<DesktopIniKey> DesktopIniKeys(bool isThere, const wxString& iconName);
 
 /// Sets one key; the success flag of WritePrivateProfileStringW, which changes no other key and
@@ -23,10 +23,12 @@ std::vector<DesktopIniKey> DesktopIniKeys(bool isThere, const wxString& iconName
 bool WriteIniString(const wxString& section, const wxString& key, const wxString& value,
                     const wxString& path);
 
-/// Makes a Desktop.ini with its keys. False, and nothing written, when the hot folder is not a directory; failed
-/// writes are not reported. Nothing is written when anything of that name is there.
+/// Makes a Desktop.ini with its keys. False, and nothing written, when the hot folder is not a
+/// directory; failed writes are not reported. Nothing is written when anything of that name is
+/// there.
 bool CreateDesktopIni(const wxString& hotFolder, const wxString& iconName);
 
-/// Takes read-only and system from a Desktop.ini, writes its keys and has the shell force the folder's icon
-/// with SHGetSetFolderCustomSettings. All other keys stay; of the attributes none does. Result as above.
+/// Takes read-only and system from a Desktop.ini, writes its keys and has the shell force the
+/// folder's icon with SHGetSetFolderCustomSettings. All other keys stay; of the attributes none
+/// does. Result as above.
 bool RefreshDesktopIni(const wxString& hotFolder, const wxString& iconName);
