@@ -68,6 +68,7 @@ native() {
     cmake/install_packages.sh clang libclang-rt-dev python3
     part "Fuzzing, each corpus and 20 s of each target" fuzz/run.sh 20
     part "Faults, each call of a run failing once with each of four errors" tests/faults/run.py
+    part "Benchmarks, each program once over 10 folders" bench/run.sh once
     checks
 }
 
