@@ -1,12 +1,13 @@
 // The application object, and in OnInit the body of the run: the switch, and the fixed order of the
 // steps.
 #include "run/folder_upgrade_app.h"
-#include "store/hot_folder_list.h"
-#include "run/run_log.h"
+
 #include "appearance/folder_icon.h"
 #include "appearance/icon_source.h"
 #include "migrate/hot_folder_impose_path.h"
 #include "migrate/job_preset_impose_path.h"
+#include "run/run_log.h"
+#include "store/hot_folder_list.h"
 
 #include <wx/arrstr.h>
 #include <wx/debug.h>

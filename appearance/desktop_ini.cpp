@@ -44,7 +44,8 @@ std::vector<DesktopIniKey> DesktopIniKeys(bool isThere, const wxString& iconName
     const wxString iconFile = wxString(L".\\") + PrivateDirName + L"\\" + iconName;
     if (isThere)
         return {{InfoTipKey, HotFolderInfoTip}, {IconFileKey, iconFile}};
-    return {{IconFileKey, iconFile}, {IconIndexKey, IconIndexValue}, {InfoTipKey, HotFolderInfoTip}};
+    return {
+        {IconFileKey, iconFile}, {IconIndexKey, IconIndexValue}, {InfoTipKey, HotFolderInfoTip}};
 }
 
 bool WriteIniString(const wxString& section, const wxString& key, const wxString& value,
@@ -58,8 +59,8 @@ bool CreateDesktopIni(const PinnedDirectory& directory, const wxString& iconName
 {
     if (!directory.IsOpen())
         return false;
-    // The profile functions would create it through a link, too. While the file is open for reading, nobody
-    // puts one in its place.
+    // The profile functions would create it through a link, too. While the file is open for
+    // reading, nobody puts one in its place.
     const wxString path = directory.Reach(DesktopIniName);
     RegularFile ini;
     if (ini.CreateNew(path) == RegularFile::Status::Open &&
@@ -77,8 +78,8 @@ bool RefreshDesktopIni(const PinnedDirectory& directory, const wxString& hotFold
     RegularFile ini; // as above; what cannot be read, the profile functions cannot write
     if (ini.OpenForReading(path, Links::Refuse) != RegularFile::Status::Open)
         return true;
-    // Both bits go, also when only one is there: with the other bit set instead the writes that follow
-    // would fail, and the icon that the user chose would be overwritten with a default.
+    // Both bits go, also when only one is there: with the other bit set instead the writes that
+    // follow would fail, and the icon that the user chose would be overwritten with a default.
     ChangeAttributes(path, 0, ReadOnlyAndSystem);
     WriteKeys(path, DesktopIniKeys(true, iconName));
 

@@ -40,7 +40,8 @@ void TellShell(const wxString& iniPath)
     SHChangeNotify(SHCNE_ASSOCCHANGED, SHCNF_IDLIST | SHCNF_FLUSH, nullptr, nullptr);
 }
 
-void WriteDesktopIni(const PinnedDirectory& directory, const wxString& hotFolder, const wxString& iconName)
+void WriteDesktopIni(const PinnedDirectory& directory, const wxString& hotFolder,
+                     const wxString& iconName)
 {
     if (wxFileExists(directory.Reach(DesktopIniName)))
         RefreshDesktopIni(directory, hotFolder, iconName);

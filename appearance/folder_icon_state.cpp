@@ -22,8 +22,8 @@ bool IsEnabled(const PinnedHotFolder& folder, const wxString& hotFolder)
     return settings.Enable;
 }
 
-// The library reports a directory that it cannot open, so that is asked first; and before that whether
-// the file is there at all, which is quicker than a look through the directory.
+// The library reports a directory that it cannot open, so that is asked first; and before that
+// whether the file is there at all, which is quicker than a look through the directory.
 bool HasError(const PinnedHotFolder& folder)
 {
     const wxString path = folder.privateDir.Reach(L"");

@@ -20,4 +20,5 @@ enum class FolderIconState
 bool GetFolderIconName(const wxString& hotFolder, wxString& iconName);
 
 /// The same for a hot folder that is pinned; people know it by the path.
-bool GetFolderIconName(const PinnedHotFolder& folder, const wxString& hotFolder, wxString& iconName);
+bool GetFolderIconName(const PinnedHotFolder& folder, const wxString& hotFolder,
+                       wxString& iconName);

@@ -57,8 +57,8 @@ bool IsEmptyText(const std::string& bytes)
     return bytes.length() == markLength || (mark == wxBOM_Unknown && bytes == "\xFF\xFE");
 }
 
-// The bytes are decoded as they are and line ends treated as text mode does, where the system has one: text
-// mode itself would end the file at the first Ctrl-Z, and see line ends inside UTF-16.
+// The bytes are decoded as they are and line ends treated as text mode does, where the system has
+// one: text mode itself would end the file at the first Ctrl-Z, and see line ends inside UTF-16.
 const char* Decode(const std::string& bytes, wxString& text)
 {
     if (IsEmptyText(bytes))

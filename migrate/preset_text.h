@@ -20,6 +20,6 @@ struct RewrittenPreset
     std::string bytes;
 };
 
-/// The content that replaces these bytes: the paths moved, in UTF-8 without byte-order mark, and where the
-/// system ends lines with CR LF, so ends every line.
+/// The content that replaces these bytes: the paths moved, in UTF-8 without byte-order mark, and
+/// where the system ends lines with CR LF, so ends every line.
 RewrittenPreset RewritePreset(const std::string& before, const wxString& from, const wxString& to);

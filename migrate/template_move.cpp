@@ -25,8 +25,8 @@ bool IsOnServer(const wxString& path)
     return path.length() > 1 && IsAnySeparator(path[0]) && IsAnySeparator(path[1]);
 }
 
-// "\\host\share", in lower case and with backslashes; of "\\?\UNC\host\share\x" and the like so many parts
-// that the host is among them.
+// "\\host\share", in lower case and with backslashes; of "\\?\UNC\host\share\x" and the like so
+// many parts that the host is among them.
 wxString Share(const wxString& path)
 {
     wxStringTokenizer parts(path.Lower(), "\\/", wxTOKEN_STRTOK);
@@ -74,11 +74,14 @@ bool IsSameFolder(const wxString& stored, const wxString& folder)
            !IsElsewhereByName(stored, folder) && right.SameAs(left, wxPATH_NATIVE);
 }
 
-TemplateMove DecideTemplateMove(const wxString& storedPath, const std::string& folderCfg, bool isUpgrade)
+TemplateMove DecideTemplateMove(const wxString& storedPath, const std::string& folderCfg,
+                                bool isUpgrade)
 {
     using Outcome = TemplateMove::Outcome;
-    const Lookup lookUpFrom = isUpgrade ? GetPreviousImposeTemplatePath : GetDefaultImposeTemplatePath;
-    const Lookup lookUpTo = isUpgrade ? GetDefaultImposeTemplatePath : GetPreviousImposeTemplatePath;
+    const Lookup lookUpFrom =
+        isUpgrade ? GetPreviousImposeTemplatePath : GetDefaultImposeTemplatePath;
+    const Lookup lookUpTo =
+        isUpgrade ? GetDefaultImposeTemplatePath : GetPreviousImposeTemplatePath;
     wxFileName from;
     if (!lookUpFrom(from))
         return {Outcome::NoFromFolder, {}, {}};

@@ -1,12 +1,14 @@
-// Copying a file over another one; one source for each system, and file_copy.cpp for what is the same on all.
+// Copying a file over another one; one source for each system, and file_copy.cpp for what is the
+// same on all.
 #pragma once
 
 #include <wx/string.h>
 
-/// Makes the content and attributes of an existing file those of the source, as wxCopyFile does: in place, and
-/// off Windows, where a file's own permissions do not protect it from that, in a new file where it cannot be
-/// written. Through a link in the destination's place nothing is written. False when that fails; a
-/// destination that was written in place then has its old content. Does not wait for the disk.
+/// Makes the content and attributes of an existing file those of the source, as wxCopyFile does: in
+/// place, and off Windows, where a file's own permissions do not protect it from that, in a new
+/// file where it cannot be written. Through a link in the destination's place nothing is written.
+/// False when that fails; a destination that was written in place then has its old content. Does
+/// not wait for the disk.
 bool CopyOver(const wxString& source, const wxString& destination);
 
 /// Whether CopyOver would be let at the destination, and could read the source. Changes nothing.

@@ -3,8 +3,8 @@
 
 #include <wx/filename.h>
 
-/// What wxFileName::Normalize does by default (wxPATH_NORM_ALL, which the library calls deprecated):
-/// variables expanded, dots and a leading tilde resolved, made absolute, short names made long,
-/// shortcuts followed. Letter case stays.
+/// What wxFileName::Normalize does by default (wxPATH_NORM_ALL, which the library calls
+/// deprecated): variables expanded, dots and a leading tilde resolved, made absolute, short names
+/// made long, shortcuts followed. Letter case stays.
 constexpr int NormalizeAll = wxPATH_NORM_ENV_VARS | wxPATH_NORM_DOTS | wxPATH_NORM_TILDE |
                              wxPATH_NORM_ABSOLUTE | wxPATH_NORM_LONG | wxPATH_NORM_SHORTCUT;

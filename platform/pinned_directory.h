@@ -6,8 +6,8 @@
 #include <cstdint>
 #include <utility>
 
-/// Whether the last part of a path may be a link: a symbolic link, on Windows any reparse point whose
-/// tag says that it names another file or directory. A cloud file's placeholder is no link.
+/// Whether the last part of a path may be a link: a symbolic link, on Windows any reparse point
+/// whose tag says that it names another file or directory. A cloud file's placeholder is no link.
 enum class Links
 {
     Follow,
@@ -19,8 +19,9 @@ bool IsLink(const wxString& path);
 
 /// Keeps a directory from being exchanged for another one, or for a link, between two looks at it.
 ///
-/// Windows: a handle without FILE_SHARE_DELETE, so that neither the directory nor one above it can be
-/// renamed or removed. Elsewhere: a descriptor; what is below it is reached by way of /proc/self/fd.
+/// Windows: a handle without FILE_SHARE_DELETE, so that neither the directory nor one above it can
+/// be renamed or removed. Elsewhere: a descriptor; what is below it is reached by way of
+/// /proc/self/fd.
 class PinnedDirectory
 {
   public:
@@ -29,16 +30,17 @@ class PinnedDirectory
     PinnedDirectory(const PinnedDirectory&) = delete;
     PinnedDirectory& operator=(const PinnedDirectory&) = delete;
 
-    /// False when there is no such directory, when it cannot be entered, or when it is a refused link.
+    /// False when there is no such directory, when it cannot be entered, or when it is a refused
+    /// link.
     bool IsOpen() const;
 
-    /// The path of an entry, or for an empty name of the directory itself, for the calls of the system and of
-    /// the library. Not for people: on Linux it names the descriptor. Of a directory that is not open it leads
-    /// nowhere.
+    /// The path of an entry, or for an empty name of the directory itself, for the calls of the
+    /// system and of the library. Not for people: on Linux it names the descriptor. Of a directory
+    /// that is not open it leads nowhere.
     wxString Reach(const wxString& name) const;
 
-    /// What no other directory has while both are open: volume and file index, or device and inode. Two zeros
-    /// of one that is not open.
+    /// What no other directory has while both are open: volume and file index, or device and inode.
+    /// Two zeros of one that is not open.
     std::pair<std::uint64_t, std::uint64_t> Identity() const;
 
   private:

@@ -12,6 +12,6 @@ bool IsElevated();
 /// the user's number if it has no name. Empty if the system does not say.
 wxString AccountName();
 
-/// Whether the process refuses to pass links that a process without administrator's rights has made: an
-/// elevated one on Windows 11 and Windows 10 22H2.
+/// Whether the process refuses to pass links that a process without administrator's rights has
+/// made: an elevated one on Windows 11 and Windows 10 22H2.
 bool RefusesLinksOfOthers();

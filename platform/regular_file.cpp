@@ -37,7 +37,8 @@ bool RegularFile::Rewrite(const std::string& before, const std::string& after, W
         return false;
     }
     const bool isCut = longest > after.size();
-    const bool isWritten = isCut ? Write(0, after + std::string(longest - after.size(), '\n')) : Write(0, after);
+    const bool isWritten =
+        isCut ? Write(0, after + std::string(longest - after.size(), '\n')) : Write(0, after);
     if (isWritten && (!isCut || SetLength(newLength)))
     {
         if (wait == Wait::ForDisk)

@@ -9,11 +9,11 @@
 #include <cstdint>
 #include <string>
 
-/// A file opened without waiting for anybody (a pipe in its place, say) and, where links are refused, not
-/// through one. No call reports an error by itself.
+/// A file opened without waiting for anybody (a pipe in its place, say) and, where links are
+/// refused, not through one. No call reports an error by itself.
 ///
-/// As long as the object lives it is the same file, whatever happens to its name; on Windows nobody can
-/// rename or remove it meanwhile (it is opened without FILE_SHARE_DELETE).
+/// As long as the object lives it is the same file, whatever happens to its name; on Windows nobody
+/// can rename or remove it meanwhile (it is opened without FILE_SHARE_DELETE).
 class RegularFile
 {
   public:
@@ -40,13 +40,14 @@ class RegularFile
     Status OpenForReading(const wxString& path, Links links);
     /// For reading and writing. The content stays as it is.
     Status OpenForUpdate(const wxString& path, Links links);
-    /// Opens the same file for update as well (ReOpenFile; elsewhere the name has to lead to the same device
-    /// and inode). Unless the result is Open, the file stays open for reading.
+    /// Opens the same file for update as well (ReOpenFile; elsewhere the name has to lead to the
+    /// same device and inode). Unless the result is Open, the file stays open for reading.
     Status ReopenForUpdate();
-    /// Makes a new, empty file and opens it for update; fails, with nothing changed, when anything of that
-    /// name is there (CREATE_NEW, O_EXCL).
+    /// Makes a new, empty file and opens it for update; fails, with nothing changed, when anything
+    /// of that name is there (CREATE_NEW, O_EXCL).
     Status CreateNew(const wxString& path);
-    /// False when the system reports an error, which concerns nobody: all bytes were handed over before.
+    /// False when the system reports an error, which concerns nobody: all bytes were handed over
+    /// before.
     bool Close();
 
     Status GetStatus() const;
@@ -55,30 +56,32 @@ class RegularFile
     /// The whole content as it is now; false when it could not be read to its end.
     bool Read(std::string& bytes) const;
 
-    /// Makes the second text the whole content, in place of the first, which is what the file holds.
+    /// Makes the second text the whole content, in place of the first, which is what the file
+    /// holds.
     ///
-    /// Room for a longer content is made before a byte changes, where the system can (a full disk leaves the
-    /// file as it was). One write; a shorter content is written with line feeds up to the old length, and
-    /// then cut. When any of that fails, the old bytes are put back and the result is false. At last, unless
-    /// that is not wanted, waits for the disk; when that fails, the new content stays. A process that is ended meanwhile leaves the old
-    /// content, the new one, or the new one followed by line feeds, as far as the system carries out a write
-    /// as one.
+    /// Room for a longer content is made before a byte changes, where the system can (a full disk
+    /// leaves the file as it was). One write; a shorter content is written with line feeds up to
+    /// the old length, and then cut. When any of that fails, the old bytes are put back and the
+    /// result is false. At last, unless that is not wanted, waits for the disk; when that fails,
+    /// the new content stays. A process that is ended meanwhile leaves the old content, the new
+    /// one, or the new one followed by line feeds, as far as the system carries out a write as one.
     bool Rewrite(const std::string& before, const std::string& after, Wait wait = Wait::ForDisk);
 
-    /// Takes over what wxCopyFile takes over with the content. Windows: the attributes and the time of the last
-    /// change. Elsewhere: the mode.
+    /// Takes over what wxCopyFile takes over with the content. Windows: the attributes and the time
+    /// of the last change. Elsewhere: the mode.
     void TakeAttributes(const RegularFile& source);
     /// Whether that would leave read-only, hidden, system or the mode as they are.
     bool HasAttributesOf(const RegularFile& source) const;
 
-    /// Has the library report that the file could not be written, under that path and with the error of the call
-    /// that failed.
+    /// Has the library report that the file could not be written, under that path and with the
+    /// error of the call that failed.
     void ReportNotWritten(const wxString& shownPath) const;
 
     /// Cuts the file, or fills it up with zeros.
     bool SetLength(std::int64_t length);
 
-    /// Adds the bytes at the end; false, and nothing added, when that fails. Does not wait for the disk.
+    /// Adds the bytes at the end; false, and nothing added, when that fails. Does not wait for the
+    /// disk.
     bool Append(const std::string& bytes);
 
   private:
@@ -98,7 +101,7 @@ class RegularFile
 #endif
 };
 
-/// Has the library report that the file could not be opened or read, with the system's last error: on Windows
-/// in a message box after the run.
+/// Has the library report that the file could not be opened or read, with the system's last error:
+/// on Windows in a message box after the run.
 void ReportNotOpened(const wxString& path);
 void ReportNotRead(const wxString& path);

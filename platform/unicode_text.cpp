@@ -69,7 +69,8 @@ wxString ToOneLine(const wxString& text)
     for (auto character = result.begin(); character != result.end(); ++character)
     {
         const auto code = static_cast<unsigned long>((*character).GetValue());
-        if ((code < 0x20 && code != '\t') || (code >= 0x7F && code < 0xA0) || code == 0x2028 || code == 0x2029)
+        if ((code < 0x20 && code != '\t') || (code >= 0x7F && code < 0xA0) || code == 0x2028 ||
+            code == 0x2029)
             *character = wxUniChar(0xFFFD);
     }
     return result;

@@ -24,7 +24,8 @@ RegularFile::Status OpenLog(RegularFile& file, const PinnedDirectory& directory,
     if (!isFirstLine)
         return status;
     if (status == RegularFile::Status::NotThere)
-        return file.CreateNew(path) == RegularFile::Status::Open ? RegularFile::Status::Open : status;
+        return file.CreateNew(path) == RegularFile::Status::Open ? RegularFile::Status::Open
+                                                                 : status;
     if (status == RegularFile::Status::Open)
         file.SetLength(0);
     return status;

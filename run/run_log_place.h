@@ -5,6 +5,6 @@
 
 constexpr const wchar_t* RunLogFileName = L"UpgradeDowngrade.log";
 
-/// The log's folder, ORX_Installers in the per-user application data folder, with a final separator. Whether it is
-/// there is not asked; the tool does not create it.
+/// The log's folder, ORX_Installers in the per-user application data folder, with a final
+/// separator. Whether it is there is not asked; the tool does not create it.
 wxString RunLogDirPath();

@@ -1,7 +1,7 @@
 // The names in Folder.cfg, which its reader and its writer share.
 //
-// An XML 1.0 document in UTF-8. The root element has the attributes of store/root_attributes.h; below it
-// are the sections, in the order of their names here. Inside JobSetting, ImposeSetting and
+// An XML 1.0 document in UTF-8. The root element has the attributes of store/root_attributes.h;
+// below it are the sections, in the order of their names here. Inside JobSetting, ImposeSetting and
 // PreflightSettings an attribute's position counts, not its name.
 //
 // The names are wide, as the library's strings are: converting them took as long as half a load.
@@ -19,7 +19,8 @@ constexpr const wchar_t* ImposeSettingSection = L"ImposeSetting";
 constexpr const wchar_t* FilterSettingSection = L"FilterSetting";
 constexpr const wchar_t* PreflightSection = L"PreflightSettings";
 
-/// The key of the imposition setting whose value is the template's path. Job presets use the same key.
+/// The key of the imposition setting whose value is the template's path. Job presets use the same
+/// key.
 constexpr const wchar_t* ImposeTemplateKey = L"ORXImposeTemplate";
 
 constexpr const wchar_t* Failfolder = L"Failfolder";

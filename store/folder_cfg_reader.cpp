@@ -1,8 +1,8 @@
 #include "store/folder_cfg_reader.h"
 
-#include "store/xml_file.h"
 #include "store/folder_cfg_format.h"
 #include "store/root_attributes.h"
+#include "store/xml_file.h"
 #include "store/xml_lookup.h"
 #include "store/xml_tree.h"
 

@@ -20,8 +20,8 @@ int LoadHotFolderSettings(const wxString& path, HotFolderSettings& settings);
 /// node stays as it was. Returns 0 in every case.
 int ReadFilterSetting(const wxString& path, wxXmlNode& node);
 
-/// What follows takes the root of a loaded document, or none. A missing section leaves the value as it
-/// was; entries with too few attributes are skipped.
+/// What follows takes the root of a loaded document, or none. A missing section leaves the value as
+/// it was; entries with too few attributes are skipped.
 
 /// As LoadHotFolderSettings; -1 without a root.
 int ReadHotFolderSettings(const wxXmlNode* root, HotFolderSettings& settings);

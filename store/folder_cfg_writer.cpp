@@ -27,8 +27,8 @@ class StringOutputStream : public wxOutputStream
     }
 };
 
-// One section under construction. It remembers its last child: to look for it each time would take a time
-// that grows with the square.
+// One section under construction. It remembers its last child: to look for it each time would take
+// a time that grows with the square.
 class Section
 {
   public:

@@ -9,16 +9,16 @@
 #include <string>
 #include <vector>
 
-/// The content of a Folder.cfg with the six values, and nothing else. A filter setting of another name than
-/// "FilterSetting" is left out, and one deeper than MaxFilterLevels must not be given.
+/// The content of a Folder.cfg with the six values, and nothing else. A filter setting of another
+/// name than "FilterSetting" is left out, and one deeper than MaxFilterLevels must not be given.
 std::string FolderCfgBytes(const HotFolderSettings& settings, const JobSettingTable& jobSettings,
                            const HotFolderPaths& paths, const wxXmlNode& filterSetting,
                            const ImposeSettingTable& imposeSettings,
                            const PreflightSettingList& preflightSettings);
 
-/// Makes that the content of the file, as RegularFile::Rewrite does; a file that is not there is created. One
-/// that cannot be opened or written stays as it was. Holds FolderCfgLock throughout. Returns 0 in
-/// every case; the library reports what cannot be opened or written.
+/// Makes that the content of the file, as RegularFile::Rewrite does; a file that is not there is
+/// created. One that cannot be opened or written stays as it was. Holds FolderCfgLock throughout.
+/// Returns 0 in every case; the library reports what cannot be opened or written.
 int SaveHotFolderSettings(const wxString& path, const HotFolderSettings& settings,
                           const JobSettingTable& jobSettings, const HotFolderPaths& paths,
                           const wxXmlNode& filterSetting, const ImposeSettingTable& imposeSettings,

@@ -5,7 +5,8 @@
 
 #include <wx/string.h>
 
-/// The directory, directly inside a hot folder, in which the client keeps the folder's settings and icons.
+/// The directory, directly inside a hot folder, in which the client keeps the folder's settings and
+/// icons.
 constexpr const wchar_t* PrivateDirName = L"[_ORX_HotFolder_]";
 constexpr const wchar_t* FolderCfgName = L"Folder.cfg";
 
@@ -15,8 +16,8 @@ wxString PrivateDirPath(const wxString& hotFolder);
 /// The path of the hot folder's Folder.cfg, in its private directory.
 wxString FolderCfgPath(const wxString& hotFolder);
 
-/// A hot folder and its private directory, which stay the same while a step works in them. The hot folder may
-/// be reached over links; a private directory that is one counts as missing.
+/// A hot folder and its private directory, which stay the same while a step works in them. The hot
+/// folder may be reached over links; a private directory that is one counts as missing.
 struct PinnedHotFolder
 {
     explicit PinnedHotFolder(const wxString& path);

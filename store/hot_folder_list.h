@@ -14,8 +14,8 @@ wxString GetHotFolderDataDir();
 struct HotFolderList
 {
     XmlFile::State state = XmlFile::State::Missing;
-    /// The folders that exist, in the order of the file and as the file spells them, less white space at
-    /// their end; of paths that are equal ignoring case, the first.
+    /// The folders that exist, in the order of the file and as the file spells them, less white
+    /// space at their end; of paths that are equal ignoring case, the first.
     wxArrayString folders;
     wxArrayString missing;  // no directory of that name
     wxArrayString repeated; // equal to one before, ignoring case
@@ -24,6 +24,6 @@ struct HotFolderList
 /// A list that cannot be opened or parsed is reported by the library.
 HotFolderList LoadHotFolderList();
 
-/// Appends the folders of the list, but for those that are in the array already, ignoring case. A list that
-/// is missing or cannot be read adds nothing.
+/// Appends the folders of the list, but for those that are in the array already, ignoring case. A
+/// list that is missing or cannot be read adds nothing.
 void ReadHotFolderList(wxArrayString& folders);

@@ -26,7 +26,8 @@ std::vector<const RootAttribute*> InChainOrder()
     std::vector<const RootAttribute*> chain;
     for (const RootAttribute& attribute : RootAttributes())
         chain.push_back(&attribute);
-    std::sort(chain.begin(), chain.end(), [](const RootAttribute* left, const RootAttribute* right)
+    std::sort(chain.begin(), chain.end(),
+              [](const RootAttribute* left, const RootAttribute* right)
               { return left->chainPlace < right->chainPlace; });
     return chain;
 }
@@ -55,7 +56,7 @@ const std::vector<RootAttribute>& RootAttributes()
         {L"Quickset_Enabled", F::NumericFlag, &S::Quickset_Enabled, 21},
         {L"Quickset", F::Text, &S::Quickset, 19},
         {L"IsWidthBased", F::NumericFlag, &S::IsWidthBased, 22},
-        {L"Enable", F::TextFlag, &S::Enable, 5},
+        {L"Enable", F::TextFlag, &S::Enable, EnablePlace},
         {L"Centralized", F::TextFlag, &S::Centralized, 10},
         {L"Isjobpresetattached", F::TextFlag, &S::Isjobpresetattached, 11},
         {L"IsCustomInterval", F::TextFlag, &S::IsCustomInterval, 12},

@@ -35,10 +35,14 @@ struct RootAttribute
 /// All of them, in the order in which they are written.
 const std::vector<RootAttribute>& RootAttributes();
 
-/// Reads the attributes as a chain, in the order of their places, up to the first that is absent: from there on
-/// all fields stay as they were. An absent number becomes -1 and does not end the chain. Gives the attribute
-/// at which the chain ended, or none.
-const RootAttribute* ReadRootAttributes(const AttributeMap& attributes, HotFolderSettings& settings);
+/// Reads the attributes as a chain, in the order of their places, up to the first that is absent:
+/// from there on all fields stay as they were. An absent number becomes -1 and does not end the
+/// chain. Gives the attribute at which the chain ended, or none.
+const RootAttribute* ReadRootAttributes(const AttributeMap& attributes,
+                                        HotFolderSettings& settings);
 
 /// The place of the last attribute, "server_name", without which a Folder.cfg counts as not read.
 constexpr int LastRequiredPlace = 4;
+
+/// The place of "Enable".
+constexpr int EnablePlace = 5;

@@ -27,23 +27,6 @@ bool IsSingleByte(const wxString& encoding)
            (code >= wxFONTENCODING_CP1250 && code <= wxFONTENCODING_CP1258);
 }
 
-// The encoding that the document declares: UTF-8 without a declaration (as in UTF-16, which the parser
-// recognises by itself), none for an empty document. The library's answer is no use where white space
-// surrounds the equals sign: it is UTF-8 or nonsense then, while its parser knows better.
-wxString DeclaredEncoding(const std::string& document)
-{
-    constexpr size_t LongestDeclaration = 256;
-    wxString declaration =
-        wxString::From8BitData(document.data(), std::min(document.size(), LongestDeclaration)).BeforeFirst('>');
-    if (declaration.StartsWith(L"\u00EF\u00BB\u00BF"))
-        declaration.Remove(0, 3);
-    const size_t name = declaration.find("encoding");
-    if (!declaration.StartsWith("<?xml") || name == wxString::npos)
-        return document.empty() ? "" : "UTF-8";
-    const wxString value = declaration.Mid(name).AfterFirst('=').Trim(false);
-    return value.Mid(1).BeforeFirst(value[0]);
-}
-
 // Where the library does not know the encoding at all, nothing is read as what it is.
 bool IsReadAsAscii(const std::string& document, const wxString& encoding)
 {
@@ -59,6 +42,32 @@ bool IsReadAsAscii(const std::string& document, const wxString& encoding)
 }
 
 } // namespace
+
+wxString DeclaredEncoding(const std::string& document)
+{
+    // The library's answer is no use where white space surrounds the equals sign: it is UTF-8 or
+    // nonsense then, while its parser knows better.
+    constexpr size_t LongestDeclaration = 256;
+    wxString declaration =
+        wxString::From8BitData(document.data(), std::min(document.size(), LongestDeclaration))
+            .BeforeFirst('>');
+    if (declaration.StartsWith(L"\u00EF\u00BB\u00BF"))
+        declaration.Remove(0, 3);
+    const size_t name = declaration.find("encoding");
+    if (!declaration.StartsWith("<?xml") || name == wxString::npos)
+        return document.empty() ? "" : "UTF-8";
+    const wxString value = declaration.Mid(name).AfterFirst('=').Trim(false);
+    return value.Mid(1).BeforeFirst(value[0]);
+}
+
+bool IsUtf8(const std::string& document)
+{
+    const bool isAscii =
+        std::all_of(document.begin(), document.end(),
+                    [](char byte) { return static_cast<unsigned char>(byte) < 0x80; });
+    return isAscii || (DeclaredEncoding(document).CmpNoCase("UTF-8") == 0 &&
+                       !wxString::FromUTF8(document.data(), document.size()).empty());
+}
 
 EncodingMap GetEncodingMap(const wxString& encoding)
 {

@@ -65,6 +65,11 @@ const wxXmlNode* XmlFile::GetRoot() const
     return m_document.GetRoot();
 }
 
+const wxXmlDocument& XmlFile::GetDocument() const
+{
+    return m_document;
+}
+
 const std::string& XmlFile::GetBytes() const
 {
     return m_bytes;

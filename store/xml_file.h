@@ -25,15 +25,17 @@ class XmlFile
     /// Opens the same file for writing, too. Where that is refused, reports it with the library.
     RegularFile::Status ReopenForUpdate();
 
-    /// Reads the file once more, and parses it unless it is the same to the byte; false when that fails.
+    /// Reads the file once more, and parses it unless it is the same to the byte; false when that
+    /// fails.
     bool LoadAgain();
 
-    /// Makes these bytes the whole content, as RegularFile::Rewrite does; a failure is reported with the
-    /// library.
+    /// Makes these bytes the whole content, as RegularFile::Rewrite does; a failure is reported
+    /// with the library.
     void Rewrite(const std::string& bytes);
 
     /// The root of the loaded document; every text node of nothing but white space is there.
     const wxXmlNode* GetRoot() const;
+    const wxXmlDocument& GetDocument() const;
     /// The content as it was loaded.
     const std::string& GetBytes() const;
 

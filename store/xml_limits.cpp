@@ -15,26 +15,26 @@ namespace
 // elements with a default of 8 KB each (64 million characters in all), or 16,384 pieces of a text.
 constexpr size_t HarmlessBytes = size_t{16} * 1024;
 
-// Levels of elements. The library destroys a document by recursion: 500,000 fit on our stack of 64 MiB,
-// 1,000,000 do not.
+// Levels of elements. The library destroys a document by recursion: 500,000 fit on our stack of 64
+// MiB, 1,000,000 do not.
 constexpr int MaxDepth = 250000;
 
-// Bytes of memory, counted for each node, attribute and character as the library keeps them on a 64-bit
-// system with wide characters of four bytes. 100,000 job settings take some 120 million.
+// Bytes of memory, counted for each node, attribute and character as the library keeps them on a
+// 64-bit system with wide characters of four bytes. 100,000 job settings take some 120 million.
 constexpr std::uint64_t MaxMemory = 192 * std::uint64_t{1000} * 1000;
 constexpr std::uint64_t NodeMemory = 208;
 constexpr std::uint64_t AttributeMemory = 176;
 constexpr std::uint64_t CharacterMemory = 4;
 
-// Characters that the library copies because it adds every piece of a text to all that was before. A
-// piece ends at each line end, at each escaped character and at each border of the buffer below.
+// Characters that the library copies because it adds every piece of a text to all that was before.
+// A piece ends at each line end, at each escaped character and at each border of the buffer below.
 constexpr std::uint64_t MaxCopiedCharacters = 1000 * std::uint64_t{1000} * 1000;
 
 // Attributes that it passes by because it looks for the last one to add another.
 constexpr std::uint64_t MaxAttributeSteps = 100 * std::uint64_t{1000} * 1000;
 
-// Bytes that the parser reads again because it is given the document in pieces of this size, and begins a
-// tag, comment or instruction that is not whole afresh with each.
+// Bytes that the parser reads again because it is given the document in pieces of this size, and
+// begins a tag, comment or instruction that is not whole afresh with each.
 constexpr std::uint64_t LibraryBuffer = 1024;
 constexpr std::uint64_t MaxBytesReadAgain = 1000 * std::uint64_t{1000} * 1000;
 
@@ -61,7 +61,8 @@ class Look
         for (const char** each = attributes; *each; each += 2)
         {
             ++count;
-            m_memory += AttributeMemory + CharacterMemory * (std::strlen(each[0]) + std::strlen(each[1]));
+            m_memory +=
+                AttributeMemory + CharacterMemory * (std::strlen(each[0]) + std::strlen(each[1]));
         }
         m_memory += NodeMemory;
         m_attributeSteps += count * count / 2;
@@ -82,7 +83,8 @@ class Look
         const std::uint64_t end = End();
         const std::uint64_t pieces = 1 + end / LibraryBuffer - begin / LibraryBuffer;
         m_lastEnd = end;
-        m_memory += CharacterMemory * static_cast<std::uint64_t>(length) + (m_textLength == 0 ? NodeMemory : 0);
+        m_memory += CharacterMemory * static_cast<std::uint64_t>(length) +
+                    (m_textLength == 0 ? NodeMemory : 0);
         m_textLength += static_cast<std::uint64_t>(length);
         m_copiedCharacters += pieces * m_textLength;
         Judge();
@@ -93,7 +95,8 @@ class Look
     {
         EndText();
         TakeToken();
-        m_memory += NodeMemory + CharacterMemory * static_cast<std::uint64_t>(XML_GetCurrentByteCount(m_parser));
+        m_memory += NodeMemory +
+                    CharacterMemory * static_cast<std::uint64_t>(XML_GetCurrentByteCount(m_parser));
         if (m_isInDocumentType && Position() - m_documentType > MaxDocumentType)
             m_isWithinLimits = false;
         Judge();
@@ -110,13 +113,14 @@ class Look
         m_isInDocumentType = false;
     }
 
-    // The document is not well-formed. It may break off in a tag that never ends, or what follows the last event
-    // may be one long token that has no place there.
+    // The document is not well-formed. It may break off in a tag that never ends, or what follows
+    // the last event may be one long token that has no place there.
     void Fail(size_t length)
     {
         const XML_Error error = XML_GetErrorCode(m_parser);
-        const bool isUnfinished = error == XML_ERROR_UNCLOSED_TOKEN || error == XML_ERROR_PARTIAL_CHAR ||
-                                  error == XML_ERROR_UNCLOSED_CDATA_SECTION || error == XML_ERROR_SYNTAX;
+        const bool isUnfinished =
+            error == XML_ERROR_UNCLOSED_TOKEN || error == XML_ERROR_PARTIAL_CHAR ||
+            error == XML_ERROR_UNCLOSED_CDATA_SECTION || error == XML_ERROR_SYNTAX;
         TakeToken(isUnfinished ? length : End());
         Judge();
     }
@@ -124,7 +128,8 @@ class Look
   private:
     std::uint64_t Position() const
     {
-        return static_cast<std::uint64_t>(std::max<XML_Index>(XML_GetCurrentByteIndex(m_parser), 0));
+        return static_cast<std::uint64_t>(
+            std::max<XML_Index>(XML_GetCurrentByteIndex(m_parser), 0));
     }
 
     std::uint64_t End() const
@@ -153,7 +158,8 @@ class Look
     {
         m_isWithinLimits = m_isWithinLimits && m_depth <= MaxDepth && m_memory <= MaxMemory &&
                            m_copiedCharacters <= MaxCopiedCharacters &&
-                           m_attributeSteps <= MaxAttributeSteps && m_bytesReadAgain <= MaxBytesReadAgain;
+                           m_attributeSteps <= MaxAttributeSteps &&
+                           m_bytesReadAgain <= MaxBytesReadAgain;
         if (!m_isWithinLimits)
             XML_StopParser(m_parser, XML_FALSE);
     }
@@ -191,14 +197,17 @@ void SetHandlers(XML_Parser parser, Look& look)
 {
     XML_SetUserData(parser, &look);
     XML_SetElementHandler(
-        parser, [](void* data, const char*, const char** attributes) { LookOf(data).BeginElement(attributes); },
+        parser,
+        [](void* data, const char*, const char** attributes)
+        { LookOf(data).BeginElement(attributes); },
         [](void* data, const char*) { LookOf(data).EndElement(); });
-    XML_SetCharacterDataHandler(parser,
-                                [](void* data, const char*, int length) { LookOf(data).Text(length); });
+    XML_SetCharacterDataHandler(parser, [](void* data, const char*, int length)
+                                { LookOf(data).Text(length); });
     XML_SetDefaultHandler(parser, [](void* data, const char*, int) { LookOf(data).Other(); });
     XML_SetDoctypeDeclHandler(
         parser,
-        [](void* data, const char*, const char*, const char*, int) { LookOf(data).BeginDocumentType(); },
+        [](void* data, const char*, const char*, const char*, int)
+        { LookOf(data).BeginDocumentType(); },
         [](void* data) { LookOf(data).EndDocumentType(); });
     XML_SetUnknownEncodingHandler(parser, FillEncoding, nullptr);
 }
@@ -216,7 +225,8 @@ bool IsWithinXmlLimits(const std::string& bytes)
     Look look(parser.get());
     SetHandlers(parser.get(), look);
     // In one piece, so that nothing is read again here.
-    if (XML_Parse(parser.get(), bytes.data(), static_cast<int>(bytes.size()), XML_TRUE) != XML_STATUS_OK)
+    if (XML_Parse(parser.get(), bytes.data(), static_cast<int>(bytes.size()), XML_TRUE) !=
+        XML_STATUS_OK)
         look.Fail(bytes.size());
     return look.IsWithinLimits();
 }

@@ -1,52 +1,21 @@
+#include "tests/check_report.h"
 #include "tests/scenario.h"
 #include "tests/text_files.h"
 
 #include <algorithm>
-#include <cctype>
 #include <iomanip>
+#include <optional>
+#include <set>
 #include <sstream>
 
 namespace
 {
-
-std::string Lower(std::string text)
-{
-    std::transform(text.begin(), text.end(), text.begin(), ::tolower);
-    return text;
-}
 
 std::string WithLineEnds(std::string text)
 {
     for (size_t at = text.find('\n'); at != std::string::npos; at = text.find('\n', at + 2))
         text.insert(at, 1, '\r');
     return text;
-}
-
-// The sections, keys and values of a profile file, which Wine rewrites whole; it also adds a key of
-// its own to Desktop.ini.
-std::string Meaning(const std::string& profile)
-{
-    std::map<std::string, std::string> values;
-    const bool isUtf16 = StartsWith(profile, "\xFF\xFE");
-    std::string text = profile.substr(isUtf16 ? 2 : 0);
-    text.erase(std::remove(text.begin(), text.end(), '\0'), text.end()); // what is UTF-16 here is of ASCII
-    std::istringstream lines(text);
-    std::string section;
-    for (std::string line; std::getline(lines, line);)
-    {
-        line.erase(line.find_last_not_of(" \t\r") + 1);
-        const size_t sign = line.find('=');
-        if (line.empty() || line[0] == ';')
-            continue;
-        if (line[0] == '[')
-            section = Lower(line);
-        else if (sign != std::string::npos && Lower(line.substr(0, sign)) != "iconresource")
-            values.emplace(section + Lower(line.substr(0, line.find_last_not_of(' ', sign - 1) + 1)), line.substr(sign + 1));
-    }
-    std::string meaning = isUtf16 ? "in UTF-16\n" : "";
-    for (const auto& [key, value] : values)
-        meaning += key + "=" + value + "\n";
-    return meaning;
 }
 
 // The lines of a text with their ends, long ones in pieces.
@@ -127,8 +96,8 @@ void Compare(const Files& expected, const Files& actual, const std::string& when
             continue;
         }
         const bool isMeaning = IsWindowsProgram() && place.find("Desktop.ini") != std::string::npos && place.back() != '#';
-        const std::string& wanted = isMeaning ? Meaning(text) : text;
-        const std::string& got = isMeaning ? Meaning(found->second) : found->second;
+        const std::string& wanted = isMeaning ? ProfileMeaning(text) : text;
+        const std::string& got = isMeaning ? ProfileMeaning(found->second) : found->second;
         if (wanted != got)
             ADD_FAILURE() << place << " " << when << ":\n" << Difference(wanted, got);
     }
@@ -157,11 +126,41 @@ constexpr bool HasSanitizer()
 #endif
 }
 
+// What the check says of a run in that direction. It changes nothing by itself.
+CheckReport Check(Workstation& workstation, const Scenario& scenario)
+{
+    const Files before = workstation.Snapshot();
+    CheckReport report(workstation, workstation.Start({scenario.arguments[0]}, "FolderUpgradeCheck"));
+    Compare(before, workstation.Snapshot(), "after a check");
+    return report;
+}
+
+bool IsRun(const Scenario& scenario)
+{
+    static const std::set<std::string> switches = {"I", "i", "U", "u"};
+    return !scenario.arguments.empty() && switches.count(scenario.arguments[0]) != 0;
+}
+
+// Before the run the check names what the run then changes, and after it nothing; where it names problems, at most.
+void CompareChecks(const CheckReport& first, const CheckReport& second, const std::set<std::string>& changed)
+{
+    if (first.problems == 0)
+    {
+        EXPECT_EQ(changed, first.changes) << first.text;
+    }
+    for (const std::string& place : changed)
+        EXPECT_TRUE(first.problems == 0 || first.changes.count(place) != 0) << place << " is not in\n" << first.text;
+    EXPECT_TRUE(second.changes.empty() || first.problems + second.problems > 0) << second.text;
+}
+
 void RunAndCompare(const Scenario& scenario)
 {
     Workstation workstation(scenario.asOtherUser);
     workstation.LayOut(WorkstationBefore(scenario));
     const Files before = workstation.Snapshot();
+    std::optional<CheckReport> check;
+    if (IsRun(scenario))
+        check = Check(workstation, scenario);
 
     const RunResult run = workstation.Start(scenario.arguments);
     EXPECT_EQ(255, run.process.exitStatus) << run.libraryLog;
@@ -178,6 +177,9 @@ void RunAndCompare(const Scenario& scenario)
         EXPECT_EQ("A message box, with the run log\n" + after.at(LogPlace), run.libraryLog);
     }
     Compare(Expected(workstation, before, scenario), after, "after the run");
+
+    if (check)
+        CompareChecks(*check, Check(workstation, scenario), ChangedPlaces(before, after));
 
     // A second run in the same direction finds nothing to move.
     if (IsWindowsProgram())

@@ -1,6 +1,6 @@
 // File attributes where the file system has none: READONLY of a file is its missing write
-// permission; every other one, and READONLY of a directory, is kept as hexadecimal text in the extended
-// attribute in which Wine and Samba keep them.
+// permission; every other one, and READONLY of a directory, is kept as hexadecimal text in the
+// extended attribute in which Wine and Samba keep them.
 #include "platform/linux/native_path.h"
 #include "platform/system.h"
 
@@ -19,8 +19,8 @@ namespace
 const char* const AttributeName = "user.DOSATTRIB";
 constexpr mode_t AnyWrite = S_IWUSR | S_IWGRP | S_IWOTH;
 
-// A file or directory that is looked at more than once, and is no link: as on Windows, attributes are
-// never those of what a link leads to.
+// A file or directory that is looked at more than once, and is no link: as on Windows, attributes
+// are never those of what a link leads to.
 class Node
 {
   public:

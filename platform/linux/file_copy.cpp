@@ -10,7 +10,8 @@ bool CopyOver(const wxString& source, const wxString& destination)
     RegularFile to;
     std::string before;
     std::string after;
-    if (from.OpenForReading(source, Links::Follow) != RegularFile::Status::Open || !from.Read(after))
+    if (from.OpenForReading(source, Links::Follow) != RegularFile::Status::Open ||
+        !from.Read(after))
         return false;
     RegularFile::Status status = to.OpenForUpdate(destination, Links::Refuse);
     if (status == RegularFile::Status::Refused && unlink(destination.utf8_str()) == 0)

@@ -13,8 +13,8 @@ bool IsLink(const wxString& path)
 }
 
 PinnedDirectory::PinnedDirectory(const wxString& path, Links links)
-    : m_descriptor(open(path.utf8_str(),
-                        O_PATH | O_DIRECTORY | O_CLOEXEC | (links == Links::Refuse ? O_NOFOLLOW : 0)))
+    : m_descriptor(open(path.utf8_str(), O_PATH | O_DIRECTORY | O_CLOEXEC |
+                                             (links == Links::Refuse ? O_NOFOLLOW : 0)))
 {
 }
 

@@ -24,7 +24,8 @@ LSTATUS RegOpenKeyExW(HKEY hive, LPCWSTR path, DWORD /*options*/, REGSAM /*acces
     const wxString folder = isMachine ? GetMachineDataFolder() : GetUserDataFolder();
     auto opened = std::make_unique<RegistryKey>();
     RegularFile file;
-    if (file.OpenForReading(folder + "/registry/" + name + ".reg", Links::Follow) != RegularFile::Status::Open ||
+    if (file.OpenForReading(folder + "/registry/" + name + ".reg", Links::Follow) !=
+            RegularFile::Status::Open ||
         !file.Read(opened->hive))
         return ERROR_FILE_NOT_FOUND;
     opened->hive = DecodeRegistryExport(std::move(opened->hive));

@@ -9,7 +9,8 @@ namespace
 bool Write(std::FILE* stream, const wxString& text)
 {
     const std::string bytes = text.utf8_string();
-    return std::fwrite(bytes.data(), 1, bytes.size(), stream) == bytes.size() && std::fflush(stream) == 0;
+    return std::fwrite(bytes.data(), 1, bytes.size(), stream) == bytes.size() &&
+           std::fflush(stream) == 0;
 }
 
 } // namespace

@@ -9,8 +9,9 @@ bool CopyOver(const wxString& source, const wxString& destination)
     std::string before;
     std::string after;
     if (from.OpenForReading(source, Links::Follow) != RegularFile::Status::Open ||
-        to.OpenForUpdate(destination, Links::Refuse) != RegularFile::Status::Open || !from.Read(after) ||
-        !to.Read(before) || !to.Rewrite(before, after, RegularFile::Wait::ForNothing))
+        to.OpenForUpdate(destination, Links::Refuse) != RegularFile::Status::Open ||
+        !from.Read(after) || !to.Read(before) ||
+        !to.Rewrite(before, after, RegularFile::Wait::ForNothing))
         return false;
     to.TakeAttributes(from);
     return true;

@@ -22,8 +22,9 @@ bool IsDirectory(HANDLE handle)
            (information.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY) != 0;
 }
 
-// Only a handle that may list the directory, or pass through it, keeps others from renaming it. Once
-// there is one, its name leads to the same directory or link, so the name can be asked about it.
+// Only a handle that may list the directory, or pass through it, keeps others from renaming it.
+// Once there is one, its name leads to the same directory or link, so the name can be asked about
+// it.
 HANDLE Pin(const wxString& path, Links links)
 {
     HANDLE handle = Open(path, FILE_LIST_DIRECTORY | FILE_READ_ATTRIBUTES, links);

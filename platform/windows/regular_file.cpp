@@ -52,8 +52,9 @@ DWORD LengthOfCall(size_t rest)
 
 } // namespace
 
-// A link is opened as itself, so that it can be told from a file. While it, or the file, is open, the name
-// leads to nothing else; so a file whose content lies elsewhere (in a cloud) can be opened by it again.
+// A link is opened as itself, so that it can be told from a file. While it, or the file, is open,
+// the name leads to nothing else; so a file whose content lies elsewhere (in a cloud) can be opened
+// by it again.
 RegularFile::Status RegularFile::Open(const wxString& path, Links links, bool forUpdate)
 {
     Close();
@@ -123,7 +124,8 @@ bool RegularFile::Read(std::string& bytes) const
     {
         OVERLAPPED place = At(static_cast<std::int64_t>(done));
         DWORD count = 0;
-        if (ReadFile(m_handle, &bytes[done], LengthOfCall(bytes.size() - done), &count, &place) == 0 ||
+        if (ReadFile(m_handle, &bytes[done], LengthOfCall(bytes.size() - done), &count, &place) ==
+                0 ||
             count == 0)
             return false;
         done += count;
@@ -148,7 +150,8 @@ bool RegularFile::Write(std::int64_t offset, const std::string& bytes)
     {
         OVERLAPPED place = At(offset + static_cast<std::int64_t>(done));
         DWORD count = 0;
-        if (WriteFile(m_handle, &bytes[done], LengthOfCall(bytes.size() - done), &count, &place) == 0 ||
+        if (WriteFile(m_handle, &bytes[done], LengthOfCall(bytes.size() - done), &count, &place) ==
+                0 ||
             count == 0)
             return false;
         done += count;
@@ -171,7 +174,8 @@ void RegularFile::WaitForDisk()
 void RegularFile::TakeAttributes(const RegularFile& source)
 {
     FILE_BASIC_INFO information = {};
-    if (GetFileInformationByHandleEx(source.m_handle, FileBasicInfo, &information, sizeof information) == 0)
+    if (GetFileInformationByHandleEx(source.m_handle, FileBasicInfo, &information,
+                                     sizeof information) == 0)
         return;
     // A time of 0 is left as it is.
     information.CreationTime.QuadPart = 0;
@@ -182,7 +186,8 @@ void RegularFile::TakeAttributes(const RegularFile& source)
 
 bool RegularFile::HasAttributesOf(const RegularFile& source) const
 {
-    constexpr DWORD Compared = FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_HIDDEN | FILE_ATTRIBUTE_SYSTEM;
+    constexpr DWORD Compared =
+        FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_HIDDEN | FILE_ATTRIBUTE_SYSTEM;
     BY_HANDLE_FILE_INFORMATION ours = {};
     BY_HANDLE_FILE_INFORMATION theirs = {};
     return GetFileInformationByHandle(m_handle, &ours) != 0 &&

@@ -15,7 +15,8 @@ bool Write(DWORD which, const wxString& text)
     if (GetConsoleMode(handle, &mode) != 0)
     {
         const auto length = static_cast<DWORD>(text.length());
-        return WriteConsoleW(handle, text.wc_str(), length, &count, nullptr) != 0 && count == length;
+        return WriteConsoleW(handle, text.wc_str(), length, &count, nullptr) != 0 &&
+               count == length;
     }
     const std::string bytes = text.utf8_string();
     const auto size = static_cast<DWORD>(bytes.size());

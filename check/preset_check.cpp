@@ -1,0 +1,110 @@
+#include "check/preset_check.h"
+
+#include "check/library_errors.h"
+#include "migrate/job_preset_files.h"
+#include "migrate/preset_text.h"
+#include "platform/unicode_text.h"
+#include "store/xml_encoding.h"
+
+#include <wx/convauto.h>
+#include <wx/filename.h>
+
+#include <algorithm>
+
+namespace
+{
+
+// How the content changes when no path moves.
+wxString OtherChange(const std::string& before, const std::string& after)
+{
+    const wxBOM mark = wxConvAuto::DetectBOM(before.data(), before.length());
+    if (mark == wxBOM_UTF8 && before.substr(3) == after)
+        return "loses its byte-order mark";
+    if (mark != wxBOM_None && mark != wxBOM_Unknown && mark != wxBOM_UTF8)
+        return "comes out in UTF-8, without byte-order mark";
+    const auto withoutLineEnds = [](std::string text)
+    {
+        text.erase(std::remove(text.begin(), text.end(), '\r'), text.end());
+        return text;
+    };
+    const std::string content = mark == wxBOM_UTF8 ? before.substr(3) : before;
+    if (withoutLineEnds(content) == withoutLineEnds(after))
+        return mark == wxBOM_UTF8 ? "loses its byte-order mark, and its line ends become CR LF"
+                                  : "its line ends become CR LF";
+    return "comes out in UTF-8";
+}
+
+// Without a byte-order mark, what is not UTF-8 is read as Latin-1.
+bool IsTakenAsLatin1(const std::string& bytes)
+{
+    const wxBOM mark = wxConvAuto::DetectBOM(bytes.data(), bytes.length());
+    return mark == wxBOM_None && !bytes.empty() &&
+           wxString::FromUTF8(bytes.data(), bytes.size()).empty();
+}
+
+void CheckContent(const wxString& name, const std::string& before, const RewrittenPreset& rewritten,
+                  Report& report)
+{
+    if (IsTakenAsLatin1(before))
+        report.Problem(name + ": is not UTF-8, so the whole file is taken as Latin-1");
+    const wxString encoding = DeclaredEncoding(rewritten.bytes);
+    if (!encoding.empty() && encoding.CmpNoCase("UTF-8") != 0)
+        report.Problem(name + ": declares the encoding " + encoding + ", but comes out in UTF-8");
+    if (rewritten.movedPaths == 1)
+        report.Change(name + ": 1 path");
+    else if (rewritten.movedPaths > 0)
+        report.Change(wxString::Format("%s: %zu paths", name, rewritten.movedPaths));
+    else if (rewritten.bytes != before)
+        report.Change(name + ": " + OtherChange(before, rewritten.bytes));
+}
+
+void CheckPreset(JobPresetFile& preset, const wxString& name, const TemplateFolders& folders,
+                 Report& report)
+{
+    if (preset.OpenForReading() != RegularFile::Status::Open)
+    {
+        report.Problem(name +
+                       ": cannot be opened for reading (no right, in use, a link, or no file)");
+        return;
+    }
+    std::string before;
+    if (!preset.GetFile().Read(before))
+    {
+        report.Problem(name + ": cannot be read");
+        return;
+    }
+    const RewrittenPreset rewritten = RewritePreset(before, folders.From(), folders.To());
+    if (rewritten.reasonToStay)
+        report.Problem(name + ": " + rewritten.reasonToStay);
+    else if (preset.ReopenForUpdate() != RegularFile::Status::Open)
+        report.Problem(name + ": cannot be opened for writing (read-only, no right, or in use)");
+    else
+        CheckContent(name, before, rewritten, report);
+}
+
+} // namespace
+
+void CheckPresets(const TemplateFolders& folders, Report& report)
+{
+    const wxString root = JobPresetRoot();
+    wxArrayString directories;
+    const bool isThere = ListJobPresetDirs(root, directories);
+    const wxString errors = TakeLibraryErrors();
+    if (!errors.empty())
+        report.Problem(root + ": " + errors);
+    bool hasPresets = false;
+    for (const wxString& directory : directories)
+    {
+        JobPresetFile preset(directory);
+        if (!preset.IsThere())
+            continue;
+        hasPresets = true;
+        folders.ReportForPresets(report);
+        if (folders.AreKnown())
+            CheckPreset(preset, preset.GetPath().Mid(root.length()), folders, report);
+        TakeLibraryErrors();
+    }
+    if (!hasPresets && errors.empty())
+        report.Note(isThere ? "there are no presets in " + root
+                            : "there are no presets: there is no folder " + root);
+}

@@ -1,0 +1,89 @@
+#include "check/workstation_check.h"
+
+#include "check/library_errors.h"
+#include "platform/process_rights.h"
+#include "platform/regular_file.h"
+#include "run/run_log_place.h"
+
+#include <wx/filename.h>
+
+namespace
+{
+
+// Whether one of the directories on the way there is a link, or it is one itself.
+bool LeadsOverLink(const wxString& path)
+{
+    wxFileName name = wxFileName::DirName(path);
+    for (; name.GetDirCount() > 0; name.RemoveLastDir())
+    {
+        if (IsLink(name.GetPath(wxPATH_GET_VOLUME)))
+            return true;
+    }
+    return false;
+}
+
+void CheckEntries(const HotFolderList& list, Report& report)
+{
+    if (list.folders.empty() && !list.missing.empty())
+        report.Problem("none of the listed hot folders is there (another account, mapped drives?)");
+    else if (list.folders.empty())
+        report.Note("HotFolderList.cfg lists no hot folder");
+    for (const wxString& folder : list.missing)
+    {
+        if (RefusesLinksOfOthers() && LeadsOverLink(folder))
+            report.Problem(
+                "listed hot folder is refused to an elevated run: it is reached over a link: " +
+                folder);
+        else
+            report.Note("listed hot folder is not there: " + folder);
+    }
+    for (const wxString& folder : list.repeated)
+        report.Note("hot folder is listed twice: " + folder);
+}
+
+} // namespace
+
+void CheckHotFolderList(const HotFolderList& list, Report& report)
+{
+    const wxString errors = TakeLibraryErrors();
+    switch (list.state)
+    {
+    case XmlFile::State::Missing:
+        report.Note("there is no HotFolderList.cfg");
+        break;
+    case XmlFile::State::NotReadable:
+        report.Problem("HotFolderList.cfg cannot be read: " + errors);
+        break;
+    case XmlFile::State::TooLarge:
+        report.Problem("HotFolderList.cfg is too large to read safely");
+        break;
+    case XmlFile::State::Loaded:
+        CheckEntries(list, report);
+        break;
+    }
+}
+
+void CheckRunLog(Report& report)
+{
+    const wxString folder = RunLogDirPath();
+    const wxString path = folder + RunLogFileName;
+    if (IsLink(folder.Left(folder.length() - 1)) || IsLink(path))
+    {
+        report.Problem("there will be no run log: it is reached over a link: " + path);
+        return;
+    }
+    if (!wxDirExists(folder))
+    {
+        report.Note("there will be no run log: there is no folder " + folder);
+        return;
+    }
+    RegularFile log;
+    const RegularFile::Status status = log.OpenForUpdate(path, Links::Refuse);
+    if (status == RegularFile::Status::Refused)
+        report.Problem("there will be no run log: it is read-only, in use or not ours to write: " +
+                       path);
+    else if (status == RegularFile::Status::NotThere && wxFileName::Exists(path))
+        report.Note("there will be no run log: something else has its name: " + path);
+    else if (status == RegularFile::Status::NotThere && !wxFileName::IsDirWritable(folder))
+        report.Problem("there will be no run log: its folder may not be written: " + folder);
+}
