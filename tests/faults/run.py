@@ -9,7 +9,7 @@ each Folder.cfg and each job preset is the old one or the new one, to the byte. 
     SHORT, SHORT_ENOSPC          a write is half done; in the second, what should continue it fails
     END                          the process is ended; a content may have line feeds up to the old length after it
     SWAP                         a file or directory is exchanged for a link; nothing outside the workstation changes
-    FULL_DISK                    (for root) there is no room left; no line of the log is lost but the last ones
+    FULL_DISK                    no room is left, on a disk that only root can make; a line that was logged stays
 """
 import contextlib
 import errno
@@ -47,8 +47,10 @@ CFG = """<HotFolder name="%s" description="%s" server_ip="" server_name="PRESS1"
 PRESET = '<Presets><Setting Key="ORXImposeTemplate">"@/old/Booklet"</Setting></Presets>\r\n'
 HIVE = 'Windows Registry Editor Version 5.00\r\n\r\n[HKEY_%s]\r\n"%s"="@%s"\r\n'
 INI = "[.ShellClassInfo]\nIconFile=mine.ico\n[ViewState]\nMode=4\n"
-# The icons that the folders get, and the length of an attribute that is lost, so that a content gets shorter.
-FOLDERS = {"A": ("hf_folder", 0), "B": ("hf_error_inactive", 2000)}
+# The icon that a folder gets, the length of its description, and that of an attribute that is lost.
+FOLDERS = {"A": ("hf_folder", 1500, 0), "B": ("hf_error_inactive", 1500, 2000)}
+# Those of the second kind need another page when they are written.
+MANY_FOLDERS = {**FOLDERS, **{f"F{number}": ("hf_folder", 3500, 0) for number in range(20)}}
 
 
 def files_of(folders):
@@ -66,8 +68,8 @@ def files_of(folders):
         "Hot Folders/B/Desktop.ini": INI,
         f"Hot Folders/B/{PRIVATE}/Error.er": "",
     }
-    for name, (icon, lost) in folders.items():
-        files[f"Hot Folders/{name}/{PRIVATE}/Folder.cfg"] = CFG % (name, "long " * 300, name != "B", lost * "x")
+    for name, (icon, described, lost) in folders.items():
+        files[f"Hot Folders/{name}/{PRIVATE}/Folder.cfg"] = CFG % (name, described * "d", name != "B", lost * "x")
         files[f"Hot Folders/{name}/{PRIVATE}/{icon}.ico"] = "an older picture"
     return files
 
@@ -138,6 +140,7 @@ class Workstation:
         self.before = look(self.original)
         self.run(0, "f")
         self.after = look(self.root)
+        self.log = (self.root / LOG).read_bytes()
         changed = {part(name) for name in differences(self.before, self.after) if name in self.before}
         if len(changed) != len(folders) + 2:
             sys.exit(f"without a fault only these change: {changed}")
@@ -151,9 +154,10 @@ class Workstation:
         shutil.copytree(self.outside_before, self.outside)
         self.report.unlink(missing_ok=True)
 
-    def run(self, number, events, calls="", error=0, below="", victim="", target=""):
+    def run(self, number, events, calls="", error=0, below="", victim="", target="", prepare=lambda _: None):
         """The finished process, and the call at which it happened with its path, or neither."""
         self.restore()
+        prepare(self.root)
         process = subprocess.run(
             [self.root / "program/FolderUpgrade", "I"], capture_output=True, text=True, timeout=60, check=False,
             env={**os.environ, "XDG_CONFIG_DIRS": f"{self.root}/machine", "XDG_CONFIG_HOME": f"{self.root}/user",
@@ -194,7 +198,7 @@ def try_calls(station, mode):
 
 def victims():
     """What is exchanged, and for a link to what; the second of a place does not exist."""
-    for folder, (icon, _) in FOLDERS.items():
+    for folder, (icon, *_) in FOLDERS.items():
         hot = f"Hot Folders/{folder}"
         yield hot, "empty"
         yield f"{hot}/{PRIVATE}", f"{hot}/{PRIVATE}"
@@ -222,13 +226,60 @@ def try_swaps(station):
             yield f"{victim} becomes a link to {target} before {call} number {number}, {os.path.relpath(path, station.root)}", wrong
 
 
+def fill_up(directory):
+    with contextlib.suppress(OSError), open(directory / "program/rest", "wb", buffering=0) as file:
+        while True:
+            file.write(bytes(4096))
+
+
+def try_full_disk(station):
+    """With no room left: what was wrong with the run."""
+    process, _ = station.run(0, "f", prepare=fill_up)
+    now = look(station.root)
+    wrong = torn(station.before, station.after, now, False) | complaints(process)
+    if not any(now[name] == station.before[name] for name in station.before if name.endswith("Folder.cfg")):
+        wrong.add("the disk was not full")
+    lines = iter(station.log.splitlines(keepends=True))
+    log = (station.root / LOG).read_bytes()
+    if len(log) < 3500 or len(log) >= len(station.log) or not all(line in lines for line in log.splitlines(keepends=True)):
+        wrong.add(f"the log is {log}")
+    yield "a full disk", wrong
+
+
+def keeps_attributes(directory):
+    try:
+        with tempfile.NamedTemporaryFile(dir=directory) as file:
+            os.setxattr(file.name, ATTRIBUTES, b"0x4")
+    except OSError:
+        return False
+    return True
+
+
+@contextlib.contextmanager
+def small_disk(folder):
+    """Mounts one of 64 megabytes at the directory."""
+    folder.mkdir()
+    subprocess.run(["mount", "-t", "tmpfs", "-o", "size=64m", "tmpfs", folder], check=True)
+    try:
+        yield folder
+    finally:
+        subprocess.run(["umount", folder], check=True)
+
+
 def main():
     mode, program, failing_calls = sys.argv[1:]
+    in_memory = "/dev/shm" if keeps_attributes("/dev/shm") else None
+    if mode == "FULL_DISK" and not (in_memory and os.geteuid() == 0):
+        print("skipped faults.FULL_DISK: only root can make a small disk, and not every system has one that keeps attributes\n"
+              "0 passed, 0 failed, 1 skipped")
+        return 0
     passed = failed = 0
-    in_memory = "/dev/shm" if os.access("/dev/shm", os.W_OK) else None
-    with tempfile.TemporaryDirectory(dir=in_memory) as folder:
-        station = Workstation(pathlib.Path(folder), pathlib.Path(program), failing_calls, FOLDERS)
-        for what, wrong in try_swaps(station) if mode == "SWAP" else try_calls(station, mode):
+    with tempfile.TemporaryDirectory(dir=in_memory) as name, contextlib.ExitStack() as disk:
+        folder, folders, runs = pathlib.Path(name), FOLDERS, {"SWAP": try_swaps, "FULL_DISK": try_full_disk}
+        if mode == "FULL_DISK":
+            folder, folders = disk.enter_context(small_disk(folder / "disk")), MANY_FOLDERS
+        station = Workstation(folder, pathlib.Path(program), failing_calls, folders)
+        for what, wrong in runs[mode](station) if mode in runs else try_calls(station, mode):
             passed += not wrong
             failed += bool(wrong)
             if wrong:
