@@ -89,12 +89,11 @@ def part(name):
     return "/".join(pieces[:length or None])
 
 
-def look(root):
-    """Everything below the directory but the run log and the program: content, mode, attributes."""
+def look(root, but=(LOG, "program/FolderUpgrade")):
+    """Everything below the directory but for these names: content, mode, attributes."""
     return {name: (path.is_file() and path.read_bytes(), path.stat().st_mode,
                    ATTRIBUTES in os.listxattr(path) and os.getxattr(path, ATTRIBUTES))
-            for path in root.rglob("*") for name in [str(path.relative_to(root))]
-            if not name.startswith((LOG, "program/FolderUpgrade"))}
+            for path in root.rglob("*") for name in [str(path.relative_to(root))] if not name.startswith(but)}
 
 
 def differences(left, right):
@@ -215,14 +214,14 @@ def victims():
 
 def try_swaps(station):
     """With each victim exchanged at each call by name that its step makes: what was wrong, for each run."""
-    outside = look(station.outside)
+    outside = look(station.outside, ())
     for victim, target in victims():
         below = LOG_DIR if victim.startswith(LOG_DIR) else part(victim)
         for number in itertools.count(1):
             process, (call, path) = station.run(number, *MODES["SWAP"], below=below, victim=victim, target=target)
             if not call:
                 break
-            wrong = complaints(process) | {f"outside/{name} differs" for name in differences(outside, look(station.outside))}
+            wrong = complaints(process) | {f"outside/{name} differs" for name in differences(outside, look(station.outside, ()))}
             yield f"{victim} becomes a link to {target} before {call} number {number}, {os.path.relpath(path, station.root)}", wrong
 
 
