@@ -15,20 +15,18 @@
 namespace
 {
 
-// Reads and announces the switch; false when it is neither of the two.
-bool ReadSwitch(const wxString& text, bool& isUpgrade)
+enum class Switch
 {
-    isUpgrade = text.CmpNoCase("I") == 0;
-    if (isUpgrade)
-        RunLog(L"Installation : Upgrade call with switch: I");
-    else if (text.CmpNoCase("U") == 0)
-        RunLog(L"Un-installation : Downgrade call with switch: U");
-    else
-    {
-        RunLog(L"Invalid call check calling parameter: exiting....");
-        return false;
-    }
-    return true;
+    Upgrade,
+    Downgrade,
+    Invalid
+};
+
+Switch ReadSwitch(const wxString& text)
+{
+    if (text.CmpNoCase("I") == 0)
+        return Switch::Upgrade;
+    return text.CmpNoCase("U") == 0 ? Switch::Downgrade : Switch::Invalid;
 }
 
 void UpdateHotFolder(const FolderUpgradeApp& app, const wxString& folder, int position)
@@ -54,8 +52,20 @@ bool FolderUpgradeApp::OnInit()
         return false;
     if (argc == 3 && argv[2].CmpNoCase("V") == 0)
         RunLogEnabled = false;
-    if (!ReadSwitch(argv[1], m_isUpgrade))
+    switch (ReadSwitch(argv[1]))
+    {
+    case Switch::Upgrade:
+        m_isUpgrade = true;
+        RunLog(L"Installation : Upgrade call with switch: I");
+        break;
+    case Switch::Downgrade:
+        m_isUpgrade = false;
+        RunLog(L"Un-installation : Downgrade call with switch: U");
+        break;
+    case Switch::Invalid:
+        RunLog(L"Invalid call check calling parameter: exiting....");
         return false;
+    }
 
     wxArrayString folders;
     ReadHotFolderList(folders);

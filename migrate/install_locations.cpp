@@ -5,17 +5,38 @@
 
 #include <algorithm>
 #include <array>
+#include <vector>
 
 namespace
 {
 
-constexpr DWORD ValueCapacity = 517; // bytes
+// Bytes. Every version has offered the registry this many; what is longer counts as missing.
+constexpr DWORD ValueCapacity = 517;
 
-const wchar_t* const DefaultKeys[] = {L"SOFTWARE\\Wow6432Node\\Vantorix\\QZA",
-                                      L"SOFTWARE\\Vantorix\\QZA"};
-const wchar_t* const PreviousKeys[] = {L"SOFTWARE\\Wow6432Node\\HF", L"SOFTWARE\\HF"};
-const wchar_t* const DefaultValue = L"InstallPath";
-const wchar_t* const PreviousValue = L"Path";
+// A value, and the keys that it is looked for in: the first of them that opens.
+struct Location
+{
+    HKEY hive;
+    std::vector<const wchar_t*> keys;
+    const wchar_t* value;
+};
+
+const Location& DefaultFolder()
+{
+    static const Location location = {
+        HKEY_LOCAL_MACHINE,
+        {L"SOFTWARE\\Wow6432Node\\Vantorix\\QZA", L"SOFTWARE\\Vantorix\\QZA"},
+        L"InstallPath"};
+    return location;
+}
+
+const Location& PreviousFolder()
+{
+    static const Location location = {
+        HKEY_CURRENT_USER, {L"SOFTWARE\\Wow6432Node\\HF", L"SOFTWARE\\HF"}, L"Path"};
+    return location;
+}
+
 const char* const TemplateDirName = "template";
 
 bool QueryText(HKEY key, const wchar_t* name, wxString& text)
@@ -29,16 +50,19 @@ bool QueryText(HKEY key, const wchar_t* name, wxString& text)
     return true;
 }
 
-// Only the opening falls back to the second key, not a missing value.
-bool ReadText(HKEY hive, const wchar_t* const (&keys)[2], const wchar_t* name, wxString& text)
+// Only the opening falls back to the next key, not a missing value.
+bool ReadText(const Location& location, wxString& text)
 {
-    HKEY key = nullptr;
-    if (RegOpenKeyExW(hive, keys[0], 0, KEY_READ, &key) != ERROR_SUCCESS &&
-        RegOpenKeyExW(hive, keys[1], 0, KEY_READ, &key) != ERROR_SUCCESS)
-        return false;
-    const bool found = QueryText(key, name, text);
-    RegCloseKey(key);
-    return found;
+    for (const wchar_t* path : location.keys)
+    {
+        HKEY key = nullptr;
+        if (RegOpenKeyExW(location.hive, path, 0, KEY_READ, &key) != ERROR_SUCCESS)
+            continue;
+        const bool found = QueryText(key, location.value, text);
+        RegCloseKey(key);
+        return found;
+    }
+    return false;
 }
 
 } // namespace
@@ -46,7 +70,7 @@ bool ReadText(HKEY hive, const wchar_t* const (&keys)[2], const wchar_t* name, w
 bool GetDefaultImposeTemplatePath(wxFileName& folder)
 {
     wxString path;
-    if (!ReadText(HKEY_LOCAL_MACHINE, DefaultKeys, DefaultValue, path))
+    if (!ReadText(DefaultFolder(), path))
         return false;
     path += wxFileName::GetPathSeparator();
     path += TemplateDirName;
@@ -57,7 +81,7 @@ bool GetDefaultImposeTemplatePath(wxFileName& folder)
 bool GetPreviousImposeTemplatePath(wxFileName& folder)
 {
     wxString path;
-    const bool found = ReadText(HKEY_CURRENT_USER, PreviousKeys, PreviousValue, path);
+    const bool found = ReadText(PreviousFolder(), path);
     folder.Assign(path, wxPATH_NATIVE);
     return found;
 }

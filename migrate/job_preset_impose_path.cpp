@@ -56,10 +56,10 @@ void UpdatePreset(JobPresetFile& preset, const wxString& from, const wxString& t
 }
 
 // Both lookups are always made, in this order; false when one failed.
-bool LookUpFolders(wxFileName& previous, wxFileName& current)
+bool LookUpFolders(wxFileName& previousFolder, wxFileName& defaultFolder)
 {
-    const bool previousFound = GetPreviousImposeTemplatePath(previous);
-    const bool defaultFound = GetDefaultImposeTemplatePath(current);
+    const bool previousFound = GetPreviousImposeTemplatePath(previousFolder);
+    const bool defaultFound = GetDefaultImposeTemplatePath(defaultFolder);
     if (!defaultFound)
         RunLog("Unable to read: Default Impose Template Path");
     if (!previousFound)

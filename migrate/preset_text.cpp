@@ -2,7 +2,7 @@
 
 #include "platform/unicode_text.h"
 #include "store/folder_cfg_format.h"
-#include "store/xml_tree.h"
+#include "store/xml_text.h"
 
 #include <wx/convauto.h>
 #include <wx/filename.h>

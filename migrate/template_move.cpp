@@ -4,6 +4,7 @@
 #include "store/folder_cfg_reader.h"
 #include "store/folder_cfg_writer.h"
 #include "store/xml_encoding.h"
+#include "store/xml_text.h"
 #include "store/xml_tree.h"
 
 #include <wx/confbase.h>

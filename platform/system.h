@@ -42,7 +42,6 @@ inline const HKEY HKEY_LOCAL_MACHINE = reinterpret_cast<HKEY>(std::uintptr_t{0x8
 constexpr REGSAM KEY_READ = 0x20019;
 constexpr LSTATUS ERROR_SUCCESS = 0;
 constexpr LSTATUS ERROR_FILE_NOT_FOUND = 2;
-constexpr LSTATUS ERROR_INVALID_HANDLE = 6;
 constexpr LSTATUS ERROR_MORE_DATA = 234;
 
 LSTATUS RegOpenKeyExW(HKEY hive, LPCWSTR path, DWORD options, REGSAM access, HKEY* key);

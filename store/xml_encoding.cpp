@@ -34,9 +34,9 @@ bool IsReadAsAscii(const std::string& document, const wxString& encoding)
         return false;
     const EncodingMap map = GetEncodingMap(encoding);
     return std::all_of(document.begin(), document.end(),
-                       [&](char byte)
+                       [&](char each)
                        {
-                           const auto code = static_cast<unsigned char>(byte);
+                           const auto code = static_cast<unsigned char>(each);
                            return code < 0x80 && map[code] == code;
                        });
 }
@@ -64,7 +64,7 @@ bool IsUtf8(const std::string& document)
 {
     const bool isAscii =
         std::all_of(document.begin(), document.end(),
-                    [](char byte) { return static_cast<unsigned char>(byte) < 0x80; });
+                    [](char each) { return static_cast<unsigned char>(each) < 0x80; });
     return isAscii || (DeclaredEncoding(document).CmpNoCase("UTF-8") == 0 &&
                        !wxString::FromUTF8(document.data(), document.size()).empty());
 }

@@ -1,7 +1,5 @@
 #include "store/xml_tree.h"
 
-#include "platform/unicode_text.h"
-
 #include <algorithm>
 #include <memory>
 
@@ -148,17 +146,4 @@ void RemoveSavedIndentation(wxXmlNode& root, int level)
             node->SetContent(
                 node->GetContent().Left(node->GetContent().length() - indentation.length()));
     }
-}
-
-bool IsXmlText(const wxString& text)
-{
-    if (!IsUnicodeText(text))
-        return false;
-    return std::none_of(text.begin(), text.end(),
-                        [](wxUniChar character)
-                        {
-                            const auto code = character.GetValue();
-                            return (code < 0x20 && code != '\t' && code != '\n' && code != '\r') ||
-                                   code == 0xFFFE || code == 0xFFFF;
-                        });
 }

@@ -21,7 +21,3 @@ void RemoveIgnoredBlanks(wxXmlNode& root);
 /// between the two, a line feed and two blanks a level; level is the root's own in the saved
 /// document. So text beside elements, comments or CDATA comes out of a file as it went in.
 void RemoveSavedIndentation(wxXmlNode& root, int level);
-
-/// Whether an XML document can hold the text: no control characters but tab, line feed and carriage
-/// return, no lone surrogate, neither U+FFFE nor U+FFFF, nothing above U+10FFFF.
-bool IsXmlText(const wxString& text);

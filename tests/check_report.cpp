@@ -76,6 +76,20 @@ CheckReport::CheckReport(const Workstation& workstation, const RunResult& run) :
     EXPECT_EQ("", run.libraryLog);
 }
 
+namespace
+{
+
+// What counts of the text at a place. Wine does not say that a directory is read-only.
+std::string Meaning(const std::string& place, const std::string& text)
+{
+    const bool isHotFolder = place.back() == '#' && std::count(place.begin(), place.end(), '/') == 1;
+    if (IsWindowsProgram() && isHotFolder && StartsWith(text, "R"))
+        return text.substr(1);
+    return place.find("Desktop.ini") != std::string::npos && place.back() != '#' ? ProfileMeaning(text) : text;
+}
+
+} // namespace
+
 std::set<std::string> ChangedPlaces(const Files& before, const Files& after)
 {
     std::set<std::string> places;
@@ -84,9 +98,7 @@ std::set<std::string> ChangedPlaces(const Files& before, const Files& after)
         for (const auto& [place, text] : left)
         {
             const auto found = right.find(place);
-            const bool isIni = place.find("Desktop.ini") != std::string::npos && place.back() != '#';
-            const bool isSame =
-                found != right.end() && (isIni ? ProfileMeaning(text) == ProfileMeaning(found->second) : text == found->second);
+            const bool isSame = found != right.end() && Meaning(place, text) == Meaning(place, found->second);
             const size_t icon = place.find(".ico#");
             if (!isSame && place.find("ORX_Installers") == std::string::npos)
                 places.insert(ReachedOverLinks(icon == std::string::npos ? place : place.substr(0, icon + 4), before));

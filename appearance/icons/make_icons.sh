@@ -16,7 +16,8 @@ need icotool icoutils
 tmp=$(mktemp -d)
 trap 'rm -rf -- "$tmp"' EXIT
 
-for name in hf_folder hf_folder_disabled hf_error_active hf_error_inactive; do
+for name in *.16.svg; do
+  name=${name%.16.svg}
   for size in 16 32 48 256; do
     src=$name.svg
     [ "$size" -ne 16 ] || src=$name.16.svg
