@@ -204,7 +204,7 @@ void Workstation::ForEachEntry(Visit visit) const
         const bool isShared = name == "user" || name == "machine";
         for (const auto& entry : fs::recursive_directory_iterator(directory))
         {
-            if (!isShared || IsOurs(fs::relative(entry.path(), directory).string()))
+            if (!isShared || IsOurs(entry.path().lexically_relative(directory).string()))
                 visit(PlaceOf(entry.path()), entry);
         }
     }
