@@ -55,9 +55,8 @@ bool WriteIniString(const wxString& section, const wxString& key, const wxString
                                       path.wc_str()) != 0;
 }
 
-bool CreateDesktopIni(const wxString& hotFolder, const wxString& iconName)
+bool CreateDesktopIni(const PinnedDirectory& directory, const wxString& iconName)
 {
-    const PinnedDirectory directory(hotFolder, Links::Follow);
     if (!directory.IsOpen())
         return false;
     // The profile functions would create it through a link, too. While the file is open for
@@ -70,9 +69,9 @@ bool CreateDesktopIni(const wxString& hotFolder, const wxString& iconName)
     return true;
 }
 
-bool RefreshDesktopIni(const wxString& hotFolder, const wxString& iconName)
+bool RefreshDesktopIni(const PinnedDirectory& directory, const wxString& hotFolder,
+                       const wxString& iconName)
 {
-    const PinnedDirectory directory(hotFolder, Links::Follow);
     if (!directory.IsOpen())
         return false;
     const wxString path = directory.Reach(DesktopIniName);

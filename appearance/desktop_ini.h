@@ -1,6 +1,8 @@
 // A hot folder's Desktop.ini, in which Explorer looks for the folder's icon and info tip.
 #pragma once
 
+#include "platform/pinned_directory.h"
+
 #include <wx/string.h>
 
 #include <vector>
@@ -26,9 +28,10 @@ bool WriteIniString(const wxString& section, const wxString& key, const wxString
 /// Makes a Desktop.ini with its keys. False, and nothing written, when the hot folder is not a
 /// directory; failed writes are not reported. Nothing is written when anything of that name is
 /// there.
-bool CreateDesktopIni(const wxString& hotFolder, const wxString& iconName);
+bool CreateDesktopIni(const PinnedDirectory& directory, const wxString& iconName);
 
 /// Takes read-only and system from a Desktop.ini, writes its keys and has the shell force the
-/// folder's icon with SHGetSetFolderCustomSettings. All other keys stay; of the attributes none
-/// does. Result as above.
-bool RefreshDesktopIni(const wxString& hotFolder, const wxString& iconName);
+/// folder's icon with SHGetSetFolderCustomSettings, to which the hot folder is known by its path.
+/// All other keys stay; of the attributes none does. Result as above.
+bool RefreshDesktopIni(const PinnedDirectory& directory, const wxString& hotFolder,
+                       const wxString& iconName);

@@ -40,12 +40,30 @@ void TellShell(const wxString& iniPath)
     SHChangeNotify(SHCNE_ASSOCCHANGED, SHCNF_IDLIST | SHCNF_FLUSH, nullptr, nullptr);
 }
 
-void WriteDesktopIni(const wxString& hotFolder, const wxString& iniPath, const wxString& iconName)
+void WriteDesktopIni(const PinnedDirectory& directory, const wxString& hotFolder,
+                     const wxString& iconName)
 {
-    if (wxFileExists(iniPath))
-        RefreshDesktopIni(hotFolder, iconName);
+    if (wxFileExists(directory.Reach(DesktopIniName)))
+        RefreshDesktopIni(directory, hotFolder, iconName);
     else
-        CreateDesktopIni(hotFolder, iconName);
+        CreateDesktopIni(directory, iconName);
+}
+
+bool Apply(const PinnedDirectory& directory, const wxString& hotFolder, const wxString& iconName)
+{
+    const wxString iniPath = IniPath(hotFolder);
+    const bool isLinked = IsLink(directory.Reach(DesktopIniName));
+    if (isLinked)
+        RunLog(L"Desktop.ini left as it is (reached over a link): " + iniPath);
+    if (GetPackedShellVersion() >= CustomFolderVersion)
+    {
+        if (!isLinked)
+            WriteDesktopIni(directory, hotFolder, iconName);
+        ChangeAttributes(directory.Reach(L""), ReadOnlyAndSystem, 0);
+        TellShell(iniPath);
+        ChangeAttributes(directory.Reach(L""), 0, FILE_ATTRIBUTE_READONLY);
+    }
+    return !isLinked && ChangeAttributes(directory.Reach(DesktopIniName), ReadOnlyAndSystem, 0);
 }
 
 bool IsFileItself(const wxString& path)
@@ -57,20 +75,7 @@ bool IsFileItself(const wxString& path)
 
 bool ApplyFolderIcon(const wxString& hotFolder, const wxString& iconName)
 {
-    const PinnedDirectory directory(hotFolder, Links::Follow);
-    const wxString iniPath = IniPath(hotFolder);
-    const bool isLinked = IsLink(directory.Reach(DesktopIniName));
-    if (isLinked)
-        RunLog(L"Desktop.ini left as it is (reached over a link): " + iniPath);
-    if (GetPackedShellVersion() >= CustomFolderVersion)
-    {
-        if (!isLinked)
-            WriteDesktopIni(hotFolder, directory.Reach(DesktopIniName), iconName);
-        ChangeAttributes(directory.Reach(L""), ReadOnlyAndSystem, 0);
-        TellShell(iniPath);
-        ChangeAttributes(directory.Reach(L""), 0, FILE_ATTRIBUTE_READONLY);
-    }
-    return !isLinked && ChangeAttributes(directory.Reach(DesktopIniName), ReadOnlyAndSystem, 0);
+    return Apply(PinnedDirectory(hotFolder, Links::Follow), hotFolder, iconName);
 }
 
 void UpdateFolderIcon(const FolderUpgradeApp& app, const wxString& hotFolder)
@@ -92,6 +97,6 @@ void UpdateFolderIcon(const FolderUpgradeApp& app, const wxString& hotFolder)
     const wxString shownDestination = PrivateDirPath(hotFolder) + iconName;
     if (!CopyOver(source, destination))
         wxLogSysError(_("Failed to copy the file '%s' to '%s'"), source, shownDestination);
-    ApplyFolderIcon(hotFolder, iconName);
+    Apply(folder.directory, hotFolder, iconName);
     RunLog(L"Icon  copied from : " + source + L" To " + shownDestination + L" ");
 }

@@ -3,12 +3,14 @@
 #include "fuzz/fuzzing.h"
 #include "store/folder_cfg_reader.h"
 #include "store/folder_cfg_writer.h"
+#include "store/root_attributes.h"
 #include "store/xml_encoding.h"
+#include "store/xml_file.h"
 #include "store/xml_tree.h"
 
 #include <wx/sstream.h>
 
-#include <tuple>
+#include <algorithm>
 
 namespace
 {
@@ -22,14 +24,6 @@ struct Values
     PreflightSettingList preflightSettings;
     wxXmlNode filterSetting;
 };
-
-auto RootFields(const HotFolderSettings& s)
-{
-    return std::tie(s.name, s.description, s.server_ip, s.server_name, s.server_version, s.server_textversion, s.server_type,
-                    s.BaseVirtualPrinter, s.BaseVirtualPrinterName, s.HFPresetName, s.PPDVersion, s.BaseVirtualPrinterDisplayName, s.Enable,
-                    s.Centralized, s.Isjobpresetattached, s.Quickset, s.IsCustomInterval, s.TimeInterval, s.ServerTypeAndJPDefaultKeyInfo,
-                    s.Quickset_Supported, s.Quickset_Enabled, s.IsWidthBased);
-}
 
 // Everything but the root's attributes, as it is; a save would indent it.
 wxString Sections(const Values& values)
@@ -51,23 +45,23 @@ wxString Sections(const Values& values)
 
 bool AreEqual(const Values& left, const Values& right)
 {
-    return RootFields(left.settings) == RootFields(right.settings) && Sections(left) == Sections(right);
+    const auto& attributes = RootAttributes();
+    return std::all_of(attributes.begin(), attributes.end(),
+                       [&](const RootAttribute& each) { return each.Format(left.settings) == each.Format(right.settings); }) &&
+           Sections(left) == Sections(right);
 }
 
 // False when the file does not load.
 bool Read(const wxString& path, Values& values)
 {
-    wxXmlDocument document;
-    const bool isLoaded = LoadFolderCfg(path, document);
-    ReadPaths(document.GetRoot(), values.paths);
-    ReadJobSettings(document.GetRoot(), values.jobSettings);
-    ReadImposeSettings(document.GetRoot(), values.imposeSettings);
-    ReadPreflightSettings(document.GetRoot(), values.preflightSettings);
-    bool isFilterLoaded = false;
-    bool areSettingsLoaded = false;
-    ReadFilterSetting(path, values.filterSetting, &isFilterLoaded);
-    LoadHotFolderSettings(path, values.settings, &areSettingsLoaded);
-    Check(isFilterLoaded == isLoaded && areSettingsLoaded == isLoaded, "the readers agree");
+    XmlFile cfg;
+    const bool isLoaded = cfg.Load(path, Links::Refuse, path) == XmlFile::State::Loaded;
+    ReadPaths(cfg.GetRoot(), values.paths);
+    ReadJobSettings(cfg.GetRoot(), values.jobSettings);
+    ReadImposeSettings(cfg.GetRoot(), values.imposeSettings);
+    ReadPreflightSettings(cfg.GetRoot(), values.preflightSettings);
+    ReadFilterSetting(cfg.GetRoot(), values.filterSetting);
+    ReadHotFolderSettings(cfg.GetRoot(), values.settings);
     return isLoaded;
 }
 
@@ -94,7 +88,7 @@ void Try(const std::string& input)
     WriteBytes(path, input);
     if (!Read(path, values))
         return Check(AreEqual(values, before), "what does not load changes no value");
-    if (CountLevels(values.filterSetting) > MaxFilterLevels || !IsReadFaithfully(path))
+    if (CountLevels(values.filterSetting) > MaxFilterLevels || !IsReadFaithfully(input))
         return;
 
     Save(path, values);

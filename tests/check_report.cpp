@@ -39,6 +39,18 @@ std::string PlaceOf(const Workstation& workstation, const std::string& title, co
     return folder + "/[P]/" + name;
 }
 
+// A place to which a link leads, by the place of the link.
+std::string ReachedOverLinks(std::string place, const Files& files)
+{
+    for (const auto& [link, text] : files)
+    {
+        const std::string target = StartsWith(text, "{link:") ? text.substr(6, text.size() - 7) + "/" : "";
+        if (!target.empty() && StartsWith(place, target))
+            return ReachedOverLinks(link + place.substr(target.size()), files);
+    }
+    return place;
+}
+
 } // namespace
 
 CheckReport::CheckReport(const Workstation& workstation, const RunResult& run) : text(run.output)
@@ -89,7 +101,7 @@ std::set<std::string> ChangedPlaces(const Files& before, const Files& after)
             const bool isSame = found != right.end() && Meaning(place, text) == Meaning(place, found->second);
             const size_t icon = place.find(".ico#");
             if (!isSame && place.find("ORX_Installers") == std::string::npos)
-                places.insert(icon == std::string::npos ? place : place.substr(0, icon + 4));
+                places.insert(ReachedOverLinks(icon == std::string::npos ? place : place.substr(0, icon + 4), before));
         }
     };
     add(before, after);

@@ -53,6 +53,29 @@ void GiveAway(const fs::path& path)
         throw std::runtime_error("only root can give files away");
 }
 
+std::string Repeat(const std::string& text)
+{
+    const std::string start = "{repeat:";
+    std::string result;
+    size_t done = 0;
+    for (size_t at = text.find(start); at != std::string::npos; at = text.find(start, done))
+    {
+        result.append(text, done, at - done);
+        const size_t colon = text.find(':', at + start.size());
+        done = text.find('}', colon) + 1;
+        std::string piece = text.substr(colon + 1, done - colon - 2);
+        const size_t number = piece.find('#');
+        const int count = std::stoi(text.substr(at + start.size()));
+        for (int i = 0; i < count; ++i)
+        {
+            if (number != std::string::npos)
+                piece.replace(number, i == 0 ? 1 : 6, std::to_string(1000000 + i).substr(1));
+            result += piece;
+        }
+    }
+    return result.append(text, done);
+}
+
 std::string ExpandedAt(const Workstation& workstation, const Files& files, const char* place)
 {
     const auto found = files.find(place);
@@ -151,7 +174,7 @@ std::string Workstation::Expand(std::string text) const
     const size_t icon = text.find("{icon:");
     if (icon != std::string::npos)
         return ReadFile(fs::path(TOOL_DIR) / (text.substr(icon + 6, text.find('}') - icon - 6)));
-    return text;
+    return Repeat(text);
 }
 
 void Workstation::SetAttributes(const std::string& place, const std::string& letters) const
@@ -181,7 +204,7 @@ void Workstation::ForEachEntry(Visit visit) const
         const bool isShared = name == "user" || name == "machine";
         for (const auto& entry : fs::recursive_directory_iterator(directory))
         {
-            if (!isShared || IsOurs(fs::relative(entry.path(), directory).string()))
+            if (!isShared || IsOurs(entry.path().lexically_relative(directory).string()))
                 visit(PlaceOf(entry.path()), entry);
         }
     }

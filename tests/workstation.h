@@ -11,7 +11,8 @@
 //
 // The texts contain what differs between systems as {hot}, {user}, {tool}, {app}, {previous},
 // {default} (each as the tool sees it) and {/}, the path separator; in capitals, {HOT} or {/2}, as
-// the registry editor's text has them. A whole text can also be
+// the registry editor's text has them. {repeat:COUNT:TEXT} is the text so many times, in each with its number, of
+// six digits, in place of '#'. A whole text can also be
 //   {utf16}TEXT     the text in UTF-16 with a byte-order mark
 //   {icon:NAME}     the bytes of a shipped icon
 //   {link:TARGET}   a symbolic link to another place or to an absolute path; to a directory, if its

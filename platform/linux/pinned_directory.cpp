@@ -6,15 +6,29 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+namespace
+{
+
+// With a separator after it, a link would be followed.
+wxString WithoutFinalSeparators(wxString path)
+{
+    while (path.length() > 1 && path.EndsWith("/"))
+        path.RemoveLast();
+    return path;
+}
+
+} // namespace
+
 bool IsLink(const wxString& path)
 {
     struct stat status = {};
-    return lstat(path.utf8_str(), &status) == 0 && S_ISLNK(status.st_mode);
+    return lstat(WithoutFinalSeparators(path).utf8_str(), &status) == 0 && S_ISLNK(status.st_mode);
 }
 
 PinnedDirectory::PinnedDirectory(const wxString& path, Links links)
-    : m_descriptor(open(path.utf8_str(), O_PATH | O_DIRECTORY | O_CLOEXEC |
-                                             (links == Links::Refuse ? O_NOFOLLOW : 0)))
+    : m_descriptor(
+          open(WithoutFinalSeparators(path).utf8_str(),
+               O_PATH | O_DIRECTORY | O_CLOEXEC | (links == Links::Refuse ? O_NOFOLLOW : 0)))
 {
 }
 

@@ -7,11 +7,20 @@
 namespace
 {
 
+// With a separator after it, a link might be followed.
+wxString WithoutFinalSeparators(wxString path)
+{
+    while (!path.empty() && wxFileName::IsPathSeparator(path.Last()))
+        path.RemoveLast();
+    return path;
+}
+
 HANDLE Open(const wxString& path, DWORD access, Links links)
 {
     const DWORD flags =
         FILE_FLAG_BACKUP_SEMANTICS | (links == Links::Refuse ? FILE_FLAG_OPEN_REPARSE_POINT : 0);
-    return CreateFileW(path.wc_str(), access, FILE_SHARE_READ | FILE_SHARE_WRITE, nullptr,
+    const wxString name = links == Links::Refuse ? WithoutFinalSeparators(path) : path;
+    return CreateFileW(name.wc_str(), access, FILE_SHARE_READ | FILE_SHARE_WRITE, nullptr,
                        OPEN_EXISTING, flags, nullptr);
 }
 
@@ -41,11 +50,8 @@ HANDLE Pin(const wxString& path, Links links)
 
 bool IsLink(const wxString& path)
 {
-    wxString name = path;
-    while (!name.empty() && wxFileName::IsPathSeparator(name.Last()))
-        name.RemoveLast();
     WIN32_FIND_DATAW found = {};
-    const HANDLE search = FindFirstFileW(name.wc_str(), &found);
+    const HANDLE search = FindFirstFileW(WithoutFinalSeparators(path).wc_str(), &found);
     if (search == INVALID_HANDLE_VALUE)
         return false;
     FindClose(search);

@@ -1,12 +1,17 @@
 #!/usr/bin/env python3
-"""Runs the tool over and over on a small workstation, and each time another of its calls fails.
+"""Runs the tool over and over on a small workstation, and each time something happens at another of its calls.
 
-    tests/faults/run.py ERROR PROGRAM FAILING_CALLS
+    tests/faults/run.py MODE PROGRAM FAILING_CALLS
 
-Whichever call it is (see failing_calls.cpp, which FAILING_CALLS is built of), with an ERROR such as
-ENOSPC: the run ends with -1 and no report of a sanitizer, only what the call concerned differs from
-a run without a fault, and no file that is only read has changed.
+FAILING_CALLS is built of failing_calls.cpp. Whatever the mode, a run ends with -1 and no report of a sanitizer, and
+each Folder.cfg and each job preset is the old one or the new one, to the byte. MODE is one of
+    EIO, ENOSPC, EACCES, EINTR   the call fails; only what it concerns differs from a run without a fault
+    SHORT, SHORT_ENOSPC          a write is half done; in the second, what should continue it fails
+    END                          the process is ended; a content may have line feeds up to the old length after it
+    SWAP                         a file or directory is exchanged for a link; nothing outside the workstation changes
+    FULL_DISK                    no room is left, on a disk that only root can make; a line that was logged stays
 """
+import contextlib
 import errno
 import itertools
 import os
@@ -17,32 +22,64 @@ import sys
 import tempfile
 
 FINISHED = 255  # the tool's exit status of -1, on every path
+KILLED = -9
 ATTRIBUTES = "user.DOSATTRIB"
-LOG = "user/ORX_Installers"
+LOG_DIR = "user/ORX_Installers"
+LOG = LOG_DIR + "/UpgradeDowngrade.log"
+PRIVATE = "[_ORX_HotFolder_]"
 
-CFG = """<HotFolder name="%s" description="%s" server_ip="" server_name="PRESS1" Enable="%d">
+# The event of failing_calls.cpp, and at which calls; none for all of them.
+MODES = {
+    "EIO": ("f", ""),
+    "ENOSPC": ("f", "open64 pwrite64 fallocate64 ftruncate64 setxattr "),
+    "EACCES": ("f", "open64 opendir access unlink chmod fchmod setxattr "),
+    "EINTR": ("f", "open64 close pread64 pwrite64 fallocate64 ftruncate64 fsync "),
+    "SHORT": ("s", "pwrite64 "),
+    "SHORT_ENOSPC": ("sf", "pwrite64 "),
+    "END": ("e", ""),
+    "SWAP": ("x", "open64 opendir access stat64 lstat64 fstatat64 unlink chmod getxattr setxattr removexattr "),
+}
+
+CFG = """<HotFolder name="%s" description="%s" server_ip="" server_name="PRESS1" Enable="%d" unknown="%s">
 <JobSetting><KEYVALUE Key="ORXCopies" Value="500" KeyDisplayValue="" LocDisplayValue=""/></JobSetting>
 <ImposeSetting><KEYVALUE Key="ORXImposeTemplate" Value="@/old/Booklet" KeyDisplayValue=""/></ImposeSetting>
 <FilterSetting>text<Filter/></FilterSetting></HotFolder>"""
 PRESET = '<Presets><Setting Key="ORXImposeTemplate">"@/old/Booklet"</Setting></Presets>\r\n'
 HIVE = 'Windows Registry Editor Version 5.00\r\n\r\n[HKEY_%s]\r\n"%s"="@%s"\r\n'
-LIST = "<HotFolderList>" + "".join(f'<HotFolder path="@/Hot Folders/{name}"/>' for name in "ABC") + "</HotFolderList>"
-FILES = {
-    "machine/hotfolder/HotFolderList.cfg": LIST,
-    "machine/registry/HKEY_LOCAL_MACHINE.reg": HIVE % (r"LOCAL_MACHINE\SOFTWARE\Vantorix\QZA", "InstallPath", ""),
-    "user/registry/HKEY_CURRENT_USER.reg": HIVE % (r"CURRENT_USER\SOFTWARE\HF", "Path", "/old"),
-    "user/ORX/JPData/P/Presets/presets.xml": PRESET,
-    "user/ORX/JPData/Q/Presets/presets.xml": PRESET,
-    LOG + "/UpgradeDowngrade.log": "an older run's\r\n",
-    "old/Booklet": "a template",
-    "template/Booklet": "a template",
-    "Hot Folders/B/Desktop.ini": "[.ShellClassInfo]\nIconFile=mine.ico\n[ViewState]\nMode=4\n",
-    "Hot Folders/B/[_ORX_HotFolder_]/Error.er": "",
-}
-for name, icon in (("A", "hf_folder"), ("B", "hf_error_inactive"), ("C", "hf_folder")):
-    # Longer than the piece in which the library reads, so that a read can fail half way.
-    FILES[f"Hot Folders/{name}/[_ORX_HotFolder_]/Folder.cfg"] = CFG % (name, "long " * 300, name != "B")
-    FILES[f"Hot Folders/{name}/[_ORX_HotFolder_]/{icon}.ico"] = "an older picture"
+INI = "[.ShellClassInfo]\nIconFile=mine.ico\n[ViewState]\nMode=4\n"
+# The icon that a folder gets, the length of its description, and that of an attribute that is lost.
+FOLDERS = {"A": ("hf_folder", 1500, 0), "B": ("hf_error_inactive", 1500, 2000)}
+# Those of the second kind need another page when they are written.
+MANY_FOLDERS = {**FOLDERS, **{f"F{number}": ("hf_folder", 3500, 0) for number in range(20)}}
+
+
+def files_of(folders):
+    """The workstation's files; @ is its root."""
+    files = {
+        "machine/hotfolder/HotFolderList.cfg":
+            "<HotFolderList>" + "".join(f'<HotFolder path="@/Hot Folders/{name}"/>' for name in folders) + "</HotFolderList>",
+        "machine/registry/HKEY_LOCAL_MACHINE.reg": HIVE % (r"LOCAL_MACHINE\SOFTWARE\Vantorix\QZA", "InstallPath", ""),
+        "user/registry/HKEY_CURRENT_USER.reg": HIVE % (r"CURRENT_USER\SOFTWARE\HF", "Path", "/old"),
+        "user/ORX/JPData/P/Presets/presets.xml": PRESET,
+        "user/ORX/JPData/Q/Presets/presets.xml": "\ufeff" + 40 * PRESET,
+        LOG: "an older run's\r\n",
+        "old/Booklet": "a template",
+        "template/Booklet": "a template",
+        "Hot Folders/B/Desktop.ini": INI,
+        f"Hot Folders/B/{PRIVATE}/Error.er": "",
+    }
+    for name, (icon, described, lost) in folders.items():
+        files[f"Hot Folders/{name}/{PRIVATE}/Folder.cfg"] = CFG % (name, described * "d", name != "B", lost * "x")
+        files[f"Hot Folders/{name}/{PRIVATE}/{icon}.ico"] = "an older picture"
+    return files
+
+
+def lay_out(root, files, at_root):
+    for name, text in files.items():
+        path = root / name
+        path.parent.mkdir(parents=True, exist_ok=True)
+        encoding = "utf-16-le" if text.startswith("\ufeff") else "utf-8"
+        path.write_bytes(text.replace("@", str(at_root)).encode(encoding))
 
 
 def part(name):
@@ -52,19 +89,30 @@ def part(name):
     return "/".join(pieces[:length or None])
 
 
-def look(root):
-    """Everything on the workstation but the run log and the program: content, mode, attributes."""
+def look(root, but=(LOG, "program/FolderUpgrade")):
+    """Everything below the directory but for these names: content, mode, attributes."""
     return {name: (path.is_file() and path.read_bytes(), path.stat().st_mode,
                    ATTRIBUTES in os.listxattr(path) and os.getxattr(path, ATTRIBUTES))
-            for path in root.rglob("*") for name in [str(path.relative_to(root))]
-            if not name.startswith((LOG, "program/FolderUpgrade"))}
+            for path in root.rglob("*") for name in [str(path.relative_to(root))] if not name.startswith(but)}
+
+
+def differences(left, right):
+    return {name for name in left.keys() | right.keys() if left.get(name) != right.get(name)}
+
+
+def torn(before, after, now, may_end_in_line_feeds):
+    """The files that are neither the old ones nor the new ones."""
+    def is_whole(name):
+        old, new, content = before[name][0], after[name][0], now[name][0]
+        return content in (old, new) or (may_end_in_line_feeds and content == new.ljust(len(old), b"\n"))
+    return {f"{name} is torn" for name in now if name.endswith(("Folder.cfg", "presets.xml")) and not is_whole(name)}
 
 
 def judge(hit, before, after, now):
     """What should not differ from the run without a fault, when the call concerned that path."""
-    changed = {name for name in after.keys() | now.keys() if now.get(name) != after.get(name)}
+    changed = differences(after, now)
     parts = {part(name) for name in changed}
-    if hit.startswith(LOG) or part(hit) != hit or hit in parts:
+    if hit.startswith(LOG_DIR) or part(hit) != hit or hit in parts:
         return parts - {part(hit)}
     # What all share: steps were not taken, at most those of one hot folder or of all job presets, but for
     # the list itself; a source icon that cannot be read leaves a part of its copy.
@@ -74,64 +122,170 @@ def judge(hit, before, after, now):
 
 
 class Workstation:
-    def __init__(self, folder, program, failing_calls):
+    def __init__(self, folder, program, failing_calls, folders):
         self.failing_calls = failing_calls
         self.root, self.original, self.report = folder / "work station", folder / "original", folder / "report"
-        for name, text in FILES.items():
-            path = self.original / name
-            path.parent.mkdir(parents=True, exist_ok=True)
-            path.write_bytes(text.replace("@", str(self.root)).encode())
+        self.outside, self.outside_before = folder / "outside", folder / "outside before"
+        lay_out(self.original, files_of(folders), self.root)
         os.setxattr(self.original / "Hot Folders/B/Desktop.ini", ATTRIBUTES, b"0x4")
         (self.original / "Hot Folders/B/Desktop.ini").chmod(0o444)
         (self.root / "program").mkdir(parents=True)
         for file in [program, *program.parent.glob("*.ico")]:
             shutil.copy2(file, self.root / "program")
+        lay_out(self.outside_before, {
+            # A hot folder with and one without a private directory, a job preset directory, the log's folder.
+            **{name: text for name, text in files_of(folders).items() if name.startswith(("Hot", "user/ORX"))},
+            "empty/other": "a file"}, self.root)
+        self.before = look(self.original)
+        self.run(0, "f")
+        self.after = look(self.root)
+        self.log = (self.root / LOG).read_bytes()
+        changed = {part(name) for name in differences(self.before, self.after) if name in self.before}
+        if len(changed) != len(folders) + 2:
+            sys.exit(f"without a fault only these change: {changed}")
 
-    def run(self, number, error):
-        """The finished process, and the call that failed with its path, or neither."""
+    def restore(self):
         for item in self.root.iterdir():
             if item.name != "program":
                 shutil.rmtree(item)
         shutil.copytree(self.original, self.root, dirs_exist_ok=True)
+        shutil.rmtree(self.outside, ignore_errors=True)
+        shutil.copytree(self.outside_before, self.outside)
         self.report.unlink(missing_ok=True)
+
+    def run(self, number, events, calls="", error=0, below="", victim="", target="", prepare=lambda _: None):
+        """The finished process, and the call at which it happened with its path, or neither."""
+        self.restore()
+        prepare(self.root)
         process = subprocess.run(
             [self.root / "program/FolderUpgrade", "I"], capture_output=True, text=True, timeout=60, check=False,
             env={**os.environ, "XDG_CONFIG_DIRS": f"{self.root}/machine", "XDG_CONFIG_HOME": f"{self.root}/user",
-                 "LD_PRELOAD": self.failing_calls, "FAULT_ROOT": str(self.root),
-                 "FAULT_NUMBER": str(number), "FAULT_ERROR": str(error), "FAULT_REPORT": str(self.report)})
+                 "LD_PRELOAD": self.failing_calls, "FAULT_ROOT": f"{self.root}/{below}", "FAULT_NUMBER": str(number),
+                 "FAULT_EVENTS": events, "FAULT_CALLS": calls, "FAULT_ERROR": str(error),
+                 "FAULT_VICTIM": f"{self.root}/{victim}", "FAULT_TARGET": f"{self.outside}/{target}",
+                 "FAULT_REPORT": str(self.report)})
         return process, self.report.read_text().split("\t") if self.report.exists() else [None, None]
 
+    def has_torn_line(self):
+        """Whether the log is neither the earlier run's nor made of whole lines."""
+        log = (self.root / LOG).read_bytes()
+        return log != (self.original / LOG).read_bytes() and not log.endswith(b"\r\n") and log != b""
 
-def try_faults(station, error):
-    """With every call failing in its turn: the number of good runs, and what was wrong with the others."""
-    passed, failures = 0, []
-    station.run(0, 0)
-    after = look(station.root)
-    before = look(station.original)
-    if len({part(name) for name in before if after[name] != before[name]}) != 5:
-        return 0, ["without a fault not all 3 hot folders and 2 job presets change"]
+
+def complaints(process, status=FINISHED):
+    is_good = process.returncode == status and "Sanitizer" not in process.stderr and "runtime error" not in process.stderr
+    return set() if is_good else {f"exit status {process.returncode}, {process.stderr}"}
+
+
+def try_calls(station, mode):
+    """With a fault at each call in its turn: what was wrong, for each run."""
+    events, calls = MODES[mode]
+    ends = mode == "END"
     for number in itertools.count(1):
-        process, (call, path) = station.run(number, error)
+        process, (call, path) = station.run(number, events, calls, getattr(errno, mode.split("_")[-1], 0))
         if not call:
-            return passed, failures
+            return
         hit = os.path.relpath(path, station.root)
-        wrong = judge(hit, before, after, look(station.root))
-        if process.returncode != FINISHED or "Sanitizer" in process.stderr or "runtime error" in process.stderr:
-            wrong.add(f"exit status {process.returncode}, {process.stderr}")
-        passed += not wrong
-        if wrong:
-            failures.append(f"{call} number {number} fails, {hit}: {wrong}")
+        now = look(station.root)
+        wrong = torn(station.before, station.after, now, ends) | complaints(process, KILLED if ends else FINISHED)
+        if not ends:
+            wrong |= judge(hit, station.before, station.after, now)
+        if station.has_torn_line():
+            wrong.add("a line of the log is torn")
+        yield f"{call} number {number}, {hit}", wrong
+
+
+def victims():
+    """What is exchanged, and for a link to what; the second of a place does not exist."""
+    for folder, (icon, *_) in FOLDERS.items():
+        hot = f"Hot Folders/{folder}"
+        yield hot, "empty"
+        yield f"{hot}/{PRIVATE}", f"{hot}/{PRIVATE}"
+        for name, directory in (("Folder.cfg", f"{hot}/{PRIVATE}"), (f"{icon}.ico", f"{hot}/{PRIVATE}"), ("Desktop.ini", hot)):
+            target = f"Hot Folders/B/{name}" if name == "Desktop.ini" else f"{directory}/{name}"
+            yield f"{directory}/{name}", target
+            yield f"{directory}/{name}", "empty/missing"
+    yield "user/ORX/JPData/P/Presets", "user/ORX/JPData/P/Presets"
+    yield "user/ORX/JPData/P/Presets/presets.xml", "user/ORX/JPData/P/Presets/presets.xml"
+    yield LOG_DIR, LOG_DIR
+    yield LOG, LOG
+    yield LOG, "empty/missing"
+
+
+def try_swaps(station):
+    """With each victim exchanged at each call by name that its step makes: what was wrong, for each run."""
+    outside = look(station.outside, ())
+    for victim, target in victims():
+        below = LOG_DIR if victim.startswith(LOG_DIR) else part(victim)
+        for number in itertools.count(1):
+            process, (call, path) = station.run(number, *MODES["SWAP"], below=below, victim=victim, target=target)
+            if not call:
+                break
+            wrong = complaints(process) | {f"outside/{name} differs" for name in differences(outside, look(station.outside, ()))}
+            yield f"{victim} becomes a link to {target} before {call} number {number}, {os.path.relpath(path, station.root)}", wrong
+
+
+def fill_up(directory):
+    with contextlib.suppress(OSError), open(directory / "program/rest", "wb", buffering=0) as file:
+        while True:
+            file.write(bytes(4096))
+
+
+def try_full_disk(station):
+    """With no room left: what was wrong with the run."""
+    process, _ = station.run(0, "f", prepare=fill_up)
+    now = look(station.root)
+    wrong = torn(station.before, station.after, now, False) | complaints(process)
+    if not any(now[name] == station.before[name] for name in station.before if name.endswith("Folder.cfg")):
+        wrong.add("the disk was not full")
+    lines = iter(station.log.splitlines(keepends=True))
+    log = (station.root / LOG).read_bytes()
+    if len(log) < 3500 or len(log) >= len(station.log) or not all(line in lines for line in log.splitlines(keepends=True)):
+        wrong.add(f"the log is {log}")
+    yield "a full disk", wrong
+
+
+def keeps_attributes(directory):
+    try:
+        with tempfile.NamedTemporaryFile(dir=directory) as file:
+            os.setxattr(file.name, ATTRIBUTES, b"0x4")
+    except OSError:
+        return False
+    return True
+
+
+@contextlib.contextmanager
+def small_disk(folder):
+    """Mounts one of 64 megabytes at the directory."""
+    folder.mkdir()
+    subprocess.run(["mount", "-t", "tmpfs", "-o", "size=64m", "tmpfs", folder], check=True)
+    try:
+        yield folder
+    finally:
+        subprocess.run(["umount", folder], check=True)
 
 
 def main():
-    error, program, failing_calls = sys.argv[1:]
-    with tempfile.TemporaryDirectory() as folder:
-        station = Workstation(pathlib.Path(folder), pathlib.Path(program), failing_calls)
-        passed, failures = try_faults(station, getattr(errno, error))
-    print(*failures, sep="\n", end="\n" * bool(failures))
-    print(f"{passed} passed, {len(failures)} failed, 0 skipped")
-    return bool(failures) or not passed
+    mode, program, failing_calls = sys.argv[1:]
+    in_memory = "/dev/shm" if keeps_attributes("/dev/shm") else None
+    if mode == "FULL_DISK" and not (in_memory and os.geteuid() == 0):
+        print("skipped faults.FULL_DISK: only root can make a small disk, and not every system has one that keeps attributes\n"
+              "0 passed, 0 failed, 1 skipped")
+        return 0
+    passed = failed = 0
+    with tempfile.TemporaryDirectory(dir=in_memory) as name, contextlib.ExitStack() as disk:
+        folder, folders, runs = pathlib.Path(name), FOLDERS, {"SWAP": try_swaps, "FULL_DISK": try_full_disk}
+        if mode == "FULL_DISK":
+            folder, folders = disk.enter_context(small_disk(folder / "disk")), MANY_FOLDERS
+        station = Workstation(folder, pathlib.Path(program), failing_calls, folders)
+        for what, wrong in runs[mode](station) if mode in runs else try_calls(station, mode):
+            passed += not wrong
+            failed += bool(wrong)
+            if wrong:
+                print(f"{what}: {wrong}")
+    print(f"{passed} passed, {failed} failed, 0 skipped")
+    return failed or not passed
 
 
 if __name__ == "__main__":
-    sys.exit(main())
+    sys.exit(bool(main()))

@@ -35,6 +35,10 @@ std::vector<Scenario> FolderCfgs()
     const Text written = MinimalWritten(MovedTo);
     const Text mixed = Filter("t\n    <x>u\n      <y/>v</x>\n    <![CDATA[<w>]]>z\n    <!--c-->\n  ");
     const auto elsewhere = [](const Name& name, const Text& path) { return Scenario(name).FolderCfg(Written(path)).LogOfA(Found(path)); };
+    const Text onServer = "{/}{/}host{/}share{/}old{/}x";
+    const auto onShare = [&](const Name& name, const Text& share) {
+        return Scenario(name).Before({{UserHive, UserValue("\"Path\"=\"{/2}{/2}host{/2}" + share + "{/2}old\"")}}).LogOfA(Found(onServer));
+    };
     const auto nested = [&](const Name& name, int levels) {
         return Scenario(name)
             .FolderCfg(Written(MovedFrom, Filter(Chain(levels))))
@@ -52,6 +56,15 @@ std::vector<Scenario> FolderCfgs()
         Scenario("AUtf16FolderCfgComesOutInUtf8").FolderCfg("{utf16}" + Minimal(MovedFrom), written).LogOfDisabledA(found),
         elsewhere("ATemplateInASubfolderStays", "{previous}{/}Sub{/}x"),
         elsewhere("ATemplateElsewhereStays", "{previous}2{/}x"),
+        elsewhere("ATemplateOnAServerStays", "\\\\host\\share\\x\\B"),
+        elsewhere("ATemplateOnAServerStaysWithSlashes", "//host/share/B"),
+        onShare("ATemplateOnTheShareThatIsLeftMoves", "share").FolderCfg(Written(onServer), Written("{default}{/}x")),
+        onShare("ATemplateOnAnotherShareStays", "other").FolderCfg(Written(onServer)),
+        Scenario("HiddenAndSystemFilesAreWrittenAndStayThat")
+            .Before({{CfgPlace + "#", "HS"}, {PresetPlace + "#", "HS"}})
+            .FolderCfg(Written(MovedFrom), Written(MovedTo))
+            .Preset(Stored(MovedFrom), Stored(MovedTo))
+            .LogOfA(found, PresetLine(Updated)),
         Scenario("AnEmptyFolderCfgStays").FolderCfg("").LogOfDisabledA("").LibraryReports(),
         Scenario("ATruncatedFolderCfgStays").FolderCfg(Foreign(MovedFrom).substr(0, 700)).LogOfDisabledA("").LibraryReports(),
         Scenario("WithoutImposeSettingNothingIsLogged").FolderCfg("<HotFolder/>").LogOfDisabledA(""),
@@ -85,7 +98,19 @@ std::vector<Scenario> Encodings()
             .FolderCfg(Minimal("{hot}{/}x", "<?xml version='1.0' encoding" + encoding + "?>", folder))
             .LogOfDisabledA(Found("{hot}{/}x") + Untouched("unknown encoding"));
     };
+    const auto ascii = [&](const Name& name, const Text& encoding)
+    {
+        return declared(name, "='" + encoding + "'", "x")
+            .After({{CfgPlace, MinimalWritten("{hot}{/}template{/}x", "x")}})
+            .LogOfDisabledA(Found("{hot}{/}x"));
+    };
     return {
+        ascii("AsciiInUtf8OfAnotherNameIsReadAsThat", "UTF8"),
+        ascii("AsciiInLatin1IsReadAsThat", "latin1"),
+        ascii("AsciiIsReadAsThat", "ASCII"),
+        ascii("AsciiInWindows1252IsReadAsThat", "windows-1252"),
+        ascii("AsciiInShiftJisIsReadAsThat", "Shift_JIS"),
+        declared("Utf8OfAnotherNameStays", "='UTF8'", "\xC3\xA4"),
         declared("AWindows1252FolderCfgComesOutInUtf8", "='windows-1252'", "\x80\xE4")
             .After({{CfgPlace, MinimalWritten("{hot}{/}template{/}x", "€ä")}})
             .LogOfDisabledA(Found("{hot}{/}x")),

@@ -9,6 +9,7 @@ std::vector<Scenario> Runs()
     const Text from = Written(MovedFrom);
     const Text to = Written(MovedTo);
     const Text found = Found(MovedFrom);
+    const Text forged = "x&#13;&#10;End: Updating Impose path for JP Presets&#13;&#10;&#x2028;&#x2029;&#x85;&#x7F;&#9;y";
     return {
         Scenario("NoSwitchTouchesNothing").FolderCfg(from).Run({}),
         Scenario("ADashedSwitchIsInvalid").FolderCfg(from).Run({"-I"}).WholeLog("Invalid call check calling parameter: exiting....\n"),
@@ -25,6 +26,13 @@ std::vector<Scenario> Runs()
         Scenario("APercentSignIsLoggedAsItIs")
             .Before({{"hot/%d %s/", ""}})
             .Log(FolderLines("%d %s", 1, NoIcon("hf_folder_disabled"), NoCfg("%d %s"))),
+        Scenario("AStoredPathStaysInItsLine")
+            .FolderCfg(Minimal(forged))
+            .LogOfDisabledA(Found(u8"x\uFFFD\uFFFDEnd: Updating Impose path for JP Presets\uFFFD\uFFFD\uFFFD\uFFFD\uFFFD\uFFFD\ty")),
+        Scenario("AFolderNameStaysInItsLine")
+            .Before({{"hot/x\ny/", ""}, {ListPlace, "<l><HotFolder path='{hot}{/}x&#10;y'/></l>"}})
+            .Log(FolderLines(u8"x\uFFFDy", 1, NoIcon("hf_folder_disabled"), NoCfg(u8"x\uFFFDy")))
+            .NotUnderWine("no name of a file has a line end there"),
     };
 }
 

@@ -1,0 +1,33 @@
+// The run log, line by line. One test, since the log of a process has one first line.
+#include "run/run_log.h"
+#include "tests/text_files.h"
+
+#include <gtest/gtest.h>
+
+#include <cstdlib>
+#include <filesystem>
+
+TEST(RunLogFile, EveryLineIsOneLineAtTheEndOfTheFile)
+{
+    namespace fs = std::filesystem;
+    std::string folder = (fs::temp_directory_path() / "log XXXXXX").string();
+    ASSERT_NE(nullptr, mkdtemp(folder.data()));
+    ASSERT_EQ(0, setenv("XDG_CONFIG_HOME", folder.c_str(), 1));
+    const fs::path log = fs::path(folder) / "ORX_Installers" / "UpgradeDowngrade.log";
+    WriteFile(log, "\xEF\xBB\xBFthe log of an earlier run\r\n");
+
+    RunLog("100 %s");
+    EXPECT_EQ("100 %s\r\n", ReadFile(log));
+    RunLog("%d", 0);
+    RunLog("ä", -2);
+    RunLog(L"a\r\nb\u2028c\u0085d\te");
+    EXPECT_EQ("100 %s\r\n%d count:  0\r\nä count:  -2\r\na\uFFFD\uFFFDb\uFFFDc\uFFFDd\te\r\n", ReadFile(log));
+
+    fs::remove(log);
+    RunLog("deleted");
+    EXPECT_FALSE(fs::exists(log));
+    WriteFile(log, "another's\r\n");
+    RunLog("added", 1);
+    EXPECT_EQ("another's\r\nadded count:  1\r\n", ReadFile(log));
+    fs::remove_all(folder);
+}
