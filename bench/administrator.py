@@ -4,7 +4,7 @@
     administrator.py LIST ICON_DIR OLD NEW PRESET_DIR
 
 LIST is HotFolderList.cfg; template paths move from the folder OLD to the folder NEW, in the hot folders and in the
-presets below PRESET_DIR. It keeps no log and asks no registry.
+presets below PRESET_DIR. Like the tool it waits for the disk after each rewrite. It keeps no log and asks no registry.
 """
 import glob
 import os
@@ -17,6 +17,18 @@ KEY = 'ORXImposeTemplate'
 INI = {'InfoTip': 'This folder has been configured as an ORX hot folder.'}
 
 
+def read(path):
+    with open(path, encoding='utf-8', newline='') as file:
+        return file.read()
+
+
+def rewrite(path, content):
+    with open(path, 'wb') as file:
+        file.write(content)
+        file.flush()
+        os.fsync(file.fileno())
+
+
 def refresh_icon(folder, private, enabled, icon_dir):
     error = os.path.isfile(f'{private}/Error.er')
     name = {(True, False): 'hf_folder', (False, False): 'hf_folder_disabled',
@@ -26,14 +38,12 @@ def refresh_icon(folder, private, enabled, icon_dir):
     shutil.copyfile(f'{icon_dir}/{name}', f'{private}/{name}')
     ini = f'{folder}/Desktop.ini'
     values = dict(INI, IconFile=f'.\\[_ORX_HotFolder_]\\{name}')
-    with open(ini, encoding='utf-8', newline='') as file:
-        before = file.read()
+    before = read(ini)
     text = '\r\n'.join(f'{key}={values[key]}' if (key := line.partition('=')[0]) in values else line
                         for line in before.split('\r\n'))
     os.chmod(ini, 0o644)
     if text != before:
-        with open(ini, 'w', encoding='utf-8', newline='') as file:
-            file.write(text)
+        rewrite(ini, text.encode())
     os.setxattr(ini, 'user.DOSATTRIB', b'0x4')
     os.chmod(ini, 0o444)
     os.setxattr(folder, 'user.DOSATTRIB', b'0x4')
@@ -44,7 +54,7 @@ def move_template(path, document, old, new):
         directory, name = os.path.split(entry.get('Value'))
         if directory == old:
             entry.set('Value', os.path.join(new, name))
-            document.write(path, encoding='UTF-8', xml_declaration=True)
+            rewrite(path, etree.tostring(document, encoding='UTF-8', xml_declaration=True))
 
 
 def main(hot_folder_list, icon_dir, old, new, preset_dir):
@@ -55,10 +65,7 @@ def main(hot_folder_list, icon_dir, old, new, preset_dir):
         refresh_icon(folder, private, document.getroot().get('Enable') == '1', icon_dir)
         move_template(f'{private}/Folder.cfg', document, old, new)
     for path in glob.glob(f'{preset_dir}/*/Presets/presets.xml'):
-        with open(path, encoding='utf-8', newline='') as file:
-            text = file.read()
-        with open(path, 'w', encoding='utf-8', newline='') as file:
-            file.write(text.replace(f'{KEY}">"{old}/', f'{KEY}">"{new}/'))
+        rewrite(path, read(path).replace(f'{KEY}">"{old}/', f'{KEY}">"{new}/').encode())
 
 
 main(*sys.argv[1:])

@@ -1,60 +1,73 @@
-// The floor of a whole run: nothing but the library's loads of each Folder.cfg, the one save and
-// the copy of the icon.
+// The floor: what a run cannot do without, done by the library's calls and nothing else.
 //
-//     floor FOLDERS ICON [SAVE]
-//
-// FOLDERS is a text file that names a hot folder a line, ICON the icon that goes over each folder's
-// own. SAVE is the library's way to the file: "buffered" on its plain file stream, as if nothing is
-// given, where the buffer's end waits for the disk; "unsynced", on its stream of the C library,
-// which does not and is what the tool does; "named", with its own save by file name.
-
+//     floor FOLDERS ICON        three loads of each Folder.cfg, one save to memory, one write and
+//     its
+//                               wait for the disk, and a copy of the icon over the folder's own;
+//                               FOLDERS is a file that names a hot folder a line
+//     floor PRESET FROM TO      the read of a preset file, one replacement, and the write
+#include <wx/convauto.h>
+#include <wx/ffile.h>
+#include <wx/file.h>
 #include <wx/filefn.h>
 #include <wx/filename.h>
 #include <wx/init.h>
+#include <wx/mstream.h>
 #include <wx/textfile.h>
-#include <wx/wfstream.h>
 #include <wx/xml/xml.h>
 
 namespace
 {
 
-// One for the icon, two for the template path, five for the settings that are written back with it.
-constexpr int LoadsPerFolder = 8;
+// One for the icon, one for the template path, one before the file is rewritten.
+constexpr int LoadsPerFolder = 3;
 
 constexpr int IndentationStep = 2;
-constexpr size_t WriteBufferBytes = 16 * 1024;
 
-template <typename Stream>
-bool SaveBuffered(const wxXmlDocument& document, Stream&& file)
+// The file has to have been written by the library before: then the new bytes are as many.
+bool Rewrite(const wxString& path, const wxXmlDocument& document)
 {
-    wxBufferedOutputStream buffered(file, WriteBufferBytes);
-    return document.Save(buffered, IndentationStep) && buffered.Close() && file.Close();
+    wxMemoryOutputStream text;
+    if (!document.Save(text, IndentationStep))
+        return false;
+    const auto size = static_cast<size_t>(text.GetLength());
+    wxFile file(path, wxFile::read_write);
+    return file.IsOpened() && file.Length() == text.GetLength() &&
+           file.Write(text.GetOutputStreamBuffer()->GetBufferStart(), size) == size &&
+           file.Flush() && file.Close();
 }
 
-bool Save(const wxXmlDocument& document, const wxString& path, const wxString& way)
-{
-    if (way == "named")
-        return document.Save(path, IndentationStep);
-    if (way == "unsynced")
-        return SaveBuffered(document, wxFFileOutputStream(path, "wb"));
-    return SaveBuffered(document, wxFileOutputStream(path));
-}
-
-bool Refresh(const wxString& folder, const wxString& icon, const wxString& iconName,
-             const wxString& saveWay)
+bool Refresh(const wxString& folder, const wxString& icon)
 {
     const wxString privateDir = folder + "/[_ORX_HotFolder_]/";
     const wxString cfgPath = privateDir + "Folder.cfg";
-    for (int load = 1; load < LoadsPerFolder; ++load)
+    wxXmlDocument document;
+    for (int i = 0; i < LoadsPerFolder; ++i)
     {
-        wxXmlDocument document;
         if (!document.Load(cfgPath, "UTF-8"))
             return false;
     }
-    wxXmlDocument document;
-    if (!document.Load(cfgPath, "UTF-8"))
+    return Rewrite(cfgPath, document) &&
+           wxCopyFile(icon, privateDir + wxFileName(icon).GetFullName(), true);
+}
+
+bool RefreshAll(const wxString& list, const wxString& icon)
+{
+    wxTextFile folders;
+    bool isDone = folders.Open(list);
+    for (size_t i = 0; isDone && i < folders.GetLineCount(); ++i)
+        isDone = Refresh(folders[i], icon);
+    return isDone;
+}
+
+bool MigratePreset(const wxString& path, const wxString& from, const wxString& to)
+{
+    wxFFile file(path, "r");
+    wxString text;
+    if (!file.IsOpened() || !file.ReadAll(&text, wxConvAuto()))
         return false;
-    return Save(document, cfgPath, saveWay) && wxCopyFile(icon, privateDir + iconName, true);
+    text.Replace(from, to);
+    file.Close();
+    return file.Open(path, "w") && file.Write(text, wxConvAuto()) && file.Close();
 }
 
 } // namespace
@@ -62,18 +75,12 @@ bool Refresh(const wxString& folder, const wxString& icon, const wxString& iconN
 int main(int argc, char** argv)
 {
     const wxInitializer library(argc, argv);
-    if (argc < 3)
-        return 2;
-    wxTextFile folders;
-    if (!folders.Open(wxString::FromUTF8(argv[1])))
-        return 1;
-    const wxString icon = wxString::FromUTF8(argv[2]);
-    const wxString iconName = wxFileName(icon).GetFullName();
-    const wxString saveWay = argc > 3 ? argv[3] : "buffered";
-    for (size_t i = 0; i < folders.GetLineCount(); ++i)
+    const auto argument = [argv](int i)
     {
-        if (!Refresh(folders[i], icon, iconName, saveWay))
-            return 1;
-    }
-    return 0;
+        return wxString::FromUTF8(argv[i]);
+    };
+    const bool isDone = argc == 3   ? RefreshAll(argument(1), argument(2))
+                        : argc == 4 ? MigratePreset(argument(1), argument(2), argument(3))
+                                    : false;
+    return isDone ? 0 : 1;
 }

@@ -1,7 +1,6 @@
 #include "check/folder_cfg_loss.h"
 
 #include "store/folder_cfg_format.h"
-#include "store/root_attributes.h"
 #include "store/xml_document.h"
 
 #include <wx/hashmap.h>
@@ -45,18 +44,30 @@ wxString WithoutWhiteSpace(const wxString& text)
     return result;
 }
 
-// A node below the root, with a number for the names of those above it up to its section: a section
-// counts as directly below the root wherever it is, as it does for the readers.
+// A node below the root, with a number for all that it is: its name and attributes or its text, and
+// the names of those above it up to its section. A section counts as directly below the root
+// wherever it is, as it does for the readers.
 struct Thing
 {
     const wxXmlNode* node;
-    size_t place;
-    wxString text; // of what is no element
+    size_t fingerprint;
 };
 
-bool IsElement(const Thing& thing)
+bool IsElement(const wxXmlNode& node)
 {
-    return thing.node->GetType() == wxXML_ELEMENT_NODE;
+    return node.GetType() == wxXML_ELEMENT_NODE;
+}
+
+// In whatever order. Outside the filter setting the writer adds empty ones.
+size_t AttributesFingerprint(const wxXmlNode& element, bool withEmpty)
+{
+    size_t sum = 0;
+    for (const wxXmlAttribute* each = element.GetAttributes(); each; each = each->GetNext())
+    {
+        if (withEmpty || !each->GetValue().empty())
+            sum += Mix(Hash(each->GetName()), Hash(each->GetValue()));
+    }
+    return sum;
 }
 
 // Comments and white space are left out.
@@ -80,103 +91,68 @@ std::vector<Thing> Collect(const wxXmlNode& root)
         }
         open.back().next = node->GetNext();
         const auto [next, place, isInFilter] = open.back();
-        if (node->GetType() == wxXML_ELEMENT_NODE)
+        if (IsElement(*node))
         {
             const bool isSection = !isInFilter && IsSection(node->GetName());
             const size_t own = Mix(isSection ? 0 : place, Hash(node->GetName()));
-            things.push_back({node, own, {}});
+            things.push_back({node, Mix(own, AttributesFingerprint(*node, isInFilter))});
             open.push_back(
                 {node->GetChildren(), own,
                  isInFilter || (isSection && node->GetName() == FolderCfg::FilterSettingSection)});
             continue;
         }
         const wxString text = WithoutWhiteSpace(node->GetContent());
-        if (node->GetType() != wxXML_COMMENT_NODE && !text.empty())
-            things.push_back({node, Mix(place, static_cast<size_t>(node->GetType())), text});
+        if (node->GetType() == wxXML_PI_NODE ||
+            (node->GetType() != wxXML_COMMENT_NODE && !text.empty()))
+            things.push_back(
+                {node, Mix(Mix(place, static_cast<size_t>(node->GetType())), Hash(text))});
     }
     return things;
-}
-
-size_t Key(size_t place, const wxString& name, const wxString& value)
-{
-    return Mix(Mix(place, Hash(name)), Hash(value));
 }
 
 bool HasAll(const wxXmlNode& element, const wxXmlNode& wanted)
 {
     for (const wxXmlAttribute* each = wanted.GetAttributes(); each; each = each->GetNext())
     {
-        wxString value;
-        if (!element.GetAttribute(each->GetName(), &value) || value != each->GetValue())
+        if (!element.HasAttribute(each->GetName()))
             return false;
     }
     return true;
 }
 
-// The things of the new document, each of which can stand for one of the old.
-class Pool
+// So much of a text as people can read in a line.
+wxString Shown(const wxString& text)
 {
-  public:
-    explicit Pool(const std::vector<Thing>& things)
-    {
-        for (const Thing& thing : things)
-        {
-            m_things.emplace(IsElement(thing) ? thing.place : Mix(thing.place, Hash(thing.text)),
-                             thing.node);
-            for (const wxXmlAttribute* each = thing.node->GetAttributes(); each;
-                 each = each->GetNext())
-                m_things.emplace(Key(thing.place, each->GetName(), each->GetValue()), thing.node);
-        }
-    }
+    constexpr size_t Longest = 200;
+    return text.length() <= Longest ? text : text.Left(Longest) + "...";
+}
 
-    bool Take(const Thing& thing)
-    {
-        constexpr int MostTries = 1000; // so that many alike cost a time in proportion
-        const wxXmlAttribute* first = thing.node->GetAttributes();
-        const size_t key = !IsElement(thing) ? Mix(thing.place, Hash(thing.text))
-                           : first           ? Key(thing.place, first->GetName(), first->GetValue())
-                                             : thing.place;
-        const auto [begin, end] = m_things.equal_range(key);
-        int tries = 0;
-        for (auto each = begin; each != end && tries < MostTries; ++each, ++tries)
-        {
-            if (IsElement(thing) && !HasAll(*each->second, *thing.node))
-                continue;
-            m_things.erase(each);
-            return true;
-        }
-        return false;
-    }
-
-  private:
-    std::unordered_multimap<size_t, const wxXmlNode*> m_things;
-};
-
-wxString Describe(const Thing& thing)
+wxString Describe(const wxXmlNode& node)
 {
-    const wxXmlNode& node = *thing.node;
     if (node.GetType() == wxXML_PI_NODE)
         return "the instruction <?" + node.GetName() + "?>";
-    if (!IsElement(thing))
-        return "the text \"" + thing.text + "\" in <" + node.GetParent()->GetName() + ">";
+    const wxString place = " in <" + node.GetParent()->GetName() + ">";
+    if (!IsElement(node))
+        return "the text \"" + Shown(wxString(node.GetContent()).Trim().Trim(false)) + "\"" + place;
     wxString tag = "<" + node.GetName();
     for (const wxXmlAttribute* each = node.GetAttributes(); each; each = each->GetNext())
         tag += " " + each->GetName() + "=\"" + each->GetValue() + "\"";
-    return tag + "> in <" + node.GetParent()->GetName() + ">";
+    return Shown(tag) + ">" + place;
 }
 
 void FindLostThings(const wxXmlNode& before, const wxXmlNode& after, wxArrayString& losses)
 {
-    const std::vector<Thing> things = Collect(before);
-    Pool pool(Collect(after));
-    // One without attributes could take the place of any other.
-    for (const bool withAttributes : {true, false})
+    // Each of the new document's can stand for one of the old.
+    std::unordered_multimap<size_t, const wxXmlNode*> pool;
+    for (const Thing& thing : Collect(after))
+        pool.emplace(thing.fingerprint, thing.node);
+    for (const Thing& thing : Collect(before))
     {
-        for (const Thing& thing : things)
-        {
-            if ((thing.node->GetAttributes() != nullptr) == withAttributes && !pool.Take(thing))
-                losses.Add("loses " + Describe(thing));
-        }
+        const auto found = pool.find(thing.fingerprint);
+        if (found != pool.end() && HasAll(*found->second, *thing.node))
+            pool.erase(found);
+        else
+            losses.Add("loses " + Describe(*thing.node));
     }
 }
 
@@ -187,13 +163,9 @@ void FindLostAttributes(const wxXmlNode& root, wxArrayString& losses)
     HotFolderSettings settings;
     const RootAttribute* gap = ReadRootAttributes(attributes, settings);
     if (gap)
-    {
-        const bool wasEnabled =
-            !settings.Enable && attributes.count(L"Enable") != 0 && gap->chainPlace <= EnablePlace;
         losses.Add(wxString("lacks the attribute \"") + gap->name +
                    "\"; the rewrite sets it and all that follow it to their defaults" +
-                   (wasEnabled ? " (the folder comes out disabled)" : ""));
-    }
+                   (FindGapBeforeEnable(root) ? " (the folder comes out disabled)" : ""));
     for (const RootAttribute& each : RootAttributes())
     {
         const auto found = attributes.find(each.name);
@@ -203,12 +175,12 @@ void FindLostAttributes(const wxXmlNode& root, wxArrayString& losses)
         const wxString now = each.Format(settings);
         if (isRead && each.form != AttributeForm::Text &&
             wxString(found->second).Trim().Trim(false) != now)
-            losses.Add(wxString(each.name) + "=\"" + found->second + "\" comes out as \"" + now +
-                       "\"");
+            losses.Add(wxString(each.name) + "=\"" + Shown(found->second) + "\" comes out as \"" +
+                       now + "\"");
         attributes.erase(found);
     }
     for (const auto& [name, value] : attributes)
-        losses.Add("loses the attribute " + name + "=\"" + value + "\"");
+        losses.Add("loses the attribute " + name + "=\"" + Shown(value) + "\"");
 }
 
 } // namespace
@@ -222,12 +194,31 @@ wxArrayString FindFolderCfgLosses(const wxXmlDocument& document, const std::stri
          node = node->GetNext())
     {
         if (node->GetType() == wxXML_PI_NODE)
-            losses.Add("loses " + Describe({node, 0, {}}));
+            losses.Add("loses " + Describe(*node));
     }
     const wxXmlNode& root = *document.GetRoot();
+    if (root.GetName() != FolderCfg::Root)
+        losses.Add("its root <" + root.GetName() + "> comes out as <" + FolderCfg::Root + ">");
     FindLostAttributes(root, losses);
     wxXmlDocument after;
     if (LoadXml(rewritten, after, wxXMLDOC_KEEP_WHITESPACE_NODES) == XmlLoad::Loaded)
         FindLostThings(root, *after.GetRoot(), losses);
     return losses;
+}
+
+const RootAttribute* FindGapBeforeEnable(const wxXmlNode& root)
+{
+    AttributeMap attributes;
+    CollectAttributes(root, attributes);
+    HotFolderSettings settings;
+    const RootAttribute* gap = ReadRootAttributes(attributes, settings);
+    if (!gap || gap->chainPlace > EnablePlace)
+        return nullptr;
+    for (const RootAttribute& each : RootAttributes())
+    {
+        const auto found = attributes.find(each.name);
+        if (each.chainPlace == EnablePlace && found != attributes.end())
+            each.Read(found->second, settings);
+    }
+    return settings.Enable ? gap : nullptr;
 }

@@ -7,6 +7,7 @@
 #include "appearance/shell_version.h"
 #include "check/folder_cfg_loss.h"
 #include "check/library_errors.h"
+#include "check/reach.h"
 #include "migrate/template_move.h"
 #include "platform/attribute_rights.h"
 #include "platform/file_copy.h"
@@ -146,15 +147,15 @@ void CheckIcon(const PinnedHotFolder& folder, const wxString& hotFolder, bool is
 // ---------------------------------------------------------------------------------------------------
 
 // What keeps a Folder.cfg from being there for a run.
-void CheckMissing(const PinnedHotFolder& folder, Report& report)
+void CheckMissing(const PinnedHotFolder& folder, const wxString& hotFolder, Report& report)
 {
     const wxString privateDir = folder.directory.Reach(PrivateDirName);
-    if (!folder.directory.IsOpen() || !wxFileName::Exists(folder.directory.Reach(L".")))
-        report.Problem("the hot folder cannot be entered");
+    const wxString obstacle = WhyOutOfReach(hotFolder);
+    if (!obstacle.empty())
+        report.Problem("the hot folder " + obstacle);
     else if (IsLink(privateDir))
         report.Problem(wxString(PrivateDirName) + ": reached over a link");
-    else if (wxDirExists(privateDir) &&
-             (!folder.privateDir.IsOpen() || !wxFileName::Exists(folder.privateDir.Reach(L"."))))
+    else if (wxDirExists(privateDir) && !MayEnter(folder.privateDir))
         report.Problem(wxString(PrivateDirName) + ": cannot be entered");
     else if (IsLink(folder.privateDir.Reach(FolderCfgName)))
         report.Problem("Folder.cfg: reached over a link");
@@ -166,18 +167,14 @@ void CheckMissing(const PinnedHotFolder& folder, Report& report)
 
 void CheckShownState(const wxXmlNode& root, Report& report)
 {
-    AttributeMap attributes;
-    CollectAttributes(root, attributes);
-    HotFolderSettings settings;
-    const RootAttribute* gap = ReadRootAttributes(attributes, settings);
-    wxString enable;
-    if (gap && gap->chainPlace < EnablePlace && GetAttribute(attributes, L"Enable", enable) &&
-        enable.Trim() == "1")
+    const RootAttribute* gap = FindGapBeforeEnable(root);
+    if (gap)
         report.Problem(wxString("Folder.cfg: lacks the attribute \"") + gap->name +
                        "\", so the enabled folder shows as disabled");
 }
 
-void CheckMove(XmlFile& cfg, const TemplateMove& move, const wxString& stored,
+// False when the file is not rewritten.
+bool CheckMove(XmlFile& cfg, const TemplateMove& move, const wxString& stored,
                const ImposeSettingTable& table, Report& report)
 {
     // The new path makes no difference to what is lost.
@@ -185,13 +182,15 @@ void CheckMove(XmlFile& cfg, const TemplateMove& move, const wxString& stored,
     if (rewritten.reasonToStay)
     {
         report.Problem(wxString("Folder.cfg: left as it is (") + rewritten.reasonToStay + ")");
-        return;
+        return false;
     }
     if (cfg.ReopenForUpdate() != RegularFile::Status::Open)
     {
         report.Problem("Folder.cfg: cannot be opened for writing (" + TakeLibraryErrors() + ")");
-        return;
+        return false;
     }
+    if (stored == move.newPath && rewritten.bytes == cfg.GetBytes())
+        return true;
     for (const wxString& loss : FindFolderCfgLosses(cfg.GetDocument(), rewritten.bytes))
         report.Problem("Folder.cfg: " + loss);
     report.Change("Folder.cfg: " + stored + " -> " + move.newPath);
@@ -199,6 +198,7 @@ void CheckMove(XmlFile& cfg, const TemplateMove& move, const wxString& stored,
         report.Note("Folder.cfg: comes out in UTF-8");
     if (!wxFileName::Exists(move.newPath))
         report.Note("no such file: " + move.newPath);
+    return true;
 }
 
 // False when the file is not rewritten.
@@ -236,10 +236,9 @@ bool CheckTemplate(XmlFile& cfg, const TemplateFolders& folders, Report& report)
         break;
     case TemplateMove::Outcome::Moves:
         folders.ReportTo(report);
-        CheckMove(cfg, move, stored, table, report);
-        break;
+        return CheckMove(cfg, move, stored, table, report);
     }
-    return move.outcome == TemplateMove::Outcome::Moves;
+    return false;
 }
 
 void CheckFolderCfg(const PinnedHotFolder& folder, const wxString& hotFolder,
@@ -250,7 +249,7 @@ void CheckFolderCfg(const PinnedHotFolder& folder, const wxString& hotFolder,
         cfg.Load(folder.privateDir.Reach(FolderCfgName), Links::Refuse, FolderCfgPath(hotFolder)))
     {
     case XmlFile::State::Missing:
-        CheckMissing(folder, report);
+        CheckMissing(folder, hotFolder, report);
         break;
     case XmlFile::State::TooLarge:
         report.Problem("Folder.cfg: left as it is (too large to read safely)");

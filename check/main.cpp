@@ -11,8 +11,9 @@
 
 #include <wx/app.h>
 #include <wx/datetime.h>
+#include <wx/debug.h>
 
-#include <set>
+#include <map>
 
 namespace
 {
@@ -39,15 +40,17 @@ void WriteHead(const TemplateFolders& folders, Report& report)
 // A directory that is listed under two names is looked at once.
 void CheckHotFolders(const HotFolderList& list, const TemplateFolders& folders, Report& report)
 {
-    std::set<std::pair<std::uint64_t, std::uint64_t>> known;
-    for (const wxString& hotFolder : list.folders)
+    std::map<std::pair<std::uint64_t, std::uint64_t>, size_t> known; // identity -> position
+    for (size_t i = 0; i < list.folders.size(); ++i)
     {
+        const wxString& hotFolder = list.folders[i];
         report.Begin(hotFolder);
         const auto identity = PinnedDirectory(hotFolder, Links::Follow).Identity();
-        if (identity != std::pair<std::uint64_t, std::uint64_t>() && !known.insert(identity).second)
-            report.Note("the same directory as one above, under another name");
-        else
+        const auto [first, isNew] = known.emplace(identity, i);
+        if (isNew || identity == std::pair<std::uint64_t, std::uint64_t>())
             CheckHotFolder(hotFolder, folders, report);
+        else
+            report.Note("the same directory as " + list.folders[first->second]);
     }
 }
 
@@ -56,15 +59,23 @@ int Check(bool isUpgrade, const wxString& fileName)
     KeepLibraryErrors();
     const TemplateFolders folders(isUpgrade);
     Report report(fileName);
+    TakeLibraryErrors(); // of a file that cannot be written; that is said at the end
     WriteHead(folders, report);
     report.Begin("Workstation");
+    folders.ReportPath(report);
     const HotFolderList list = LoadHotFolderList();
     CheckHotFolderList(list, report);
     CheckRunLog(report);
     CheckHotFolders(list, folders, report);
     report.Begin("Job presets");
     CheckPresets(folders, report);
-    if (!report.End() || report.GetProblems() > 0)
+    if (!report.End())
+    {
+        WriteStandardError("FolderUpgradeCheck: the report cannot be written to " +
+                           (fileName.empty() ? wxString("the standard output") : fileName) + "\n");
+        return HasProblems;
+    }
+    if (report.GetProblems() > 0)
         return HasProblems;
     return report.GetChanges() > 0 ? HasChanges : NothingToDo;
 }
@@ -80,13 +91,14 @@ class FolderUpgradeCheckApp : public wxAppConsole
 
     int OnRun() override
     {
+        wxDisableAsserts();
         const bool isUpgrade = argc > 1 && argv[1].CmpNoCase("I") == 0;
         const bool isDowngrade = argc > 1 && argv[1].CmpNoCase("U") == 0;
         if ((isUpgrade || isDowngrade) && argc <= 3)
             return Check(isUpgrade, argc == 3 ? argv[2] : wxString());
         WriteStandardError("Usage: FolderUpgradeCheck I|U [FILE]\n"
                            "Says what FolderUpgrade with the same switch would change, and what "
-                           "stands in its way.\n"
+                           "stands in its way, on the standard output or in FILE.\n"
                            "Exit status: 0 nothing, 1 changes, 2 problems, 3 wrong call.\n");
         return WrongCall;
     }

@@ -1,6 +1,7 @@
 #include "check/preset_check.h"
 
 #include "check/library_errors.h"
+#include "check/reach.h"
 #include "migrate/job_preset_files.h"
 #include "migrate/preset_text.h"
 #include "platform/unicode_text.h"
@@ -45,17 +46,18 @@ bool IsTakenAsLatin1(const std::string& bytes)
 void CheckContent(const wxString& name, const std::string& before, const RewrittenPreset& rewritten,
                   Report& report)
 {
-    if (IsTakenAsLatin1(before))
-        report.Problem(name + ": is not UTF-8, so the whole file is taken as Latin-1");
     const wxString encoding = DeclaredEncoding(rewritten.bytes);
     if (!encoding.empty() && encoding.CmpNoCase("UTF-8") != 0)
         report.Problem(name + ": declares the encoding " + encoding + ", but comes out in UTF-8");
-    if (rewritten.movedPaths == 1)
-        report.Change(name + ": 1 path");
-    else if (rewritten.movedPaths > 0)
-        report.Change(wxString::Format("%s: %zu paths", name, rewritten.movedPaths));
-    else if (rewritten.bytes != before)
+    else if (IsTakenAsLatin1(before))
+        report.Problem(name + ": is not UTF-8, so the whole file is taken as Latin-1");
+    if (rewritten.bytes == before)
+        return;
+    if (rewritten.movedPaths == 0)
         report.Change(name + ": " + OtherChange(before, rewritten.bytes));
+    else
+        report.Change(wxString::Format("%s: %zu path%s", name, rewritten.movedPaths,
+                                       rewritten.movedPaths == 1 ? "" : "s"));
 }
 
 void CheckPreset(JobPresetFile& preset, const wxString& name, const TemplateFolders& folders,
@@ -82,6 +84,18 @@ void CheckPreset(JobPresetFile& preset, const wxString& name, const TemplateFold
         CheckContent(name, before, rewritten, report);
 }
 
+// What keeps a presets.xml from being there for a run.
+void CheckMissing(const JobPresetFile& preset, const wxString& directory, const wxString& name,
+                  Report& report)
+{
+    for (const wxString& each : {directory, wxFileName(preset.GetPath()).GetPath()})
+    {
+        const wxString obstacle = WhyOutOfReach(each);
+        if (!obstacle.empty())
+            report.Problem(name + ": " + each + " " + obstacle);
+    }
+}
+
 } // namespace
 
 void CheckPresets(const TemplateFolders& folders, Report& report)
@@ -90,21 +104,28 @@ void CheckPresets(const TemplateFolders& folders, Report& report)
     wxArrayString directories;
     const bool isThere = ListJobPresetDirs(root, directories);
     const wxString errors = TakeLibraryErrors();
-    if (!errors.empty())
+    const wxString obstacle = WhyOutOfReach(root);
+    if (!obstacle.empty())
+        report.Problem(root + " " + obstacle);
+    else if (!errors.empty())
         report.Problem(root + ": " + errors);
     bool hasPresets = false;
     for (const wxString& directory : directories)
     {
         JobPresetFile preset(directory);
+        const wxString name = preset.GetPath().Mid(root.length());
         if (!preset.IsThere())
+        {
+            CheckMissing(preset, directory, name, report);
             continue;
+        }
         hasPresets = true;
         folders.ReportForPresets(report);
         if (folders.AreKnown())
-            CheckPreset(preset, preset.GetPath().Mid(root.length()), folders, report);
+            CheckPreset(preset, name, folders, report);
         TakeLibraryErrors();
     }
-    if (!hasPresets && errors.empty())
+    if (!hasPresets && errors.empty() && obstacle.empty())
         report.Note(isThere ? "there are no presets in " + root
                             : "there are no presets: there is no folder " + root);
 }

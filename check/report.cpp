@@ -8,9 +8,9 @@
 namespace
 {
 
-wxString Count(int number, const wxString& what)
+wxString Count(size_t number, const wxString& what)
 {
-    return wxString::Format("%d %s%s", number, what, number == 1 ? "" : "s");
+    return wxString::Format("%zu %s%s", number, what, number == 1 ? "" : "s");
 }
 
 } // namespace
@@ -28,25 +28,23 @@ void Report::Head(const wxString& text)
 
 void Report::Begin(const wxString& title)
 {
+    EndBlock();
     m_title = title;
-}
-
-void Report::Change(const wxString& text)
-{
-    ++m_changes;
-    Line("  change   " + text);
 }
 
 void Report::Problem(const wxString& text)
 {
-    ++m_problems;
-    Line("  problem  " + text);
+    Add(Problems, "  problem  " + text);
+}
+
+void Report::Change(const wxString& text)
+{
+    Add(Changes, "  change   " + text);
 }
 
 void Report::Note(const wxString& text)
 {
-    ++m_notes;
-    Line("  note     " + text);
+    Add(Notes, "  note     " + text);
 }
 
 void Report::ProblemOnce(const wxString& text)
@@ -57,31 +55,44 @@ void Report::ProblemOnce(const wxString& text)
 
 bool Report::End()
 {
+    EndBlock();
     Write("");
-    Write(Count(m_changes, "change") + ", " + Count(m_problems, "problem") + ", " +
-          Count(m_notes, "note"));
+    Write(Count(m_counts[Changes], "change") + ", " + Count(m_counts[Problems], "problem") + ", " +
+          Count(m_counts[Notes], "note"));
     return (!m_toFile || !m_file.IsOpened() || m_file.Close()) && m_isWritten;
 }
 
-int Report::GetChanges() const
+size_t Report::GetProblems() const
 {
-    return m_changes;
+    return m_counts[Problems];
 }
 
-int Report::GetProblems() const
+size_t Report::GetChanges() const
 {
-    return m_problems;
+    return m_counts[Changes];
 }
 
-void Report::Line(const wxString& text)
+void Report::Add(Kind kind, const wxString& text)
 {
-    if (!m_title.empty())
+    m_block[kind].Add(text);
+    ++m_counts[kind];
+}
+
+void Report::EndBlock()
+{
+    bool isTitled = false;
+    for (wxArrayString& lines : m_block)
     {
-        Write("");
-        Write(m_title);
-        m_title.clear();
+        if (!lines.empty() && !isTitled)
+        {
+            Write("");
+            Write(m_title);
+            isTitled = true;
+        }
+        for (const wxString& line : lines)
+            Write(line);
+        lines.clear();
     }
-    Write(text);
 }
 
 void Report::Write(const wxString& text)

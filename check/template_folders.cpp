@@ -1,6 +1,7 @@
 #include "check/template_folders.h"
 
 #include "migrate/install_locations.h"
+#include "store/xml_tree.h"
 
 #include <wx/filename.h>
 
@@ -31,11 +32,12 @@ bool IsBelow(const wxString& folder, const wxString& outer)
 TemplateFolders::TemplateFolders(bool isUpgrade) : m_isUpgrade(isUpgrade)
 {
     wxFileName folder;
-    m_default.value = "InstallPath in HKEY_LOCAL_MACHINE\\SOFTWARE\\Vantorix\\QZA";
+    m_default.value = "registry value InstallPath in "
+                      "HKEY_LOCAL_MACHINE\\SOFTWARE[\\Wow6432Node]\\Vantorix\\QZA: ";
     m_default.isKnown = GetDefaultImposeTemplatePath(folder);
     if (m_default.isKnown)
         m_default.path = folder.GetFullPath(wxPATH_NATIVE);
-    m_previous.value = "Path in HKEY_CURRENT_USER\\SOFTWARE\\HF";
+    m_previous.value = "registry value Path in HKEY_CURRENT_USER\\SOFTWARE[\\Wow6432Node]\\HF: ";
     m_previous.isKnown = GetPreviousImposeTemplatePath(folder);
     m_previous.path = folder.GetFullPath(wxPATH_NATIVE);
 }
@@ -60,41 +62,51 @@ bool TemplateFolders::AreKnown() const
     return m_default.isKnown && m_previous.isKnown;
 }
 
+void TemplateFolders::ReportPath(Report& report) const
+{
+    if (!m_previous.isKnown)
+        return;
+    if (m_previous.path.empty())
+        report.Problem(m_previous.value +
+                       (m_isUpgrade ? "empty; only templates stored without a folder move"
+                                    : "empty; templates move to the root of the drive"));
+    else if (EndsInSeparator(m_previous.path))
+        report.Problem(m_previous.value +
+                       (m_isUpgrade
+                            ? "ends in a separator; no template of a hot folder moves"
+                            : "ends in a separator; it is doubled in the paths of hot folders"));
+}
+
 void TemplateFolders::ReportFrom(Report& report) const
 {
-    ReportFolder(m_isUpgrade ? m_previous : m_default, report);
+    ReportUnknown(m_isUpgrade ? m_previous : m_default, report);
 }
 
 void TemplateFolders::ReportTo(Report& report) const
 {
-    ReportFolder(m_isUpgrade ? m_default : m_previous, report);
+    ReportUnknown(m_isUpgrade ? m_default : m_previous, report);
 }
 
-void TemplateFolders::ReportFolder(const Folder& folder, Report& report)
+void TemplateFolders::ReportUnknown(const Folder& folder, Report& report)
 {
-    const wxString value = wxString("registry value ") + folder.value + ": ";
     if (!folder.isKnown)
-        report.ProblemOnce(value +
+        report.ProblemOnce(folder.value +
                            "missing, longer than 257 characters, or not readable; nothing moves");
-    else if (folder.path.empty())
-        report.ProblemOnce(value + "empty");
-    else if (EndsInSeparator(folder.path))
-        report.ProblemOnce(value +
-                           "ends in a separator; an upgrade moves no template of a hot folder");
 }
 
 void TemplateFolders::ReportForPresets(Report& report) const
 {
-    ReportFolder(m_default, report);
-    ReportFolder(m_previous, report);
+    ReportFrom(report);
+    ReportTo(report);
     for (const Folder* folder : {&m_default, &m_previous})
     {
         if (folder->path.find_first_of("&<") != wxString::npos)
-            report.ProblemOnce(wxString("registry value ") + folder->value +
-                               ": holds & or <, which presets store in another form");
+            report.ProblemOnce(folder->value + "holds & or <, which presets store in another form");
     }
+    if (!IsXmlText(To()))
+        report.ProblemOnce("the folder being installed holds a character that XML cannot store; no "
+                           "path of a preset moves");
     if (AreKnown() && IsBelow(To(), From()))
-        report.ProblemOnce(
-            "the folder being installed is below the one being left; every further run moves the "
-            "paths of presets again");
+        report.ProblemOnce("the folder being installed is below the one being left; every further "
+                           "run moves the paths of presets again");
 }

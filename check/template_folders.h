@@ -17,12 +17,13 @@ class TemplateFolders
     const wxString& To() const;
     bool AreKnown() const;
 
-    /// For a hot folder with a template, or a preset: reports once what keeps paths from moving at
-    /// all, or as they should. A folder that is asked for only when a template is about to move
-    /// need not be needed.
+    /// What is wrong with the previous version's folder, whoever asks for it.
+    void ReportPath(Report& report) const;
+    /// For a hot folder with a template, or a preset: reports once a folder that is not known. One
+    /// that is asked for only when a template is about to move need not be needed.
     void ReportFrom(Report& report) const;
     void ReportTo(Report& report) const;
-    /// What matters in the text of presets only.
+    /// Both, and what matters in the text of presets only.
     void ReportForPresets(Report& report) const;
 
   private:
@@ -30,10 +31,10 @@ class TemplateFolders
     {
         bool isKnown = false;
         wxString path;
-        const char* value; // the registry value, for people
+        wxString value; // the registry value, for people
     };
 
-    static void ReportFolder(const Folder& folder, Report& report);
+    static void ReportUnknown(const Folder& folder, Report& report);
 
     bool m_isUpgrade;
     Folder m_default;

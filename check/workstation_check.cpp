@@ -1,7 +1,7 @@
 #include "check/workstation_check.h"
 
 #include "check/library_errors.h"
-#include "platform/process_rights.h"
+#include "check/reach.h"
 #include "platform/regular_file.h"
 #include "run/run_log_place.h"
 
@@ -9,18 +9,6 @@
 
 namespace
 {
-
-// Whether one of the directories on the way there is a link, or it is one itself.
-bool LeadsOverLink(const wxString& path)
-{
-    wxFileName name = wxFileName::DirName(path);
-    for (; name.GetDirCount() > 0; name.RemoveLastDir())
-    {
-        if (IsLink(name.GetPath(wxPATH_GET_VOLUME)))
-            return true;
-    }
-    return false;
-}
 
 void CheckEntries(const HotFolderList& list, Report& report)
 {
@@ -30,10 +18,9 @@ void CheckEntries(const HotFolderList& list, Report& report)
         report.Note("HotFolderList.cfg lists no hot folder");
     for (const wxString& folder : list.missing)
     {
-        if (RefusesLinksOfOthers() && LeadsOverLink(folder))
-            report.Problem(
-                "listed hot folder is refused to an elevated run: it is reached over a link: " +
-                folder);
+        const wxString obstacle = WhyOutOfReach(folder);
+        if (!obstacle.empty())
+            report.Problem("listed hot folder " + folder + " " + obstacle);
         else
             report.Note("listed hot folder is not there: " + folder);
     }
@@ -46,16 +33,20 @@ void CheckEntries(const HotFolderList& list, Report& report)
 void CheckHotFolderList(const HotFolderList& list, Report& report)
 {
     const wxString errors = TakeLibraryErrors();
+    const wxString obstacle = WhyOutOfReach(GetHotFolderDataDir());
     switch (list.state)
     {
     case XmlFile::State::Missing:
-        report.Note("there is no HotFolderList.cfg");
+        if (!obstacle.empty())
+            report.Problem("HotFolderList.cfg: its folder " + obstacle);
+        else
+            report.Note("there is no HotFolderList.cfg");
         break;
     case XmlFile::State::NotReadable:
-        report.Problem("HotFolderList.cfg cannot be read: " + errors);
+        report.Problem("HotFolderList.cfg: " + errors);
         break;
     case XmlFile::State::TooLarge:
-        report.Problem("HotFolderList.cfg is too large to read safely");
+        report.Problem("HotFolderList.cfg: too large to read safely");
         break;
     case XmlFile::State::Loaded:
         CheckEntries(list, report);
@@ -70,6 +61,12 @@ void CheckRunLog(Report& report)
     if (IsLink(folder.Left(folder.length() - 1)) || IsLink(path))
     {
         report.Problem("there will be no run log: it is reached over a link: " + path);
+        return;
+    }
+    const wxString obstacle = WhyOutOfReach(folder);
+    if (!obstacle.empty())
+    {
+        report.Problem("there will be no run log: its folder " + obstacle + ": " + folder);
         return;
     }
     if (!wxDirExists(folder))

@@ -1,0 +1,44 @@
+"""The migration of one preset file of 64 MiB, beside the library's read, one replacement and write of it."""
+import os
+import time
+
+from workstation import write
+
+BYTES = 64 * 1024 * 1024
+ROUNDS = 7
+KEY = 'ORXImposeTemplate">"'
+PATH = f'    <Setting Key="{KEY}/old/Booklet"</Setting>\r\n'.encode()
+LINE = b'    <Setting Key="ORXMediaType">"Plain"</Setting>\r\n'
+TEXTS = {'no hits': LINE, '8 hits': PATH + LINE * (BYTES // 8 // len(LINE)),
+         'a hit each KiB': PATH + LINE * (1024 // len(LINE))}
+HIVE = 'Windows Registry Editor Version 5.00\n\n[HKEY_{}]\n"{}"="{}"\n'
+
+
+def run(command, env, preset, text):
+    """The seconds of a run, and its bytes of memory for each byte of the file."""
+    write(preset, text)
+    start = time.perf_counter()
+    _, _, usage = os.wait4(os.spawnve(os.P_NOWAIT, command[0], command, env), 0)
+    elapsed = time.perf_counter() - start
+    with open(preset, 'rb') as file:
+        if file.read() != text.replace(b'"/old/', b'"/new/template/'):
+            raise SystemExit(f'{command[0]} did not migrate the preset')
+    return elapsed, usage.ru_maxrss * 1024 / len(text)
+
+
+def measure(build, root):
+    """Each text's name, and of the tool and the floor the least seconds and the most memory.
+
+    The paths grow as they move, which is what takes the most memory.
+    """
+    write(f'{root}/user/registry/HKEY_CURRENT_USER.reg', HIVE.format('CURRENT_USER\\SOFTWARE\\HF', 'Path', '/old').encode())
+    write(f'{root}/machine/registry/HKEY_LOCAL_MACHINE.reg',
+          HIVE.format('LOCAL_MACHINE\\SOFTWARE\\Vantorix\\QZA', 'InstallPath', '/new').encode())
+    env = {'XDG_CONFIG_HOME': f'{root}/user', 'XDG_CONFIG_DIRS': f'{root}/machine'}
+    preset = f'{root}/user/ORX/JPData/P/Presets/presets.xml'
+    commands = ([f'{build}/FolderUpgrade', 'I', 'V'],
+                [f'{build}/bench/floor', preset, f'{KEY}/old', f'{KEY}/new/template'])
+    for name, part in TEXTS.items():
+        text = (part * (BYTES // len(part) + 1))[:BYTES]
+        runs = [[run(command, env, preset, text) for command in commands] for _ in range(ROUNDS)]
+        yield name, *((min(each[i][0] for each in runs), max(each[i][1] for each in runs)) for i in (0, 1))

@@ -1,0 +1,36 @@
+#include "check/reach.h"
+
+#include "platform/process_rights.h"
+
+#include <wx/filename.h>
+
+namespace
+{
+
+// Whether one of the directories on the way there is a link, or it is one itself.
+bool LeadsOverLink(const wxString& directory)
+{
+    wxFileName name = wxFileName::DirName(directory);
+    for (; name.GetDirCount() > 0; name.RemoveLastDir())
+    {
+        if (IsLink(name.GetPath(wxPATH_GET_VOLUME)))
+            return true;
+    }
+    return false;
+}
+
+} // namespace
+
+bool MayEnter(const PinnedDirectory& directory)
+{
+    return directory.IsOpen() && wxFileName::Exists(directory.Reach(L"."));
+}
+
+wxString WhyOutOfReach(const wxString& directory)
+{
+    if (MayEnter(PinnedDirectory(directory, Links::Follow)))
+        return {};
+    if (RefusesLinksOfOthers() && LeadsOverLink(directory))
+        return "is reached over a link, which is refused to an elevated run";
+    return wxDirExists(directory) ? "cannot be entered" : "";
+}
