@@ -146,20 +146,12 @@ void CheckIcon(const PinnedHotFolder& folder, const wxString& hotFolder, bool is
 // Folder.cfg
 // ---------------------------------------------------------------------------------------------------
 
-// What keeps a Folder.cfg from being there for a run.
-void CheckMissing(const PinnedHotFolder& folder, const wxString& hotFolder, Report& report)
+void CheckMissing(const PinnedHotFolder& folder, Report& report)
 {
-    const wxString privateDir = folder.directory.Reach(PrivateDirName);
-    const wxString obstacle = WhyOutOfReach(hotFolder);
-    if (!obstacle.empty())
-        report.Problem("the hot folder " + obstacle);
-    else if (IsLink(privateDir))
-        report.Problem(wxString(PrivateDirName) + ": reached over a link");
-    else if (wxDirExists(privateDir) && !MayEnter(folder.privateDir))
-        report.Problem(wxString(PrivateDirName) + ": cannot be entered");
-    else if (IsLink(folder.privateDir.Reach(FolderCfgName)))
+    const wxString path = folder.privateDir.Reach(FolderCfgName);
+    if (IsLink(path))
         report.Problem("Folder.cfg: reached over a link");
-    else if (wxFileName::Exists(folder.privateDir.Reach(FolderCfgName)))
+    else if (wxFileName::Exists(path))
         report.Problem("Folder.cfg: is no file");
     else
         report.Note("no Folder.cfg");
@@ -249,7 +241,7 @@ void CheckFolderCfg(const PinnedHotFolder& folder, const wxString& hotFolder,
         cfg.Load(folder.privateDir.Reach(FolderCfgName), Links::Refuse, FolderCfgPath(hotFolder)))
     {
     case XmlFile::State::Missing:
-        CheckMissing(folder, hotFolder, report);
+        CheckMissing(folder, report);
         break;
     case XmlFile::State::TooLarge:
         report.Problem("Folder.cfg: left as it is (too large to read safely)");
@@ -265,11 +257,31 @@ void CheckFolderCfg(const PinnedHotFolder& folder, const wxString& hotFolder,
     }
 }
 
+// What keeps a run from everything in the private directory.
+wxString FindObstacle(const PinnedHotFolder& folder, const wxString& hotFolder)
+{
+    const wxString obstacle = WhyOutOfReach(hotFolder);
+    if (!obstacle.empty())
+        return "the hot folder " + obstacle;
+    const wxString privateDir = folder.directory.Reach(PrivateDirName);
+    if (IsLink(privateDir))
+        return wxString(PrivateDirName) + ": reached over a link";
+    if (wxDirExists(privateDir) && !MayEnter(folder.privateDir))
+        return wxString(PrivateDirName) + ": cannot be entered";
+    return {};
+}
+
 } // namespace
 
 void CheckHotFolder(const wxString& hotFolder, const TemplateFolders& folders, Report& report)
 {
     const PinnedHotFolder folder(hotFolder);
+    const wxString obstacle = FindObstacle(folder, hotFolder);
+    if (!obstacle.empty())
+    {
+        report.Problem(obstacle);
+        return;
+    }
     CheckFolderCfg(folder, hotFolder, folders, report);
     CheckIcon(folder, hotFolder, folders.IsUpgrade(), report);
     const wxString errors = TakeLibraryErrors();

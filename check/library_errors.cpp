@@ -10,7 +10,9 @@ wxString kept;
 class Keeper : public wxLog
 {
   protected:
-    void DoLogTextAtLevel(wxLogLevel level, const wxString& text) override
+    // The library's own text, without the word "Error" and the time.
+    void DoLogRecord(wxLogLevel level, const wxString& text,
+                     const wxLogRecordInfo& /*info*/) override
     {
         if (level > wxLOG_Warning)
             return;
@@ -22,7 +24,6 @@ class Keeper : public wxLog
 
 void KeepLibraryErrors()
 {
-    wxLog::DisableTimestamp();
     delete wxLog::SetActiveTarget(new Keeper); // the library's from here on
 }
 
