@@ -60,7 +60,7 @@ bool CreateDesktopIni(const PinnedDirectory& directory, const wxString& iconName
     if (!directory.IsOpen())
         return false;
     // The profile functions would create it through a link, too. While the file is open for
-    // reading, nobody puts one in its place.
+    // reading, no link can take its place.
     const wxString path = directory.Reach(DesktopIniName);
     RegularFile ini;
     if (ini.CreateNew(path) == RegularFile::Status::Open &&

@@ -3,8 +3,6 @@
 #include <wx/intl.h>
 #include <wx/log.h>
 
-#include <algorithm>
-
 RegularFile::~RegularFile()
 {
     Close();
@@ -20,26 +18,20 @@ RegularFile::Status RegularFile::OpenForUpdate(const wxString& path, Links links
     return Open(path, links, true);
 }
 
-RegularFile::Status RegularFile::GetStatus() const
-{
-    return m_status;
-}
-
 bool RegularFile::Rewrite(const std::string& before, const std::string& after, Wait wait)
 {
     const auto oldLength = static_cast<std::int64_t>(before.size());
     const auto newLength = static_cast<std::int64_t>(after.size());
-    // Another program may have made it longer a moment ago.
-    const auto longest = static_cast<size_t>(std::max({Length(), oldLength, newLength}));
     if (newLength > oldLength && !Reserve(oldLength, newLength - oldLength))
     {
         m_error = wxSysErrorCode();
         return false;
     }
-    const bool isCut = longest > after.size();
+    const bool isShorter = newLength < oldLength;
     const bool isWritten =
-        isCut ? Write(0, after + std::string(longest - after.size(), '\n')) : Write(0, after);
-    if (isWritten && (!isCut || SetLength(newLength)))
+        Write(0, isShorter ? after + std::string(before.size() - after.size(), '\n') : after);
+    // Another program may have made it longer a moment ago.
+    if (isWritten && (Length() == newLength || SetLength(newLength)))
     {
         if (wait == Wait::ForDisk)
             WaitForDisk();

@@ -9,11 +9,14 @@
 #include <cstdint>
 #include <string>
 
-/// A file opened without waiting for anybody (a pipe in its place, say) and, where links are
+/// Bytes. What is longer is not read into memory: a planted file of terabytes must not end a run.
+constexpr std::int64_t LongestFile = std::int64_t{256} * 1024 * 1024;
+
+/// A file opened without waiting for another program (at a pipe in its place) and, where links are
 /// refused, not through one. No call reports an error by itself.
 ///
-/// As long as the object lives it is the same file, whatever happens to its name; on Windows nobody
-/// can rename or remove it meanwhile (it is opened without FILE_SHARE_DELETE).
+/// As long as the object lives it is the same file, whatever happens to its name; on Windows no
+/// program can rename or remove it meanwhile (it is opened without FILE_SHARE_DELETE).
 class RegularFile
 {
   public:
@@ -46,15 +49,15 @@ class RegularFile
     /// Makes a new, empty file and opens it for update; fails, with nothing changed, when anything
     /// of that name is there (CREATE_NEW, O_EXCL).
     Status CreateNew(const wxString& path);
-    /// False when the system reports an error, which concerns nobody: all bytes were handed over
+    /// False when the system reports an error, which does not matter: all bytes were handed over
     /// before.
     bool Close();
 
-    Status GetStatus() const;
     /// In bytes; -1 when it cannot be found out.
     std::int64_t Length() const;
-    /// The whole content as it is now; false when it could not be read to its end.
-    bool Read(std::string& bytes) const;
+    /// The whole content as it is now; false when it has more bytes than that, or could not be read
+    /// to its end.
+    bool Read(std::string& bytes, std::int64_t most = LongestFile) const;
 
     /// Makes the second text the whole content, in place of the first, which is what the file
     /// holds.

@@ -15,6 +15,6 @@ constexpr int NoCount = -1;
 /// and creates it where its folder exists; the file is closed between any two lines, and one that
 /// is removed meanwhile is not made again. Neither the folder nor the file may be a link, nor the
 /// file anything but a regular one: then there is no log. A line that cannot be written is dropped
-/// whole. The caller is told nothing; the library reports the first such failure. Does nothing at
-/// all while RunLogEnabled is false.
+/// whole. Nothing is reported to the caller; the library reports the first such failure. Does
+/// nothing at all while RunLogEnabled is false.
 void RunLog(const wxString& message, int count = NoCount);

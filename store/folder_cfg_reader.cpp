@@ -113,7 +113,7 @@ void ReadFilterSetting(const wxXmlNode* root, wxXmlNode& node)
         return;
     node = wxXmlNode();
     CopyTree(*section, node);
-    RemoveIgnoredBlanks(node);
+    RemoveIgnoredWhiteSpace(node);
     RemoveSavedIndentation(node, FolderCfg::FilterSettingLevel);
 }
 

@@ -67,13 +67,13 @@ struct KeyValueNames
     wxString locDisplayValue = L"LocDisplayValue";
 };
 
-void WriteFilterSetting(wxXmlNode& root, const wxXmlNode& filterSetting)
+void WriteFilterSetting(wxXmlNode& root, wxXmlNode& filterSetting)
 {
     if (filterSetting.GetName() != FolderCfg::FilterSettingSection)
         return;
-    auto* copy = new wxXmlNode(wxXML_ELEMENT_NODE, FolderCfg::FilterSettingSection);
-    root.AddChild(copy); // the root's from here on
-    CopyTree(filterSetting, *copy);
+    auto* child = new wxXmlNode(wxXML_ELEMENT_NODE, FolderCfg::FilterSettingSection);
+    root.AddChild(child); // the root's from here on
+    MoveTree(filterSetting, *child);
 }
 
 } // namespace
@@ -147,7 +147,7 @@ void WritePreflightSettings(wxXmlNode* root, const PreflightSettingList& list)
 }
 
 std::string FolderCfgBytes(const HotFolderSettings& settings, const JobSettingTable& jobSettings,
-                           const HotFolderPaths& paths, const wxXmlNode& filterSetting,
+                           const HotFolderPaths& paths, wxXmlNode& filterSetting,
                            const ImposeSettingTable& imposeSettings,
                            const PreflightSettingList& preflightSettings)
 {
@@ -173,8 +173,10 @@ int SaveHotFolderSettings(const wxString& path, const HotFolderSettings& setting
                           const PreflightSettingList& preflightSettings)
 {
     const wxCriticalSectionLocker lock(FolderCfgLock);
-    const std::string bytes = FolderCfgBytes(settings, jobSettings, paths, filterSetting,
-                                             imposeSettings, preflightSettings);
+    wxXmlNode filterCopy;
+    CopyTree(filterSetting, filterCopy);
+    const std::string bytes =
+        FolderCfgBytes(settings, jobSettings, paths, filterCopy, imposeSettings, preflightSettings);
     RegularFile file;
     RegularFile::Status status = file.OpenForUpdate(path, Links::Refuse);
     if (status == RegularFile::Status::NotThere)

@@ -10,9 +10,10 @@
 #include <vector>
 
 /// The content of a Folder.cfg with the six values, and nothing else. A filter setting of another
-/// name than "FilterSetting" is left out, and one deeper than MaxFilterLevels must not be given.
+/// name than "FilterSetting" is left out, and one deeper than MaxFilterLevels must not be given; it
+/// is taken over, and empty afterwards.
 std::string FolderCfgBytes(const HotFolderSettings& settings, const JobSettingTable& jobSettings,
-                           const HotFolderPaths& paths, const wxXmlNode& filterSetting,
+                           const HotFolderPaths& paths, wxXmlNode& filterSetting,
                            const ImposeSettingTable& imposeSettings,
                            const PreflightSettingList& preflightSettings);
 

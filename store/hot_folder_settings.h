@@ -18,7 +18,7 @@ struct InputFormat
     wxString ShortName;
 };
 
-/// The attributes of the root element and the input formats; each field bears the name of the
+/// The attributes of the root element and the input formats; each field has the name of the
 /// attribute or element that stores it. The tool gives a meaning to Enable alone.
 struct HotFolderSettings
 {

@@ -27,8 +27,8 @@ bool IsSingleByte(const wxString& encoding)
            (code >= wxFONTENCODING_CP1250 && code <= wxFONTENCODING_CP1258);
 }
 
-// Where the library does not know the encoding at all, nothing is read as what it is: it takes it for
-// Latin-1, which is right only for a name of that which it does not know on Windows.
+// Where the library does not know the encoding at all, nothing is read as what it is: it takes it
+// for Latin-1, which is right only for a name of that which it does not know on Windows.
 bool IsReadAsAscii(const std::string& document, const wxString& encoding)
 {
     if (!wxCSConv(encoding).IsOk() && encoding.CmpNoCase("latin1") != 0)
@@ -40,6 +40,25 @@ bool IsReadAsAscii(const std::string& document, const wxString& encoding)
                            const auto code = static_cast<unsigned char>(each);
                            return code < 0x80 && map[code] == code;
                        });
+}
+
+// Whether every byte has a meaning in the encoding. One without would come out as the character
+// before it.
+bool HasMeaning(const std::string& document, const wxString& encoding)
+{
+    std::array<bool, 256> isThere{};
+    for (const char each : document)
+        isThere[static_cast<unsigned char>(each)] = true;
+    const wxCSConv conversion(encoding);
+    std::array<wchar_t, 10> wide{};
+    for (size_t i = 1; i < isThere.size(); ++i)
+    {
+        const std::array<char, 2> narrow = {static_cast<char>(i), '\0'};
+        if (isThere[i] &&
+            conversion.MB2WC(wide.data(), narrow.data(), wide.size()) == wxCONV_FAILED)
+            return false;
+    }
+    return true;
 }
 
 } // namespace
@@ -90,7 +109,5 @@ bool IsReadFaithfully(const std::string& document)
     const wxString encoding = DeclaredEncoding(document);
     if (IsBuiltIn(encoding) || IsReadAsAscii(document, encoding))
         return true;
-    // A byte without a meaning in the encoding would come out as the character before it.
-    return IsSingleByte(encoding) &&
-           !wxString(document.data(), wxCSConv(encoding), document.size()).empty();
+    return IsSingleByte(encoding) && HasMeaning(document, encoding);
 }

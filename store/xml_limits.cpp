@@ -20,9 +20,10 @@ constexpr size_t HarmlessBytes = size_t{16} * 1024;
 // MiB, 1,000,000 do not.
 constexpr int MaxDepth = 250000;
 
-// Bytes of memory, counted for each node, attribute and character as the library keeps them on a
-// 64-bit system with wide characters of four bytes. 100,000 job settings take some 120 million.
-constexpr std::uint64_t MaxMemory = 192 * std::uint64_t{1000} * 1000;
+// Bytes of memory, counted for the document itself and for each node, attribute and character as
+// the library keeps them on a 64-bit system with wide characters of four bytes. 100,000 job
+// settings take some 120 million.
+constexpr std::uint64_t MaxMemory = 208 * std::uint64_t{1000} * 1000;
 constexpr std::uint64_t NodeMemory = 208;
 constexpr std::uint64_t AttributeMemory = 176;
 constexpr std::uint64_t CharacterMemory = 4;
@@ -31,11 +32,12 @@ constexpr std::uint64_t CharacterMemory = 4;
 // A piece ends at each line end, at each escaped character and at each border of the buffer below.
 constexpr std::uint64_t MaxCopiedCharacters = 1000 * std::uint64_t{1000} * 1000;
 
-// Attributes that it passes by because it looks for the last one to add another.
+// Attributes that it passes by because it looks for the last one to add another; and, at each
+// element, those that the document type declares.
 constexpr std::uint64_t MaxAttributeSteps = 100 * std::uint64_t{1000} * 1000;
 
 // Bytes that the parser reads again because it is given the document in pieces of this size, and
-// begins a tag, comment or instruction that is not whole afresh with each.
+// begins again with each a tag, comment or instruction that is not whole.
 constexpr std::uint64_t LibraryBuffer = 1024;
 constexpr std::uint64_t MaxBytesReadAgain = 1000 * std::uint64_t{1000} * 1000;
 
@@ -45,7 +47,7 @@ constexpr std::uint64_t MaxDocumentType = 16 * std::uint64_t{1024};
 class Look
 {
   public:
-    explicit Look(XML_Parser parser) : m_parser(parser)
+    Look(XML_Parser parser, size_t length) : m_parser(parser), m_memory(length)
     {
     }
 
@@ -54,7 +56,7 @@ class Look
         return m_isWithinLimits;
     }
 
-    void BeginElement(const char** attributes)
+    void BeginElement(const char* name, const char** attributes)
     {
         EndText();
         TakeToken();
@@ -65,8 +67,8 @@ class Look
             m_memory +=
                 AttributeMemory + CharacterMemory * (std::strlen(each[0]) + std::strlen(each[1]));
         }
-        m_memory += NodeMemory;
-        m_attributeSteps += count * count / 2;
+        m_memory += NodeMemory + CharacterMemory * std::strlen(name);
+        m_attributeSteps += count * count / 2 + m_declaredAttributes;
         ++m_depth;
         Judge();
     }
@@ -101,6 +103,12 @@ class Look
         if (m_isInDocumentType && Position() - m_documentType > MaxDocumentType)
             m_isWithinLimits = false;
         Judge();
+    }
+
+    void DeclareAttribute()
+    {
+        ++m_declaredAttributes;
+        Other();
     }
 
     void BeginDocumentType()
@@ -169,10 +177,11 @@ class Look
     bool m_isWithinLimits = true;
     bool m_isInDocumentType = false;
     int m_depth = 0;
-    std::uint64_t m_memory = 0;
+    std::uint64_t m_memory;
     std::uint64_t m_textLength = 0;
     std::uint64_t m_copiedCharacters = 0;
     std::uint64_t m_attributeSteps = 0;
+    std::uint64_t m_declaredAttributes = 0;
     std::uint64_t m_bytesReadAgain = 0;
     std::uint64_t m_documentType = 0;
     std::uint64_t m_lastEnd = 0;
@@ -199,8 +208,8 @@ void SetHandlers(XML_Parser parser, Look& look)
     XML_SetUserData(parser, &look);
     XML_SetElementHandler(
         parser,
-        [](void* data, const char*, const char** attributes)
-        { LookOf(data).BeginElement(attributes); },
+        [](void* data, const char* name, const char** attributes)
+        { LookOf(data).BeginElement(name, attributes); },
         [](void* data, const char*) { LookOf(data).EndElement(); });
     XML_SetCharacterDataHandler(parser, [](void* data, const char*, int length)
                                 { LookOf(data).Text(length); });
@@ -210,6 +219,8 @@ void SetHandlers(XML_Parser parser, Look& look)
         [](void* data, const char*, const char*, const char*, int)
         { LookOf(data).BeginDocumentType(); },
         [](void* data) { LookOf(data).EndDocumentType(); });
+    XML_SetAttlistDeclHandler(parser, [](void* data, const char*, const char*, const char*,
+                                         const char*, int) { LookOf(data).DeclareAttribute(); });
     XML_SetUnknownEncodingHandler(parser, FillEncoding, nullptr);
 }
 
@@ -225,7 +236,7 @@ bool IsWithinXmlLimits(const std::string& bytes)
         return false;
     const std::unique_ptr<XML_ParserStruct, void (*)(XML_Parser)> parser(XML_ParserCreate(nullptr),
                                                                          XML_ParserFree);
-    Look look(parser.get());
+    Look look(parser.get(), bytes.size());
     SetHandlers(parser.get(), look);
     // In one piece, so that nothing is read again here.
     if (XML_Parse(parser.get(), bytes.data(), static_cast<int>(bytes.size()), XML_TRUE) !=

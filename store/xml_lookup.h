@@ -16,7 +16,7 @@ using AttributeMap = std::map<wxString, wxString>;
 /// order. The node itself never matches. Works at any depth of nesting.
 const wxXmlNode* FindElement(const wxXmlNode* node, const wxString& name, bool recursive);
 
-/// The first element of that name among the node and the siblings behind it, or none.
+/// The first element of that name among the node and the siblings after it, or none.
 const wxXmlNode* FirstNamed(const wxXmlNode* node, const wxString& name);
 
 /// Adds every attribute of the element to the map; of a repeated name the first value stays.

@@ -48,7 +48,7 @@ void CopyNode(const wxXmlNode& source, wxXmlNode& target)
     CopyAttributes(source, target);
 }
 
-// Appends a copy of the source behind the parent's last child so far.
+// Appends a copy of the source after the parent's last child so far.
 wxXmlNode* AppendCopy(const wxXmlNode& source, wxXmlNode& parent, wxXmlNode* last)
 {
     auto copy = std::make_unique<wxXmlNode>(source.GetType(), source.GetName());
@@ -109,6 +109,17 @@ void CopyTree(const wxXmlNode& source, wxXmlNode& target)
     }
 }
 
+void MoveTree(wxXmlNode& source, wxXmlNode& target)
+{
+    target.SetContent(source.GetContent());
+    target.SetAttributes(source.GetAttributes());
+    target.SetChildren(source.GetChildren());
+    source.SetAttributes(nullptr);
+    source.SetChildren(nullptr);
+    for (wxXmlNode* child = target.GetChildren(); child; child = child->GetNext())
+        child->SetParent(&target);
+}
+
 int CountLevels(const wxXmlNode& root)
 {
     int deepest = 0;
@@ -118,7 +129,7 @@ int CountLevels(const wxXmlNode& root)
     return deepest;
 }
 
-void RemoveIgnoredBlanks(wxXmlNode& root)
+void RemoveIgnoredWhiteSpace(wxXmlNode& root)
 {
     int level = 0;
     for (wxXmlNode* node = &root; node; node = NextNode(node, root, level))
@@ -141,9 +152,10 @@ void RemoveSavedIndentation(wxXmlNode& root, int level)
         if (node == &root || node->GetType() != wxXML_TEXT_NODE || !next ||
             next->GetType() == wxXML_TEXT_NODE)
             continue;
-        const wxString indentation = "\n" + wxString(' ', static_cast<size_t>(2 * level));
-        if (node->GetContent().EndsWith(indentation))
-            node->SetContent(
-                node->GetContent().Left(node->GetContent().length() - indentation.length()));
+        // Asked first, since the indentation of many levels would take long to make.
+        const size_t length = 1 + 2 * static_cast<size_t>(level);
+        const wxString& text = node->GetContent();
+        if (text.length() >= length && text.EndsWith("\n" + wxString(' ', length - 1)))
+            node->SetContent(text.Left(text.length() - length));
     }
 }

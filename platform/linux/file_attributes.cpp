@@ -125,6 +125,12 @@ BOOL SetFileAttributesW(LPCWSTR path, DWORD attributes)
     // Not even its owner can change an extended attribute of a file without write permission.
     const mode_t between =
         (status.st_mode & S_IWUSR) != 0 ? status.st_mode : status.st_mode | S_IWUSR;
-    const bool done = node.ChangeMode(status.st_mode, between) && node.WriteStored(stored);
-    return node.ChangeMode(between, done ? mode : status.st_mode) && done ? 1 : 0;
+    const DWORD before = node.ReadStored();
+    const bool isStored = node.ChangeMode(status.st_mode, between) && node.WriteStored(stored);
+    if (isStored && node.ChangeMode(between, mode))
+        return 1;
+    if (isStored)
+        node.WriteStored(before);
+    node.ChangeMode(between, status.st_mode);
+    return 0;
 }

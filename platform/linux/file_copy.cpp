@@ -16,8 +16,15 @@ bool CopyOver(const wxString& source, const wxString& destination)
     RegularFile::Status status = to.OpenForUpdate(destination, Links::Refuse);
     if (status == RegularFile::Status::Refused && unlink(destination.utf8_str()) == 0)
         status = to.CreateNew(destination);
-    if (status != RegularFile::Status::Open || !to.Read(before) ||
-        !to.Rewrite(before, after, RegularFile::Wait::ForNothing))
+    if (status != RegularFile::Status::Open)
+        return false;
+    if (!to.Read(before))
+    {
+        // Too long for an icon: nothing that is worth to be put back.
+        before.clear();
+        to.SetLength(0);
+    }
+    if (!to.Rewrite(before, after, RegularFile::Wait::ForNothing))
         return false;
     to.TakeAttributes(from);
     return true;

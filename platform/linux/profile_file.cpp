@@ -1,6 +1,6 @@
 // Profile files (.ini): one key is read or changed, every other byte of the file stays.
 //
-// The text is handled in units, a byte each or, behind a UTF-16LE byte-order mark, two, so that
+// The text is handled in units, a byte each or, after a UTF-16LE byte-order mark, two, so that
 // bytes of any encoding come out as they went in. Of a repeated section or key the first counts.
 #include "platform/linux/native_path.h"
 #include "platform/regular_file.h"
@@ -101,7 +101,7 @@ char16_t Fold(char16_t unit)
     return unit >= 'A' && unit <= 'Z' ? static_cast<char16_t>(unit + 32) : unit;
 }
 
-// One line of the text: its content without surrounding blanks, and where the next one begins.
+// One line of the text: its content without surrounding white space, and where the next one begins.
 struct Line
 {
     size_t begin;
@@ -130,15 +130,15 @@ bool Equals(const Units& units, size_t begin, size_t end, const Units& name)
                       [](char16_t left, char16_t right) { return Fold(left) == Fold(right); });
 }
 
-// Where a key stands, or where it would have to be added.
+// Where a key is, or where it would have to be added.
 struct Place
 {
     bool hasSection = false;
     bool hasKey = false;
-    size_t valueBegin = 0; // behind the equals sign, if there is one
-    size_t valueEnd = 0;   // without blanks and line end
+    size_t valueBegin = 0; // after the equals sign, if there is one
+    size_t valueEnd = 0;   // without white space and line end
     bool hasEqualsSign = false;
-    size_t addAt = 0; // behind the last line of the section that is not blank
+    size_t addAt = 0; // after the last line of the section that is not empty
 };
 
 Place Find(const Units& units, const Units& section, const Units& key)
@@ -195,7 +195,7 @@ bool OpenForWriting(LPCWSTR path, RegularFile& file)
            file.OpenForUpdate(NativeName(path), Links::Refuse) == RegularFile::Status::Open;
 }
 
-// Puts lines in at a place, behind a line end if the text before it lacks one.
+// Puts lines in at a place, after a line end if the text before it lacks one.
 void Insert(Units& units, size_t at, const Units& lines)
 {
     const bool needsEnd = at > 0 && units[at - 1] != '\n';

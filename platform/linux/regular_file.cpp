@@ -13,11 +13,23 @@ bool IsRegular(int descriptor, struct stat& status)
     return fstat(descriptor, &status) == 0 && S_ISREG(status.st_mode);
 }
 
-// Opened so that a pipe in the file's place keeps nobody waiting.
+// Opened so that a pipe in the file's place does not make the tool wait.
 int OpenDescriptor(const wxString& path, Links links, int flags)
 {
     return open(path.utf8_str(),
                 flags | O_NONBLOCK | O_CLOEXEC | (links == Links::Refuse ? O_NOFOLLOW : 0));
+}
+
+// Whether the name, which may be no link, leads to that file. Keeps the error of the call before.
+bool IsSameFile(const wxString& path, int descriptor)
+{
+    const int error = errno;
+    struct stat named = {};
+    struct stat ours = {};
+    const bool isSame = lstat(path.utf8_str(), &named) == 0 && fstat(descriptor, &ours) == 0 &&
+                        named.st_dev == ours.st_dev && named.st_ino == ours.st_ino;
+    errno = error;
+    return isSame;
 }
 
 // Why the file did not open. Keeps the error of the opening.
@@ -58,7 +70,7 @@ RegularFile::Status RegularFile::ReopenForUpdate()
     struct stat now = {};
     const int descriptor = OpenDescriptor(m_path, m_links, O_RDWR);
     if (descriptor < 0)
-        return ReasonNotOpen(m_path, m_links) == Status::Refused ? Status::Refused : Status::Gone;
+        return IsSameFile(m_path, m_descriptor) ? Status::Refused : Status::Gone;
     if (!IsRegular(m_descriptor, before) || !IsRegular(descriptor, now) ||
         before.st_dev != now.st_dev || before.st_ino != now.st_ino)
     {
@@ -93,10 +105,10 @@ std::int64_t RegularFile::Length() const
     return fstat(m_descriptor, &status) == 0 ? static_cast<std::int64_t>(status.st_size) : -1;
 }
 
-bool RegularFile::Read(std::string& bytes) const
+bool RegularFile::Read(std::string& bytes, std::int64_t most) const
 {
     const std::int64_t length = Length();
-    if (length < 0)
+    if (length < 0 || length > most)
         return false;
     bytes.resize(static_cast<size_t>(length));
     for (size_t done = 0; done < bytes.size();)

@@ -1,4 +1,4 @@
-// The shell of a machine without one: every call is accepted, and there is nobody to tell.
+// The shell of a machine without one: every call is accepted, and nothing happens.
 #include "platform/system.h"
 
 #include <wx/string.h>

@@ -9,9 +9,16 @@ bool CopyOver(const wxString& source, const wxString& destination)
     std::string before;
     std::string after;
     if (from.OpenForReading(source, Links::Follow) != RegularFile::Status::Open ||
-        to.OpenForUpdate(destination, Links::Refuse) != RegularFile::Status::Open ||
-        !from.Read(after) || !to.Read(before) ||
-        !to.Rewrite(before, after, RegularFile::Wait::ForNothing))
+        !from.Read(after) ||
+        to.OpenForUpdate(destination, Links::Refuse) != RegularFile::Status::Open)
+        return false;
+    if (!to.Read(before))
+    {
+        // Too long for an icon: nothing that is worth to be put back.
+        before.clear();
+        to.SetLength(0);
+    }
+    if (!to.Rewrite(before, after, RegularFile::Wait::ForNothing))
         return false;
     to.TakeAttributes(from);
     return true;

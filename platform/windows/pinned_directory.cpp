@@ -1,8 +1,11 @@
 #include "platform/pinned_directory.h"
 
 #include "platform/system.h"
+#include "platform/windows/link_handle.h"
 
 #include <wx/filename.h>
+
+#include <array>
 
 namespace
 {
@@ -32,18 +35,35 @@ bool IsDirectory(HANDLE handle)
 }
 
 // Only a handle that may list the directory, or pass through it, keeps others from renaming it.
-// Once there is one, its name leads to the same directory or link, so the name can be asked about
-// it.
+// Once there is one, its name leads to the same directory or link. The name is asked, too, since
+// only that shows a link of the system below Wine.
 HANDLE Pin(const wxString& path, Links links)
 {
     HANDLE handle = Open(path, FILE_LIST_DIRECTORY | FILE_READ_ATTRIBUTES, links);
     if (handle == INVALID_HANDLE_VALUE)
         handle = Open(path, FILE_TRAVERSE | FILE_READ_ATTRIBUTES, links);
     if (handle == INVALID_HANDLE_VALUE ||
-        (IsDirectory(handle) && !(links == Links::Refuse && IsLink(path))))
+        (IsDirectory(handle) &&
+         !(links == Links::Refuse && (IsLinkHandle(handle) || IsLink(path)))))
         return handle;
     CloseHandle(handle);
     return INVALID_HANDLE_VALUE;
+}
+
+// The path that leads over no link, for what is behind one may be exchanged. The given one, where
+// that is too long for calls that take no more than MAX_PATH characters, file names included.
+wxString FinalPath(HANDLE handle, const wxString& path)
+{
+    constexpr DWORD Longest = MAX_PATH - 40;
+    std::array<wchar_t, MAX_PATH> buffer{};
+    const DWORD length =
+        GetFinalPathNameByHandleW(handle, buffer.data(), MAX_PATH, FILE_NAME_NORMALIZED);
+    if (length == 0 || length > Longest)
+        return path;
+    const wxString final = buffer.data();
+    if (final.StartsWith(L"\\\\?\\UNC\\"))
+        return L"\\" + final.Mid(7);
+    return final.StartsWith(L"\\\\?\\") ? final.Mid(4) : final;
 }
 
 } // namespace
@@ -61,7 +81,8 @@ bool IsLink(const wxString& path)
 }
 
 PinnedDirectory::PinnedDirectory(const wxString& path, Links links)
-    : m_handle(Pin(path, links)), m_path(path)
+    : m_handle(Pin(path, links)),
+      m_path(IsOpen() && links == Links::Follow ? FinalPath(m_handle, path) : path)
 {
 }
 
@@ -79,7 +100,7 @@ bool PinnedDirectory::IsOpen() const
 wxString PinnedDirectory::Reach(const wxString& name) const
 {
     if (!IsOpen())
-        return "?"; // in no file name
+        return "|"; // in no file name
     if (name.empty() || m_path.empty() || wxFileName::IsPathSeparator(m_path.Last()))
         return m_path + name;
     return m_path + wxFileName::GetPathSeparator() + name;
@@ -88,7 +109,9 @@ wxString PinnedDirectory::Reach(const wxString& name) const
 std::pair<std::uint64_t, std::uint64_t> PinnedDirectory::Identity() const
 {
     BY_HANDLE_FILE_INFORMATION information = {};
-    if (!IsOpen() || GetFileInformationByHandle(m_handle, &information) == 0)
+    // Some network file systems number no files.
+    if (!IsOpen() || GetFileInformationByHandle(m_handle, &information) == 0 ||
+        (information.nFileIndexHigh == 0 && information.nFileIndexLow == 0))
         return {};
     return {information.dwVolumeSerialNumber,
             std::uint64_t{information.nFileIndexHigh} << 32 | information.nFileIndexLow};

@@ -1,6 +1,7 @@
 #include "platform/regular_file.h"
 
 #include "platform/system.h"
+#include "platform/windows/link_handle.h"
 
 #include <algorithm>
 #include <limits>
@@ -36,6 +37,12 @@ RegularFile::Status ReasonNotOpen(const wxString& path)
                : RegularFile::Status::Refused;
 }
 
+bool IsDiskFull(DWORD error)
+{
+    return error == ERROR_DISK_FULL || error == ERROR_HANDLE_DISK_FULL ||
+           error == ERROR_DISK_QUOTA_EXCEEDED || error == ERROR_NOT_ENOUGH_QUOTA;
+}
+
 // Where a transfer that is longer than one call can be goes on.
 OVERLAPPED At(std::int64_t offset)
 {
@@ -65,7 +72,8 @@ RegularFile::Status RegularFile::Open(const wxString& path, Links links, bool fo
     if (!m_handle)
         return m_status = ReasonNotOpen(path);
     m_status = Status::Open;
-    if (GetFileType(m_handle) != FILE_TYPE_DISK || (links == Links::Refuse && IsLink(path)))
+    if (GetFileType(m_handle) != FILE_TYPE_DISK ||
+        (links == Links::Refuse && (IsLinkHandle(m_handle) || IsLink(path))))
     {
         Close();
         m_status = Status::NotThere;
@@ -82,8 +90,11 @@ RegularFile::Status RegularFile::Open(const wxString& path, Links links, bool fo
 
 RegularFile::Status RegularFile::ReopenForUpdate()
 {
-    const HANDLE handle = ReOpenFile(m_handle, GENERIC_READ | GENERIC_WRITE, Sharing, 0);
+    HANDLE handle = ReOpenFile(m_handle, GENERIC_READ | GENERIC_WRITE, Sharing, 0);
+    // Not every file system can do that. The open handle keeps the name from leading elsewhere.
     if (handle == INVALID_HANDLE_VALUE)
+        handle = OpenHandle(m_path, GENERIC_READ | GENERIC_WRITE, 0);
+    if (!handle)
         return Status::Refused;
     CloseHandle(m_handle);
     m_handle = handle;
@@ -94,8 +105,9 @@ RegularFile::Status RegularFile::CreateNew(const wxString& path)
 {
     Close();
     m_path = path;
-    const HANDLE handle = CreateFileW(path.wc_str(), GENERIC_READ | GENERIC_WRITE, Sharing, nullptr,
-                                      CREATE_NEW, FILE_ATTRIBUTE_NORMAL, nullptr);
+    const HANDLE handle =
+        CreateFileW(path.wc_str(), GENERIC_READ | GENERIC_WRITE, Sharing, nullptr, CREATE_NEW,
+                    FILE_ATTRIBUTE_NORMAL | FILE_FLAG_OPEN_REPARSE_POINT, nullptr);
     m_handle = handle == INVALID_HANDLE_VALUE ? nullptr : handle;
     return m_status = m_handle ? Status::Open : Status::Refused;
 }
@@ -114,10 +126,10 @@ std::int64_t RegularFile::Length() const
     return GetFileSizeEx(m_handle, &length) != 0 ? length.QuadPart : -1;
 }
 
-bool RegularFile::Read(std::string& bytes) const
+bool RegularFile::Read(std::string& bytes, std::int64_t most) const
 {
     const std::int64_t length = Length();
-    if (length < 0)
+    if (length < 0 || length > most)
         return false;
     bytes.resize(static_cast<size_t>(length));
     for (size_t done = 0; done < bytes.size();)
@@ -135,13 +147,13 @@ bool RegularFile::Read(std::string& bytes) const
 
 bool RegularFile::Reserve(std::int64_t from, std::int64_t length)
 {
-    if (length == 0)
-        return true;
+    if (Length() >= from + length)
+        return true; // to allocate less than there is would cut the file
     FILE_ALLOCATION_INFO room = {};
     room.AllocationSize.QuadPart = from + length;
     // Of what a file system that cannot do it says, only a full disk matters.
     return SetFileInformationByHandle(m_handle, FileAllocationInfo, &room, sizeof room) != 0 ||
-           GetLastError() != ERROR_DISK_FULL;
+           !IsDiskFull(GetLastError());
 }
 
 bool RegularFile::Write(std::int64_t offset, const std::string& bytes)

@@ -1,0 +1,15 @@
+// Whether an open handle is one of a link.
+#pragma once
+
+#include "platform/system.h"
+
+/// For a handle that was opened with FILE_FLAG_OPEN_REPARSE_POINT: whether it is one of a reparse
+/// point whose tag is a name surrogate. What the system does not say counts as one.
+inline bool IsLinkHandle(HANDLE handle)
+{
+    FILE_ATTRIBUTE_TAG_INFO information = {};
+    return GetFileInformationByHandleEx(handle, FileAttributeTagInfo, &information,
+                                        sizeof information) == 0 ||
+           ((information.FileAttributes & FILE_ATTRIBUTE_REPARSE_POINT) != 0 &&
+            IsReparseTagNameSurrogate(information.ReparseTag));
+}
