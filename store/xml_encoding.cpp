@@ -27,8 +27,8 @@ bool IsSingleByte(const wxString& encoding)
            (code >= wxFONTENCODING_CP1250 && code <= wxFONTENCODING_CP1258);
 }
 
-// Where the library does not know the encoding at all, nothing is read as what it is: it takes it for
-// Latin-1, which is right only for a name of that which it does not know on Windows.
+// Where the library does not know the encoding at all, nothing is read as what it is: it takes it
+// for Latin-1, which is right only for a name of that which it does not know on Windows.
 bool IsReadAsAscii(const std::string& document, const wxString& encoding)
 {
     if (!wxCSConv(encoding).IsOk() && encoding.CmpNoCase("latin1") != 0)
