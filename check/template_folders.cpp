@@ -1,7 +1,7 @@
 #include "check/template_folders.h"
 
 #include "migrate/install_locations.h"
-#include "store/xml_tree.h"
+#include "store/xml_text.h"
 
 #include <wx/filename.h>
 

@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 """Plants small faults in a copy of the product, one at a time, and shows which of them the tests find.
 
-    tests/plant_faults.py [NUMBER [SEED]]
+    bench/plant_faults.py [NUMBER [SEED]]
 
 In place of a fault that does not compile another one is drawn. The same seed gives the same faults, as
 long as the sources are the same. A survivor is either a missing test or a fault that changes nothing.
