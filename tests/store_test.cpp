@@ -11,8 +11,6 @@
 #include <wx/log.h>
 #include <wx/sstream.h>
 
-#include <chrono>
-
 namespace
 {
 
@@ -173,29 +171,6 @@ TEST_F(Store, DefaultsAreWrittenAndAFilterOfAnotherNameIsNot)
                                 "    <Movefolder path=\"\"/>\n    <Hotfolder path=\"\"/>\n  </Paths>\n"
                                 "  <JobSetting/>\n  <ImposeSetting/>\n  <PreflightSettings/>\n</HotFolder>\n"));
     EXPECT_TRUE(Text().Contains("server_version=\"-1\""));
-}
-
-TEST_F(Store, SizeCostsTimeInProportion)
-{
-    // A second or two is what it may take; the square of the number would take half a minute.
-    constexpr int Entries = 100000;
-    wxString text = "<r><FilterSetting>";
-    for (int i = 0; i < Entries; ++i)
-        text += "<x/>";
-    text += "</FilterSetting><JobSetting>";
-    for (int i = 0; i < Entries; ++i)
-        text += wxString::Format("<K k='%d' v=''/>", i);
-    const wxString path = File(text + "</JobSetting></r>");
-    const auto start = std::chrono::steady_clock::now();
-    JobSettingTable jobs;
-    wxXmlNode filter;
-    ReadFilterSetting(path, filter);
-    m_document.Load(path);
-    ReadJobSettings(m_document.GetRoot(), jobs);
-    SaveHotFolderSettings(path, {}, jobs, {}, filter, {}, {});
-    EXPECT_LT(std::chrono::steady_clock::now() - start, std::chrono::seconds(10));
-    EXPECT_EQ(static_cast<size_t>(Entries), jobs.size());
-    EXPECT_EQ(Entries, Text().Freq('\n') - Entries - 16);
 }
 
 } // namespace
