@@ -1,5 +1,6 @@
 #!/usr/bin/env bash
-# Builds the tool, runs it on a sample workstation and shows what it logged and changed there:
+# Builds the tool, runs it on a sample workstation and shows what it logged and changed there, and what the check says
+# before and after:
 #
 #     ./run.sh [--fresh] [I|U] [V]
 #
@@ -13,7 +14,7 @@ set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")"
 
 workstation="$PWD/build/sample workstation"
-tool=build/program/FolderUpgrade
+programs=build/program
 log="$workstation/user/ORX_Installers/UpgradeDowngrade.log"
 finished=255 # the tool's exit status of -1, on every path
 
@@ -25,6 +26,10 @@ usage() {
 # Shows the output of a command only when it fails.
 quietly() {
     "$@" >"$scratch/output" 2>&1 || { cat "$scratch/output" >&2; exit 1; }
+}
+
+on_workstation() {
+    XDG_CONFIG_DIRS="$workstation/machine" XDG_CONFIG_HOME="$workstation/user" "$@"
 }
 
 # The names of the attributes of a file or folder of the workstation, "-" for none.
@@ -47,6 +52,19 @@ shorten() {
     while IFS= read -r text; do
         printf '%s\n' "${text//"$workstation"/WORKSTATION}"
     done
+}
+
+check() {
+    local status=0
+    echo "== FolderUpgradeCheck $switch, $1 the run"
+    on_workstation "$programs/FolderUpgradeCheck" "$switch" >"$scratch/report" || status=$?
+    shorten <"$scratch/report"
+    case $status in
+        0) echo "Exit status 0: nothing to change" ;;
+        1) echo "Exit status 1: changes" ;;
+        2) echo "Exit status 2: problems" ;;
+        *) exit 1 ;;
+    esac
 }
 
 # Everything on the workstation but the run log, which is shown apart.
@@ -120,10 +138,13 @@ elif [ ! -e "$workstation" ]; then
 fi
 remember
 
-echo "== FolderUpgrade $switch${verbosity[0]+ ${verbosity[0]}}, in the texts below WORKSTATION is $workstation"
+echo "WORKSTATION is $workstation"
+echo
+check before
+echo
+echo "== FolderUpgrade $switch${verbosity[0]+ ${verbosity[0]}}"
 status=0
-XDG_CONFIG_DIRS="$workstation/machine" XDG_CONFIG_HOME="$workstation/user" \
-    "$tool" "$switch" ${verbosity[@]+"${verbosity[@]}"} || status=$?
+on_workstation "$programs/FolderUpgrade" "$switch" ${verbosity[@]+"${verbosity[@]}"} || status=$?
 if [ $status != $finished ]; then
     echo "Exit status $status, not $finished: it did not run to its end." >&2
     exit 1
@@ -144,3 +165,5 @@ if [ -s "$scratch/changes" ]; then
 else
     echo nothing
 fi
+echo
+check after

@@ -152,7 +152,7 @@ void FindLostThings(const wxXmlNode& before, const wxXmlNode& after, wxArrayStri
         if (found != pool.end() && HasAll(*found->second, *thing.node))
             pool.erase(found);
         else
-            losses.Add("loses " + Describe(*thing.node));
+            losses.Add("does not keep " + Describe(*thing.node));
     }
 }
 
@@ -194,7 +194,7 @@ wxArrayString FindFolderCfgLosses(const wxXmlDocument& document, const std::stri
          node = node->GetNext())
     {
         if (node->GetType() == wxXML_PI_NODE)
-            losses.Add("loses " + Describe(*node));
+            losses.Add("does not keep " + Describe(*node));
     }
     const wxXmlNode& root = *document.GetRoot();
     if (root.GetName() != FolderCfg::Root)

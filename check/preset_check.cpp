@@ -63,37 +63,42 @@ void CheckContent(const wxString& name, const std::string& before, const Rewritt
 void CheckPreset(JobPresetFile& preset, const wxString& name, const TemplateFolders& folders,
                  Report& report)
 {
-    if (preset.OpenForReading() != RegularFile::Status::Open)
-    {
-        report.Problem(name +
-                       ": cannot be opened for reading (no right, in use, a link, or no file)");
+    const RegularFile::Status status = preset.OpenForReading();
+    if (status == RegularFile::Status::Refused)
+        report.Problem(name + ": cannot be opened for reading (" + TakeLibraryErrors() + ")");
+    else if (status != RegularFile::Status::Open)
+        report.Problem(name + ": reached over a link, or no file");
+    if (status != RegularFile::Status::Open)
         return;
-    }
     std::string before;
     if (!preset.GetFile().Read(before))
     {
-        report.Problem(name + ": cannot be read");
+        report.Problem(name + ": left as it is (cannot be read)");
         return;
     }
     const RewrittenPreset rewritten = RewritePreset(before, folders.From(), folders.To());
     if (rewritten.reasonToStay)
-        report.Problem(name + ": " + rewritten.reasonToStay);
+        report.Problem(name + ": left as it is (" + rewritten.reasonToStay + ")");
     else if (preset.ReopenForUpdate() != RegularFile::Status::Open)
-        report.Problem(name + ": cannot be opened for writing (read-only, no right, or in use)");
+        report.Problem(name + ": cannot be opened for writing (" + TakeLibraryErrors() + ")");
     else
         CheckContent(name, before, rewritten, report);
 }
 
-// What keeps a presets.xml from being there for a run.
-void CheckMissing(const JobPresetFile& preset, const wxString& directory, const wxString& name,
+// Whether presets.xml is missing only because a run does not get at it.
+bool IsOutOfReach(const JobPresetFile& preset, const wxString& directory, const wxString& name,
                   Report& report)
 {
     for (const wxString& each : {directory, wxFileName(preset.GetPath()).GetPath()})
     {
         const wxString obstacle = WhyOutOfReach(each);
         if (!obstacle.empty())
+        {
             report.Problem(name + ": " + each + " " + obstacle);
+            return true;
+        }
     }
+    return false;
 }
 
 } // namespace
@@ -116,7 +121,7 @@ void CheckPresets(const TemplateFolders& folders, Report& report)
         const wxString name = preset.GetPath().Mid(root.length());
         if (!preset.IsThere())
         {
-            CheckMissing(preset, directory, name, report);
+            hasPresets = IsOutOfReach(preset, directory, name, report) || hasPresets;
             continue;
         }
         hasPresets = true;

@@ -77,8 +77,10 @@ void CheckRunLog(Report& report)
     RegularFile log;
     const RegularFile::Status status = log.OpenForUpdate(path, Links::Refuse);
     if (status == RegularFile::Status::Refused)
-        report.Problem("there will be no run log: it is read-only, in use or not ours to write: " +
-                       path);
+    {
+        ReportNotOpened(path); // for the system's reason
+        report.Problem("there will be no run log: " + TakeLibraryErrors());
+    }
     else if (status == RegularFile::Status::NotThere && wxFileName::Exists(path))
         report.Note("there will be no run log: something else has its name: " + path);
     else if (status == RegularFile::Status::NotThere && !wxFileName::IsDirWritable(folder))

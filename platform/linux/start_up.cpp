@@ -1,6 +1,8 @@
 // What has to be so before the library starts.
 #include "platform/linux/start_up.h"
 
+#include <wx/strconv.h>
+
 #include <algorithm>
 #include <clocale>
 #include <sys/resource.h>
@@ -26,5 +28,6 @@ StartUp::StartUp()
 {
     // Should the system lack it, names that are not ASCII stay what they were.
     static_cast<void>(std::setlocale(LC_CTYPE, "C.UTF-8"));
+    wxConvLocal = wxCSConv(wxFONTENCODING_UTF8); // by which the library reads the command line
     RaiseStackLimit();
 }
