@@ -2,6 +2,8 @@
 
 #include <wx/log.h>
 
+#include <memory>
+
 namespace
 {
 
@@ -24,7 +26,8 @@ class Keeper : public wxLog
 
 void KeepLibraryErrors()
 {
-    delete wxLog::SetActiveTarget(new Keeper); // the library's from here on
+    delete wxLog::SetActiveTarget(
+        std::make_unique<Keeper>().release()); // the library's from here on
 }
 
 wxString TakeLibraryErrors()

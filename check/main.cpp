@@ -80,6 +80,8 @@ int Check(bool isUpgrade, const wxString& fileName)
     return report.GetChanges() > 0 ? HasChanges : NothingToDo;
 }
 
+} // namespace
+
 class FolderUpgradeCheckApp : public wxAppConsole
 {
   public:
@@ -103,7 +105,5 @@ class FolderUpgradeCheckApp : public wxAppConsole
         return WrongCall;
     }
 };
-
-} // namespace
 
 wxIMPLEMENT_APP_CONSOLE(FolderUpgradeCheckApp);

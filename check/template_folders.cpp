@@ -32,12 +32,11 @@ bool IsBelow(const wxString& folder, const wxString& outer)
 TemplateFolders::TemplateFolders(bool isUpgrade) : m_isUpgrade(isUpgrade)
 {
     wxFileName folder;
-    m_default.value = "registry value InstallPath in "
-                      "HKEY_LOCAL_MACHINE\\SOFTWARE[\\Wow6432Node]\\Vantorix\\QZA: ";
+    m_default.value = wxString("registry value ") + DefaultFolderSource + ": ";
     m_default.isKnown = GetDefaultImposeTemplatePath(folder);
     if (m_default.isKnown)
         m_default.path = folder.GetFullPath(wxPATH_NATIVE);
-    m_previous.value = "registry value Path in HKEY_CURRENT_USER\\SOFTWARE[\\Wow6432Node]\\HF: ";
+    m_previous.value = wxString("registry value ") + PreviousFolderSource + ": ";
     m_previous.isKnown = GetPreviousImposeTemplatePath(folder);
     m_previous.path = folder.GetFullPath(wxPATH_NATIVE);
 }

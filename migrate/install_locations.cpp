@@ -39,6 +39,15 @@ const Location& PreviousFolder()
 
 const char* const TemplateDirName = "template";
 
+} // namespace
+
+const char* const DefaultFolderSource =
+    "InstallPath in HKEY_LOCAL_MACHINE\\SOFTWARE[\\Wow6432Node]\\Vantorix\\QZA";
+const char* const PreviousFolderSource = "Path in HKEY_CURRENT_USER\\SOFTWARE[\\Wow6432Node]\\HF";
+
+namespace
+{
+
 bool QueryText(HKEY key, const wchar_t* name, wxString& text)
 {
     std::array<BYTE, ValueCapacity> data{};

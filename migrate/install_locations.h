@@ -4,6 +4,10 @@
 #include <wx/filename.h>
 #include <wx/string.h>
 
+/// Where the two folders come from, for people.
+extern const char* const DefaultFolderSource;
+extern const char* const PreviousFolderSource;
+
 /// The default template folder of the installed software: "template" below the InstallPath of the
 /// machine's key. False, and the folder as it was, when that cannot be read.
 ///

@@ -85,24 +85,24 @@ TemplateMove DecideTemplateMove(const wxString& storedPath, const std::string& f
         isUpgrade ? GetDefaultImposeTemplatePath : GetPreviousImposeTemplatePath;
     wxFileName from;
     if (!lookUpFrom(from))
-        return {Outcome::NoFromFolder, {}, {}};
+        return {Outcome::NoFromFolder, {}};
     const wxString fromPath = from.GetFullPath(wxPATH_NATIVE);
     const wxFileName templateFile(storedPath, wxPATH_NATIVE);
     const bool isInFolder = IsSameFolder(FolderOf(templateFile), fromPath);
     // In an encoding that is not known only ASCII is read as what it is.
     if (!isInFolder && storedPath.IsAscii())
-        return {Outcome::Elsewhere, {}, fromPath};
+        return {Outcome::Elsewhere, {}};
     if (!IsReadFaithfully(folderCfg))
-        return {Outcome::UnknownEncoding, {}, fromPath};
+        return {Outcome::UnknownEncoding, {}};
     if (!isInFolder)
-        return {Outcome::Elsewhere, {}, fromPath};
+        return {Outcome::Elsewhere, {}};
     wxFileName to;
     if (!lookUpTo(to))
-        return {Outcome::NoToFolder, {}, fromPath};
+        return {Outcome::NoToFolder, {}};
     const wxString newPath = to.GetFullPath(wxPATH_NATIVE) +
                              wxFileName::GetPathSeparator(wxPATH_NATIVE) +
                              templateFile.GetFullName();
-    return {IsXmlText(newPath) ? Outcome::Moves : Outcome::NotStorable, newPath, fromPath};
+    return {IsXmlText(newPath) ? Outcome::Moves : Outcome::NotStorable, newPath};
 }
 
 RewrittenFolderCfg RewriteFolderCfg(const wxXmlNode& root, const ImposeSettingTable& imposeSettings)

@@ -25,9 +25,6 @@ struct TemplateMove
 
     Outcome outcome;
     wxString newPath; // when it moves
-
-    /// The template folder of the version being left, as far as it was looked up.
-    wxString fromFolder;
 };
 
 /// Decides for the path that this Folder.cfg (its bytes) stores. Each registry lookup is made only

@@ -45,9 +45,9 @@ class PinnedDirectory
 
   private:
 #ifdef _WIN32
-    void* m_handle;
+    void* m_handle = nullptr;
     wxString m_path;
 #else
-    int m_descriptor;
+    int m_descriptor = -1;
 #endif
 };
