@@ -40,7 +40,7 @@ RegularFile::Status ReasonNotOpen(const wxString& path)
 bool IsDiskFull(DWORD error)
 {
     return error == ERROR_DISK_FULL || error == ERROR_HANDLE_DISK_FULL ||
-           error == ERROR_DISK_QUOTA_EXCEEDED || error == ERROR_NOT_ENOUGH_QUOTA;
+           error == ERROR_NOT_ENOUGH_QUOTA;
 }
 
 // Where a transfer that is longer than one call can be goes on.
