@@ -85,20 +85,36 @@ void CheckPreset(JobPresetFile& preset, const wxString& name, const TemplateFold
         CheckContent(name, before, rewritten, report);
 }
 
-// Whether presets.xml is missing only because a run does not get at it.
-bool IsOutOfReach(const JobPresetFile& preset, const wxString& directory, const wxString& name,
-                  Report& report)
+// Why a presets.xml is missing although it may be there; empty if it is not.
+wxString WhyMissing(const JobPresetFile& preset, const wxString& directory)
 {
     for (const wxString& each : {directory, wxFileName(preset.GetPath()).GetPath()})
     {
         const wxString obstacle = WhyOutOfReach(each);
         if (!obstacle.empty())
-        {
-            report.Problem(name + ": " + each + " " + obstacle);
-            return true;
-        }
+            return each + " " + obstacle;
     }
-    return false;
+    return {};
+}
+
+// False when there is none.
+bool CheckDirectory(const wxString& directory, const wxString& root, const TemplateFolders& folders,
+                    Report& report)
+{
+    JobPresetFile preset(directory);
+    const wxString name = preset.GetPath().Mid(root.length());
+    if (preset.IsThere())
+    {
+        folders.ReportForPresets(report);
+        if (folders.AreKnown())
+            CheckPreset(preset, name, folders, report);
+        TakeLibraryErrors();
+        return true;
+    }
+    const wxString obstacle = WhyMissing(preset, directory);
+    if (!obstacle.empty())
+        report.Problem(name + ": " + obstacle);
+    return !obstacle.empty();
 }
 
 } // namespace
@@ -116,20 +132,7 @@ void CheckPresets(const TemplateFolders& folders, Report& report)
         report.Problem(root + ": " + errors);
     bool hasPresets = false;
     for (const wxString& directory : directories)
-    {
-        JobPresetFile preset(directory);
-        const wxString name = preset.GetPath().Mid(root.length());
-        if (!preset.IsThere())
-        {
-            hasPresets = IsOutOfReach(preset, directory, name, report) || hasPresets;
-            continue;
-        }
-        hasPresets = true;
-        folders.ReportForPresets(report);
-        if (folders.AreKnown())
-            CheckPreset(preset, name, folders, report);
-        TakeLibraryErrors();
-    }
+        hasPresets = CheckDirectory(directory, root, folders, report) || hasPresets;
     if (!hasPresets && errors.empty() && obstacle.empty())
         report.Note(isThere ? "there are no presets in " + root
                             : "there are no presets: there is no folder " + root);

@@ -13,6 +13,7 @@ const Text Ini = "hot/A/Desktop.ini";
 const Text Jobs = "user/ORX/JPData";
 const Text LogFolder = "user/ORX_Installers";
 const char* const NoLinks = "links to files are for this machine only";
+const char* const NoRefusal = "Wine opens a directory for writing, whoever asks";
 
 // A workstation, and all lines of one kind that are said of it ("problem", and no more: there is none).
 // A line that ends in * goes on in the system's own words.
@@ -194,9 +195,13 @@ std::vector<Finding> Icons()
          "problem  Desktop.ini: left as it is (reached over a link)"},
         {Done("DesktopIniIsAnothers").Before({{Ini, "[.ShellClassInfo]"}, {Ini + "#", "X"}}).AsOtherUser(),
          "problem  Desktop.ini: cannot be opened for reading and writing\nproblem  Desktop.ini: its attributes may not be changed"},
-        {Done("DesktopIniCannotBeMade").Before({{Ini, Removed}, {Ini + "#", Removed}, {"hot/A#", "SX"}}).AsOtherUser(),
+        {Done("DesktopIniCannotBeMade")
+             .Before({{Ini, Removed}, {Ini + "#", Removed}, {"hot/A#", "SX"}})
+             .AsOtherUser()
+             .NotUnderWine(NoRefusal),
          "problem  Desktop.ini: cannot be made, the hot folder may not be written"},
-        {Done("TheHotFolderIsAnothers").Before({{"hot/A#", "X"}}).AsOtherUser(), "problem  hot folder: its attributes may not be changed"},
+        {Done("TheHotFolderIsAnothers").Before({{"hot/A#", "X"}}).AsOtherUser().NotUnderWine(NoRefusal),
+         "problem  hot folder: its attributes may not be changed"},
         {Done("KeysAndAttributesDiffer").Before({{Ini, "[.ShellClassInfo]\r\nIconFile=x\r\n"}, {Ini + "#", "H"}, {"hot/A#", "H"}}),
          "change   Desktop.ini: InfoTip, IconFile\nchange   Desktop.ini: attributes HIDDEN -> READONLY SYSTEM\n"
          "change   hot folder: attributes HIDDEN -> HIDDEN SYSTEM"},
@@ -237,7 +242,10 @@ std::vector<Finding> PresetsAndLogs()
          noLog + "it is reached over a link: {user}{/}ORX_Installers{/}UpgradeDowngrade.log"},
         {Done("TheLogsFolderMayNotBeEntered").Before({{LogFolder + "#", "0"}}).AsOtherUser(),
          noLog + "its folder cannot be entered: {user}{/}ORX_Installers{/}"},
-        {Done("TheLogsFolderIsAnothers").Before({{LogPlace, Removed}, {LogFolder + "/", ""}, {LogFolder + "#", "X"}}).AsOtherUser(),
+        {Done("TheLogsFolderIsAnothers")
+             .Before({{LogPlace, Removed}, {LogFolder + "/", ""}, {LogFolder + "#", "X"}})
+             .AsOtherUser()
+             .NotUnderWine(NoRefusal),
          noLog + "its folder may not be written: {user}{/}ORX_Installers{/}"},
         {Done("AFolderHasTheLogsName").Before({{LogPlace, Removed}, {Text(LogPlace) + "/", ""}}),
          "note     there will be no run log: something else has its name: {user}{/}ORX_Installers{/}UpgradeDowngrade.log"},
