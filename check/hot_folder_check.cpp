@@ -9,7 +9,7 @@
 #include "check/library_errors.h"
 #include "check/reach.h"
 #include "migrate/template_move.h"
-#include "platform/attribute_rights.h"
+#include "platform/access_rights.h"
 #include "platform/file_copy.h"
 #include "platform/regular_file.h"
 #include "store/folder_cfg_format.h"
@@ -107,7 +107,7 @@ void CheckDesktopIni(const PinnedDirectory& directory, const wxString& iconName,
     }
     else if (wxFileName::Exists(path))
         report.Problem("Desktop.ini: is no file");
-    else if (isCustomised && wxFileName::IsDirWritable(directory.Reach(L"")))
+    else if (isCustomised && MayCreateIn(directory.Reach(L"")))
         report.Change("Desktop.ini: new");
     else if (isCustomised)
         report.Problem("Desktop.ini: cannot be made, the hot folder may not be written");

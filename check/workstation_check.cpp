@@ -2,6 +2,7 @@
 
 #include "check/library_errors.h"
 #include "check/reach.h"
+#include "platform/access_rights.h"
 #include "platform/regular_file.h"
 #include "run/run_log_place.h"
 
@@ -83,6 +84,6 @@ void CheckRunLog(Report& report)
     }
     else if (status == RegularFile::Status::NotThere && wxFileName::Exists(path))
         report.Note("there will be no run log: something else has its name: " + path);
-    else if (status == RegularFile::Status::NotThere && !wxFileName::IsDirWritable(folder))
+    else if (status == RegularFile::Status::NotThere && !MayCreateIn(folder))
         report.Problem("there will be no run log: its folder may not be written: " + folder);
 }

@@ -1,4 +1,4 @@
-#include "platform/attribute_rights.h"
+#include "platform/access_rights.h"
 
 #include <sys/stat.h>
 #include <unistd.h>
@@ -12,4 +12,9 @@ bool MayChangeAttributes(const wxString& path)
         return false;
     return geteuid() == 0 || geteuid() == status.st_uid ||
            (S_ISDIR(status.st_mode) && access(path.utf8_str(), W_OK) == 0);
+}
+
+bool MayCreateIn(const wxString& directory)
+{
+    return access(directory.utf8_str(), W_OK | X_OK) == 0;
 }

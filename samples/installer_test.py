@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 """Signs and packs the Windows programs, builds both sample installers and runs them under Wine.
 
-    tests/installer_test.py BUILD_DIR
+    samples/installer_test.py BUILD_DIR
 
 BUILD_DIR is the folder of the preset "windows", built. Its package is made again, unsigned at the end. Wine gets a prefix
 and a display of its own. On the workstation are two hot folders, one whose template moves, and a job preset.
