@@ -1,5 +1,4 @@
-// Copying a file over another one; one source for each system, and file_copy.cpp for what is the
-// same on all.
+// Copying a file over another one.
 #pragma once
 
 #include <wx/string.h>

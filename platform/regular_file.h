@@ -49,6 +49,10 @@ class RegularFile
     /// Makes a new, empty file and opens it for update; fails, with nothing changed, when anything
     /// of that name is there (CREATE_NEW, O_EXCL).
     Status CreateNew(const wxString& path);
+    /// Puts a new, empty file in the place of one that may not be written. Not on Windows, where a
+    /// file's own permissions protect it from that.
+    Status Replace(const wxString& path);
+    static bool MayReplace(const wxString& path);
     /// False when the system reports an error, which does not matter: all bytes were handed over
     /// before.
     bool Close();

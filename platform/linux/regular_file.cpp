@@ -1,5 +1,7 @@
 #include "platform/regular_file.h"
 
+#include "platform/access_rights.h"
+
 #include <cerrno>
 #include <fcntl.h>
 #include <sys/stat.h>
@@ -89,6 +91,16 @@ RegularFile::Status RegularFile::CreateNew(const wxString& path)
     m_path = path;
     m_descriptor = open(path.utf8_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, Everybody);
     return m_status = m_descriptor < 0 ? Status::Refused : Status::Open;
+}
+
+RegularFile::Status RegularFile::Replace(const wxString& path)
+{
+    return unlink(path.utf8_str()) == 0 ? CreateNew(path) : m_status = Status::Refused;
+}
+
+bool RegularFile::MayReplace(const wxString& path)
+{
+    return MayCreateIn(path.BeforeLast('/'));
 }
 
 bool RegularFile::Close()

@@ -112,6 +112,16 @@ RegularFile::Status RegularFile::CreateNew(const wxString& path)
     return m_status = m_handle ? Status::Open : Status::Refused;
 }
 
+RegularFile::Status RegularFile::Replace(const wxString& /*path*/)
+{
+    return m_status = Status::Refused;
+}
+
+bool RegularFile::MayReplace(const wxString& /*path*/)
+{
+    return false;
+}
+
 bool RegularFile::Close()
 {
     const bool isDone = !m_handle || CloseHandle(m_handle) != 0;
