@@ -60,6 +60,7 @@ UninstPage instfiles
     !insertmacro START FolderUpgradeCheck.exe '${switch} "${REPORTS}-before.txt"'
     !insertmacro START FolderUpgrade.exe ${switch}
     !insertmacro START FolderUpgradeCheck.exe '${switch} "${REPORTS}-after.txt"'
+    ; An elevated setup writes here into a folder in which the user may plant links; the check and CopyFiles follow them.
     CopyFiles /SILENT "$APPDATA\ORX_Installers\UpgradeDowngrade.log" "${REPORTS}.log"
     !undef REPORTS
 !macroend
@@ -77,7 +78,6 @@ Section
     File "${PACKAGE}/hf_*.ico" ; this version's, which an upgrade copies
 
     WriteRegStr HKLM "${KEY}" "InstallPath" "$INSTDIR" ; NSIS has cut off a final separator: the tool adds "\template"
-    WriteRegStr HKLM "${KEY}" "Version" "${VERSION}"
     WriteUninstaller "$INSTDIR\uninstall.exe"
     WriteRegStr HKLM "${UNINSTALL_KEY}" "DisplayName" "Hot folder client"
     WriteRegStr HKLM "${UNINSTALL_KEY}" "DisplayVersion" "${VERSION}"
@@ -86,6 +86,7 @@ Section
     ${If} $1 != "${VERSION}"
         !insertmacro MIGRATE I upgrade
     ${EndIf}
+    WriteRegStr HKLM "${KEY}" "Version" "${VERSION}" ; last: a setup that is ended before it migrates when started again
 SectionEnd
 
 Section Uninstall

@@ -3,7 +3,7 @@
 
     samples/installer_test.py BUILD_DIR
 
-BUILD_DIR is the folder of the preset "windows", built. Its package is made again, unsigned at the end. Wine gets a prefix
+BUILD_DIR is the folder of the preset "windows", built. Wine gets a prefix
 and a display of its own. On the workstation are two hot folders, one whose template moves, and a job preset.
 """
 import functools
@@ -54,10 +54,10 @@ def files_below(folder):
 
 # Package ------------------------------------------------------------------------------------------
 
-def pack(build, sign):
-    run("cmake", f"-DFOLDER_UPGRADE_SIGN_COMMAND={sign}", build)
-    run("cmake", "--build", build, "--target", "package")
-    (package,) = build.glob("FolderUpgrade-*-win64.zip")
+def pack(build, scratch, sign):
+    """The package, made beside that of the build folder, whose settings stay as they are."""
+    run("cpack", "--config", build / "CPackConfig.cmake", "-D", f"CPACK_FOLDER_UPGRADE_SIGN_COMMAND={sign}", "-B", scratch / "packing")
+    (package,) = (scratch / "packing").glob("FolderUpgrade-*-win64.zip")
     return package.read_bytes()
 
 
@@ -74,9 +74,9 @@ def try_signing(build, scratch):
         "extendedKeyUsage=codeSigning", "-keyout", scratch / "key", "-out", scratch / "cert")
     (scratch / "sign").write_text(SIGN.format(scratch))
     (scratch / "sign").chmod(0o755)
-    unsigned = pack(build, "")
-    signed = pack(build, scratch / "sign")
-    check("without a command two packages are the same", pack(build, "") == unsigned, True)
+    unsigned = pack(build, scratch, "")
+    signed = pack(build, scratch, scratch / "sign")
+    check("without a command two packages are the same", pack(build, scratch, "") == unsigned, True)
     unpack(unsigned, scratch / "package")
     unpack(signed, scratch / "signed package")
     for program in PROGRAMS:

@@ -45,7 +45,9 @@ wxString ReadPath(const wxXmlNode& element)
     return path.Trim();
 }
 
-wxString GetListPath()
+} // namespace
+
+wxString GetHotFolderListPath()
 {
     wxFileName file;
     file.AssignDir(GetHotFolderDataDir());
@@ -53,8 +55,6 @@ wxString GetListPath()
     file.SetExt(ListExtension);
     return file.GetFullPath();
 }
-
-} // namespace
 
 wxString GetHotFolderDataDir()
 {
@@ -68,7 +68,7 @@ HotFolderList LoadHotFolderList()
 {
     HotFolderList list;
     XmlFile file;
-    const wxString path = GetListPath();
+    const wxString path = GetHotFolderListPath();
     list.state = file.Load(path, Links::Follow, path);
     if (list.state != XmlFile::State::Loaded)
         return list;
