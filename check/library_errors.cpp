@@ -27,7 +27,7 @@ class Keeper : public wxLog
 void KeepLibraryErrors()
 {
     delete wxLog::SetActiveTarget(
-        std::make_unique<Keeper>().release()); // the library's from here on
+        std::make_unique<Keeper>().release()); // from here on owned by the library
 }
 
 wxString TakeLibraryErrors()

@@ -13,7 +13,7 @@ const char* const PresetRootName = "JPData";
 const char* const PresetDirName = "Presets";
 const char* const PresetFileName = "presets.xml";
 
-// Collects the sub-directories of the directory that it traverses, and enters none.
+// Collects the sub-directories of the directory being traversed, without entering them.
 class wxDirTraverserSimple : public wxDirTraverser
 {
   public:

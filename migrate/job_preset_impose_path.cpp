@@ -17,7 +17,8 @@ struct Rewriting
     bool isDecided = false;
 };
 
-// Decides for what the file holds now; false, and a line in the log, when it has to stay as it is.
+// Decides about the current content of the file. If the file has to stay as it is, logs a line and
+// returns false.
 bool Decide(JobPresetFile& preset, const wxString& from, const wxString& to, Rewriting& rewriting)
 {
     std::string now;
@@ -55,7 +56,7 @@ void UpdatePreset(JobPresetFile& preset, const wxString& from, const wxString& t
     }
 }
 
-// Both lookups are always made, in this order; false when one failed.
+// Always makes both lookups, in this order; returns false if either fails.
 bool LookUpFolders(wxFileName& previousFolder, wxFileName& defaultFolder)
 {
     const bool previousFound = GetPreviousImposeTemplatePath(previousFolder);

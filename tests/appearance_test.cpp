@@ -52,7 +52,7 @@ class Appearance : public testing::Test
     const wxString m_folder;
 };
 
-TEST_F(Appearance, ANewDesktopIniIsToldButNotForced)
+TEST_F(Appearance, ANewDesktopIniIsAnnouncedButNotForced)
 {
     EXPECT_TRUE(ApplyFolderIcon(m_folder, "i.ico"));
     EXPECT_EQ(Calls(false, ""), ShellCalls);

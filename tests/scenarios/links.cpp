@@ -43,13 +43,13 @@ std::vector<Scenario> PlantedLinks()
                      "InfoTip=This folder has been configured as an ORX hot folder.\r\n";
     const Text iniStays = "Desktop.ini left as it is (reached over a link): {hot}{/}A{/}Desktop.ini\n";
     std::vector<Scenario> scenarios = {
-        Scenario("APrivateDirectoryIsNoLink")
+        Scenario("ALinkedPrivateDirectoryIsMissing")
             .Before({{"elsewhere/P/Folder.cfg", cfg}, {"elsewhere/P/hf_folder_disabled.ico", "old"}, {"hot/A/[P]/", LinkTo("elsewhere/P")}})
             .LogOfDisabledA(NoCfg()),
         Scenario("ALinkedPresetDirectoryIsNotOpened")
             .Before({{"elsewhere/P/presets.xml", preset}, {PresetDir + "/", LinkTo("elsewhere/P")}})
             .LogOfPreset(CannotOpenPreset),
-        Scenario("ALinkedLogFolderHasNoLog")
+        Scenario("ALinkedLogFolderGetsNoLog")
             .Before({{LogPlace, Removed}, {"elsewhere/L/UpgradeDowngrade.log", "-"}, {LogDir + "/", LinkTo("elsewhere/L")}})
             .FolderCfg(cfg, Written(MovedTo)),
         Scenario("AHotFolderMayBeReachedOverALink")
@@ -60,7 +60,7 @@ std::vector<Scenario> PlantedLinks()
             .Before({{"elsewhere/P/Presets/presets.xml", preset}, {"user/ORX/JPData/.P/", LinkTo("elsewhere/P")}})
             .After({{"elsewhere/P/Presets/presets.xml", Stored(MovedTo)}})
             .LogOfPreset(Updated),
-        Scenario("TheFoldersAboveItMayBeLinks")
+        Scenario("TheFoldersAboveThePresetsMayBeLinks")
             .Before({{"user/ORX/JPData/", Removed},
                      {"elsewhere/ORX/other", ""},
                      {"elsewhere/JPData/.P/Presets/presets.xml", preset},
@@ -95,15 +95,15 @@ std::vector<Scenario> PlantedPipes()
         return Scenario(name).Before({{place, "{fifo}"}}).NotUnderWine(NoPipes).Within(10, 512);
     };
     return {
-        pipe("APipeIsNoFolderCfg", CfgPlace).LogOfDisabledA(NoCfg()),
-        pipe("APipeIsNoIcon", Icon).LogOfDisabledA(NoCfg()),
-        pipe("APipeIsNoDesktopIni", Ini)
+        pipe("APipeIsNotAFolderCfg", CfgPlace).LogOfDisabledA(NoCfg()),
+        pipe("APipeIsNotAnIcon", Icon).LogOfDisabledA(NoCfg()),
+        pipe("APipeIsNotADesktopIni", Ini)
             .Before({{Icon, "old"}})
             .After({{Icon, "{icon:hf_folder_disabled.ico}"}, {"hot/A#", "S"}})
             .Log(FolderLines("A", 1, Copied("hf_folder_disabled"), NoCfg())),
-        pipe("APipeIsNoPreset", PresetPlace).LogOfPreset(CannotOpenPreset),
-        pipe("APipeIsNoList", ListPlace).Before({{"hot/A/", ""}}).Log(""),
-        pipe("APipeIsNoLog", LogPlace).FolderCfg(cfg, Written(MovedTo)),
+        pipe("APipeIsNotAPreset", PresetPlace).LogOfPreset(CannotOpenPreset),
+        pipe("APipeIsNotAList", ListPlace).Before({{"hot/A/", ""}}).Log(""),
+        pipe("APipeIsNotALog", LogPlace).FolderCfg(cfg, Written(MovedTo)),
     };
 }
 
