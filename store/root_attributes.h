@@ -41,7 +41,8 @@ const std::vector<RootAttribute>& RootAttributes();
 const RootAttribute* ReadRootAttributes(const AttributeMap& attributes,
                                         HotFolderSettings& settings);
 
-/// The place of the last attribute, "server_name", without which a Folder.cfg counts as not read.
+/// The place of "server_name", the last required attribute: without it, a Folder.cfg counts as not
+/// read.
 constexpr int LastRequiredPlace = 4;
 
 /// The place of "Enable".

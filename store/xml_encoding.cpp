@@ -9,7 +9,7 @@
 namespace
 {
 
-// The encodings that the parser behind wxXmlDocument reads by itself.
+// The encodings that wxXmlDocument's parser reads by itself.
 bool IsBuiltIn(const wxString& encoding)
 {
     static const std::array<const char*, 6> names = {"UTF-8",    "UTF-16",     "UTF-16LE",

@@ -1,5 +1,5 @@
-// What FolderUpgradeCheck says of workstations with one thing amiss. That it names every change, and
-// changes nothing itself, each scenario of a run shows.
+// What FolderUpgradeCheck reports for workstations with one problem. Every scenario shows that it names each change and
+// changes nothing itself.
 #include "tests/check_report.h"
 #include "tests/scenarios/texts.h"
 
@@ -15,15 +15,15 @@ const Text LogFolder = "user/ORX_Installers";
 const char* const NoLinks = "links to files are for this machine only";
 const char* const NoRefusal = "Wine opens a directory for writing, whoever asks";
 
-// A workstation, and all lines of one kind that are said of it ("problem", and no more: there is none).
-// A line that ends in * goes on in the system's own words.
+// A workstation, and all its report lines of one kind ("problem" alone: there is no such line). A line that ends in *
+// continues in the system's own words.
 struct Finding
 {
     Scenario workstation;
     Text lines;
 };
 
-// A run would change nothing here, and there is nothing to say.
+// A run would change nothing here, and there is nothing to report.
 Scenario Done(const Name& name)
 {
     return Scenario(name)
@@ -135,7 +135,7 @@ std::vector<Finding> FolderCfgs()
     };
 }
 
-// What a Folder.cfg that moves loses.
+// What a Folder.cfg loses when its template moves.
 std::vector<Finding> Losses()
 {
     const Text start = "<HotFolder ";

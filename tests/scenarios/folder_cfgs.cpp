@@ -6,7 +6,7 @@ namespace
 
 Text Filter(const Text& content) { return "  <FilterSetting>" + content + "</FilterSetting>\n"; }
 
-// A chain of elements, as the library writes it: one below the other, the levels counted from 1.
+// A chain of nested elements, as the library writes it; levels are counted from 1.
 Text Nested(int levels)
 {
     Text opened;
@@ -20,7 +20,7 @@ Text Nested(int levels)
     return opened + closed + "\n  ";
 }
 
-// The same in one line.
+// The same on one line.
 Text Chain(int levels)
 {
     Text text;
@@ -88,7 +88,7 @@ std::vector<Scenario> FolderCfgs()
     };
 }
 
-// In these encodings only folders with ASCII names can be told apart.
+// In these encodings only folders with ASCII names can be distinguished.
 std::vector<Scenario> Encodings()
 {
     const auto declared = [](const Name& name, const Text& encoding, const Text& folder)

@@ -49,7 +49,7 @@ std::vector<Scenario> Icons()
     };
 }
 
-// The folder of a user who has a Desktop.ini already.
+// A folder that already has a user's Desktop.ini.
 std::vector<Scenario> DesktopInis()
 {
     const Text disabled = IconFile("hf_folder_disabled");

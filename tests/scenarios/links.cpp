@@ -1,4 +1,4 @@
-// Links and pipes where an ordinary user can plant them. What is elsewhere stays as it is.
+// Links and pipes where an ordinary user can plant them. Files elsewhere stay as they are.
 #include "tests/scenarios/texts.h"
 
 namespace
@@ -15,7 +15,7 @@ const Text CannotOpenPreset = "Unable to open preset.xml for read : ";
 
 Text LinkTo(const Text& place) { return "{link:" + place + "}"; }
 
-// A link in that place, to a file or directory of its kind and to nothing.
+// Two links in that place: one to a file or directory, whichever belongs there, and a dangling one.
 std::vector<Scenario> BothLinks(const Scenario& scenario, const Text& place, const Text& target, const Text& text)
 {
     Scenario linked = scenario;
@@ -26,7 +26,7 @@ std::vector<Scenario> BothLinks(const Scenario& scenario, const Text& place, con
     return {linked, dangling};
 }
 
-// What a run without a Folder.cfg does to A, whose icon is there.
+// What a run without a Folder.cfg does to A, whose icon exists.
 Scenario WithIcon(const Name& name)
 {
     return Scenario(name)

@@ -17,7 +17,7 @@ Text Bytes(const Text& name, const Text& type, const Text& bytes)
     return value;
 }
 
-// A hot folder and a preset that would move, and such a value of the key.
+// A hot folder and a preset whose paths would move, and this value in the key.
 Scenario Both(const Name& name, const Text& letter, const Files& hives)
 {
     const Text path = letter == "I" ? MovedFrom : MovedTo;
