@@ -60,9 +60,9 @@ def check_outcome(build):
             outcomes.append(station.outcome())
             unchanged = {os.path.basename(path) for path, state in outcomes[-1].items() if state == before.get(path)}
             if unchanged & {'Folder.cfg', ICON, 'Desktop.ini'}:
-                raise SystemExit(f'the {name} has left something as it was')
+                raise SystemExit(f'the {name} left something unchanged')
         if outcomes[0] != outcomes[1]:
-            raise SystemExit('the tool and the script do not leave the same')
+            raise SystemExit('the tool and the script leave different files')
         cfg, icon = (f'{station.root}/Hot Folders/Jobs 00003/{PRIVATE}/{name}' for name in ('Folder.cfg', ICON))
         os.utime(cfg, (0, 0))
         write(icon, b'')

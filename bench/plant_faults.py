@@ -90,7 +90,7 @@ def plant_all(root, drawn, wanted):
                           stdout=subprocess.DEVNULL)
     subprocess.check_call(build, stdout=subprocess.DEVNULL)
     if not passes(root):
-        sys.exit("without any fault the tests fail")
+        sys.exit("the tests fail without any fault")
     counts = {"found": 0, "SURVIVED": 0, "did not compile": 0}
     for name, number, line, changed in drawn:
         if counts["found"] + counts["SURVIVED"] == wanted:

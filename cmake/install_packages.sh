@@ -30,7 +30,7 @@ for group in "$@"; do
 done
 
 if ! command -v dpkg-query >/dev/null; then
-    echo "Not a Debian system; the counterparts of these packages have to be there: ${wanted[*]}" >&2
+    echo "Not a Debian system. Install the counterparts of these packages: ${wanted[*]}" >&2
     exit 0
 fi
 

@@ -75,7 +75,7 @@ put_icon() {
 set_attributes() {
     local path="$dir/Hot Folders/$1" bits=$2
     [ -d "$path" ] || bits=$((bits & ~1))
-    setfattr -n user.DOSATTRIB -v "$(printf '"0x%x"' "$bits")" "$path" || fail "this file system keeps no attributes: $dir"
+    setfattr -n user.DOSATTRIB -v "$(printf '"0x%x"' "$bits")" "$path" || fail "this file system does not support extended attributes: $dir"
     if [ "$bits" != "$2" ]; then
         chmod a-w "$path"
     fi
@@ -107,7 +107,7 @@ fi
 if [ -e "$dir/$marker" ]; then
     fail "already created (--fresh creates it again): $dir"
 elif [ -e "$dir" ] && { [ ! -d "$dir" ] || [ -n "$(ls -A -- "$dir")" ]; }; then
-    fail "there is something else already: $dir"
+    fail "already exists, but is not a sample workstation: $dir"
 fi
 
 mkdir -p -- "$dir"

@@ -12,8 +12,8 @@ const Text Icon = "hot/A/[P]/hf_folder.ico";
 const Text Ini = "hot/A/Desktop.ini";
 const Text Jobs = "user/ORX/JPData";
 const Text LogFolder = "user/ORX_Installers";
-const char* const NoLinks = "links to files are for this machine only";
-const char* const NoRefusal = "Wine opens a directory for writing, whoever asks";
+const char* const NoLinks = "Wine does not show links to files as links";
+const char* const NoRefusal = "Wine lets every user open a directory for writing";
 
 // A workstation, and all its report lines of one kind ("problem" alone: there is no such line). A line that ends in *
 // continues in the system's own words.

@@ -79,7 +79,7 @@ Files Expected(const Workstation& workstation, const Files& before, const Scenar
         const std::string owner = entry->first.substr(0, entry->first.size() - 1);
         const bool isAttributes = entry->first.back() == '#';
         if (isAttributes && expected.count(owner) + expected.count(owner + "/") == 0)
-            ADD_FAILURE() << entry->first << " has the attributes of nothing";
+            ADD_FAILURE() << entry->first << " has attributes, but does not exist";
         entry = isAttributes && entry->second.empty() ? expected.erase(entry) : std::next(entry);
     }
     return expected;

@@ -144,7 +144,7 @@ fs::path Workstation::HostPath(const std::string& place) const
     const size_t slash = place.find('/');
     const auto top = m_hostDirs.find(place.substr(0, slash));
     if (slash == std::string::npos || slash + 1 == place.size() || top == m_hostDirs.end())
-        throw std::runtime_error("\"" + place + "\" is no place on the workstation");
+        throw std::runtime_error("\"" + place + "\" is not a place on the workstation");
     std::string rest = place.substr(slash + 1);
     ReplaceAll(rest, "[P]", "[_ORX_HotFolder_]");
     return top->second / rest;

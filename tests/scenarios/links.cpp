@@ -4,8 +4,8 @@
 namespace
 {
 
-const char* const WineFollowsLinks = "Wine shows no links to files, and no dangling ones";
-const char* const NoPipes = "there are no pipes among Windows files";
+const char* const WineFollowsLinks = "Wine shows neither links to files nor dangling ones as links";
+const char* const NoPipes = "Windows has no pipes among files";
 
 const Text LogDir = "user/ORX_Installers";
 const Text PresetDir = "user/ORX/JPData/.P/Presets";
