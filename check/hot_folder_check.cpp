@@ -106,7 +106,10 @@ void CheckDesktopIni(const PinnedDirectory& directory, const wxString& iconName,
         CheckAttributes("Desktop.ini", path, ReadOnlyAndSystem, report);
     }
     else if (wxFileName::Exists(path))
+    {
         report.Problem("Desktop.ini: is not a file");
+        CheckAttributes("Desktop.ini", path, ReadOnlyAndSystem, report);
+    }
     else if (isCustomised && MayCreateIn(directory.Reach(L"")))
         report.Change("Desktop.ini: new");
     else if (isCustomised)

@@ -2,8 +2,6 @@
 
 #include <wx/log.h>
 
-#include <memory>
-
 namespace
 {
 
@@ -26,8 +24,8 @@ class Keeper : public wxLog
 
 void KeepLibraryErrors()
 {
-    delete wxLog::SetActiveTarget(
-        std::make_unique<Keeper>().release()); // from here on owned by the library
+    // From here on owned by the library. NOLINTNEXTLINE(clang-analyzer-cplusplus.NewDeleteLeaks)
+    delete wxLog::SetActiveTarget(new Keeper);
 }
 
 wxString TakeLibraryErrors()

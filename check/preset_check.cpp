@@ -130,10 +130,13 @@ void CheckPresets(const TemplateFolders& folders, Report& report)
         report.Problem(root + " " + obstacle);
     else if (!errors.empty())
         report.Problem(root + ": " + errors);
+    else if (isThere && !wxFileName::IsDirReadable(root))
+        report.Problem(root + " cannot be listed");
     bool hasPresets = false;
     for (const wxString& directory : directories)
         hasPresets = CheckDirectory(directory, root, folders, report) || hasPresets;
-    if (!hasPresets && errors.empty() && obstacle.empty())
+    if (!hasPresets && errors.empty() && obstacle.empty() &&
+        (!isThere || wxFileName::IsDirReadable(root)))
         report.Note(isThere ? "there are no presets in " + root
                             : "there are no presets, because there is no folder " + root);
 }

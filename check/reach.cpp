@@ -32,5 +32,12 @@ wxString WhyOutOfReach(const wxString& directory)
         return {};
     if (RefusesLinksOfOthers() && LeadsOverLink(directory))
         return "is reached over a link that an elevated run refuses to follow";
-    return wxDirExists(directory) ? "cannot be entered" : "";
+    // A directory above it may keep it from being seen.
+    wxFileName above = wxFileName::DirName(directory);
+    while (above.GetDirCount() > 0 && !wxDirExists(above.GetPath(wxPATH_GET_VOLUME)))
+        above.RemoveLastDir();
+    if (above.GetDirCount() == 0 ||
+        MayEnter(PinnedDirectory(above.GetPath(wxPATH_GET_VOLUME), Links::Follow)))
+        return {};
+    return "cannot be entered";
 }

@@ -59,7 +59,12 @@ bool Report::End()
     Write("");
     Write(Count(m_counts[Changes], "change") + ", " + Count(m_counts[Problems], "problem") + ", " +
           Count(m_counts[Notes], "note"));
-    return (!m_toFile || !m_file.IsOpened() || m_file.Close()) && m_isWritten;
+    if (m_file.IsOpened() && !m_file.Close())
+    {
+        m_file.Detach(); // or the library closes it again
+        m_isWritten = false;
+    }
+    return m_isWritten;
 }
 
 size_t Report::GetProblems() const

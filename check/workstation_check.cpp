@@ -40,6 +40,9 @@ void CheckHotFolderList(const HotFolderList& list, Report& report)
     case XmlFile::State::Missing:
         if (!obstacle.empty())
             report.Problem("HotFolderList.cfg: its folder " + obstacle);
+        else if (wxFileName::Exists(GetHotFolderListPath(),
+                                    wxFILE_EXISTS_ANY | wxFILE_EXISTS_NO_FOLLOW))
+            report.Problem("HotFolderList.cfg: is not a file");
         else
             report.Note("there is no HotFolderList.cfg");
         break;

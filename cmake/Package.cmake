@@ -15,14 +15,13 @@ endif()
 # osslsigncode writes to another file, so it needs a script:
 #
 #     #!/bin/sh -e
-#     osslsigncode sign -pkcs12 key.p12 -pass "$PASSWORD" -h sha256 -n FolderUpgrade -in "$1" -out "$1.signed"
+#     osslsigncode sign -key key.pem -certs certificate.pem -h sha256 -in "$1" -out "$1.signed"
 #     mv "$1.signed" "$1"
 #
 # and this makes a certificate for trials:
 #
 #     openssl req -x509 -newkey rsa:2048 -nodes -days 30 -subj /CN=Trial -addext extendedKeyUsage=codeSigning \
 #         -keyout key.pem -out certificate.pem
-#     openssl pkcs12 -export -inkey key.pem -in certificate.pem -passout "pass:$PASSWORD" -out key.p12
 #
 # The programs in the build folder and their symbol files stay as they are. Add a time stamp (signtool /tr, osslsigncode
 # -ts), or the signature expires with the certificate. Whoever builds an installer signs it with the same command.

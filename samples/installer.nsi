@@ -61,6 +61,7 @@ UninstPage instfiles
     !insertmacro START FolderUpgradeCheck.exe '${switch} "${REPORTS}-before.txt"'
     !insertmacro START FolderUpgrade.exe ${switch}
     !insertmacro START FolderUpgradeCheck.exe '${switch} "${REPORTS}-after.txt"'
+    ; An elevated setup writes to a folder in which the user may have planted links; the check and CopyFiles follow them.
     CopyFiles /SILENT "$APPDATA\ORX_Installers\UpgradeDowngrade.log" "${REPORTS}.log"
     !undef REPORTS
 !macroend
@@ -78,7 +79,6 @@ Section
     File "${PACKAGE}/hf_*.ico" ; this version's, which an upgrade copies
 
     WriteRegStr HKLM "${KEY}" "InstallPath" "$INSTDIR" ; NSIS has removed a final separator; the tool adds "\template"
-    WriteRegStr HKLM "${KEY}" "Version" "${VERSION}"
     WriteUninstaller "$INSTDIR\uninstall.exe"
     WriteRegStr HKLM "${UNINSTALL_KEY}" "DisplayName" "Hot folder client"
     WriteRegStr HKLM "${UNINSTALL_KEY}" "DisplayVersion" "${VERSION}"
@@ -87,6 +87,7 @@ Section
     ${If} $1 != "${VERSION}"
         !insertmacro MIGRATE I upgrade
     ${EndIf}
+    WriteRegStr HKLM "${KEY}" "Version" "${VERSION}" ; last: if the setup is ended before this, it migrates when it is started again
 SectionEnd
 
 Section Uninstall

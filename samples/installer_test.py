@@ -3,8 +3,7 @@
 
     samples/installer_test.py BUILD_DIR
 
-BUILD_DIR is the build folder of the preset "windows". Its package is made again, unsigned at the end. Wine gets a prefix
-and a display of its own. On the workstation are two hot folders, one whose template moves, and a job preset.
+BUILD_DIR is the build folder of the preset "windows". Wine gets its own prefix and display. On the workstation are two hot folders, one whose template moves, and a job preset.
 """
 import functools
 import os
@@ -54,10 +53,10 @@ def files_below(folder):
 
 # Package ------------------------------------------------------------------------------------------
 
-def pack(build, sign):
-    run("cmake", f"-DFOLDER_UPGRADE_SIGN_COMMAND={sign}", build)
-    run("cmake", "--build", build, "--target", "package")
-    (package,) = build.glob("FolderUpgrade-*-win64.zip")
+def pack(build, scratch, sign):
+    """Makes the package apart from that of the build folder, whose settings stay as they are."""
+    run("cpack", "--config", build / "CPackConfig.cmake", "-D", f"CPACK_FOLDER_UPGRADE_SIGN_COMMAND={sign}", "-B", scratch / "packing")
+    (package,) = (scratch / "packing").glob("FolderUpgrade-*-win64.zip")
     return package.read_bytes()
 
 
@@ -74,9 +73,9 @@ def try_signing(build, scratch):
         "extendedKeyUsage=codeSigning", "-keyout", scratch / "key", "-out", scratch / "cert")
     (scratch / "sign").write_text(SIGN.format(scratch))
     (scratch / "sign").chmod(0o755)
-    unsigned = pack(build, "")
-    signed = pack(build, scratch / "sign")
-    check("without a command two packages are the same", pack(build, "") == unsigned, True)
+    unsigned = pack(build, scratch, "")
+    signed = pack(build, scratch, scratch / "sign")
+    check("without a command two packages are identical", pack(build, scratch, "") == unsigned, True)
     unpack(unsigned, scratch / "package")
     unpack(signed, scratch / "signed package")
     for program in PROGRAMS:

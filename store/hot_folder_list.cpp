@@ -46,7 +46,9 @@ wxString ReadPath(const wxXmlNode& element)
     return path.Trim();
 }
 
-wxString GetListPath()
+} // namespace
+
+wxString GetHotFolderListPath()
 {
     wxFileName file;
     file.AssignDir(GetHotFolderDataDir());
@@ -54,8 +56,6 @@ wxString GetListPath()
     file.SetExt(ListExtension);
     return file.GetFullPath();
 }
-
-} // namespace
 
 wxString GetHotFolderDataDir()
 {
@@ -69,7 +69,7 @@ HotFolderList LoadHotFolderList()
 {
     HotFolderList list;
     XmlFile file;
-    const wxString path = GetListPath();
+    const wxString path = GetHotFolderListPath();
     list.state = file.Load(path, Links::Follow, path);
     if (list.state != XmlFile::State::Loaded)
         return list;

@@ -6,6 +6,9 @@
 #include <wx/arrstr.h>
 #include <wx/string.h>
 
+/// The list's path.
+wxString GetHotFolderListPath();
+
 /// The folder of the list: "hotfolder" in the machine-wide application data folder, with a final
 /// separator.
 wxString GetHotFolderDataDir();
