@@ -4,7 +4,7 @@
 #
 #     ./run.sh [--fresh] [I|U] [V]
 #
-#     --fresh  lay the sample workstation out anew first; otherwise it stays as the last run left it
+#     --fresh  first creates the sample workstation again; otherwise it stays as the last run left it
 #     I        upgrade (the default)
 #     U        downgrade; after an upgrade it shows the way back
 #     V        without the run log
@@ -23,7 +23,7 @@ usage() {
     exit 2
 }
 
-# Shows the output of a command only when it fails.
+# Shows the output of a command only if it fails.
 quietly() {
     "$@" >"$scratch/output" 2>&1 || { cat "$scratch/output" >&2; exit 1; }
 }
@@ -46,7 +46,7 @@ attributes() {
     echo "${names:--}"
 }
 
-# The texts name many paths on the workstation; its own is left out of them.
+# The texts have many paths on the workstation; their common beginning is shortened.
 shorten() {
     local text
     while IFS= read -r text; do
@@ -67,7 +67,7 @@ check() {
     esac
 }
 
-# Everything on the workstation but the run log, which is shown apart.
+# Everything on the workstation except the run log, which is shown separately.
 list() {
     find "$workstation" -mindepth 1 ! -path "$log" -printf '%P\n' | LC_ALL=C sort
 }
@@ -146,7 +146,7 @@ echo "== FolderUpgrade $switch${verbosity[0]+ ${verbosity[0]}}"
 status=0
 on_workstation "$programs/FolderUpgrade" "$switch" ${verbosity[@]+"${verbosity[@]}"} || status=$?
 if [ $status != $finished ]; then
-    echo "Exit status $status, not $finished: it did not run to its end." >&2
+    echo "Exit status $status, not $finished: it did not finish." >&2
     exit 1
 fi
 echo "Exit status $status (that is -1), as on every run"

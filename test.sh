@@ -1,8 +1,8 @@
 #!/usr/bin/env bash
-# Installs what the tests need, builds and runs them, and closes with their count.
+# Installs what the tests need, builds and runs them, and ends with their count.
 #
 #     ./test.sh             every test of this machine's program, with the sanitizers, fuzzing, faults and checks
-#     ./test.sh windows     the same table of scenarios against the Windows program, under Wine
+#     ./test.sh windows     the same scenarios with the Windows programs, under Wine
 #     ./test.sh coverage    the lines of the program that the tests run
 #     ./test.sh checks      format and static checks alone
 set -euo pipefail
@@ -36,7 +36,7 @@ build() {
 }
 
 # Reads what CTest wrote about its tests: prints the skipped ones and the line 'N passed, N failed, N skipped'. A test
-# whose own output closes with such a line is as many as that says.
+# whose own output ends with such a line counts as many times as the line says.
 count() {
     awk '
         /<testcase / { status = $0; sub(/.* status="/, "", status); sub(/".*/, "", status); own = "" }
@@ -88,7 +88,7 @@ windows() {
     run_tests windows
 }
 
-# The counters go where the runs of another user can write them, too.
+# The counters are put where runs as another user can also write them.
 coverage() {
     local counters file
     cmake/install_packages.sh build test coverage

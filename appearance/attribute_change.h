@@ -5,9 +5,9 @@
 
 #include <wx/string.h>
 
-/// The two attributes by which Explorer recognises what it is to treat specially.
+/// The two attributes by which Explorer recognises a customised folder or file.
 constexpr DWORD ReadOnlyAndSystem = FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_SYSTEM;
 
-/// Adds and removes attributes with GetFileAttributesW and SetFileAttributesW. Nothing is written
-/// when the attributes cannot be read, or are right already. False when one of the two calls fails.
+/// Adds and removes attributes with GetFileAttributesW and SetFileAttributesW. Writes nothing if
+/// the attributes cannot be read or are already right. Returns false if either call fails.
 bool ChangeAttributes(const wxString& path, DWORD add, DWORD remove);

@@ -17,7 +17,7 @@ const wchar_t* const IconIndexValue = L"00";
 const wchar_t* const HotFolderInfoTip = L"This folder has been configured as an ORX hot folder.";
 const wchar_t* const DefaultIconFile = L"00";
 
-constexpr DWORD IconFileCapacity = 200; // characters, the terminating NUL included
+constexpr DWORD IconFileCapacity = 200; // characters, including the terminating NUL
 
 void WriteKeys(const wxString& path, const std::vector<DesktopIniKey>& keys)
 {
@@ -59,8 +59,8 @@ bool CreateDesktopIni(const PinnedDirectory& directory, const wxString& iconName
 {
     if (!directory.IsOpen())
         return false;
-    // The profile functions would create it through a link, too. While the file is open for
-    // reading, no link can take its place.
+    // The profile functions would also create the file through a link. While it is open for
+    // reading, no link can replace it.
     const wxString path = directory.Reach(DesktopIniName);
     RegularFile ini;
     if (ini.CreateNew(path) == RegularFile::Status::Open &&
@@ -75,11 +75,11 @@ bool RefreshDesktopIni(const PinnedDirectory& directory, const wxString& hotFold
     if (!directory.IsOpen())
         return false;
     const wxString path = directory.Reach(DesktopIniName);
-    RegularFile ini; // as above; what cannot be read, the profile functions cannot write
+    RegularFile ini; // as above; the profile functions cannot write what cannot be read
     if (ini.OpenForReading(path, Links::Refuse) != RegularFile::Status::Open)
         return true;
-    // Both bits go, also when only one is there: with the other bit set instead the writes that
-    // follow would fail, and the icon that the user chose would be overwritten with a default.
+    // Both bits are removed even if only one is set. If one stayed, the writes that follow would
+    // fail, and the icon that the user chose would be overwritten with a default.
     ChangeAttributes(path, 0, ReadOnlyAndSystem);
     WriteKeys(path, DesktopIniKeys(true, iconName));
 

@@ -19,7 +19,7 @@
 namespace
 {
 
-// The path by which people and the shell know it.
+// The path to show to people and to give to the shell.
 wxString IniPath(const wxString& hotFolder)
 {
     wxFileName ini;
@@ -31,7 +31,7 @@ wxString IniPath(const wxString& hotFolder)
 void TellShell(const wxString& iniPath)
 {
     SHChangeNotify(SHCNE_ATTRIBUTES, SHCNF_PATHW | SHCNF_FLUSH, iniPath.wc_str(), nullptr);
-    // Cleared, so that a failed call leaves the index of an icon and not chance.
+    // Cleared, so that the index is defined even if the call fails.
     SHFILEINFOW info = {};
     SHGetFileInfoW(iniPath.wc_str(), 0, &info, sizeof info, SHGFI_SYSICONINDEX);
     const auto* const image = reinterpret_cast<const void*>(static_cast<std::intptr_t>(info.iIcon));

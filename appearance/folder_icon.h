@@ -5,14 +5,14 @@
 
 #include <wx/string.h>
 
-/// Copies the icon for the folder's state over the one of that name in its private directory, and
-/// refreshes Desktop.ini, attributes and Explorer. An upgrade takes the icon from the executable's
-/// directory, a downgrade from the bundle icons directory in it. Where either icon is missing
-/// nothing changes. Reports to the run log only; a failed copy is not noticed.
+/// Copies the icon for the folder's state over the icon of the same name in its private directory,
+/// and refreshes Desktop.ini, attributes and Explorer. An upgrade takes the icon from the
+/// executable's directory, a downgrade from the bundle icons directory in it. If either icon is
+/// missing, nothing changes. Reports to the run log only; a failed copy is not reported.
 void UpdateFolderIcon(const FolderUpgradeApp& app, const wxString& hotFolder);
 
 /// Writes or refreshes the folder's Desktop.ini, makes the folder a system folder that is not
-/// read-only, tells the shell, and makes Desktop.ini read-only and system. Before shell version
-/// 4.72 only the last of these. Returns the success flag of the last attribute write; nothing else
-/// is reported.
+/// read-only, notifies the shell, and makes Desktop.ini read-only and system. Before shell version
+/// 4.72 it does only the last of these. Returns the success flag of the last attribute write;
+/// nothing else is reported.
 bool ApplyFolderIcon(const wxString& hotFolder, const wxString& iconName);

@@ -22,8 +22,9 @@ bool IsEnabled(const PinnedHotFolder& folder, const wxString& hotFolder)
     return settings.Enable;
 }
 
-// The library reports a directory that it cannot open, so that is asked first; and before that
-// whether the file is there at all, which is quicker than a look through the directory.
+// The library reports an error for a directory that it cannot open, so that is checked first.
+// Before that it is checked whether the file exists at all, which is quicker than listing the
+// directory.
 bool HasError(const PinnedHotFolder& folder)
 {
     const wxString path = folder.privateDir.Reach(L"");

@@ -13,12 +13,12 @@ enum class FolderIconState
     ErrorInactive = 4
 };
 
-/// Gives the file name, without a directory, of the icon for the folder's present state: whether
-/// its Folder.cfg enables it, and whether its private directory holds a file "Error.er". A folder
-/// whose Folder.cfg cannot be read is not enabled; one whose private directory is missing or cannot
-/// be listed is not in error. Changes and logs nothing; returns true.
+/// Gives the file name, without a directory, of the icon for the folder's current state, which
+/// depends on whether its Folder.cfg enables it and whether its private directory holds a file
+/// "Error.er". A folder whose Folder.cfg cannot be read is not enabled; one whose private directory
+/// is missing or cannot be listed is not in error. Changes and logs nothing; returns true.
 bool GetFolderIconName(const wxString& hotFolder, wxString& iconName);
 
-/// The same for a hot folder that is pinned; people know it by the path.
+/// The same for a pinned hot folder; its path is for messages.
 bool GetFolderIconName(const PinnedHotFolder& folder, const wxString& hotFolder,
                        wxString& iconName);

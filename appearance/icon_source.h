@@ -7,5 +7,5 @@
 constexpr const wchar_t* BundleIconsDirName = L"BundleIcons";
 
 /// The full path of the icon: an upgrade takes it from the executable's directory, a downgrade from
-/// the bundle icons directory in it. Whether it is there is not asked.
+/// the bundle icons directory in it. Does not check that it exists.
 wxString SourceIconPath(const wxString& iconName, bool isUpgrade, const wxString& bundleIconsDir);

@@ -13,7 +13,7 @@ std::uint32_t GetPackedShellVersion()
     {
         DLLVERSIONINFO version = {};
         version.cbSize = sizeof version;
-        // By way of void*, since the two types of function have nothing in common.
+        // By way of void*, since the two function types are unrelated.
         const auto getVersion = reinterpret_cast<DLLGETVERSIONPROC>(reinterpret_cast<void*>(entry));
         if (SUCCEEDED(getVersion(&version)))
             packed = (version.dwMajorVersion & 0xFFFF) << 16 | (version.dwMinorVersion & 0xFFFF);

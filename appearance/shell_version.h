@@ -7,5 +7,5 @@
 constexpr std::uint32_t CustomFolderVersion = 0x00040048;
 
 /// The version of shell32.dll (DllGetVersion), major in the upper 16 bits and minor in the lower; 0
-/// when it cannot be found out.
+/// if it cannot be determined.
 std::uint32_t GetPackedShellVersion();

@@ -1,10 +1,11 @@
 #!/usr/bin/python3
-"""The same upgrade the way an administrator would write it today: one load of each Folder.cfg, with lxml.
+"""The same upgrade as an administrator would script it today: it loads each Folder.cfg once, with lxml.
 
     administrator.py LIST ICON_DIR OLD NEW PRESET_DIR
 
 LIST is HotFolderList.cfg; template paths move from the folder OLD to the folder NEW, in the hot folders and in the
-presets below PRESET_DIR. Like the tool it waits for the disk after each rewrite. It keeps no log and asks no registry.
+presets below PRESET_DIR. Like the tool it waits for the disk after each rewrite. It keeps no log and does not read the
+registry.
 """
 import glob
 import os

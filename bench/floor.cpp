@@ -1,10 +1,9 @@
-// The floor: what a run cannot do without, done by the library's calls and nothing else.
+// The floor: the work that no run can avoid, done with the library's calls and nothing else.
 //
-//     floor FOLDERS ICON        three loads of each Folder.cfg, one save to memory, one write and
-//     its
-//                               wait for the disk, and a copy of the icon over the folder's own;
-//                               FOLDERS is a file that names a hot folder a line
-//     floor PRESET FROM TO      the read of a preset file, one replacement, and the write
+//     floor FOLDERS ICON        loads each Folder.cfg three times, saves it to memory once, writes
+//                               it once and waits for the disk, and copies the icon over the
+//                               folder's own; FOLDERS is a file with one hot folder on each line
+//     floor PRESET FROM TO      reads a preset file, replaces once, and writes it
 #include <wx/convauto.h>
 #include <wx/ffile.h>
 #include <wx/file.h>
@@ -23,7 +22,7 @@ constexpr int LoadsPerFolder = 3;
 
 constexpr int IndentationStep = 2;
 
-// The file has to have been written by the library before: then the new bytes are as many.
+// The library must have written the file before, so that the number of bytes stays the same.
 bool Rewrite(const wxString& path, const wxXmlDocument& document)
 {
     wxMemoryOutputStream text;

@@ -4,7 +4,7 @@
     bench/measure.py native|once|windows BUILD OLD_TOOL PICTURE [COUNT...]
 
 BUILD is a build with the benchmarks, OLD_TOOL a program to compare with or empty, PICTURE an SVG file to write. Each
-figure is the least of several rounds, in which the programs take turns.
+figure is the minimum of several rounds, in which the programs take turns.
 """
 import contextlib
 import os
@@ -22,7 +22,7 @@ TMPFS, DISK = '/dev/shm', None  # None: the temporary folder
 COUNTS = {'native': [10, 100, 1000, 10000], 'once': [10], 'windows': [10, 100, 1000]}
 MOST_ON_DISK = 1000
 FOLDERS_IN_ALL_ROUNDS, MOST_ROUNDS, FEWEST_ROUNDS = 7000, 30, 3
-ROUNDS_UNDER_WINE = 3  # where a run takes far longer
+ROUNDS_UNDER_WINE = 3  # where a run takes much longer
 
 
 @contextlib.contextmanager
@@ -37,7 +37,7 @@ def workstation(where, kind, *arguments):
 
 
 def measure(station, count, names, rounds=None):
-    """The least seconds of each program. All but the floor move the templates, which then move back."""
+    """The minimum time of each program in seconds. All but the floor move the templates, which are then moved back."""
     times = dict.fromkeys(names, float('inf'))
     for _ in range(rounds or min(max(FOLDERS_IN_ALL_ROUNDS // count, FEWEST_ROUNDS), MOST_ROUNDS)):
         for name in names:
@@ -48,7 +48,7 @@ def measure(station, count, names, rounds=None):
 
 
 def check_outcome(build):
-    """The tool and the script have to change everything, and to the same; the floor has to do its work."""
+    """Checks that the tool and the script change everything, in the same way, and that the floor does its work."""
     outcomes = []
     with tempfile.TemporaryDirectory(prefix='bench ', dir=TMPFS) as root:
         station = Workstation(f'{root}/same')
@@ -60,9 +60,9 @@ def check_outcome(build):
             outcomes.append(station.outcome())
             unchanged = {os.path.basename(path) for path, state in outcomes[-1].items() if state == before.get(path)}
             if unchanged & {'Folder.cfg', ICON, 'Desktop.ini'}:
-                raise SystemExit(f'the {name} has left something as it was')
+                raise SystemExit(f'the {name} left something unchanged')
         if outcomes[0] != outcomes[1]:
-            raise SystemExit('the tool and the script do not leave the same')
+            raise SystemExit('the tool and the script leave different files')
         cfg, icon = (f'{station.root}/Hot Folders/Jobs 00003/{PRIVATE}/{name}' for name in ('Folder.cfg', ICON))
         os.utime(cfg, (0, 0))
         write(icon, b'')
@@ -72,7 +72,7 @@ def check_outcome(build):
 
 
 def wait_cost():
-    """The median seconds that a wait for the disk takes after a write of the size of a Folder.cfg."""
+    """The median time in seconds of a wait for the disk after writing as much as a Folder.cfg."""
     costs = []
     with tempfile.NamedTemporaryFile(dir=DISK) as file:
         for _ in range(51):
@@ -84,7 +84,7 @@ def wait_cost():
 
 
 def find_crossing(build, results):
-    """The number of folders from which on the script is quicker, by halving; infinite when it never is."""
+    """The number of folders from which the script is quicker, found by bisection; infinite if it never is."""
     quicker = [now['count'] for now in results if now['script'] < now['tool']]
     if not quicker:
         return float('inf')
@@ -110,7 +110,7 @@ def print_table(titles, rows):
 
 
 def print_runs(results, ratios):
-    """The tool's times, and for each of the ratios the other program's and the tool's over it."""
+    """The tool's times; and for each ratio the other program's time, and the tool's divided by it."""
     titles = ['Folders', 'Tool, log off (ms)', 'per folder (ms)']
     for title in ratios.values():
         titles += [f'{title} (ms)', 'log on / off' if title == 'Tool, log on' else f'tool / {title}']

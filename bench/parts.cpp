@@ -1,5 +1,5 @@
-// Times the parts of a run with Google Benchmark, on a tmpfs: a wait for the disk costs nothing
-// there.
+// Measures the parts of a run with Google Benchmark, on a tmpfs, where waiting for the disk costs
+// nothing.
 #include "appearance/folder_icon.h"
 #include "migrate/preset_text.h"
 #include "run/run_log.h"
@@ -23,8 +23,8 @@ constexpr size_t PresetBytes = size_t{4} * 1024 * 1024;
 const char* const OldTemplates = "/srv/old/Templates";
 const char* const NewTemplates = "/srv/imposition/new/template";
 
-fs::path
-    root; // a folder of this process, which is the user's application data folder and a hot folder
+// A folder of this process, used as the user's application data folder and as a hot folder.
+fs::path root;
 
 wxString CfgPath(const char* name)
 {
@@ -44,7 +44,7 @@ void LoadCfg(benchmark::State& state)
 }
 BENCHMARK(LoadCfg)->Unit(benchmark::kMicrosecond);
 
-// So many job settings; the sample has about 30.
+// With this many job settings; the sample has about 30.
 void SaveCfg(benchmark::State& state)
 {
     JobSettingTable table;
@@ -57,7 +57,8 @@ void SaveCfg(benchmark::State& state)
 }
 BENCHMARK(SaveCfg)->Arg(30)->Arg(10000)->Unit(benchmark::kMicrosecond);
 
-// A template path every so many lines, or none; forth and back, so that each call finds as many.
+// A template path every this many lines, or none. Moves forth and back, so that each call finds the
+// same number.
 void MovePaths(benchmark::State& state)
 {
     const wxString path =
@@ -80,7 +81,7 @@ void MovePaths(benchmark::State& state)
 }
 BENCHMARK(MovePaths)->Arg(0)->Arg(4)->Unit(benchmark::kMillisecond);
 
-// Into a log that grows with every call.
+// Writes to a log that grows with every call.
 void LogLine(benchmark::State& state)
 {
     for (auto _ : state)

@@ -3,7 +3,7 @@
 
     bench/plant_faults.py [NUMBER [SEED]]
 
-In place of a fault that does not compile another one is drawn. The same seed gives the same faults, as
+A fault that does not compile is replaced by another one. The same seed gives the same faults, as
 long as the sources are the same. A survivor is either a missing test or a fault that changes nothing.
 """
 import os
@@ -23,7 +23,7 @@ TIME_LIMIT = 120  # seconds for all tests of one fault
 STRING = r'"(?:[^"\\]|\\.)*"'
 NEXT = {"true": "false", "==": "!=", "&&": "||", "<": "<=", ">": ">=", "+": "-", "++": "--", "&": "|"}
 NEXT.update({value: key for key, value in NEXT.items()})
-# What is looked for in a line of code, and what it becomes.
+# What to look for in a line of code, and what to replace it with.
 RULES = (
     (r"\b(?:true|false)\b| (?:==|!=|&&|\|\||<=?|>=?|[+&|-]) |\+\+|--", lambda m: re.sub(r"\S+", lambda sign: NEXT[sign[0]], m[0])),
     (r"(?<=\bif \().+(?=\)$)|(?<=\bwhile \().+(?=\)$)", lambda m: f"!({m[0]})"),
@@ -36,7 +36,7 @@ RULES = (
 
 
 def run(command, **options):
-    """Whether the command succeeds; everything that it started is gone afterwards."""
+    """Whether the command succeeds. Afterwards everything that it started has ended."""
     process = subprocess.Popen(command, stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL, start_new_session=True, **options)
     try:
         return process.wait(TIME_LIMIT) == 0
@@ -90,7 +90,7 @@ def plant_all(root, drawn, wanted):
                           stdout=subprocess.DEVNULL)
     subprocess.check_call(build, stdout=subprocess.DEVNULL)
     if not passes(root):
-        sys.exit("without any fault the tests fail")
+        sys.exit("the tests fail without any fault")
     counts = {"found": 0, "SURVIVED": 0, "did not compile": 0}
     for name, number, line, changed in drawn:
         if counts["found"] + counts["SURVIVED"] == wanted:

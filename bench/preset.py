@@ -1,4 +1,4 @@
-"""The migration of one preset file of 64 MiB, beside the library's read, one replacement and write of it."""
+"""The migration of a preset file of 64 MiB, compared with the library's reading, one replacement and writing."""
 import os
 import time
 
@@ -15,7 +15,7 @@ HIVE = 'Windows Registry Editor Version 5.00\n\n[HKEY_{}]\n"{}"="{}"\n'
 
 
 def run(command, env, preset, text):
-    """The seconds of a run, and its bytes of memory for each byte of the file."""
+    """The seconds that a run takes, and its bytes of memory for each byte of the file."""
     write(preset, text)
     start = time.perf_counter()
     _, _, usage = os.wait4(os.spawnve(os.P_NOWAIT, command[0], command, env), 0)
@@ -27,9 +27,9 @@ def run(command, env, preset, text):
 
 
 def measure(build, root):
-    """Each text's name, and of the tool and the floor the least seconds and the most memory.
+    """Each text's name, and the minimum time and maximum memory of the tool and of the floor.
 
-    The paths grow as they move, which is what takes the most memory.
+    The paths get longer when they move, which takes the most memory.
     """
     write(f'{root}/user/registry/HKEY_CURRENT_USER.reg', HIVE.format('CURRENT_USER\\SOFTWARE\\HF', 'Path', '/old').encode())
     write(f'{root}/machine/registry/HKEY_LOCAL_MACHINE.reg',

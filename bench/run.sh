@@ -5,15 +5,15 @@
 #                                        folders or the given counts, a large preset, the parts; a quarter of an hour
 #     bench/run.sh windows [COUNT...]    whole runs of the Windows program under Wine, over 10, 100 and 1,000
 #
-# On Debian 12 it first installs what it needs. The tables are kept in build/bench/results.md and windows.md, the picture
-# in build/bench/results.svg. The machine should have nothing else to do, and /dev/shm room for 1 GB.
+# On Debian 12 it first installs what it needs. The tables are kept in build/bench/results.md and windows.md, the
+# picture in build/bench/results.svg. The machine should have nothing else to do, and /dev/shm needs 1 GB of free space.
 set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")/.."
 
 build=build/bench
 compared=b6c3480
 
-# Shows the output of a command only when it fails.
+# Shows the output of a command only if it fails.
 quietly() {
     "$@" >"$build/build.log" 2>&1 || { cat "$build/build.log" >&2; exit 1; }
 }

@@ -1,4 +1,4 @@
-"""A workstation with any number of hot folders, whose templates an upgrade moves, and the programs that run on it."""
+"""A workstation with any number of hot folders whose templates an upgrade moves, and the programs that run on it."""
 import glob
 import os
 import shutil
@@ -27,9 +27,9 @@ def write(path, content):
 
 
 class Workstation:
-    """Below root, on this machine: each hot folder is a copy of the sample's, with an icon of 60 KB.
+    """On this machine, below root: each hot folder is a copy of the sample's, with an icon of 60 KB.
 
-    Each program is a method that gives the seconds it took, the start of its process included.
+    Each program is a method that returns the seconds it took, including the start of its process.
     """
     separator, executable, hive_encoding, is_quiet = '/', '', 'utf-8', True
 
@@ -84,7 +84,7 @@ class Workstation:
         write(f'{folder}/Desktop.ini', STALE_INI.encode())
 
     def run(self, *command, status=0):
-        with tempfile.TemporaryFile() as errors:  # no pipe, which Wine's services would keep open
+        with tempfile.TemporaryFile() as errors:  # not a pipe, because Wine's services would keep it open
             start = time.perf_counter()
             found = subprocess.run(command, env=self.environment, stdout=errors, stderr=errors, check=False).returncode
             elapsed = time.perf_counter() - start
@@ -118,12 +118,12 @@ class Workstation:
                         self.seen('Program Files', 'Vantorix', 'QZA', 'template'), f'{self.user}/ORX/JPData')
 
     def outcome(self):
-        """What a run leaves of each file and folder: the content, the attributes and the mode."""
+        """The state of each file and folder after a run: content, attributes and mode."""
         found = {}
         for path in (path for place in ('Hot Folders', 'user/ORX') for path in
                      glob.glob(f'{self.root}/{place}/**', recursive=True)):
             content = None
-            if path.endswith('/Folder.cfg'):  # as a canonical document: quotes and the like are the writer's own
+            if path.endswith('/Folder.cfg'):  # canonical, because the programs' quotes and the like differ
                 content = etree.tostring(etree.parse(path), method='c14n')
             elif os.path.isfile(path):
                 with open(path, 'rb') as file:
@@ -137,7 +137,7 @@ class Workstation:
 
 
 class WineWorkstation(Workstation):
-    """In a prefix of Wine's, whose drive C: is root for the programs."""
+    """In a Wine prefix whose drive C: is the root for the programs."""
     separator, executable, hive_encoding, is_quiet = '\\', '.exe', 'utf-16', False
     wine, server = '/usr/lib/wine/wine64', '/usr/lib/wine/wineserver64'
 
@@ -149,7 +149,7 @@ class WineWorkstation(Workstation):
                                 WINEDLLOVERRIDES='mscoree=;mshtml=')
 
     def lay_out(self, build, count, old_tool=None):
-        self.run(self.server, '-p')  # it stays between the runs
+        self.run(self.server, '-p')  # it keeps running between the runs
         self.run(self.wine, 'wineboot', '--init')
         super().lay_out(build, count)
 

@@ -44,9 +44,9 @@ wxString WithoutWhiteSpace(const wxString& text)
     return result;
 }
 
-// A node below the root, with a number for all that it is: its name and attributes or its text, and
-// the names of those above it up to its section. A section counts as directly below the root
-// wherever it is, as it does for the readers.
+// A node below the root, with a hash of everything that identifies it: its name and attributes or
+// its text, and the names of the nodes above it up to its section. A section counts as directly
+// below the root wherever it is, as it does for the readers.
 struct Thing
 {
     const wxXmlNode* node;
@@ -58,7 +58,7 @@ bool IsElement(const wxXmlNode& node)
     return node.GetType() == wxXML_ELEMENT_NODE;
 }
 
-// In whatever order. Outside the filter setting the writer adds empty ones.
+// The same in any order. Outside the filter setting the writer adds empty attributes.
 size_t AttributesFingerprint(const wxXmlNode& element, bool withEmpty)
 {
     size_t sum = 0;
@@ -120,7 +120,7 @@ bool HasAll(const wxXmlNode& element, const wxXmlNode& wanted)
     return true;
 }
 
-// So much of a text as people can read in a line.
+// As much of a text as is readable in one line.
 wxString Shown(const wxString& text)
 {
     constexpr size_t Longest = 200;
@@ -142,7 +142,7 @@ wxString Describe(const wxXmlNode& node)
 
 void FindLostThings(const wxXmlNode& before, const wxXmlNode& after, wxArrayString& losses)
 {
-    // Each of the new document's can stand for one of the old.
+    // Each node of the new document can match one of the old.
     std::unordered_multimap<size_t, const wxXmlNode*> pool;
     for (const Thing& thing : Collect(after))
         pool.emplace(thing.fingerprint, thing.node);
@@ -152,7 +152,7 @@ void FindLostThings(const wxXmlNode& before, const wxXmlNode& after, wxArrayStri
         if (found != pool.end() && HasAll(*found->second, *thing.node))
             pool.erase(found);
         else
-            losses.Add("does not keep " + Describe(*thing.node));
+            losses.Add("loses " + Describe(*thing.node));
     }
 }
 
@@ -194,7 +194,7 @@ wxArrayString FindFolderCfgLosses(const wxXmlDocument& document, const std::stri
          node = node->GetNext())
     {
         if (node->GetType() == wxXML_PI_NODE)
-            losses.Add("does not keep " + Describe(*node));
+            losses.Add("loses " + Describe(*node));
     }
     const wxXmlNode& root = *document.GetRoot();
     if (root.GetName() != FolderCfg::Root)

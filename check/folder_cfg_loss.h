@@ -8,11 +8,11 @@
 
 #include <string>
 
-/// A sentence for each thing of the document that its rewrite with the same template path (these
-/// bytes) has lost or changed, but for comments, white space and order. The document has to be
-/// loaded with wxXMLDOC_KEEP_WHITESPACE_NODES.
+/// One sentence for each part of the document that is lost or changed in its rewrite (these bytes,
+/// with the same template path). Comments, white space and order are ignored. The document has to
+/// be loaded with wxXMLDOC_KEEP_WHITESPACE_NODES.
 wxArrayString FindFolderCfgLosses(const wxXmlDocument& document, const std::string& rewritten);
 
-/// The attribute without which the chain of root attributes ends before Enable, although Enable is
-/// set; none otherwise.
+/// The missing attribute that ends the chain of root attributes before Enable, although Enable is
+/// set; null if there is none.
 const RootAttribute* FindGapBeforeEnable(const wxXmlNode& root);

@@ -53,13 +53,13 @@ void CheckAttributes(const wxString& name, const wxString& path, DWORD wanted, R
         report.Change(name + ": attributes" + AttributeNames(attributes) + " ->" +
                       AttributeNames(wanted));
     else
-        report.Problem(name + ": its attributes may not be changed");
+        report.Problem(name + ": its attributes cannot be changed");
 }
 
-// The names of the keys that have another value.
+// The names of the keys whose values differ.
 wxString ChangedKeys(const wxString& path, const wxString& iconName)
 {
-    constexpr DWORD Capacity = 1024; // characters, more than any of our values has
+    constexpr DWORD Capacity = 1024; // characters; longer than any of our values
     wxString names;
     for (const DesktopIniKey& each : DesktopIniKeys(true, iconName))
     {
@@ -72,7 +72,7 @@ wxString ChangedKeys(const wxString& path, const wxString& iconName)
     return names;
 }
 
-// Read-only goes before the keys are written, so it keeps nobody from it who may change attributes.
+// Read-only is removed before the keys are written, so it stops nobody who may change attributes.
 bool MayWriteIni(const wxString& path)
 {
     if ((GetFileAttributesW(path.wc_str()) & FILE_ATTRIBUTE_READONLY) != 0)
@@ -107,13 +107,14 @@ void CheckDesktopIni(const PinnedDirectory& directory, const wxString& iconName,
     }
     else if (wxFileName::Exists(path))
     {
-        report.Problem("Desktop.ini: is no file");
+        report.Problem("Desktop.ini: is not a file");
         CheckAttributes("Desktop.ini", path, ReadOnlyAndSystem, report);
     }
     else if (isCustomised && MayCreateIn(directory.Reach(L"")))
         report.Change("Desktop.ini: new");
     else if (isCustomised)
-        report.Problem("Desktop.ini: cannot be made, the hot folder may not be written");
+        report.Problem(
+            "Desktop.ini: cannot be created, because the hot folder cannot be written to");
     if (!isCustomised)
         return;
     const wxString folder = directory.Reach(L"");
@@ -127,7 +128,7 @@ void CheckIcon(const PinnedHotFolder& folder, const wxString& hotFolder, bool is
 {
     wxString name;
     GetFolderIconName(folder, hotFolder, name);
-    TakeLibraryErrors(); // those about Folder.cfg come again, with the template
+    TakeLibraryErrors(); // errors about Folder.cfg are reported again, with the template
     const wxString destination = folder.privateDir.Reach(name);
     const wxString source = SourceIconPath(name, isUpgrade, BundleIconsDirName);
     if (IsLink(destination))
@@ -135,7 +136,7 @@ void CheckIcon(const PinnedHotFolder& folder, const wxString& hotFolder, bool is
     else if (!wxFileExists(destination))
         report.Note("no copy of the icon to replace: " + name);
     else if (!wxFileExists(source))
-        report.ProblemOnce("no icon " + source);
+        report.ProblemOnce("source icon missing: " + source);
     else
     {
         if (!MayCopyOver(source, destination))
@@ -155,7 +156,7 @@ void CheckMissing(const PinnedHotFolder& folder, Report& report)
     if (IsLink(path))
         report.Problem("Folder.cfg: reached over a link");
     else if (wxFileName::Exists(path))
-        report.Problem("Folder.cfg: is no file");
+        report.Problem("Folder.cfg: is not a file");
     else
         report.Note("no Folder.cfg");
 }
@@ -190,7 +191,7 @@ bool CheckMove(XmlFile& cfg, const TemplateMove& move, const wxString& stored,
         report.Problem("Folder.cfg: " + loss);
     report.Change("Folder.cfg: " + stored + " -> " + move.newPath);
     if (!IsUtf8(cfg.GetBytes()))
-        report.Note("Folder.cfg: comes out in UTF-8");
+        report.Note("Folder.cfg: comes out as UTF-8");
     if (!wxFileName::Exists(move.newPath))
         report.Note("no such file: " + move.newPath);
     return true;
@@ -260,7 +261,7 @@ void CheckFolderCfg(const PinnedHotFolder& folder, const wxString& hotFolder,
     }
 }
 
-// What keeps a run from everything in the private directory.
+// What prevents a run from reaching anything in the private directory.
 wxString FindObstacle(const PinnedHotFolder& folder, const wxString& hotFolder)
 {
     const wxString obstacle = WhyOutOfReach(hotFolder);

@@ -24,7 +24,7 @@ class Keeper : public wxLog
 
 void KeepLibraryErrors()
 {
-    // The library's from here on. NOLINTNEXTLINE(clang-analyzer-cplusplus.NewDeleteLeaks)
+    // From here on owned by the library. NOLINTNEXTLINE(clang-analyzer-cplusplus.NewDeleteLeaks)
     delete wxLog::SetActiveTarget(new Keeper);
 }
 

@@ -3,7 +3,7 @@
 
 #include <wx/string.h>
 
-/// From now on the library's errors are kept, and nothing of them is shown.
+/// From now on the library's errors are collected and not shown.
 void KeepLibraryErrors();
 
 /// The errors since the last call, one after another; empty if there was none.

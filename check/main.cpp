@@ -1,5 +1,5 @@
-// FolderUpgradeCheck: what a run of FolderUpgrade would change, and what stands in its way. Only
-// reads.
+// FolderUpgradeCheck: what a run of FolderUpgrade would change, and what would prevent a change.
+// Only reads.
 #include "check/hot_folder_check.h"
 #include "check/library_errors.h"
 #include "check/preset_check.h"
@@ -18,7 +18,7 @@
 namespace
 {
 
-// The exit statuses; the greatest that applies.
+// The exit statuses. The highest one that applies is returned.
 constexpr int NothingToDo = 0;
 constexpr int HasChanges = 1;
 constexpr int HasProblems = 2;
@@ -37,7 +37,7 @@ void WriteHead(const TemplateFolders& folders, Report& report)
     report.Head("From " + orUnknown(folders.From()) + " to " + orUnknown(folders.To()));
 }
 
-// A directory that is listed under two names is looked at once.
+// A directory that is listed under two names is checked once.
 void CheckHotFolders(const HotFolderList& list, const TemplateFolders& folders, Report& report)
 {
     std::map<std::pair<std::uint64_t, std::uint64_t>, size_t> known; // identity -> position
@@ -59,7 +59,7 @@ int Check(bool isUpgrade, const wxString& fileName)
     KeepLibraryErrors();
     const TemplateFolders folders(isUpgrade);
     Report report(fileName);
-    TakeLibraryErrors(); // of a file that cannot be written; that is said at the end
+    TakeLibraryErrors(); // if a file cannot be written, that is reported at the end
     WriteHead(folders, report);
     report.Begin("Workstation");
     folders.ReportPath(report);
@@ -85,7 +85,7 @@ int Check(bool isUpgrade, const wxString& fileName)
 class FolderUpgradeCheckApp : public wxAppConsole
 {
   public:
-    // The base class would look at the command line itself.
+    // The base class would parse the command line itself.
     bool OnInit() override
     {
         return true;
@@ -98,10 +98,11 @@ class FolderUpgradeCheckApp : public wxAppConsole
         const bool isDowngrade = argc > 1 && argv[1].CmpNoCase("U") == 0;
         if ((isUpgrade || isDowngrade) && argc <= 3)
             return Check(isUpgrade, argc == 3 ? argv[2] : wxString());
-        WriteStandardError("Usage: FolderUpgradeCheck I|U [FILE]\n"
-                           "Says what FolderUpgrade with the same switch would change, and what "
-                           "stands in its way, on the standard output or in FILE.\n"
-                           "Exit status: 0 nothing, 1 changes, 2 problems, 3 wrong call.\n");
+        WriteStandardError(
+            "Usage: FolderUpgradeCheck I|U [FILE]\n"
+            "Reports what FolderUpgrade would change with the same switch, and what "
+            "would prevent a change, to the standard output or to FILE.\n"
+            "Exit status: 0 nothing to do, 1 changes, 2 problems, 3 wrong arguments.\n");
         return WrongCall;
     }
 };

@@ -22,7 +22,7 @@ wxString OtherChange(const std::string& before, const std::string& after)
     if (mark == wxBOM_UTF8 && before.substr(3) == after)
         return "loses its byte-order mark";
     if (mark != wxBOM_None && mark != wxBOM_Unknown && mark != wxBOM_UTF8)
-        return "comes out in UTF-8, without byte-order mark";
+        return "comes out as UTF-8, without byte-order mark";
     const auto withoutLineEnds = [](std::string text)
     {
         text.erase(std::remove(text.begin(), text.end(), '\r'), text.end());
@@ -32,10 +32,10 @@ wxString OtherChange(const std::string& before, const std::string& after)
     if (withoutLineEnds(content) == withoutLineEnds(after))
         return mark == wxBOM_UTF8 ? "loses its byte-order mark, and its line ends become CR LF"
                                   : "its line ends become CR LF";
-    return "comes out in UTF-8";
+    return "comes out as UTF-8";
 }
 
-// Without a byte-order mark, what is not UTF-8 is read as Latin-1.
+// Without a byte-order mark, anything that is not UTF-8 is read as Latin-1.
 bool IsTakenAsLatin1(const std::string& bytes)
 {
     const wxBOM mark = wxConvAuto::DetectBOM(bytes.data(), bytes.length());
@@ -48,9 +48,9 @@ void CheckContent(const wxString& name, const std::string& before, const Rewritt
 {
     const wxString encoding = DeclaredEncoding(rewritten.bytes);
     if (!encoding.empty() && encoding.CmpNoCase("UTF-8") != 0)
-        report.Problem(name + ": declares the encoding " + encoding + ", but comes out in UTF-8");
+        report.Problem(name + ": declares the encoding " + encoding + ", but comes out as UTF-8");
     else if (IsTakenAsLatin1(before))
-        report.Problem(name + ": is not UTF-8, so the whole file is taken as Latin-1");
+        report.Problem(name + ": is not UTF-8, so the whole file is read as Latin-1");
     if (rewritten.bytes == before)
         return;
     if (rewritten.movedPaths == 0)
@@ -67,7 +67,7 @@ void CheckPreset(JobPresetFile& preset, const wxString& name, const TemplateFold
     if (status == RegularFile::Status::Refused)
         report.Problem(name + ": cannot be opened for reading (" + TakeLibraryErrors() + ")");
     else if (status != RegularFile::Status::Open)
-        report.Problem(name + ": reached over a link, or no file");
+        report.Problem(name + ": reached over a link, or not a file");
     if (status != RegularFile::Status::Open)
         return;
     std::string before;
@@ -79,13 +79,16 @@ void CheckPreset(JobPresetFile& preset, const wxString& name, const TemplateFold
     const RewrittenPreset rewritten = RewritePreset(before, folders.From(), folders.To());
     if (rewritten.reasonToStay)
         report.Problem(name + ": left as it is (" + rewritten.reasonToStay + ")");
-    else if (preset.ReopenForUpdate() != RegularFile::Status::Open)
+    else if (preset.GetFile().ReopenForUpdate() != RegularFile::Status::Open)
+    {
+        preset.GetFile().ReportNotReopened(preset.GetPath()); // for the system's reason
         report.Problem(name + ": cannot be opened for writing (" + TakeLibraryErrors() + ")");
+    }
     else
         CheckContent(name, before, rewritten, report);
 }
 
-// Why a presets.xml is missing although it may be there; empty if it is not.
+// Why a presets.xml that may exist cannot be seen; empty if it does not exist.
 wxString WhyMissing(const JobPresetFile& preset, const wxString& directory)
 {
     for (const wxString& each : {directory, wxFileName(preset.GetPath()).GetPath()})
@@ -138,5 +141,5 @@ void CheckPresets(const TemplateFolders& folders, Report& report)
     if (!hasPresets && errors.empty() && obstacle.empty() &&
         (!isThere || wxFileName::IsDirReadable(root)))
         report.Note(isThere ? "there are no presets in " + root
-                            : "there are no presets: there is no folder " + root);
+                            : "there are no presets, because there is no folder " + root);
 }

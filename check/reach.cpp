@@ -7,7 +7,7 @@
 namespace
 {
 
-// Whether one of the directories on the way there is a link, or it is one itself.
+// Whether the directory or one of those above it is a link.
 bool LeadsOverLink(const wxString& directory)
 {
     wxFileName name = wxFileName::DirName(directory);
@@ -31,8 +31,8 @@ wxString WhyOutOfReach(const wxString& directory)
     if (MayEnter(PinnedDirectory(directory, Links::Follow)))
         return {};
     if (RefusesLinksOfOthers() && LeadsOverLink(directory))
-        return "is reached over a link, which is refused to an elevated run";
-    // What keeps it from being seen may be a directory above it.
+        return "is reached over a link that an elevated run refuses to follow";
+    // A directory above it may keep it from being seen.
     wxFileName above = wxFileName::DirName(directory);
     while (above.GetDirCount() > 0 && !wxDirExists(above.GetPath(wxPATH_GET_VOLUME)))
         above.RemoveLastDir();

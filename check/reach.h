@@ -1,4 +1,4 @@
-// Whether a run gets at what is in a directory.
+// Whether a run can reach the contents of a directory.
 #pragma once
 
 #include "platform/pinned_directory.h"
@@ -7,6 +7,6 @@
 
 bool MayEnter(const PinnedDirectory& directory);
 
-/// Why a run does not get at what is in the directory, as the end of a sentence. Empty if it does,
-/// and if there is no such directory.
+/// Why a run cannot reach the contents of the directory, as the end of a sentence. Empty if it can,
+/// or if there is no such directory.
 wxString WhyOutOfReach(const wxString& directory);

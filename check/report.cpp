@@ -61,7 +61,7 @@ bool Report::End()
           Count(m_counts[Notes], "note"));
     if (m_file.IsOpened() && !m_file.Close())
     {
-        m_file.Detach(); // or the library closes it once more
+        m_file.Detach(); // or the library closes it again
         m_isWritten = false;
     }
     return m_isWritten;

@@ -1,4 +1,4 @@
-// The report of a check: what a run would change, what stands in its way, and what is worth
+// The report of a check: what a run would change, what would prevent a change, and what is worth
 // knowing.
 #pragma once
 
@@ -12,23 +12,23 @@
 class Report
 {
   public:
-    /// Writes to the file, or for an empty name to the standard output.
+    /// Writes to the file, or to the standard output if the name is empty.
     explicit Report(const wxString& fileName);
 
-    /// A line of the head, before any block.
+    /// Writes a line of the head, which comes before all blocks.
     void Head(const wxString& text);
 
-    /// The lines that follow are about this. A block without lines is left out; of others the
-    /// problems are written first, and the notes last.
+    /// Begins a block about this subject. A block without lines is left out; in others, the
+    /// problems are written first and the notes last.
     void Begin(const wxString& title);
 
     void Problem(const wxString& text);
     void Change(const wxString& text);
     void Note(const wxString& text);
-    /// One that concerns many blocks: written with the first of them.
+    /// A problem that concerns many blocks: written only with the first of them.
     void ProblemOnce(const wxString& text);
 
-    /// Writes the sums. False when anything could not be written.
+    /// Writes the totals. Returns false if anything could not be written.
     bool End();
 
     size_t GetProblems() const;

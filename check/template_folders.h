@@ -11,19 +11,19 @@ class TemplateFolders
     explicit TemplateFolders(bool isUpgrade);
 
     bool IsUpgrade() const;
-    /// The folder of the version being left, and that of the version being installed; empty for one
-    /// that the registry does not name.
+    /// The folder of the version being left, and that of the version being installed; empty if the
+    /// registry does not name it.
     const wxString& From() const;
     const wxString& To() const;
     bool AreKnown() const;
 
-    /// What is wrong with the previous version's folder, whoever asks for it.
+    /// Reports what is wrong with the previous version's folder, whatever it is used for.
     void ReportPath(Report& report) const;
-    /// For a hot folder with a template, or a preset: reports once a folder that is not known. One
-    /// that is asked for only when a template is about to move need not be needed.
+    /// For a hot folder with a template, or for a preset: reports an unknown folder once. A folder
+    /// that is looked up only when a template is about to move may not be needed at all.
     void ReportFrom(Report& report) const;
     void ReportTo(Report& report) const;
-    /// Both, and what matters in the text of presets only.
+    /// Does both, and reports what matters only in the text of presets.
     void ReportForPresets(Report& report) const;
 
   private:
@@ -31,7 +31,7 @@ class TemplateFolders
     {
         bool isKnown = false;
         wxString path;
-        wxString value; // the registry value, for people
+        wxString value; // the registry value, for messages
     };
 
     static void ReportUnknown(const Folder& folder, Report& report);

@@ -14,7 +14,7 @@ namespace
 void CheckEntries(const HotFolderList& list, Report& report)
 {
     if (list.folders.empty() && !list.missing.empty())
-        report.Problem("none of the listed hot folders is there (another account, mapped drives?)");
+        report.Problem("none of the listed hot folders exists (another account? mapped drives?)");
     else if (list.folders.empty())
         report.Note("HotFolderList.cfg lists no hot folder");
     for (const wxString& folder : list.missing)
@@ -23,7 +23,7 @@ void CheckEntries(const HotFolderList& list, Report& report)
         if (!obstacle.empty())
             report.Problem("listed hot folder " + folder + " " + obstacle);
         else
-            report.Note("listed hot folder is not there: " + folder);
+            report.Note("listed hot folder does not exist: " + folder);
     }
     for (const wxString& folder : list.repeated)
         report.Note("hot folder is listed twice: " + folder);
@@ -42,7 +42,7 @@ void CheckHotFolderList(const HotFolderList& list, Report& report)
             report.Problem("HotFolderList.cfg: its folder " + obstacle);
         else if (wxFileName::Exists(GetHotFolderListPath(),
                                     wxFILE_EXISTS_ANY | wxFILE_EXISTS_NO_FOLLOW))
-            report.Problem("HotFolderList.cfg: is no file");
+            report.Problem("HotFolderList.cfg: is not a file");
         else
             report.Note("there is no HotFolderList.cfg");
         break;
@@ -82,11 +82,11 @@ void CheckRunLog(Report& report)
     const RegularFile::Status status = log.OpenForUpdate(path, Links::Refuse);
     if (status == RegularFile::Status::Refused)
     {
-        ReportNotOpened(path); // for the system's reason
+        ReportNotOpened(path); // to get the system's reason
         report.Problem("there will be no run log: " + TakeLibraryErrors());
     }
     else if (status == RegularFile::Status::NotThere && wxFileName::Exists(path))
         report.Note("there will be no run log: something else has its name: " + path);
     else if (status == RegularFile::Status::NotThere && !MayCreateIn(folder))
-        report.Problem("there will be no run log: its folder may not be written: " + folder);
+        report.Problem("there will be no run log: its folder cannot be written to: " + folder);
 }

@@ -1,30 +1,30 @@
-# The target package: FolderUpgrade-<version>-<system>.zip, what is installed and nothing around it.
+# The target package: FolderUpgrade-<version>-<system>.zip, which holds only what is installed.
 
-# Linked statically, the Windows programs contain the works of others. Elsewhere, and with another toolchain, no notices are
-# added.
+# The statically linked Windows programs contain the work of others. Elsewhere, and with other toolchains, no notices
+# are added.
 if(MINGW)
     install(CODE "set(wx_prefix \"${FOLDER_UPGRADE_WX_PREFIX}\")")
     install(SCRIPT ${CMAKE_CURRENT_LIST_DIR}/write_notices.cmake)
 endif()
 
 # Signing. The command is called for each program of the package with the program's path as its last argument, before
-# packing; it has to sign in place and to fail when it cannot. On Windows, for example:
+# packing; it has to sign in place, and to fail if it cannot. On Windows, for example:
 #
 #     -D "FOLDER_UPGRADE_SIGN_COMMAND=signtool;sign;/fd;sha256;/a"
 #
-# With osslsigncode, which writes another file, it is a script:
+# osslsigncode writes to another file, so it needs a script:
 #
 #     #!/bin/sh -e
 #     osslsigncode sign -key key.pem -certs certificate.pem -h sha256 -in "$1" -out "$1.signed"
 #     mv "$1.signed" "$1"
 #
-# and a certificate for trials comes from
+# and this makes a certificate for trials:
 #
 #     openssl req -x509 -newkey rsa:2048 -nodes -days 30 -subj /CN=Trial -addext extendedKeyUsage=codeSigning \
 #         -keyout key.pem -out certificate.pem
 #
 # The programs in the build folder and their symbol files stay as they are. Add a time stamp (signtool /tr, osslsigncode
-# -ts) or the signature ends with the certificate. Installers are signed by whoever makes them, with the same command.
+# -ts), or the signature expires with the certificate. Whoever builds an installer signs it with the same command.
 set(FOLDER_UPGRADE_SIGN_COMMAND "" CACHE STRING
     "Command and arguments, as a list, that sign the program whose path is added; empty for none")
 set(CPACK_FOLDER_UPGRADE_SIGN_COMMAND ${FOLDER_UPGRADE_SIGN_COMMAND})

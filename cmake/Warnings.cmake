@@ -1,4 +1,4 @@
-# For our own code: every warning, and each an error.
+# For our own code: all warnings, as errors.
 add_library(warnings INTERFACE)
 if(MSVC)
     target_compile_options(warnings INTERFACE "$<$<COMPILE_LANGUAGE:CXX>:/W4;/WX>")

@@ -1,6 +1,6 @@
-# What a program for Windows needs beside its sources.
+# What a program for Windows needs in addition to its sources.
 
-# Resources: the icon, the manifest and the version, which says DESCRIPTION and the target's name.
+# Resources: the icon, the manifest and the version, which has DESCRIPTION and the target's name.
 function(add_windows_resources target description)
     set(templates ${CMAKE_SOURCE_DIR}/cmake/windows)
     set(icons ${CMAKE_SOURCE_DIR}/appearance/icons)
@@ -18,9 +18,9 @@ function(add_windows_resources target description)
     endif()
 endfunction()
 
-# The stack is for the XML library, which destroys a document by recursion: with these 64 MiB
-# elements nested 600,000 deep do no harm (1,000,000 do), with 2 MiB 60,000 end the run. Only what is
-# used of it takes memory. What has to be so before main() comes with the module platform.
+# The stack is for the XML library, which destroys a document by recursion: with 64 MiB, elements nested 600,000 deep do
+# no harm (1,000,000 do); with 2 MiB, 60,000 crash the run. Only the used part takes memory. The module platform does
+# what has to be done before main().
 function(harden_windows_program target)
     if(MSVC)
         target_link_options(${target} PRIVATE
@@ -31,14 +31,14 @@ function(harden_windows_program target)
     endif()
 endfunction()
 
-# Moves the symbols of the release into a file of their own, <program>.debug, beside the program;
-# MSVC's linker always keeps them apart.
+# Moves the symbols of the release into a separate file, <program>.debug, beside the program; MSVC's linker always keeps
+# them separate.
 function(split_symbols target)
     if(MSVC OR NOT CMAKE_BUILD_TYPE STREQUAL Release)
         return()
     endif()
     set(program $<TARGET_FILE:${target}>)
-    # Like the linker's, its copies bear no date.
+    # Its copies have no date, like the linker's output.
     set(objcopy ${CMAKE_COMMAND} -E env SOURCE_DATE_EPOCH=0 ${CMAKE_OBJCOPY})
     add_custom_command(TARGET ${target} POST_BUILD
         COMMAND ${objcopy} --only-keep-debug ${program} ${program}.debug

@@ -1,10 +1,10 @@
 #!/usr/bin/env bash
-# Installs those Debian packages that are missing for a purpose:
+# Installs the Debian packages that a purpose needs and that are missing:
 #
 #     cmake/install_packages.sh GROUP...
 #
-# The groups are the names in packages(), below. With apt-get, as root or by sudo without a password; where neither can
-# be, it says what is missing and fails. When nothing is missing, nothing is asked of the network.
+# The groups are the names in packages(), below. It runs apt-get as root, or with sudo if that needs no password.
+# Otherwise it says what is missing and fails. If nothing is missing, it does not use the network.
 set -euo pipefail
 
 packages() {
@@ -30,7 +30,7 @@ for group in "$@"; do
 done
 
 if ! command -v dpkg-query >/dev/null; then
-    echo "Not a Debian system; the counterparts of these packages have to be there: ${wanted[*]}" >&2
+    echo "Not a Debian system. Install the counterparts of these packages: ${wanted[*]}" >&2
     exit 0
 fi
 

@@ -14,12 +14,12 @@ add_notices("Expat" ${wx_prefix}/licences/expat)
 add_notices("MinGW-w64's runtime and headers, winpthreads" /usr/share/doc/mingw-w64-x86-64-dev/copyright)
 add_notices("GCC's runtime, libgcc and libstdc++" /usr/share/doc/g++-mingw-w64-x86-64-posix/copyright)
 
-# What these texts refer to on a Debian system is appended.
+# The files on a Debian system that these texts refer to are appended.
 file(READ ${notices} text)
 string(REGEX MATCHALL "/usr/share/common-licenses/[A-Za-z0-9.-]*[A-Za-z0-9]" names "${text}")
 set(licences "")
 foreach(name IN LISTS names)
-    file(REAL_PATH ${name} licence) # "GPL" is the newest of them
+    file(REAL_PATH ${name} licence) # "GPL" links to the newest
     list(APPEND licences ${licence})
 endforeach()
 list(REMOVE_DUPLICATES licences)

@@ -1,10 +1,10 @@
-# Packs the staged files the same to the byte whenever, wherever and by whom the same commit is
-# packed. CPack's own zip files tell the order of the files on the disk and the user's number.
+# Packs the staged files so that one commit gives identical zip files, whenever, wherever and by whom it is packed.
+# CPack's own zip files depend on the order of the files on the disk and on the user's number.
 execute_process(
     COMMAND git -C ${CMAKE_CURRENT_LIST_DIR} log -1 --format=%ct
     OUTPUT_VARIABLE date OUTPUT_STRIP_TRAILING_WHITESPACE ERROR_QUIET RESULT_VARIABLE failed)
 if(failed OR NOT date)
-    set(date 315619200) # no commit known: 2 January 1980, the first day a zip file tells anywhere
+    set(date 315619200) # no commit known: 2 January 1980, the first day that a zip file can store in every time zone
 endif()
 set(ENV{SOURCE_DATE_EPOCH} ${date})
 set(ENV{TZ} UTC0)

@@ -1,5 +1,5 @@
-// Any bytes as a Folder.cfg: what loads comes out of a save as it went in, and what does not load
-// leaves every value as it was.
+// Arbitrary bytes as a Folder.cfg: what loads is unchanged after saving and loading, and what does not load leaves
+// every value as it was.
 #include "fuzz/fuzzing.h"
 #include "store/folder_cfg_reader.h"
 #include "store/folder_cfg_writer.h"
@@ -25,12 +25,12 @@ struct Values
     wxXmlNode filterSetting;
 };
 
-// Everything but the root's attributes, as it is; a save would indent it.
+// Everything but the root's attributes, without the indentation that saving adds.
 wxString Sections(const Values& values)
 {
     auto* root = new wxXmlNode(wxXML_ELEMENT_NODE, "Sections");
     wxXmlDocument document;
-    document.SetRoot(root); // the document's from here on
+    document.SetRoot(root); // from here on owned by the document
     WriteInputFormats(root, values.settings.InputFormatsSummary);
     WritePaths(root, values.paths);
     WriteJobSettings(root, values.jobSettings);
@@ -51,7 +51,7 @@ bool AreEqual(const Values& left, const Values& right)
            Sections(left) == Sections(right);
 }
 
-// False when the file does not load.
+// Returns false if the file does not load.
 bool Read(const wxString& path, Values& values)
 {
     XmlFile cfg;

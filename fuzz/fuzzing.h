@@ -22,7 +22,7 @@ inline void Check(bool holds, const char* promise)
     std::abort();
 }
 
-/// A new file of this process's own, in $TMPDIR.
+/// A new file of this process in $TMPDIR.
 inline std::string NewFile()
 {
     return wxFileName::CreateTempFileName("fuzz").utf8_string();

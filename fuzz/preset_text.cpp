@@ -1,5 +1,5 @@
-// Any job preset text and any two folders, the input's first two lines: nothing changes but the
-// folder's text where a path lies in it, and the way back restores the text.
+// Any job preset text and any two folders, which are the input's first two lines: only the folder's text in template
+// paths changes, and moving back restores the text.
 #include "migrate/preset_text.h"
 
 #include "fuzz/fuzzing.h"
@@ -23,7 +23,7 @@ std::wstring WithoutFinalSeparators(std::wstring folder)
     return folder.erase(folder.find_last_not_of(L'/') + 1);
 }
 
-// The text with every path that lies in the folder moved, a character at a time.
+// The text with every path in the folder moved, computed one character at a time.
 std::wstring Moved(const std::wstring& text, const std::wstring& from, const std::wstring& to)
 {
     std::wstring moved;
@@ -43,7 +43,7 @@ bool LiesIn(const std::wstring& folder, const std::wstring& outer)
     return (folder + L"/").compare(0, outer.size() + 1, outer + L"/") == 0;
 }
 
-// Whether the folder can lie on a disk, and its text begins no search text that the preset's ends.
+// Whether the folder can exist on a disk, and does not end with what could be the beginning of a search text.
 bool IsPlain(const std::wstring& folder)
 {
     return IsXmlText(folder) && folder.find(L'"') == std::wstring::npos && !wxString(folder).EndsWith(Key);

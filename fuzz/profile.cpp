@@ -1,5 +1,4 @@
-// Any bytes as a profile file: a write changes its one line and no other byte, and a read gives the
-// value back.
+// Arbitrary bytes as a profile file: a write changes one line and no other byte, and a read returns the value.
 #include "fuzz/fuzzing.h"
 #include "platform/system.h"
 
@@ -11,7 +10,7 @@ namespace
 
 constexpr LPCWSTR Section = L".ShellClassInfo";
 constexpr LPCWSTR Value = L".\\[_ORX_HotFolder_]\\hf_folder.ico";
-// The line feeds among the bytes from begin to end of the file, in UTF-16 or in bytes.
+// The number of line feeds between begin and end, in UTF-16 or in bytes.
 int CountLineFeeds(const std::string& bytes, size_t begin, size_t end)
 {
     const size_t unit = bytes.compare(0, 2, "\xFF\xFE") == 0 ? 2 : 1;

@@ -4,7 +4,7 @@
 #     fuzz/run.sh corpus|fuzz PROGRAM [SAMPLES]
 #
 #     corpus   over its corpus, and over those files of the sample workstation whose name is SAMPLES
-#     fuzz     over what it makes of them, for FUZZ_SECONDS (20)
+#     fuzz     over inputs derived from them, for FUZZ_SECONDS (20)
 #
 # An input that breaks a promise is kept in findings/ beside the program; once fixed, it goes into the target's corpus
 # and stays a test.
@@ -14,7 +14,7 @@ cd "$(dirname "${BASH_SOURCE[0]}")/.."
 program=$2
 target=${program##*/fuzz_}
 findings=${program%/*}/findings
-# In memory where there is such a place, since every input is a file.
+# In memory if possible, because every input is written to a file.
 TMPDIR=$(mktemp -d -p "$([ -w /dev/shm ] && echo /dev/shm || echo "${TMPDIR:-/tmp}")")
 export TMPDIR
 trap 'rm -rf "$TMPDIR"' EXIT
@@ -27,7 +27,7 @@ done < <(find samples/workstation -name "${3-}" -print0)
 inputs=(fuzz/corpus/"$target" "$TMPDIR/samples")
 limits=(-runs=0)
 if [ "$1" = fuzz ]; then
-    inputs=("$TMPDIR/found" "${inputs[@]}") # the first is where new ones go
+    inputs=("$TMPDIR/found" "${inputs[@]}") # new ones go to the first
     limits=(-max_len=16384 -max_total_time="${FUZZ_SECONDS:-20}")
 fi
 "$program" -dict=fuzz/"$target".dict -artifact_prefix="$findings/$target-" -timeout=10 -print_final_stats=1 \

@@ -40,7 +40,7 @@ void LogDecision(const TemplateMove& move, const wxString& cfgPath, bool isUpgra
     }
 }
 
-// What is not in the table is read once more, from the file that is then written.
+// Everything outside the table is read again, from the file that is then written.
 void Rewrite(XmlFile& cfg, const ImposeSettingTable& imposeSettings, const wxString& cfgPath)
 {
     const wxCriticalSectionLocker lock(FolderCfgLock);

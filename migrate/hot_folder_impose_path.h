@@ -5,8 +5,8 @@
 
 #include <wx/string.h>
 
-/// Points the template path in the hot folder's Folder.cfg, when it lies directly in the template
-/// folder of the version being left, at the file of the same name in that of the version being
-/// installed, and rewrites Folder.cfg; the template itself is not looked at. In every other case
+/// If the template path in the hot folder's Folder.cfg is directly in the template folder of the
+/// version being left, changes it to the same name in the template folder of the version being
+/// installed, and rewrites Folder.cfg. The template itself is not accessed. In every other case
 /// Folder.cfg stays as it is. Reports to the run log only.
 void UpdateHotFolderImposePath(const FolderUpgradeApp& app, const wxString& hotFolder);

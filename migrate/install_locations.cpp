@@ -10,10 +10,11 @@
 namespace
 {
 
-// Bytes. Every version has offered the registry this many; what is longer counts as missing.
+// Bytes. Every version has passed a buffer of this size to the registry; a longer value counts as
+// missing.
 constexpr DWORD ValueCapacity = 517;
 
-// A value, and the keys that it is looked for in: the first of them that opens.
+// A value, and the keys to look for it in: only the first that can be opened is used.
 struct Location
 {
     HKEY hive;
@@ -59,7 +60,7 @@ bool QueryText(HKEY key, const wchar_t* name, wxString& text)
     return true;
 }
 
-// Only the opening falls back to the next key, not a missing value.
+// The next key is tried only if a key cannot be opened, not if its value is missing.
 bool ReadText(const Location& location, wxString& text)
 {
     for (const wchar_t* path : location.keys)

@@ -4,19 +4,19 @@
 #include <wx/filename.h>
 #include <wx/string.h>
 
-/// Where the two folders come from, for people.
+/// Where the two folders come from, for messages.
 extern const char* const DefaultFolderSource;
 extern const char* const PreviousFolderSource;
 
 /// The default template folder of the installed software: "template" below the InstallPath of the
-/// machine's key. False, and the folder as it was, when that cannot be read.
+/// machine's key. Returns false and leaves the folder as it was if that cannot be read.
 ///
-/// Both lookups follow RegOpenKeyExW and RegQueryValueExW: the 32-bit key first, the other only
-/// when that does not open; at most 517 bytes, taken as UTF-16 up to the first NUL whatever the
-/// value's type; the registry is read at every call, and no folder is looked for on disk. The
-/// folder's last component is held as the file name.
+/// Both lookups follow RegOpenKeyExW and RegQueryValueExW: the 32-bit key comes first, the other is
+/// tried only if the first cannot be opened; at most 517 bytes are read, as UTF-16 up to the first
+/// NUL whatever the value's type; every call reads the registry, and none checks that the folder
+/// exists. The folder's last component becomes the file name.
 bool GetDefaultImposeTemplatePath(wxFileName& folder);
 
-/// The default template folder of the previous version: the Path of the current user's key. False,
-/// and an empty file name, when that cannot be read.
+/// The default template folder of the previous version: the Path of the current user's key. Returns
+/// false and an empty file name if that cannot be read.
 bool GetPreviousImposeTemplatePath(wxFileName& folder);

@@ -13,7 +13,7 @@ const char* const PresetRootName = "JPData";
 const char* const PresetDirName = "Presets";
 const char* const PresetFileName = "presets.xml";
 
-// Collects the sub-directories of the directory that it traverses, and enters none.
+// Collects the sub-directories of the directory being traversed, without entering them.
 class wxDirTraverserSimple : public wxDirTraverser
 {
   public:
@@ -86,14 +86,6 @@ RegularFile::Status JobPresetFile::OpenForReading()
 {
     const RegularFile::Status status =
         m_file.OpenForReading(m_presets.Reach(PresetFileName), Links::Refuse);
-    if (status == RegularFile::Status::Refused)
-        ReportNotOpened(m_path);
-    return status;
-}
-
-RegularFile::Status JobPresetFile::ReopenForUpdate()
-{
-    const RegularFile::Status status = m_file.ReopenForUpdate();
     if (status == RegularFile::Status::Refused)
         ReportNotOpened(m_path);
     return status;

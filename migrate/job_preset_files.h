@@ -11,7 +11,8 @@
 wxString JobPresetRoot();
 
 /// Appends the full paths of the root's direct sub-directories, hidden ones too, in the order of
-/// the listing. False when the root is no directory. The library reports one that cannot be listed.
+/// the listing. Returns false if the root is not a directory. The library reports an error if it
+/// cannot be listed.
 bool ListJobPresetDirs(const wxString& root, wxArrayString& directories);
 
 /// One job preset's file. The job preset directory and those above it may be links (redirected
@@ -21,18 +22,16 @@ class JobPresetFile
   public:
     explicit JobPresetFile(const wxString& directory);
 
-    /// For people.
+    /// For messages.
     const wxString& GetPath() const;
 
-    /// Whether there is anything of that name, be it a link or a directory. A linked directory
-    /// Presets counts as if there were: what it leads to is not asked.
+    /// Whether anything of that name exists, even a link or a directory. True if the directory
+    /// Presets is a link: its target is not accessed.
     bool IsThere() const;
 
-    /// Refused for anything but a regular file, too. The library reports a regular file that does
-    /// not open.
+    /// Also refused for anything but a regular file. The library reports an error if a regular file
+    /// does not open.
     RegularFile::Status OpenForReading();
-    /// Likewise.
-    RegularFile::Status ReopenForUpdate();
 
     /// The file, once it is open.
     RegularFile& GetFile();

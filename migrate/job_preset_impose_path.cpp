@@ -10,52 +10,41 @@
 namespace
 {
 
-struct Rewriting
-{
-    std::string before;
-    RewrittenPreset after;
-    bool isDecided = false;
-};
-
-// Decides for what the file holds now; false, and a line in the log, when it has to stay as it is.
-bool Decide(JobPresetFile& preset, const wxString& from, const wxString& to, Rewriting& rewriting)
-{
-    std::string now;
-    const char* reason = "cannot be read";
-    if (preset.GetFile().Read(now))
-    {
-        if (!rewriting.isDecided || now != rewriting.before)
-        {
-            rewriting.before.swap(now);
-            rewriting.after = RewritePreset(rewriting.before, from, to);
-            rewriting.isDecided = true;
-        }
-        reason = rewriting.after.reasonToStay;
-    }
-    if (reason)
-        RunLog(wxString::Format("preset.xml left as it is (%s): %s", reason, preset.GetPath()));
-    return !reason;
-}
-
+// The file is read once, through the handle that it is then written with; that one is opened first,
+// but what is wrong with the content is logged before what is wrong with the handle.
 void UpdatePreset(JobPresetFile& preset, const wxString& from, const wxString& to)
 {
     const wxString& path = preset.GetPath();
-    Rewriting rewriting;
     if (preset.OpenForReading() != RegularFile::Status::Open)
-        RunLog("Unable to open preset.xml for read : " + path);
-    else if (!Decide(preset, from, to, rewriting))
-        return;
-    else if (preset.ReopenForUpdate() != RegularFile::Status::Open)
-        RunLog("Unable to open preset.xml for write : " + path);
-    else if (Decide(preset, from, to, rewriting)) // it may have changed meanwhile
     {
-        if (!preset.GetFile().Rewrite(rewriting.before, rewriting.after.bytes))
-            preset.GetFile().ReportNotWritten(path);
+        RunLog("Unable to open preset.xml for read : " + path);
+        return;
+    }
+    RegularFile& file = preset.GetFile();
+    const RegularFile::Status status = file.ReopenForUpdate();
+    std::string before;
+    RewrittenPreset after;
+    if (file.Read(before))
+        after = RewritePreset(before, from, to);
+    else
+        after.reasonToStay = "cannot be read";
+    if (after.reasonToStay)
+        RunLog(wxString::Format("preset.xml left as it is (%s): %s", after.reasonToStay, path));
+    else if (status != RegularFile::Status::Open)
+    {
+        if (status == RegularFile::Status::Refused)
+            file.ReportNotReopened(path);
+        RunLog("Unable to open preset.xml for write : " + path);
+    }
+    else
+    {
+        if (!file.Rewrite(before, after.bytes))
+            file.ReportNotWritten(path);
         RunLog("Updated preset.xml  : " + path);
     }
 }
 
-// Both lookups are always made, in this order; false when one failed.
+// Always makes both lookups, in this order; returns false if either fails.
 bool LookUpFolders(wxFileName& previousFolder, wxFileName& defaultFolder)
 {
     const bool previousFound = GetPreviousImposeTemplatePath(previousFolder);

@@ -9,10 +9,11 @@
 /// depth, to that of the version being installed, in the text of every job preset file. Reports to
 /// the run log only.
 ///
-/// A path is what follows the search text ORXImposeTemplate">" directly; it moves when the folder's
-/// text is followed by a path separator or the closing double quote. A preset file that opens for
-/// reading and writing is rewritten, in place and as UTF-8 without byte-order mark, whether or not
-/// it held such a path; one that cannot be read, decoded or encoded again stays as it was.
+/// A path is the text directly after the search text ORXImposeTemplate">". It moves if it begins
+/// with the folder's text, followed by a path separator or the closing double quote. A preset file
+/// that can be opened for reading and writing is rewritten, in place and as UTF-8 without
+/// byte-order mark, whether or not it held such a path; one that cannot be read, decoded or encoded
+/// again stays as it was.
 void UpdateJobPresetImposePath(const FolderUpgradeApp& app);
 
 /// Appends the full paths of the job preset directories, the direct sub-directories (hidden ones

@@ -27,7 +27,7 @@ bool EndsFolder(const wxString& text, size_t position)
            (text[position] == '"' || wxFileName::IsPathSeparator(text[position]));
 }
 
-// The positions of the folder's text in the text's template paths, in ascending order.
+// The positions of the folder in the template paths of the text, in ascending order.
 std::vector<size_t> FindFolders(const wxString& text, const wxString& folder)
 {
     const wxString introduction = wxString(FolderCfg::ImposeTemplateKey) + PathIntroduction;
@@ -40,30 +40,32 @@ std::vector<size_t> FindFolders(const wxString& text, const wxString& folder)
         const bool isPath = EndsFolder(text, end);
         if (isPath)
             folders.push_back(begin);
-        // After a path, for a folder's text that holds the introduction would overlap itself.
+        // Continues after the path: if the folder's own text holds the introduction, hits could
+        // overlap.
         found = text.find(searched, isPath ? end : begin);
     }
     return folders;
 }
 
-// Whether the bytes are nothing but a byte-order mark, if anything.
+// Whether the bytes are empty or only a byte-order mark.
 bool IsEmptyText(const std::string& bytes)
 {
     size_t markLength = 0;
     const wxBOM mark = wxConvAuto::DetectBOM(bytes.data(), bytes.length());
     if (mark != wxBOM_None && mark != wxBOM_Unknown)
         wxConvAuto::GetBOMChars(mark, &markLength);
-    // Two bytes alone may be the beginning of another mark, but then there is no text either.
+    // Two bytes alone may be the beginning of a longer mark, but then there is no text either.
     return bytes.length() == markLength || (mark == wxBOM_Unknown && bytes == "\xFF\xFE");
 }
 
-// The bytes are decoded as they are and line ends treated as text mode does, where the system has
-// one: text mode itself would end the file at the first Ctrl-Z, and see line ends inside UTF-16.
+// Decodes the bytes unchanged, then converts line ends as the system's text mode would, if it has
+// one. Text mode itself would end the file at the first Ctrl-Z, and find line ends inside UTF-16
+// characters.
 const char* Decode(const std::string& bytes, wxString& text)
 {
     if (IsEmptyText(bytes))
         return nullptr;
-    wxString(bytes.data(), wxConvAuto(), bytes.length()).swap(text); // to assign it would copy it
+    wxString(bytes.data(), wxConvAuto(), bytes.length()).swap(text); // assigning would copy it
     if (text.empty())
         return "cannot be decoded";
     if (wxTextBuffer::typeDefault == wxTextFileType_Dos)
@@ -83,10 +85,10 @@ size_t MovePresetPaths(wxString& text, wxString from, wxString to)
     if (folders.empty())
         return 0;
 
-    // A text that grew as it is put together would be in memory three times at the worst.
+    // A text that grows piece by piece would be in memory three times at worst.
     wxString moved;
     moved.reserve(text.length() + folders.size() * to.length() - folders.size() * from.length());
-    size_t copied = 0; // how many characters of the text are in moved
+    size_t copied = 0; // the number of characters of the text that are in moved
     for (const size_t folder : folders)
     {
         moved.append(text, copied, folder - copied).append(to);

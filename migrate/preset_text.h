@@ -1,15 +1,15 @@
-// The text of a job preset, and what becomes of it.
+// The text of a job preset, and its migrated form.
 #pragma once
 
 #include <wx/string.h>
 
 #include <string>
 
-/// Replaces the folder by the other one in every template path of the text that lies in it: where
-/// the search text ORXImposeTemplate">" and the folder's text follow each other, and a path
-/// separator or the closing double quote follows them. Separators at the end of either folder do
-/// not count. An empty folder, or a new one that XML text cannot hold, replaces nothing.
-/// Returns the number of replacements; takes a time in proportion to the text.
+/// Replaces the first folder with the second in every template path of the text that lies in it:
+/// where the search text ORXImposeTemplate">" is directly followed by the folder's text, and that
+/// by a path separator or the closing double quote. Separators at the end of either folder are
+/// ignored. Replaces nothing if the folder is empty, or if XML cannot hold the text of the new one.
+/// Returns the number of replacements. Takes time proportional to the length of the text.
 size_t MovePresetPaths(wxString& text, wxString from, wxString to);
 
 /// A preset file's new content, or why the file has to stay as it is.
@@ -20,6 +20,6 @@ struct RewrittenPreset
     std::string bytes;
 };
 
-/// The content that replaces these bytes: the paths moved, in UTF-8 without byte-order mark, and
-/// where the system ends lines with CR LF, so ends every line.
+/// The content that replaces these bytes: with moved paths, in UTF-8 without byte-order mark, and
+/// with every line ending in CR LF if the system's lines do.
 RewrittenPreset RewritePreset(const std::string& before, const wxString& from, const wxString& to);

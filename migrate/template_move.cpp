@@ -26,8 +26,8 @@ bool IsOnServer(const wxString& path)
     return path.length() > 1 && IsAnySeparator(path[0]) && IsAnySeparator(path[1]);
 }
 
-// "\\host\share", in lower case and with backslashes; of "\\?\UNC\host\share\x" and the like so
-// many parts that the host is among them.
+// "\\host\share", in lower case and with backslashes; of "\\?\UNC\host\share\x" and the like,
+// enough parts to include the host.
 wxString Share(const wxString& path)
 {
     wxStringTokenizer parts(path.Lower(), "\\/", wxTOKEN_STRTOK);
@@ -43,7 +43,7 @@ wxString Share(const wxString& path)
     return share;
 }
 
-// Variables may stand for a server's name or a drive, too.
+// A variable may also expand to a server or a drive.
 bool IsElsewhereByName(const wxString& stored, const wxString& folder)
 {
     const wxString path = wxExpandEnvVars(stored);
@@ -89,7 +89,7 @@ TemplateMove DecideTemplateMove(const wxString& storedPath, const std::string& f
     const wxString fromPath = from.GetFullPath(wxPATH_NATIVE);
     const wxFileName templateFile(storedPath, wxPATH_NATIVE);
     const bool isInFolder = IsSameFolder(FolderOf(templateFile), fromPath);
-    // In an encoding that is not known only ASCII is read as what it is.
+    // In an unknown encoding, only ASCII is read correctly.
     if (!isInFolder && storedPath.IsAscii())
         return {Outcome::Elsewhere, {}};
     if (!IsReadFaithfully(folderCfg))

@@ -9,17 +9,16 @@
 
 #include <string>
 
-/// What becomes of a stored template path.
+/// What happens to a stored template path.
 struct TemplateMove
 {
     enum class Outcome
     {
-        NoFromFolder,    // the registry does not name the template folder of the version being left
-        Elsewhere,       // the template does not lie directly in that folder
-        UnknownEncoding, // the document cannot be read faithfully, so its text cannot be written
-                         // again
-        NoToFolder, // the registry does not name the template folder of the version being installed
-        NotStorable, // the new path holds a character that XML cannot store
+        NoFromFolder,    // no registry value for the template folder of the version being left
+        Elsewhere,       // the template is not directly in that folder
+        UnknownEncoding, // the document cannot be read faithfully, so it cannot be rewritten
+        NoToFolder,      // no registry value for the template folder of the version being installed
+        NotStorable,     // the new path holds a character that XML cannot store
         Moves
     };
 
@@ -27,19 +26,19 @@ struct TemplateMove
     wxString newPath; // when it moves
 };
 
-/// Decides for the path that this Folder.cfg (its bytes) stores. Each registry lookup is made only
-/// when the ones before it leave the question open.
+/// Decides about the path that this Folder.cfg (given as bytes) stores. Makes each registry lookup
+/// only if the decision still depends on it.
 TemplateMove DecideTemplateMove(const wxString& storedPath, const std::string& folderCfg,
                                 bool isUpgrade);
 
-/// Whether both names lead to the same folder. As wxFileName::SameAs, but no stored name makes
-/// anybody ask a server: one on a server, or one whose drive differs from the other's, is in
-/// another folder without further ado, unless the other folder is on the same share; so is one that
-/// leads over a shortcut (.lnk). A name with a final separator is not the same as one without.
+/// Whether both names lead to the same folder. Like wxFileName::SameAs, but a stored name never
+/// causes access to a server: a name on a server counts as another folder unless both are on the
+/// same share, and so do a name on another drive and a name that leads over a shortcut (.lnk). A
+/// name with a final separator is not the same as one without.
 bool IsSameFolder(const wxString& stored, const wxString& folder);
 
-/// The Folder.cfg with the root's settings and this imposition table, or why the file has to stay
-/// as it is. The document has to be loaded with wxXMLDOC_KEEP_WHITESPACE_NODES.
+/// The content of Folder.cfg with the root's settings and this imposition table, or why the file
+/// has to stay as it is. The document has to be loaded with wxXMLDOC_KEEP_WHITESPACE_NODES.
 struct RewrittenFolderCfg
 {
     const wchar_t* reasonToStay = nullptr;

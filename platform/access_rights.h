@@ -1,10 +1,11 @@
-// What the process may do, without doing it; one source for each system.
+// What the process is permitted to do, found out without doing it; one source for each system.
 #pragma once
 
 #include <wx/string.h>
 
-/// Whether SetFileAttributesW would be let at it. Changes nothing; a link is looked at itself.
+/// Whether SetFileAttributesW would be permitted. Changes nothing; of a link, checks the link
+/// itself.
 bool MayChangeAttributes(const wxString& path);
 
-/// Whether a file may be made in the directory.
+/// Whether a file can be created in the directory.
 bool MayCreateIn(const wxString& directory);

@@ -18,7 +18,7 @@ bool CopyOver(const wxString& source, const wxString& destination)
         return false;
     if (!to.Read(before))
     {
-        // Too long for an icon: nothing that is worth being put back.
+        // Too long for an icon, so not worth restoring.
         before.clear();
         to.SetLength(0);
     }

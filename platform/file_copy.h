@@ -3,15 +3,15 @@
 
 #include <wx/string.h>
 
-/// Makes the content and attributes of an existing file those of the source, as wxCopyFile does: in
-/// place, and off Windows, where a file's own permissions do not protect it from that, in a new
-/// file where it cannot be written. Through a link in the destination's place nothing is written.
-/// False when that fails; a destination that was written in place then has its old content. Does
+/// Copies the source's content and attributes over an existing file, as wxCopyFile does. Writes in
+/// place; except on Windows, a file that cannot be written is replaced by a new one, which its own
+/// permissions do not prevent. Never writes through a link in place of the destination. Returns
+/// false if the copy fails; a destination that was written in place then has its old content. Does
 /// not wait for the disk.
 bool CopyOver(const wxString& source, const wxString& destination);
 
-/// Whether CopyOver would be let at the destination, and could read the source. Changes nothing.
+/// Whether CopyOver could read the source and write the destination. Changes nothing.
 bool MayCopyOver(const wxString& source, const wxString& destination);
 
-/// Whether the destination has the source's content and attributes already.
+/// Whether the destination already has the source's content and attributes.
 bool IsCopy(const wxString& source, const wxString& destination);

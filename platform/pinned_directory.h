@@ -1,4 +1,4 @@
-// A directory that stays the same one while it is worked in; one source for each system.
+// A directory that cannot be exchanged while it is in use; one source for each system.
 #pragma once
 
 #include <wx/string.h>
@@ -14,14 +14,13 @@ enum class Links
     Refuse
 };
 
-/// Whether there is a link of that name. The link itself is looked at, not what it leads to.
+/// Whether the name is that of a link. Checks the name itself, not a link's target.
 bool IsLink(const wxString& path);
 
-/// Keeps a directory from being exchanged for another one, or for a link, between two looks at it.
+/// Prevents a directory from being exchanged for another one, or for a link, between two accesses.
 ///
 /// Windows: a handle without FILE_SHARE_DELETE, so that neither the directory nor one above it can
-/// be renamed or removed. Elsewhere: a descriptor; what is below it is reached by way of
-/// /proc/self/fd.
+/// be renamed or removed. Elsewhere: a descriptor; entries are reached through /proc/self/fd.
 class PinnedDirectory
 {
   public:
@@ -30,17 +29,17 @@ class PinnedDirectory
     PinnedDirectory(const PinnedDirectory&) = delete;
     PinnedDirectory& operator=(const PinnedDirectory&) = delete;
 
-    /// False when there is no such directory, when it cannot be entered, or when it is a refused
+    /// Returns false if there is no such directory, if it cannot be entered, or if it is a refused
     /// link.
     bool IsOpen() const;
 
-    /// The path of an entry, or for an empty name of the directory itself, for the calls of the
-    /// system and of the library. Not for people: on Linux it names the descriptor. Of a directory
-    /// that is not open it leads nowhere.
+    /// The path of an entry, or of the directory itself if the name is empty, for calls to the
+    /// system and the library. Not for messages: on Linux it names the descriptor. If the directory
+    /// is not open, the path leads nowhere.
     wxString Reach(const wxString& name) const;
 
-    /// What no other directory has while both are open: volume and file index, or device and inode.
-    /// Two zeros of one that is not open.
+    /// Identifies the directory among all that are open: volume and file index, or device and
+    /// inode. Two zeros if it is not open.
     std::pair<std::uint64_t, std::uint64_t> Identity() const;
 
   private:

@@ -3,8 +3,9 @@
 
 #include <wx/string.h>
 
-/// Whether the process has an administrator's rights. Windows: its token is elevated, as that of
-/// SYSTEM is, too. Elsewhere: its effective user is root. Needs no static object to be ready.
+/// Whether the process has an administrator's rights. Windows: its token is elevated, as is that of
+/// SYSTEM. Elsewhere: its effective user is root. Can be called before static objects are
+/// constructed.
 bool IsElevated();
 
 /// The account that the process runs as: the domain or the computer, a backslash, the user, for
@@ -12,6 +13,6 @@ bool IsElevated();
 /// the user's number if it has no name. Empty if the system does not say.
 wxString AccountName();
 
-/// Whether the process refuses to pass links that a process without administrator's rights has
-/// made: an elevated one on Windows 11 and Windows 10 22H2.
+/// Whether the process refuses to follow links made by processes without administrator's rights: an
+/// elevated process does on Windows 11 and Windows 10 22H2.
 bool RefusesLinksOfOthers();

@@ -43,6 +43,11 @@ bool RegularFile::Rewrite(const std::string& before, const std::string& after, W
     return false;
 }
 
+void RegularFile::ReportNotReopened(const wxString& shownPath) const
+{
+    wxLogSysError(static_cast<long>(m_error), _("can't open file '%s'"), shownPath);
+}
+
 void RegularFile::ReportNotWritten(const wxString& shownPath) const
 {
     wxLogSysError(static_cast<long>(m_error), _("can't write to file '%s'"), shownPath);

@@ -1,5 +1,5 @@
 // A regular file that is read, and perhaps rewritten in place; one source for each system, and
-// regular_file.cpp for what is the same on all.
+// regular_file.cpp for what is the same on all of them.
 #pragma once
 
 #include "platform/pinned_directory.h"
@@ -9,23 +9,23 @@
 #include <cstdint>
 #include <string>
 
-/// Bytes. What is longer is not read into memory: a planted file of terabytes must not end a run.
+/// Bytes. A longer file is not read into memory: a planted file of terabytes must not crash a run.
 constexpr std::int64_t LongestFile = std::int64_t{256} * 1024 * 1024;
 
-/// A file opened without waiting for another program (at a pipe in its place) and, where links are
-/// refused, not through one. No call reports an error by itself.
+/// A file that is opened without waiting (a pipe in its place would block) and, if links are
+/// refused, not through a link. No call reports an error by itself.
 ///
-/// As long as the object lives it is the same file, whatever happens to its name; on Windows no
-/// program can rename or remove it meanwhile (it is opened without FILE_SHARE_DELETE).
+/// As long as it is open, it is the same file, whatever happens to its name; on Windows no program
+/// can rename or remove it meanwhile (it is opened without FILE_SHARE_DELETE).
 class RegularFile
 {
   public:
     enum class Status
     {
         NotOpen,
-        NotThere, // nothing of that name that counts: no regular file, or a refused link
-        Refused,  // it is there, but may not be opened that way, or another program keeps it
-        Gone,     // the name does not lead to the same file any more
+        NotThere, // no such file, not a regular file, or a refused link
+        Refused,  // it exists, but access is denied or another program blocks it
+        Gone,     // the name no longer leads to the same file
         Open
     };
 
@@ -41,53 +41,57 @@ class RegularFile
     RegularFile& operator=(const RegularFile&) = delete;
 
     Status OpenForReading(const wxString& path, Links links);
-    /// For reading and writing. The content stays as it is.
+    /// Opens for reading and writing. The content stays as it is.
     Status OpenForUpdate(const wxString& path, Links links);
-    /// Opens the same file for update as well (ReOpenFile; elsewhere the name has to lead to the
-    /// same device and inode). Unless the result is Open, the file stays open for reading.
+    /// Also opens the same file for update (ReOpenFile; elsewhere the name has to lead to the same
+    /// device and inode). If the result is not Open, the file stays open for reading.
     Status ReopenForUpdate();
-    /// Makes a new, empty file and opens it for update; fails, with nothing changed, when anything
-    /// of that name is there (CREATE_NEW, O_EXCL).
+    /// Creates an empty file and opens it for update; fails and changes nothing if anything of that
+    /// name exists (CREATE_NEW, O_EXCL).
     Status CreateNew(const wxString& path);
-    /// Puts a new, empty file in the place of one that may not be written. Not on Windows, where a
-    /// file's own permissions protect it from that.
+    /// Replaces a file that cannot be written with a new, empty one. Not on Windows, where a file's
+    /// own permissions prevent that.
     Status Replace(const wxString& path);
     static bool MayReplace(const wxString& path);
-    /// False when the system reports an error, which does not matter: all bytes were handed over
-    /// before.
+    /// Returns false if the system reports an error, which does not matter: all bytes have already
+    /// been written.
     bool Close();
 
-    /// In bytes; -1 when it cannot be found out.
+    /// In bytes; -1 if it cannot be determined.
     std::int64_t Length() const;
-    /// The whole content as it is now; false when it has more bytes than that, or could not be read
+    /// Reads the whole current content; returns false if it is longer than that, or cannot be read
     /// to its end.
     bool Read(std::string& bytes, std::int64_t most = LongestFile) const;
 
-    /// Makes the second text the whole content, in place of the first, which is what the file
-    /// holds.
+    /// Replaces the whole content. The first text must be the current content, the second is the
+    /// new one.
     ///
-    /// Room for a longer content is made before a byte changes, where the system can (a full disk
-    /// leaves the file as it was). One write; a shorter content is written with line feeds up to
-    /// the old length, and then cut. When any of that fails, the old bytes are put back and the
-    /// result is false. At last, unless that is not wanted, waits for the disk; when that fails,
-    /// the new content stays. A process that is ended meanwhile leaves the old content, the new
-    /// one, or the new one followed by line feeds, as far as the system carries out a write as one.
+    /// If the system supports it, reserves space for a longer content before a byte changes (so a
+    /// full disk leaves the file as it was). Writes once; a shorter content is written with line
+    /// feeds up to the old length, and the file is then cut. If any of that fails, restores the old
+    /// bytes and returns false. Finally waits for the disk, if requested; if that fails, the new
+    /// content stays. If the process is ended meanwhile, the file has the old content, the new one,
+    /// or the new one followed by line feeds, provided that the system does not interrupt a write.
     bool Rewrite(const std::string& before, const std::string& after, Wait wait = Wait::ForDisk);
 
-    /// Takes over what wxCopyFile takes over with the content. Windows: the attributes and the time
-    /// of the last change. Elsewhere: the mode.
+    /// Copies what wxCopyFile copies in addition to the content. Windows: the attributes and the
+    /// time of the last change. Elsewhere: the mode.
     void TakeAttributes(const RegularFile& source);
-    /// Whether that would leave read-only, hidden, system or the mode as they are.
+    /// Whether TakeAttributes would change neither read-only, hidden and system nor the mode.
     bool HasAttributesOf(const RegularFile& source) const;
+
+    /// Has the library report, under that path, why the file could not be opened for update as
+    /// well.
+    void ReportNotReopened(const wxString& shownPath) const;
 
     /// Has the library report that the file could not be written, under that path and with the
     /// error of the call that failed.
     void ReportNotWritten(const wxString& shownPath) const;
 
-    /// Cuts the file, or fills it up with zeros.
+    /// Cuts the file, or extends it with zeros.
     bool SetLength(std::int64_t length);
 
-    /// Adds the bytes at the end; false, and nothing added, when that fails. Does not wait for the
+    /// Appends the bytes; if that fails, appends nothing and returns false. Does not wait for the
     /// disk.
     bool Append(const std::string& bytes);
 

@@ -4,7 +4,7 @@
 
 #include <wx/string.h>
 
-/// Writes the text in UTF-8, on a Windows console as Unicode, whatever its code page. False when it
-/// could not be written whole.
+/// Writes the text in UTF-8, or to a Windows console as Unicode, whatever its code page. Returns
+/// false if it could not be written completely.
 bool WriteStandardOutput(const wxString& text);
 void WriteStandardError(const wxString& text);

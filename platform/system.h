@@ -1,8 +1,8 @@
 // The operating system calls that the tool makes, under their real names.
 //
-// On Windows this is the system's own headers. Elsewhere it declares the same names with the same
-// contracts, and platform/linux/ answers them: the hives are text files, attributes live in file
-// modes and extended attributes, a profile file is a file, and there is no shell to tell.
+// On Windows this header only includes the system's own. Elsewhere it declares the same names with
+// the same contracts, and platform/linux/ answers them: the hives are text files, attributes live
+// in file modes and extended attributes, a profile file is a file, and there is no shell to notify.
 #pragma once
 
 #ifdef _WIN32
@@ -69,7 +69,7 @@ DWORD GetPrivateProfileStringW(LPCWSTR section, LPCWSTR key, LPCWSTR defaultValu
 
 // Shell --------------------------------------------------------------------------------------
 
-constexpr int MAX_PATH = 260; // characters, the terminating NUL included
+constexpr int MAX_PATH = 260; // characters, including the terminating NUL
 
 using HMODULE = struct Module*;
 using FARPROC = std::intptr_t (*)();

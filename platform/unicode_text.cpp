@@ -15,7 +15,7 @@ bool IsLow(unsigned long unit)
     return unit >= 0xDC00 && unit < 0xE000;
 }
 
-// The position of the first wide character from the start on that is not part of Unicode text.
+// The position of the first wide character, from the given start, that is not part of Unicode text.
 size_t FindOffender(const wchar_t* text, size_t length, size_t start)
 {
     for (size_t i = start; i < length; ++i)

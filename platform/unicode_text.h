@@ -5,15 +5,15 @@
 
 #include <cstddef>
 
-/// Whether the text is Unicode: no surrogate without its partner, nothing above U+10FFFF. Exactly
-/// then it encodes as UTF-8 and comes back from it as it was.
+/// Whether the text is Unicode: no surrogate without its partner, nothing above U+10FFFF. Only such
+/// text survives encoding as UTF-8 and decoding.
 bool IsUnicodeText(const wxString& text);
 
 /// The text of UTF-16LE bytes up to the first NUL or the last whole unit. A surrogate without its
-/// partner stays what it is.
+/// partner stays as it is.
 wxString FromUtf16Bytes(const unsigned char* bytes, size_t count);
 
-/// The text as one line of Unicode, for a log or a report: U+FFFD in place of every control
-/// character but tab (U+0000 to U+001F, U+007F to U+009F), of U+2028 and U+2029, which end lines
-/// too, and of everything that is not Unicode.
+/// The text as one line of Unicode, for a log or a report: U+FFFD replaces every control character
+/// except tab (U+0000 to U+001F, U+007F to U+009F), U+2028 and U+2029, which also end lines, and
+/// everything that is not Unicode.
 wxString ToOneLine(const wxString& text);

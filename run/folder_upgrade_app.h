@@ -1,5 +1,5 @@
 // The application object, which lives for the whole run and carries its state to the steps. Its
-// functions are in app/folder_upgrade_app.cpp, which knows the steps.
+// functions are in app/folder_upgrade_app.cpp, which calls the steps.
 #pragma once
 
 #include <wx/app.h>

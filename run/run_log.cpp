@@ -16,7 +16,7 @@ std::string FormatLine(const wxString& message, int count)
     return ToOneLine(line).utf8_string() + "\r\n";
 }
 
-// The first line makes the file, or empties it, a byte-order mark included.
+// The first line creates the file or empties it, including a byte-order mark.
 RegularFile::Status OpenLog(RegularFile& file, const PinnedDirectory& directory, bool isFirstLine)
 {
     const wxString path = directory.Reach(RunLogFileName);

@@ -6,5 +6,5 @@
 constexpr const wchar_t* RunLogFileName = L"UpgradeDowngrade.log";
 
 /// The log's folder, ORX_Installers in the per-user application data folder, with a final
-/// separator. Whether it is there is not asked; the tool does not create it.
+/// separator. Does not check that it exists; the tool never creates it.
 wxString RunLogDirPath();

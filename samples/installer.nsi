@@ -1,5 +1,5 @@
-; A setup that ships FolderUpgrade, as a sample and for trials. It takes the place of the client's own, so it has no other
-; files and no dialogs but the progress.
+; A setup that ships FolderUpgrade, as a sample and for trials. It replaces the client's own setup, so it has no other
+; files, and no dialog except the progress.
 ;
 ;     makensis -DPACKAGE=<folder of the unpacked zip> -DVERSION=1.1.0 -DOUTPUT=<setup>.exe samples/installer.nsi
 ;     <setup>.exe [/S] [/D=<folder>]     upgrades
@@ -24,10 +24,10 @@
 ;
 ; What NSIS cannot do:
 ;
-;   - An elevated setup cannot start a program as the user without a plug-in. Where another account confirms the
+;   - An elevated setup cannot start a program as the user without a plug-in. If another account confirms the
 ;     elevation, the tool sees that account's registry, presets and log folder. The reports' first line names the account.
 ;     An MSI does better there (installer.wxs).
-;   - nsExec has a time limit but leaves a program that exceeds it running. What still runs after ten minutes is the
+;   - nsExec has a time limit but leaves a program that exceeds it running. After ten minutes, all that still runs is the
 ;     library's message box, which waits for its button: the run is over by then, and its log complete. The report
 ;     "before" names each cause of a box as a problem.
 !include LogicLib.nsh
@@ -45,8 +45,9 @@ RequestExecutionLevel admin ; for Program Files and the machine's registry
 Page instfiles
 UninstPage instfiles
 
-; Starts a program. Its status is written to the details and otherwise ignored: the tool's is always -1 (some engines:
-; 4294967295), the check's is in its report, and a migration that fails for one folder is no reason to leave the client out.
+; Starts a program. Its status is written to the details and otherwise ignored: the tool's is always -1 (in some engines
+; 4294967295), the check's follows from its report, and a migration that fails for a single folder is no reason not to
+; install the client.
 !macro START program arguments
     nsExec::Exec /TIMEOUT=${TIME_LIMIT} '"$INSTDIR\${program}" ${arguments}'
     Pop $0 ; or "timeout" or "error"
@@ -60,13 +61,13 @@ UninstPage instfiles
     !insertmacro START FolderUpgradeCheck.exe '${switch} "${REPORTS}-before.txt"'
     !insertmacro START FolderUpgrade.exe ${switch}
     !insertmacro START FolderUpgradeCheck.exe '${switch} "${REPORTS}-after.txt"'
-    ; An elevated setup writes here into a folder in which the user may plant links; the check and CopyFiles follow them.
+    ; An elevated setup writes to a folder in which the user may have planted links; the check and CopyFiles follow them.
     CopyFiles /SILENT "$APPDATA\ORX_Installers\UpgradeDowngrade.log" "${REPORTS}.log"
     !undef REPORTS
 !macroend
 
 Section
-    SetRegView 64 ; the tool looks into the 32-bit view first: a client that once wrote there has to remove its key
+    SetRegView 64 ; the tool reads the 32-bit view first: a client that once wrote there has to remove its key
     ReadRegStr $1 HKLM "${KEY}" "Version" ; before it is overwritten
 
     SetOutPath "$INSTDIR\BundleIcons"
@@ -77,7 +78,7 @@ Section
     File "${PACKAGE}/THIRD-PARTY-NOTICES.txt"
     File "${PACKAGE}/hf_*.ico" ; this version's, which an upgrade copies
 
-    WriteRegStr HKLM "${KEY}" "InstallPath" "$INSTDIR" ; NSIS has cut off a final separator: the tool adds "\template"
+    WriteRegStr HKLM "${KEY}" "InstallPath" "$INSTDIR" ; NSIS has removed a final separator; the tool adds "\template"
     WriteUninstaller "$INSTDIR\uninstall.exe"
     WriteRegStr HKLM "${UNINSTALL_KEY}" "DisplayName" "Hot folder client"
     WriteRegStr HKLM "${UNINSTALL_KEY}" "DisplayVersion" "${VERSION}"
@@ -86,16 +87,16 @@ Section
     ${If} $1 != "${VERSION}"
         !insertmacro MIGRATE I upgrade
     ${EndIf}
-    WriteRegStr HKLM "${KEY}" "Version" "${VERSION}" ; last: a setup that is ended before it migrates when started again
+    WriteRegStr HKLM "${KEY}" "Version" "${VERSION}" ; last: if the setup is ended before this, it migrates when it is started again
 SectionEnd
 
 Section Uninstall
     SetRegView 64
-    !insertmacro MIGRATE U downgrade ; while the files and the folder that it moves from are there
+    !insertmacro MIGRATE U downgrade ; while the files and the registry value that it needs are there
 
     DeleteRegKey HKLM "${UNINSTALL_KEY}"
     DeleteRegKey HKLM "${KEY}"
-    ; By name: the folder may be one that the user chose, with other files in it.
+    ; File by file: the user may have chosen a folder that has other files.
     Delete "$INSTDIR\BundleIcons\hf_*.ico"
     RMDir "$INSTDIR\BundleIcons"
     Delete "$INSTDIR\hf_*.ico"

@@ -3,8 +3,7 @@
 
     samples/installer_test.py BUILD_DIR
 
-BUILD_DIR is the folder of the preset "windows", built. Wine gets a prefix
-and a display of its own. On the workstation are two hot folders, one whose template moves, and a job preset.
+BUILD_DIR is the build folder of the preset "windows". Wine gets its own prefix and display. On the workstation are two hot folders, one whose template moves, and a job preset.
 """
 import functools
 import os
@@ -32,7 +31,7 @@ def check(name, found, wanted):
     if found == wanted:
         passed += 1
         return
-    if isinstance(found, dict) and isinstance(wanted, dict):  # what differs says enough
+    if isinstance(found, dict) and isinstance(wanted, dict):  # show only the differences
         names = [key for key in found.keys() | wanted.keys() if found.get(key) != wanted.get(key)]
         found, wanted = ({key: files.get(key) for key in names} for files in (found, wanted))
     failures.append(name)
@@ -55,7 +54,7 @@ def files_below(folder):
 # Package ------------------------------------------------------------------------------------------
 
 def pack(build, scratch, sign):
-    """The package, made beside that of the build folder, whose settings stay as they are."""
+    """Makes the package apart from that of the build folder, whose settings stay as they are."""
     run("cpack", "--config", build / "CPackConfig.cmake", "-D", f"CPACK_FOLDER_UPGRADE_SIGN_COMMAND={sign}", "-B", scratch / "packing")
     (package,) = (scratch / "packing").glob("FolderUpgrade-*-win64.zip")
     return package.read_bytes()
@@ -76,7 +75,7 @@ def try_signing(build, scratch):
     (scratch / "sign").chmod(0o755)
     unsigned = pack(build, scratch, "")
     signed = pack(build, scratch, scratch / "sign")
-    check("without a command two packages are the same", pack(build, scratch, "") == unsigned, True)
+    check("without a command two packages are identical", pack(build, scratch, "") == unsigned, True)
     unpack(unsigned, scratch / "package")
     unpack(signed, scratch / "signed package")
     for program in PROGRAMS:
@@ -120,7 +119,7 @@ class Workstation:
                     rf'<K n="ORXImposeTemplate">"{template_dir}\Sub\Booklet"</K>'.encode() + b"\r\n"}
 
     def lay_out(self, previous):
-        """As before an upgrade, without reports and logs; previous is the registry's text, None for no value."""
+        """Restores the state before an upgrade, without reports and logs; previous is the registry's text or None."""
         for name, text in {**self.files(PREVIOUS, b"an older picture"), "ProgramData/hotfolder/HotFolderList.cfg":
                            rb'<L><HotFolder path="C:\Hot Folders\A"/><HotFolder path="C:\Hot Folders\B"/></L>'}.items():
             (self.drive / name).parent.mkdir(parents=True, exist_ok=True)
@@ -132,7 +131,7 @@ class Workstation:
             self.wine("reg", "add", r"HKCU\SOFTWARE\HF", "/v", "Path", "/d", previous, "/f")
 
     def look(self):
-        """The hot folders' and presets' files, less what Wine makes of Desktop.ini."""
+        """The files of the hot folders and presets, except Desktop.ini, which Wine changes."""
         return {str(path.relative_to(self.drive)): path.read_bytes() for folder in (self.drive / "Hot Folders", self.user / "ORX")
                 for path in folder.rglob("*") if path.is_file() and path.name != "Desktop.ini"}
 
@@ -143,14 +142,14 @@ class Workstation:
             return dict(re.findall(r"^ +(\w+) +REG_SZ +(.*)$", output.read(), re.MULTILINE))
 
     def report(self, name):
-        """Its direction, the kinds of its lines, and its text."""
+        """A report's direction, the kinds of its lines, and its text."""
         text = (self.logs / name).read_text(encoding="utf-8") if (self.logs / name).exists() else ""
         direction = re.match(r"FolderUpgradeCheck \d+\.\d+\.\d+, (\w+), ", text)
         return direction and direction[1], set(re.findall(r"^  (change|problem)  ", text, re.MULTILINE)), text
 
 
 def log_lines(user, switch, icon_dir, stored, complaint=None):
-    """The run log, where complaint is what the log says when a template path cannot move."""
+    """The expected run log; complaint is its line if a template path cannot move."""
     call = {"I": "Installation : Upgrade call with switch: I", "U": "Un-installation : Downgrade call with switch: U"}[switch]
     icon, copy = rf"{icon_dir}\hf_folder.ico", r"C:\Hot Folders\A\[_ORX_HotFolder_]\hf_folder.ico"
     complaints = [complaint] if complaint else []
@@ -191,11 +190,11 @@ def try_installer(name, build_installer, scratch, station):
     new_icon, user = shipped["hf_folder.ico"], "C:\\" + str(station.user.relative_to(station.drive)).replace("/", "\\")
 
     def check_step(step, command, version, files, reports=None, log=None):
-        """reports: the direction, and what kinds of lines both have."""
+        """reports: the direction, and the kinds of lines in both."""
         step = f"{name}, {step}"
         before = files_below(station.logs)
         check(f"{step}: exit status", station.wine(*command), 0)
-        for _ in range(300 if version is None else 0):  # the uninstaller goes on as a copy of itself
+        for _ in range(300 if version is None else 0):  # the uninstaller continues as a copy of itself
             if not station.product.exists():
                 break
             time.sleep(0.1)

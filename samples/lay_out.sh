@@ -1,11 +1,12 @@
 #!/usr/bin/env bash
-# Lays out in a folder what the machine of a user of hot folders looks like before an upgrade:
+# Creates in a folder what a hot folder user's machine looks like before an upgrade:
 #
 #     samples/lay_out.sh [--fresh] DIR
 #
-# DIR/machine is then to be $XDG_CONFIG_DIRS, DIR/user $XDG_CONFIG_HOME. The texts come from samples/workstation/, where
-# @ROOT@ stands for DIR and @/@ for the path separator (@//@ as a .reg file writes it); the icons from appearance/icons/.
-# DIR has to be absent or empty. --fresh first removes what an earlier call laid out there, never another folder.
+# Use DIR/machine as $XDG_CONFIG_DIRS and DIR/user as $XDG_CONFIG_HOME. The texts come from samples/workstation/, where
+# @ROOT@ is replaced with DIR and @/@ with the path separator (@//@ with its form in a .reg file); the icons come from
+# appearance/icons/. DIR has to be missing or empty. --fresh first removes what an earlier call created there, never
+# another folder.
 set -euo pipefail
 shopt -s extglob
 
@@ -14,7 +15,7 @@ icons=$samples/../appearance/icons
 marker=.sample-workstation
 private='[_ORX_HotFolder_]'
 
-# Hot folder | the icon in its private directory | the picture that this stale copy has
+# Hot folder | the icon in its private directory | the picture in this outdated copy
 stale_icons='
 Flyers A4       | hf_folder          | hf_folder_disabled
 Broschüren Köln | hf_folder_disabled | hf_folder
@@ -51,7 +52,7 @@ for_each_row() {
     done <<<"$1"
 }
 
-# The text as the replacement of a sed command.
+# The text, escaped as the replacement in a sed command.
 replacement() {
     printf %s "$1" | sed 's/[\\&|]/\\&/g'
 }
@@ -70,11 +71,11 @@ put_icon() {
     cp "$icons/$3.ico" "$dir/Hot Folders/$1/$private/$2.ico"
 }
 
-# The bits go into the extended attribute first: once a file is read-only, its owner cannot set that.
+# The bits go into the extended attribute first: the owner cannot set it on a read-only file.
 set_attributes() {
     local path="$dir/Hot Folders/$1" bits=$2
     [ -d "$path" ] || bits=$((bits & ~1))
-    setfattr -n user.DOSATTRIB -v "$(printf '"0x%x"' "$bits")" "$path" || fail "this file system keeps no attributes: $dir"
+    setfattr -n user.DOSATTRIB -v "$(printf '"0x%x"' "$bits")" "$path" || fail "this file system does not support extended attributes: $dir"
     if [ "$bits" != "$2" ]; then
         chmod a-w "$path"
     fi
@@ -104,9 +105,9 @@ if [ "$fresh" = yes ] && [ -f "$dir/$marker" ]; then
     clear_dir
 fi
 if [ -e "$dir/$marker" ]; then
-    fail "laid out already (--fresh lays it out anew): $dir"
+    fail "already created (--fresh creates it again): $dir"
 elif [ -e "$dir" ] && { [ ! -d "$dir" ] || [ -n "$(ls -A -- "$dir")" ]; }; then
-    fail "there is something else already: $dir"
+    fail "already exists, but is not a sample workstation: $dir"
 fi
 
 mkdir -p -- "$dir"

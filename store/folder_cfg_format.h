@@ -2,9 +2,10 @@
 //
 // An XML 1.0 document in UTF-8. The root element has the attributes of store/root_attributes.h;
 // below it are the sections, in the order of their names here. Inside JobSetting, ImposeSetting and
-// PreflightSettings an attribute's position counts, not its name.
+// PreflightSettings, attributes are identified by position, not by name.
 //
-// The names are wide, as the library's strings are: converting them took as long as half a load.
+// The names are wide, like the library's strings: converting them took half as long as loading a
+// file.
 #pragma once
 
 namespace FolderCfg
@@ -31,7 +32,7 @@ constexpr const wchar_t* Hotfolder = L"Hotfolder";
 constexpr const wchar_t* ShortName = L"ShortName";
 constexpr const wchar_t* DisplayName = L"DisplayName";
 
-/// The level of the filter setting in the document; the root's is 0.
+/// The level of the filter setting in the document; the root has level 0.
 constexpr int FilterSettingLevel = 1;
 
 } // namespace FolderCfg

@@ -16,7 +16,7 @@ const wxXmlNode* FindSection(const wxXmlNode* root, const wchar_t* name)
     return root ? FindElement(root, name, true) : nullptr;
 }
 
-// The values of a node's first four attributes, which stay the node's, and how many of them it has.
+// The values of a node's first four attributes, which the node still owns, and the number of them.
 struct Positional
 {
     explicit Positional(const wxXmlNode& node)
@@ -26,7 +26,7 @@ struct Positional
             values[count++] = &attribute->GetValue();
     }
 
-    // Copies the value at that position, where there is one.
+    // Copies the value at that position, if there is one.
     void Get(size_t position, wxString& value) const
     {
         if (position < count)
@@ -151,7 +151,7 @@ void ReadInputFormats(const wxXmlNode* root, std::vector<InputFormat>& formats)
         if (attributes.empty())
             continue;
         InputFormat format;
-        // Without a short name the display name is not read.
+        // Without a short name, the display name is not read.
         if (GetAttribute(attributes, FolderCfg::ShortName, format.ShortName))
             GetAttribute(attributes, FolderCfg::DisplayName, format.DisplayName);
         formats.push_back(format);

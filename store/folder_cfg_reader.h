@@ -10,26 +10,27 @@
 
 /// Reads the root attributes and the input formats.
 ///
-/// The attributes are read as a chain: from the first absent one on, all fields stay as they were
-/// (an absent server_version becomes -1 and breaks no chain).
-/// Returns 0 when there is no such file; -1 when it cannot be loaded, which leaves the record as it
-/// was, or when the chain ends before server_name; 1 otherwise.
+/// The attributes are read as a chain: from the first missing one on, all fields stay as they were
+/// (a missing server_version becomes -1 and does not end the chain). Returns 0 if there is no such
+/// file; -1 if it cannot be loaded, which leaves the record as it was, or if the chain ends before
+/// server_name; 1 otherwise.
 int LoadHotFolderSettings(const wxString& path, HotFolderSettings& settings);
 
-/// Copies the "FilterSetting" element whole; without one, or when the file cannot be loaded, the
-/// node stays as it was. Returns 0 in every case.
+/// Copies the whole "FilterSetting" element. Without one, or if the file cannot be loaded, the node
+/// stays as it was. Always returns 0.
 int ReadFilterSetting(const wxString& path, wxXmlNode& node);
 
-/// What follows takes the root of a loaded document, or none. A missing section leaves the value as
-/// it was; entries with too few attributes are skipped.
+/// The following functions take the root of a loaded document, or null. If a section is missing,
+/// the value stays as it was; entries with too few attributes are skipped.
 
-/// As LoadHotFolderSettings; -1 without a root.
+/// Like LoadHotFolderSettings; returns -1 without a root.
 int ReadHotFolderSettings(const wxXmlNode* root, HotFolderSettings& settings);
-/// As above. The document has to be loaded with wxXMLDOC_KEEP_WHITESPACE_NODES.
+/// Copies the whole "FilterSetting" element, as above. The document has to be loaded with
+/// wxXMLDOC_KEEP_WHITESPACE_NODES.
 void ReadFilterSetting(const wxXmlNode* root, wxXmlNode& node);
-/// Returns 1 without a root or a "Paths" element, else 0.
+/// Returns 1 if there is no root or no "Paths" element, 0 otherwise.
 int ReadPaths(const wxXmlNode* root, HotFolderPaths& paths);
-/// Of a repeated key the first entry stays.
+/// If a key is repeated, the first entry stays.
 void ReadJobSettings(const wxXmlNode* root, JobSettingTable& table);
 void ReadImposeSettings(const wxXmlNode* root, ImposeSettingTable& table);
 /// Appends to the list.

@@ -13,7 +13,7 @@ namespace
 {
 
 constexpr int IndentationStep = 2;
-// The library's stream to memory moves all bytes for every kilobyte.
+// The library's memory stream copies all its bytes for every kilobyte that is added.
 class StringOutputStream : public wxOutputStream
 {
   public:
@@ -27,8 +27,8 @@ class StringOutputStream : public wxOutputStream
     }
 };
 
-// One section under construction. It remembers its last child: to look for it each time would take
-// a time that grows with the square.
+// One section under construction. It remembers its last child: finding it each time would take time
+// proportional to the square of the number of children.
 class Section
 {
   public:
@@ -45,7 +45,7 @@ class Section
   private:
     static wxXmlNode* Append(wxXmlNode& parent, const wxString& name, wxXmlNode* last)
     {
-        auto* child = new wxXmlNode(wxXML_ELEMENT_NODE, name); // the parent's from here on
+        auto* child = new wxXmlNode(wxXML_ELEMENT_NODE, name); // from here on owned by the parent
         if (last || !parent.GetChildren())
             parent.InsertChildAfter(child, last);
         else
@@ -57,7 +57,7 @@ class Section
     wxXmlNode* m_last = nullptr;
 };
 
-// Made once a section and not once an entry.
+// Made once for each section, not for each entry.
 struct KeyValueNames
 {
     wxString element = L"KEYVALUE";
@@ -72,7 +72,7 @@ void WriteFilterSetting(wxXmlNode& root, wxXmlNode& filterSetting)
     if (filterSetting.GetName() != FolderCfg::FilterSettingSection)
         return;
     auto* child = new wxXmlNode(wxXML_ELEMENT_NODE, FolderCfg::FilterSettingSection);
-    root.AddChild(child); // the root's from here on
+    root.AddChild(child); // from here on owned by the root
     MoveTree(filterSetting, *child);
 }
 
@@ -153,7 +153,7 @@ std::string FolderCfgBytes(const HotFolderSettings& settings, const JobSettingTa
 {
     wxXmlDocument document;
     auto* root = new wxXmlNode(wxXML_ELEMENT_NODE, FolderCfg::Root);
-    document.SetRoot(root); // the document's from here on
+    document.SetRoot(root); // from here on owned by the document
     for (const RootAttribute& attribute : RootAttributes())
         root->AddAttribute(attribute.name, attribute.Format(settings));
     WriteInputFormats(root, settings.InputFormatsSummary);

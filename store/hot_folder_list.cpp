@@ -33,7 +33,8 @@ struct EqualIgnoringCase
     }
 };
 
-// A comparison with every path before it would take a time that grows with the square of the list.
+// Comparing each path with every path before it would take time proportional to the square of the
+// list's length.
 using PathSet = std::unordered_set<wxString, FoldedHash, EqualIgnoringCase>;
 
 wxString ReadPath(const wxXmlNode& element)

@@ -13,20 +13,20 @@ wxString GetHotFolderListPath();
 /// separator.
 wxString GetHotFolderDataDir();
 
-/// What the list says.
+/// The content of the list.
 struct HotFolderList
 {
     XmlFile::State state = XmlFile::State::Missing;
-    /// The folders that exist, in the order of the file and as the file spells them, less white
-    /// space at their end; of paths that are equal ignoring case, the first.
+    /// The folders that exist, in the order and spelling of the file, without trailing white space;
+    /// of paths that are equal ignoring case, only the first.
     wxArrayString folders;
     wxArrayString missing;  // no directory of that name
-    wxArrayString repeated; // equal to one before, ignoring case
+    wxArrayString repeated; // equal to an earlier one, ignoring case
 };
 
-/// A list that cannot be opened or parsed is reported by the library.
+/// The library reports an error if the list cannot be opened or parsed.
 HotFolderList LoadHotFolderList();
 
-/// Appends the folders of the list, but for those that are in the array already, ignoring case. A
+/// Appends the folders of the list, except those that are already in the array, ignoring case. A
 /// list that is missing or cannot be read adds nothing.
 void ReadHotFolderList(wxArrayString& folders);

@@ -1,7 +1,7 @@
 // The settings of one hot folder in memory: six plain values, one for each part of Folder.cfg.
 //
-// All of them are their owner's own and copy deeply. FilterSetting, the sixth, is a wxXmlNode whose
-// name is "FilterSetting", or a default-constructed one for a file without that element.
+// All of them own their content and are copied deeply. FilterSetting, the sixth, is a wxXmlNode
+// with the name "FilterSetting", or a default-constructed one for a file without that element.
 #pragma once
 
 #include <wx/string.h>
@@ -19,7 +19,7 @@ struct InputFormat
 };
 
 /// The attributes of the root element and the input formats; each field has the name of the
-/// attribute or element that stores it. The tool gives a meaning to Enable alone.
+/// attribute or element that stores it. The tool interprets only Enable.
 struct HotFolderSettings
 {
     wxString name;
@@ -47,7 +47,7 @@ struct HotFolderSettings
     bool IsWidthBased = false;
 };
 
-/// The four folder paths of the "Paths" element, only carried.
+/// The four folder paths of the "Paths" element, which are only carried over.
 struct HotFolderPaths
 {
     wxString Failfolder;
@@ -82,10 +82,10 @@ struct PreflightSetting
 /// In the order of the file, repeated keys included.
 using PreflightSettingList = std::vector<PreflightSetting>;
 
-/// Sets both fields of the key's entry, which is added when the table has none.
+/// Sets both fields of the key's entry, and adds the entry if the table has none.
 void SetImposeSetting(ImposeSettingTable& table, const wxString& key, const wxString& value,
                       const wxString& keyDisplayValue);
 
-/// Guards Folder.cfg: held around the load of the settings and for the whole of a rewrite, only
-/// through wxCriticalSectionLocker scopes.
+/// Guards Folder.cfg: held while the settings are loaded and during a whole rewrite, always through
+/// a wxCriticalSectionLocker.
 extern wxCriticalSection FolderCfgLock;

@@ -6,8 +6,8 @@
 namespace
 {
 
-// The base-10 number at the front of the text; 0 without one and for one beyond 32 bits, which is
-// what a 32-bit long makes of it everywhere.
+// The base-10 number at the beginning of the text; 0 if there is none, or if it exceeds 32 bits, so
+// that the result does not depend on the size of long.
 std::int32_t ReadNumber(const wxString& text)
 {
     using Limits = std::numeric_limits<std::int32_t>;

@@ -13,9 +13,9 @@
 enum class AttributeForm
 {
     Text,        // as it is
-    Number,      // base 10, up to the first character that is no digit; 0 without digits
-    NumericFlag, // such a number: whether it is not 0
-    TextFlag     // whether the text, less white space at its end, is exactly "1"
+    Number,      // base 10, up to the first character that is not a digit; 0 without digits
+    NumericFlag, // whether such a number is not 0
+    TextFlag     // whether the text, without trailing white space, is exactly "1"
 };
 
 struct RootAttribute
@@ -35,13 +35,14 @@ struct RootAttribute
 /// All of them, in the order in which they are written.
 const std::vector<RootAttribute>& RootAttributes();
 
-/// Reads the attributes as a chain, in the order of their places, up to the first that is absent:
-/// from there on all fields stay as they were. An absent number becomes -1 and does not end the
-/// chain. Gives the attribute at which the chain ended, or none.
+/// Reads the attributes as a chain, in the order of their places, up to the first that is missing:
+/// from there on all fields stay as they were. A missing server_version becomes -1 and does not end
+/// the chain. Returns the attribute at which the chain ended, or null.
 const RootAttribute* ReadRootAttributes(const AttributeMap& attributes,
                                         HotFolderSettings& settings);
 
-/// The place of the last attribute, "server_name", without which a Folder.cfg counts as not read.
+/// The place of "server_name", the last required attribute: without it, a Folder.cfg counts as not
+/// read.
 constexpr int LastRequiredPlace = 4;
 
 /// The place of "Enable".

@@ -8,8 +8,8 @@
 enum class XmlLoad
 {
     Loaded,
-    Malformed, // or without a root element; the library has reported why
-    TooLarge   // the library would take too long or too much; see IsWithinXmlLimits
+    Malformed, // or without a root element; the library has reported the reason
+    TooLarge   // the library would take too much time or memory; see IsWithinXmlLimits
 };
 
 /// Loads the document with wxXmlDocument::Load (encoding "UTF-8", and these flags).

@@ -9,7 +9,7 @@
 namespace
 {
 
-// The encodings that the parser behind wxXmlDocument reads by itself.
+// The encodings that wxXmlDocument's parser reads by itself.
 bool IsBuiltIn(const wxString& encoding)
 {
     static const std::array<const char*, 6> names = {"UTF-8",    "UTF-16",     "UTF-16LE",
@@ -27,8 +27,8 @@ bool IsSingleByte(const wxString& encoding)
            (code >= wxFONTENCODING_CP1250 && code <= wxFONTENCODING_CP1258);
 }
 
-// Where the library does not know the encoding at all, nothing is read as what it is: it takes it
-// for Latin-1, which is right only for a name of that which it does not know on Windows.
+// An encoding that the library does not know is never read correctly: it is read as Latin-1, which
+// is right only for those names of Latin-1 that the library does not know on Windows.
 bool IsReadAsAscii(const std::string& document, const wxString& encoding)
 {
     if (!wxCSConv(encoding).IsOk() && encoding.CmpNoCase("latin1") != 0)
@@ -42,8 +42,8 @@ bool IsReadAsAscii(const std::string& document, const wxString& encoding)
                        });
 }
 
-// Whether every byte has a meaning in the encoding. One without would come out as the character
-// before it.
+// Whether every byte is defined in the encoding. An undefined one would be read as the previous
+// character.
 bool HasMeaning(const std::string& document, const wxString& encoding)
 {
     std::array<bool, 256> isThere{};
@@ -65,8 +65,8 @@ bool HasMeaning(const std::string& document, const wxString& encoding)
 
 wxString DeclaredEncoding(const std::string& document)
 {
-    // The library's answer is no use where white space surrounds the equals sign: it is UTF-8 or
-    // nonsense then, while its parser knows better.
+    // The library's answer is useless if there is white space around the equals sign: it is then
+    // UTF-8 or nonsense, although its parser reads the name correctly.
     constexpr size_t LongestDeclaration = 256;
     wxString declaration =
         wxString::From8BitData(document.data(), std::min(document.size(), LongestDeclaration))
@@ -96,7 +96,7 @@ EncodingMap GetEncodingMap(const wxString& encoding)
     std::array<wchar_t, 10> wide{};
     for (size_t i = 1; i < map.size(); ++i)
     {
-        // A byte that has no meaning comes out as the character before it, as in the library.
+        // An undefined byte becomes the previous character, as in the library.
         const std::array<char, 2> narrow = {static_cast<char>(i), '\0'};
         conversion.MB2WC(wide.data(), narrow.data(), 2);
         map[i] = static_cast<int>(wide[0]);

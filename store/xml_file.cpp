@@ -21,25 +21,39 @@ XmlFile::State XmlFile::Load(const wxString& path, Links links, const wxString& 
     return State::NotReadable;
 }
 
+// The steps for one hot folder read the same Folder.cfg one after another, and most of their time
+// is the parser's. So the last document is kept, together with its bytes: the same bytes make the
+// same document. A large one is not kept, since it would take memory while another is loaded.
 XmlFile::State XmlFile::Parse()
 {
-    switch (LoadXml(m_bytes, m_document, wxXMLDOC_KEEP_WHITESPACE_NODES))
+    constexpr size_t LongestKept = size_t{64} * 1024;
+    static std::string lastBytes;
+    static std::shared_ptr<const wxXmlDocument> lastDocument;
+    if (lastDocument && m_bytes == lastBytes)
     {
-    case XmlLoad::Loaded:
+        m_document = lastDocument;
         return State::Loaded;
-    case XmlLoad::TooLarge:
-        return State::TooLarge;
-    case XmlLoad::Malformed:
-        break;
     }
-    return State::NotReadable;
+    m_document = nullptr;
+    lastDocument = nullptr;
+    auto document = std::make_shared<wxXmlDocument>();
+    const XmlLoad result = LoadXml(m_bytes, *document, wxXMLDOC_KEEP_WHITESPACE_NODES);
+    if (result != XmlLoad::Loaded)
+        return result == XmlLoad::TooLarge ? State::TooLarge : State::NotReadable;
+    m_document = document;
+    if (m_bytes.size() <= LongestKept)
+    {
+        lastBytes = m_bytes;
+        lastDocument = m_document;
+    }
+    return State::Loaded;
 }
 
 RegularFile::Status XmlFile::ReopenForUpdate()
 {
     const RegularFile::Status status = m_file.ReopenForUpdate();
     if (status == RegularFile::Status::Refused)
-        ReportNotOpened(m_shownPath);
+        m_file.ReportNotReopened(m_shownPath);
     return status;
 }
 
@@ -48,8 +62,6 @@ bool XmlFile::LoadAgain()
     std::string now;
     if (m_file.Length() > static_cast<std::int64_t>(MaxXmlBytes) || !m_file.Read(now))
         return false;
-    if (now == m_bytes)
-        return true;
     m_bytes.swap(now);
     return Parse() == State::Loaded;
 }
@@ -62,12 +74,12 @@ void XmlFile::Rewrite(const std::string& bytes)
 
 const wxXmlNode* XmlFile::GetRoot() const
 {
-    return m_document.GetRoot();
+    return m_document ? m_document->GetRoot() : nullptr;
 }
 
 const wxXmlDocument& XmlFile::GetDocument() const
 {
-    return m_document;
+    return *m_document;
 }
 
 const std::string& XmlFile::GetBytes() const

@@ -6,6 +6,7 @@
 #include <wx/string.h>
 #include <wx/xml/xml.h>
 
+#include <memory>
 #include <string>
 
 class XmlFile
@@ -14,27 +15,27 @@ class XmlFile
     enum class State
     {
         Missing,     // no regular file of that name, or a link
-        NotReadable, // refused or malformed; the library has reported why
+        NotReadable, // refused or malformed; the library has reported the reason
         TooLarge,    // see store/xml_limits.h
         Loaded
     };
 
-    /// Opens the file for reading and parses it. People know it by the second path.
+    /// Opens the file for reading and parses it. The second path is for messages.
     State Load(const wxString& path, Links links, const wxString& shownPath);
 
-    /// Opens the same file for writing, too. Where that is refused, reports it with the library.
+    /// Also opens the same file for writing. If that is refused, has the library report it.
     RegularFile::Status ReopenForUpdate();
 
-    /// Reads the file once more, and parses it unless it is the same to the byte; false when that
-    /// fails.
+    /// Reads the file again, and parses it unless it is unchanged; returns false if that fails.
     bool LoadAgain();
 
-    /// Makes these bytes the whole content, as RegularFile::Rewrite does; a failure is reported
-    /// with the library.
+    /// Makes these bytes the whole content, as RegularFile::Rewrite does; the library reports a
+    /// failure.
     void Rewrite(const std::string& bytes);
 
-    /// The root of the loaded document; every text node of nothing but white space is there.
+    /// The root of the loaded document; it includes the text nodes that are only white space.
     const wxXmlNode* GetRoot() const;
+    /// Of a loaded file only.
     const wxXmlDocument& GetDocument() const;
     /// The content as it was loaded.
     const std::string& GetBytes() const;
@@ -45,5 +46,5 @@ class XmlFile
     RegularFile m_file;
     wxString m_shownPath;
     std::string m_bytes;
-    wxXmlDocument m_document;
+    std::shared_ptr<const wxXmlDocument> m_document;
 };

@@ -11,37 +11,38 @@
 namespace
 {
 
-// Without a document type no document up to this length can do harm: its 16,384 bytes make no more
+// Without a document type, no document up to this length can do harm: 16,384 bytes can hold no more
 // than 5,500 levels or elements, 4,100 attributes or 16,384 pieces of a text. With one, 12 KB are
-// enough for entities and defaults that take gigabytes.
+// enough for entities and defaults that expand to gigabytes.
 constexpr size_t HarmlessBytes = size_t{16} * 1024;
 
-// Levels of elements. The library destroys a document by recursion: 500,000 fit on our stack of 64
-// MiB, 1,000,000 do not.
+// Levels of elements. The library destroys a document by recursion: 500,000 levels fit on our stack
+// of 64 MiB, 1,000,000 do not.
 constexpr int MaxDepth = 250000;
 
 // Bytes of memory, counted for the document itself and for each node, attribute and character as
 // the library keeps them on a 64-bit system with wide characters of four bytes. 100,000 job
-// settings take some 120 million.
+// settings take about 120 million.
 constexpr std::uint64_t MaxMemory = 208 * std::uint64_t{1000} * 1000;
 constexpr std::uint64_t NodeMemory = 208;
 constexpr std::uint64_t AttributeMemory = 176;
 constexpr std::uint64_t CharacterMemory = 4;
 
-// Characters that the library copies because it adds every piece of a text to all that was before.
-// A piece ends at each line end, at each escaped character and at each border of the buffer below.
+// Characters that the library copies because it appends every piece of a text to a copy of all
+// earlier ones. A piece ends at each line end, at each escaped character and at each border of the
+// buffer below.
 constexpr std::uint64_t MaxCopiedCharacters = 1000 * std::uint64_t{1000} * 1000;
 
-// Attributes that it passes by because it looks for the last one to add another; and, at each
-// element, those that the document type declares.
+// Attributes that the library steps past to find the last one each time it adds another; and, at
+// each element, the attributes that the document type declares.
 constexpr std::uint64_t MaxAttributeSteps = 100 * std::uint64_t{1000} * 1000;
 
-// Bytes that the parser reads again because it is given the document in pieces of this size, and
-// begins again with each a tag, comment or instruction that is not whole.
+// Bytes that the parser reads again: it is given the document in pieces of this size, and with each
+// piece it starts an incomplete tag, comment or instruction over.
 constexpr std::uint64_t LibraryBuffer = 1024;
 constexpr std::uint64_t MaxBytesReadAgain = 1000 * std::uint64_t{1000} * 1000;
 
-// Bytes of a document type. The parser compares each default with all others of its element.
+// Bytes of a document type. The parser compares each default with all others of the same element.
 constexpr std::uint64_t MaxDocumentType = 16 * std::uint64_t{1024};
 
 class Look
@@ -93,7 +94,7 @@ class Look
         Judge();
     }
 
-    // Whatever else there is: declarations, comments, instructions, a document type.
+    // Anything else: declarations, comments, instructions, a document type.
     void Other()
     {
         EndText();
@@ -122,8 +123,8 @@ class Look
         m_isInDocumentType = false;
     }
 
-    // The document is not well-formed. It may break off in a tag that never ends, or what follows
-    // the last event may be one long token that has no place there.
+    // The document is not well-formed. It may end inside a tag, or the last event may be followed
+    // by one long token that is not allowed there.
     void Fail(size_t length)
     {
         const XML_Error error = XML_GetErrorCode(m_parser);
@@ -202,7 +203,7 @@ int FillEncoding(void* /*data*/, const char* name, XML_Encoding* encoding)
     return XML_STATUS_OK;
 }
 
-// As the library does, lest anything be taken for something else.
+// In the same way as the library, so that both see the same document.
 void SetHandlers(XML_Parser parser, Look& look)
 {
     XML_SetUserData(parser, &look);
@@ -238,7 +239,7 @@ bool IsWithinXmlLimits(const std::string& bytes)
                                                                          XML_ParserFree);
     Look look(parser.get(), bytes.size());
     SetHandlers(parser.get(), look);
-    // In one piece, so that nothing is read again here.
+    // In one piece, so that nothing is read twice here.
     if (XML_Parse(parser.get(), bytes.data(), static_cast<int>(bytes.size()), XML_TRUE) !=
         XML_STATUS_OK)
         look.Fail(bytes.size());

@@ -1,15 +1,15 @@
-// How much of an XML document the library is let at.
+// How large an XML document the library is given.
 #pragma once
 
 #include <string>
 
-/// The longest document, in bytes, that is looked at at all.
+/// The longest document, in bytes, that is examined at all.
 constexpr size_t MaxXmlBytes = size_t{64} * 1024 * 1024;
 
 /// Whether wxXmlDocument can load these bytes, and destroy them again, without exhausting the
-/// stack, taking more than a few hundred megabytes or more than a second or two. Says nothing about
-/// whether they are well-formed: what is not is judged up to the place where the library will stop,
-/// too.
+/// stack, taking more than a few hundred megabytes or more than a second or two. Does not check
+/// that they are well-formed: a malformed document is judged up to the place where the library will
+/// also stop.
 ///
-/// Takes a time in proportion to the bytes. See xml_limits.cpp for the limits.
+/// Takes time proportional to the number of bytes. See xml_limits.cpp for the limits.
 bool IsWithinXmlLimits(const std::string& bytes);

@@ -10,8 +10,8 @@ const wxXmlNode* FirstElement(const wxXmlNode* node)
     return node;
 }
 
-// The element that follows in document order below root, or none. A loop instead of a recursion, so
-// that no document can exhaust the stack.
+// The next element in document order below root, or null. A loop and not a recursion, so that no
+// document can exhaust the stack.
 const wxXmlNode* NextElement(const wxXmlNode* element, const wxXmlNode* root)
 {
     if (const wxXmlNode* child = FirstElement(element->GetChildren()))

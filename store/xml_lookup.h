@@ -1,5 +1,5 @@
-// Lookups on the tree of a loaded XML document. They neither load, change nor write a document, and
-// compare names exactly.
+// Lookups on the tree of a loaded XML document. They do not load, change or write a document. Names
+// have to match exactly.
 #pragma once
 
 #include <wx/string.h>
@@ -11,16 +11,16 @@
 /// document.
 using AttributeMap = std::map<wxString, wxString>;
 
-/// The first element of that name below the node, or none. The node's direct children come before
+/// The first element of that name below the node, or null. The node's direct children come before
 /// any subtree; with recursive set, the subtrees are then searched one after another in document
 /// order. The node itself never matches. Works at any depth of nesting.
 const wxXmlNode* FindElement(const wxXmlNode* node, const wxString& name, bool recursive);
 
-/// The first element of that name among the node and the siblings after it, or none.
+/// The first element of that name among the node and the siblings after it, or null.
 const wxXmlNode* FirstNamed(const wxXmlNode* node, const wxString& name);
 
-/// Adds every attribute of the element to the map; of a repeated name the first value stays.
+/// Adds every attribute of the element to the map; if a name is repeated, the first value stays.
 void CollectAttributes(const wxXmlNode& element, AttributeMap& attributes);
 
-/// True, and the value set, when the name is in the map; else the value stays as it was.
+/// If the name is in the map, sets the value and returns true; otherwise the value stays as it was.
 bool GetAttribute(const AttributeMap& attributes, const wxString& name, wxString& value);

@@ -6,7 +6,7 @@
 namespace
 {
 
-// The node that follows in document order below root, or none; level follows it.
+// The next node in document order below root, or null; updates level to match.
 template <typename Node>
 Node* NextNode(Node* node, const wxXmlNode& root, int& level)
 {
@@ -54,7 +54,7 @@ wxXmlNode* AppendCopy(const wxXmlNode& source, wxXmlNode& parent, wxXmlNode* las
     auto copy = std::make_unique<wxXmlNode>(source.GetType(), source.GetName());
     CopyNode(source, *copy);
     parent.InsertChildAfter(copy.get(), last);
-    return copy.release(); // the parent's from here on
+    return copy.release(); // from here on owned by the parent
 }
 
 const char* const WhiteSpace = " \t\r\n";
@@ -67,7 +67,7 @@ bool IsBlankText(const wxXmlNode& node)
 
 void RemoveBlankTexts(wxXmlNode& parent)
 {
-    wxXmlNode* last = nullptr; // of those that stay
+    wxXmlNode* last = nullptr; // the last of those that stay
     wxXmlNode* next = nullptr;
     for (wxXmlNode* child = parent.GetChildren(); child; child = next)
     {
@@ -152,7 +152,7 @@ void RemoveSavedIndentation(wxXmlNode& root, int level)
         if (node == &root || node->GetType() != wxXML_TEXT_NODE || !next ||
             next->GetType() == wxXML_TEXT_NODE)
             continue;
-        // Asked first, since the indentation of many levels would take long to make.
+        // Checked first, because making the indentation of many levels would take long.
         const size_t length = 1 + 2 * static_cast<size_t>(level);
         const wxString& text = node->GetContent();
         if (text.length() >= length && text.EndsWith("\n" + wxString(' ', length - 1)))

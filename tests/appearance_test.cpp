@@ -1,4 +1,4 @@
-// What the shell is told, which leaves no trace on the workstation, and the profile files' bytes.
+// Calls to the shell, which leave no trace on the workstation, and the bytes of profile files.
 #include "appearance/folder_icon.h"
 #include "tests/recording_shell.h"
 
@@ -52,7 +52,7 @@ class Appearance : public testing::Test
     const wxString m_folder;
 };
 
-TEST_F(Appearance, ANewDesktopIniIsToldButNotForced)
+TEST_F(Appearance, ANewDesktopIniIsAnnouncedButNotForced)
 {
     EXPECT_TRUE(ApplyFolderIcon(m_folder, "i.ico"));
     EXPECT_EQ(Calls(false, ""), ShellCalls);

@@ -20,7 +20,7 @@ std::string Lower(std::string text)
 const std::string Change = "  change   ";
 const std::string Problem = "  problem  ";
 
-// The place of a change of which the report says this, below that title.
+// The place of the change that this line reports in the block with that title.
 std::string PlaceOf(const Workstation& workstation, const std::string& title, const std::string& change)
 {
     const std::string hot = workstation.Expand("{hot}{/}");
@@ -39,7 +39,7 @@ std::string PlaceOf(const Workstation& workstation, const std::string& title, co
     return folder + "/[P]/" + name;
 }
 
-// A place to which a link leads, by the place of the link.
+// The place, with the target of a link replaced by the place of the link.
 std::string ReachedOverLinks(std::string place, const Files& files)
 {
     for (const auto& [link, text] : files)
@@ -79,7 +79,7 @@ CheckReport::CheckReport(const Workstation& workstation, const RunResult& run) :
 namespace
 {
 
-// What counts of the text at a place. Wine does not say that a directory is read-only.
+// The relevant part of the text at a place. Wine does not show that a directory is read-only.
 std::string Meaning(const std::string& place, const std::string& text)
 {
     const bool isHotFolder = place.back() == '#' && std::count(place.begin(), place.end(), '/') == 1;
@@ -114,7 +114,7 @@ std::string ProfileMeaning(const std::string& profile)
     std::map<std::string, std::string> values;
     const bool isUtf16 = StartsWith(profile, "\xFF\xFE");
     std::string text = profile.substr(isUtf16 ? 2 : 0);
-    text.erase(std::remove(text.begin(), text.end(), '\0'), text.end()); // what is UTF-16 here is of ASCII
+    text.erase(std::remove(text.begin(), text.end(), '\0'), text.end()); // UTF-16 texts here are all ASCII
     std::istringstream lines(text);
     std::string section;
     for (std::string line; std::getline(lines, line);)

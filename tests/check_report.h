@@ -1,4 +1,4 @@
-// What FolderUpgradeCheck said.
+// The report of FolderUpgradeCheck, parsed.
 #pragma once
 
 #include "tests/workstation.h"
@@ -10,14 +10,13 @@ struct CheckReport
 {
     CheckReport(const Workstation& workstation, const RunResult& run);
 
-    std::set<std::string> changes; // places; attributes as the place with '#', those of an icon as the icon
+    std::set<std::string> changes; // places; attributes are the place with '#', except that those of an icon count as the icon
     int problems = 0;
     std::string text;
 };
 
-/// The places that differ, as a report names them. In a Desktop.ini sections, keys and values count.
+/// The places that differ, as a report names them. In a Desktop.ini only sections, keys and values are compared.
 std::set<std::string> ChangedPlaces(const Files& before, const Files& after);
 
-/// The sections, keys and values of a profile file, which Wine rewrites whole; it also adds a key of
-/// its own to Desktop.ini.
+/// The sections, keys and values of a profile file. Wine rewrites the whole file, and adds its own key to Desktop.ini.
 std::string ProfileMeaning(const std::string& profile);

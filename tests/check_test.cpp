@@ -1,5 +1,5 @@
-// What FolderUpgradeCheck says of workstations with one thing amiss. That it names every change, and
-// changes nothing itself, each scenario of a run shows.
+// What FolderUpgradeCheck reports for workstations with one problem. Every scenario shows that it names each change and
+// changes nothing itself.
 #include "tests/check_report.h"
 #include "tests/scenarios/texts.h"
 
@@ -12,18 +12,18 @@ const Text Icon = "hot/A/[P]/hf_folder.ico";
 const Text Ini = "hot/A/Desktop.ini";
 const Text Jobs = "user/ORX/JPData";
 const Text LogFolder = "user/ORX_Installers";
-const char* const NoLinks = "links to files are for this machine only";
-const char* const NoRefusal = "Wine opens a directory for writing, whoever asks";
+const char* const NoLinks = "Wine does not show links to files as links";
+const char* const NoRefusal = "Wine lets every user open a directory for writing";
 
-// A workstation, and all lines of one kind that are said of it ("problem", and no more: there is none).
-// A line that ends in * goes on in the system's own words.
+// A workstation, and all its report lines of one kind ("problem" alone: there is no such line). A line that ends in *
+// continues in the system's own words.
 struct Finding
 {
     Scenario workstation;
     Text lines;
 };
 
-// A run would change nothing here, and there is nothing to say.
+// A run would change nothing here, and there is nothing to report.
 Scenario Done(const Name& name)
 {
     return Scenario(name)
@@ -54,19 +54,19 @@ std::vector<Finding> Lists()
         return Done(name).Before({{ListPlace, list + "</HotFolders>"}});
     };
     return {
-        {Done("OfWhatIsDoneNothingIsSaid"), ""},
+        {Done("WhatIsDoneIsNotReported"), ""},
         {Scenario("AnEmptyMachine")
              .Before({{ListPlace, Removed}, {LogPlace, Removed}, {Jobs + "/", Removed}, {MachineHive, Removed}, {UserHive, Removed}}),
          "note     there is no HotFolderList.cfg\n"
          "note     there will be no run log: there is no folder {user}{/}ORX_Installers{/}\n"
-         "note     there are no presets: there is no folder {user}{/}ORX{/}JPData{/}"},
+         "note     there are no presets, because there is no folder {user}{/}ORX{/}JPData{/}"},
         {Done("AListIsCutOff").Before({{ListPlace, "<HotFolders>"}}),
          "problem  HotFolderList.cfg: XML parsing error: 'no element found' at line 1"},
-        {Done("AListMayNotBeRead").Before({{Text(ListPlace) + "#", "0"}}).AsOtherUser(), "problem  HotFolderList.cfg: can't open file*"},
-        {Done("TheListsFolderMayNotBeEntered").Before({{"machine/hotfolder#", "0"}}).AsOtherUser(),
+        {Done("AListCannotBeRead").Before({{Text(ListPlace) + "#", "0"}}).AsOtherUser(), "problem  HotFolderList.cfg: can't open file*"},
+        {Done("TheListsFolderCannotBeEntered").Before({{"machine/hotfolder#", "0"}}).AsOtherUser(),
          "problem  HotFolderList.cfg: its folder cannot be entered"},
-        {lists("NoListedFolderIsThere", "BC"), "problem  none of the listed hot folders is there (another account, mapped drives?)"},
-        {lists("AListedFolderIsMissing", "AB"), "note     listed hot folder is not there: {hot}{/}B"},
+        {lists("NoListedFolderIsThere", "BC"), "problem  none of the listed hot folders exists (another account? mapped drives?)"},
+        {lists("AListedFolderIsMissing", "AB"), "note     listed hot folder does not exist: {hot}{/}B"},
         {lists("AFolderIsListedTwice", "AA"), "note     hot folder is listed twice: {hot}{/}A"},
         {lists("AListIsEmpty", ""), "note     HotFolderList.cfg lists no hot folder"},
         {Done("ADirectoryHasTwoNames").Before({{"hot/B/", "{link:hot/A}"}}), "note     the same directory as {hot}{/}A"},
@@ -118,14 +118,14 @@ std::vector<Finding> FolderCfgs()
         {Done("ItIsMissing").Before({{CfgPlace, Removed}}), "note     no Folder.cfg\n" + noIcon + "_disabled.ico"},
         {Done("ItIsMalformed").FolderCfg("<a><b></a>"), "problem  Folder.cfg: XML parsing error: 'mismatched tag' at line 1"},
         {Done("ItIsALink").Before({{CfgPlace, "{link:elsewhere/a}"}}).NotUnderWine(NoLinks), "problem  Folder.cfg: reached over a link"},
-        {Done("ItIsADirectory").Before({{CfgPlace, Removed}, {CfgPlace + "/", ""}}), "problem  Folder.cfg: is no file"},
+        {Done("ItIsADirectory").Before({{CfgPlace, Removed}, {CfgPlace + "/", ""}}), "problem  Folder.cfg: is not a file"},
         {Done("ThePrivateDirectoryIsALink").Before(linkedDir), "problem  [_ORX_HotFolder_]: reached over a link"},
-        {Done("ThePrivateDirectoryMayNotBeEntered").Before({{privateDir + "#", "0"}}).AsOtherUser(),
+        {Done("ThePrivateDirectoryCannotBeEntered").Before({{privateDir + "#", "0"}}).AsOtherUser(),
          "problem  [_ORX_HotFolder_]: cannot be entered"},
-        {Done("TheHotFolderMayNotBeEntered").Before({{"hot/A#", "0"}}).AsOtherUser(), "problem  the hot folder cannot be entered"},
+        {Done("TheHotFolderCannotBeEntered").Before({{"hot/A#", "0"}}).AsOtherUser(), "problem  the hot folder cannot be entered"},
         {Moving("ItsEncodingIsUnknown").FolderCfg(Minimal(MovedFrom, "<?xml version='1.0' encoding='x-unknown'?>", "\xC3\xA4")),
          "problem  Folder.cfg: left as it is (unknown encoding)"},
-        {Moving("ItsEncodingIsAnother").FolderCfg(utf16), "note     Folder.cfg: comes out in UTF-8\n" + noTarget},
+        {Moving("ItIsNotInUtf8").FolderCfg(utf16), "note     Folder.cfg: comes out as UTF-8\n" + noTarget},
         {Moving("NothingIsAtTheNewPath"), noTarget},
         {Done("ItHidesThatItIsEnabled").FolderCfg(hidden),
          "problem  Folder.cfg: lacks the attribute \"description\", so the enabled folder shows as disabled"},
@@ -135,14 +135,13 @@ std::vector<Finding> FolderCfgs()
     };
 }
 
-// What a Folder.cfg that moves loses.
+// What a Folder.cfg loses when its template moves.
 std::vector<Finding> Losses()
 {
     const Text start = "<HotFolder ";
     const Text end = "<PreflightSettings>\n";
     const Text entry = "<KEYVALUE Key=\"B\"";
-    const Text lostEntry =
-        "does not keep <KEYVALUE Key=\"B\" Value=\"2\" KeyDisplayValue=\"two\" LocDisplayValue=\"zwei\"> in <JobSetting>";
+    const Text lostEntry = "loses <KEYVALUE Key=\"B\" Value=\"2\" KeyDisplayValue=\"two\" LocDisplayValue=\"zwei\"> in <JobSetting>";
     const Text defaults = "; the rewrite sets it and all that follow it to their defaults";
     Text alike;
     for (int i = 0; i < 2000; ++i)
@@ -157,23 +156,22 @@ std::vector<Finding> Losses()
                 "lacks the attribute \"description\"" + defaults + " (the folder comes out disabled)"),
         changed("AQuickset", " Quickset=\"q\"", "", "lacks the attribute \"Quickset\"" + defaults),
         changed("AWordForAFlag", "Enable=\"1\"", "Enable=\"true\"", "Enable=\"true\" comes out as \"0\""),
-        changed("ANumberThatIsNone", "server_version=\"-5\"", "server_version=\"5b\"", "server_version=\"5b\" comes out as \"5\""),
+        changed("ANumberWithALetter", "server_version=\"-5\"", "server_version=\"5b\"", "server_version=\"5b\" comes out as \"5\""),
         changed("NoSpaceAfterAFlag", "Centralized=\"1\"", "Centralized=\"1 \"", ""),
         changed("AnUnknownAttribute", start, start + "mine=\"7\" ", "loses the attribute mine=\"7\""),
         changed("TheNameOfTheRoot", "HotFolder", "Mine", "its root <Mine> comes out as <HotFolder>"),
         changed("AnUnknownElement", end, "<Mine><a/></Mine>" + end,
-                "does not keep <Mine> in <HotFolder>\nproblem  Folder.cfg: does not keep <a> in <Mine>"),
-        changed(
-            "AnUnknownAttributeOfAnEntry", entry, entry + " Mine=\"\"",
-            "does not keep <KEYVALUE Key=\"B\" Mine=\"\" Value=\"2\" KeyDisplayValue=\"two\" LocDisplayValue=\"zwei\"> in <JobSetting>"),
+                "loses <Mine> in <HotFolder>\nproblem  Folder.cfg: loses <a> in <Mine>"),
+        changed("AnUnknownAttributeOfAnEntry", entry, entry + " Mine=\"\"",
+                "loses <KEYVALUE Key=\"B\" Mine=\"\" Value=\"2\" KeyDisplayValue=\"two\" LocDisplayValue=\"zwei\"> in <JobSetting>"),
         changed("ARepeatedKey", entry, entry + " Value=\"1\"/>" + entry, lostEntry),
-        changed("ARepeatedSection", "  " + end, "  <Paths/>" + end, "does not keep <Paths> in <HotFolder>"),
-        changed("AText", end, "Note " + end, "does not keep the text \"Note\" in <HotFolder>"),
-        changed("AnInstruction", end, "<?mine?>" + end, "does not keep the instruction <?mine?>"),
+        changed("ARepeatedSection", "  " + end, "  <Paths/>" + end, "loses <Paths> in <HotFolder>"),
+        changed("AText", end, "Note " + end, "loses the text \"Note\" in <HotFolder>"),
+        changed("AnInstruction", end, "<?mine?>" + end, "loses the instruction <?mine?>"),
         changed("AnEntity", start, "<!DOCTYPE HotFolder [<!ENTITY e \"text\">]>" + start,
                 "loses its document type, and with it the entities in its texts"),
         changed("NoComment", end, "<!-- c -->" + end, ""),
-        changed("NothingOfManyAlike", "<a/>", alike, ""),
+        changed("NothingOfManyEqualElements", "<a/>", alike, ""),
     };
 }
 
@@ -182,26 +180,27 @@ std::vector<Finding> Icons()
     return {
         {Done("TheCopyIsRefused").Before({{Icon, "old"}, {Icon + "#", "R"}, {"hot/A/[P]#", "X"}}).AsOtherUser(),
          "problem  hf_folder.ico: the copy would be refused"},
-        {Done("TheSourceMayNotBeRead").Before({{"tool/hf_folder.ico#", "0"}}).AsOtherUser(),
+        {Done("TheSourceCannotBeRead").Before({{"tool/hf_folder.ico#", "0"}}).AsOtherUser(),
          "problem  hf_folder.ico: the copy would be refused"},
         {Done("TheSourcesAreMissing")
              .Before({{"tool/BundleIcons#", "0"}, {"hot/B/[P]/hf_folder_disabled.ico", ""}, {"hot/C/[P]/hf_folder_disabled.ico", ""}})
              .Run({"U"})
              .AsOtherUser(),
-         "problem  no icon {tool}{/}BundleIcons{/}hf_folder.ico\nproblem  no icon {tool}{/}BundleIcons{/}hf_folder_disabled.ico"},
+         "problem  source icon missing: {tool}{/}BundleIcons{/}hf_folder.ico\nproblem  source icon missing: "
+         "{tool}{/}BundleIcons{/}hf_folder_disabled.ico"},
         {Done("TheIconIsALink").Before({{Icon, "{link:elsewhere/a}"}}).NotUnderWine(NoLinks),
          "problem  hf_folder.ico: reached over a link"},
         {Done("DesktopIniIsALink").Before({{Ini, "{link:elsewhere/a}"}, {Ini + "#", Removed}}).NotUnderWine(NoLinks),
          "problem  Desktop.ini: left as it is (reached over a link)"},
-        {Done("DesktopIniIsAnothers").Before({{Ini, "[.ShellClassInfo]"}, {Ini + "#", "X"}}).AsOtherUser(),
-         "problem  Desktop.ini: cannot be opened for reading and writing\nproblem  Desktop.ini: its attributes may not be changed"},
-        {Done("DesktopIniCannotBeMade")
+        {Done("DesktopIniBelongsToAnotherUser").Before({{Ini, "[.ShellClassInfo]"}, {Ini + "#", "X"}}).AsOtherUser(),
+         "problem  Desktop.ini: cannot be opened for reading and writing\nproblem  Desktop.ini: its attributes cannot be changed"},
+        {Done("DesktopIniCannotBeCreated")
              .Before({{Ini, Removed}, {Ini + "#", Removed}, {"hot/A#", "SX"}})
              .AsOtherUser()
              .NotUnderWine(NoRefusal),
-         "problem  Desktop.ini: cannot be made, the hot folder may not be written"},
-        {Done("TheHotFolderIsAnothers").Before({{"hot/A#", "X"}}).AsOtherUser().NotUnderWine(NoRefusal),
-         "problem  hot folder: its attributes may not be changed"},
+         "problem  Desktop.ini: cannot be created, because the hot folder cannot be written to"},
+        {Done("TheHotFolderBelongsToAnotherUser").Before({{"hot/A#", "X"}}).AsOtherUser().NotUnderWine(NoRefusal),
+         "problem  hot folder: its attributes cannot be changed"},
         {Done("KeysAndAttributesDiffer").Before({{Ini, "[.ShellClassInfo]\r\nIconFile=x\r\n"}, {Ini + "#", "H"}, {"hot/A#", "H"}}),
          "change   Desktop.ini: InfoTip, IconFile\nchange   Desktop.ini: attributes HIDDEN -> READONLY SYSTEM\n"
          "change   hot folder: attributes HIDDEN -> HIDDEN SYSTEM"},
@@ -216,7 +215,7 @@ std::vector<Finding> PresetsAndLogs()
     const Text jobs = "{user}{/}ORX{/}JPData{/}";
     return {
         {Done("ThereIsNoPreset").Before({{PresetPlace, Removed}}), "note     there are no presets in " + jobs},
-        {Moving("NothingMayBeRead").Before({{PresetPlace + "#", "0"}, {CfgPlace + "#", "0"}}).AsOtherUser(),
+        {Moving("NothingCanBeRead").Before({{PresetPlace + "#", "0"}, {CfgPlace + "#", "0"}}).AsOtherUser(),
          "problem  Folder.cfg: can't open file*\n" + problem + "cannot be opened for reading (can't open file*"},
         {Moving("EverythingIsReadOnly")
              .Before({{PresetPlace + "#", "R"}, {CfgPlace + "#", "R"}, {Text(LogPlace) + "#", "R"}})
@@ -224,29 +223,29 @@ std::vector<Finding> PresetsAndLogs()
          noLog + "can't open file*\nproblem  Folder.cfg: cannot be opened for writing (can't open file*\n" + problem +
              "cannot be opened for writing (can't open file*"},
         {Done("WhatStaysNeedNotBeWritten").Before({{CfgPlace + "#", "R"}}).AsOtherUser(), "problem"},
-        {Done("APresetsDirectoryMayNotBeEntered").Before({{Jobs + "/.P#", "0"}}).AsOtherUser(), problem + jobs + ".P cannot be entered"},
-        {Done("JPDataMayNotBeListed").Before({{Jobs + "#", "0"}}).AsOtherUser(), "problem  " + jobs + " cannot be entered"},
+        {Done("APresetsDirectoryCannotBeEntered").Before({{Jobs + "/.P#", "0"}}).AsOtherUser(), problem + jobs + ".P cannot be entered"},
+        {Done("JPDataCannotBeListed").Before({{Jobs + "#", "0"}}).AsOtherUser(), "problem  " + jobs + " cannot be entered"},
         {Done("APresetIsADirectory").Before({{PresetPlace, Removed}, {PresetPlace + "/", ""}}),
-         problem + "reached over a link, or no file"},
+         problem + "reached over a link, or not a file"},
         {Done("PresetsIsALink").Before({{PresetPlace, Removed}, {Jobs + "/.P/Presets/", "{link:elsewhere/d}"}, {"elsewhere/d/", ""}}),
-         problem + "reached over a link, or no file"},
-        {Done("APresetIsNoText").Preset(Text("\xFF\xFE\0", 3)), problem + "left as it is (cannot be decoded)"},
-        {Done("AByteIsWrong").Preset("<p>\xC3\xA4 \xE4</p>"), problem + "is not UTF-8, so the whole file is taken as Latin-1"},
+         problem + "reached over a link, or not a file"},
+        {Done("APresetIsNotText").Preset(Text("\xFF\xFE\0", 3)), problem + "left as it is (cannot be decoded)"},
+        {Done("AByteIsWrong").Preset("<p>\xC3\xA4 \xE4</p>"), problem + "is not UTF-8, so the whole file is read as Latin-1"},
         {Done("APresetDeclaresLatin1").Preset("<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?><p>\xE4</p>"),
-         problem + "declares the encoding ISO-8859-1, but comes out in UTF-8"},
+         problem + "declares the encoding ISO-8859-1, but comes out as UTF-8"},
         {Done("TwoPathsMove").Preset(Stored(MovedFrom) + Stored(MovedFrom)), change + "2 paths"},
         {Done("AMarkGoes").Preset("\xEF\xBB\xBF<p/>"), change + "loses its byte-order mark"},
-        {Done("TheEncodingChanges").Preset("{utf16}<p>ä</p>"), change + "comes out in UTF-8, without byte-order mark"},
+        {Done("TheEncodingChanges").Preset("{utf16}<p>ä</p>"), change + "comes out as UTF-8, without byte-order mark"},
         {Done("LineEndsChange").Preset("<p>\n</p>"), IsWindowsProgram() ? change + "its line ends become CR LF" : "change"},
         {Done("TheLogIsALink").Before({{LogPlace, "{link:elsewhere/a}"}}).NotUnderWine(NoLinks),
          noLog + "it is reached over a link: {user}{/}ORX_Installers{/}UpgradeDowngrade.log"},
-        {Done("TheLogsFolderMayNotBeEntered").Before({{LogFolder + "#", "0"}}).AsOtherUser(),
+        {Done("TheLogFolderCannotBeEntered").Before({{LogFolder + "#", "0"}}).AsOtherUser(),
          noLog + "its folder cannot be entered: {user}{/}ORX_Installers{/}"},
-        {Done("TheLogsFolderIsAnothers")
+        {Done("TheLogFolderBelongsToAnotherUser")
              .Before({{LogPlace, Removed}, {LogFolder + "/", ""}, {LogFolder + "#", "X"}})
              .AsOtherUser()
              .NotUnderWine(NoRefusal),
-         noLog + "its folder may not be written: {user}{/}ORX_Installers{/}"},
+         noLog + "its folder cannot be written to: {user}{/}ORX_Installers{/}"},
         {Done("AFolderHasTheLogsName").Before({{LogPlace, Removed}, {Text(LogPlace) + "/", ""}}),
          "note     there will be no run log: something else has its name: {user}{/}ORX_Installers{/}UpgradeDowngrade.log"},
     };
@@ -270,7 +269,7 @@ class Findings : public testing::TestWithParam<Finding>
 
 void PrintTo(const Finding& finding, std::ostream* stream) { *stream << finding.workstation.name.what; }
 
-TEST_P(Findings, AreSaid)
+TEST_P(Findings, AreReported)
 {
     const auto& [scenario, lines] = GetParam();
     if (IsWindowsProgram() && !scenario.notUnderWine.empty())
@@ -309,7 +308,7 @@ TEST(Check, WritesToAFile)
     EXPECT_TRUE(IsWindowsProgram() || StartsWith(run.libraryLog, "FolderUpgradeCheck: the report cannot be written to "));
 }
 
-TEST(Check, SaysHowItIsCalled)
+TEST(Check, PrintsItsUsage)
 {
     Workstation workstation(false);
     for (const std::vector<Text>& wrong : {std::vector<Text>{}, {"V"}, {"/I"}, {"I", "report", "V"}})

@@ -8,12 +8,11 @@ export LC_ALL=C
 
 [ $# -gt 0 ] || { sed -n '5s/^# *//p' "$0" >&2; exit 2; }
 
-# Those of the list KnownDLLs in the registry, which Windows takes from its own directory in any
-# case; and comctl32, for which a program has to have a manifest that asks for version 6.
+# The DLLs in the registry's list KnownDLLs, which Windows always loads from its own directory; and comctl32, if the
+# program's manifest asks for version 6.
 known='advapi32|combase|comdlg32|gdi32|imagehlp|imm32|kernel32|msctf|msvcrt|normaliz|nsi|ole32|oleaut32|psapi'
 known+='|rpcrt4|sechost|setupapi|shcore|shell32|shlwapi|user32|wldap32|ws2_32'
-# Linked so that they are loaded on their first use: then they are named in the program, but in no
-# import table.
+# DLLs that are loaded on first use: the program names them, but not in an import table.
 on_first_use=(VERSION UxTheme)
 version_6='name="Microsoft.Windows.Common-Controls" version="6.'
 

@@ -37,7 +37,7 @@ ProcessResult RunToTheEnd(const Process& process, const std::function<void(doubl
 {
     const auto start = std::chrono::steady_clock::now();
     const auto elapsed = [&]() { return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count(); };
-    std::fflush(nullptr); // or the child writes it a second time
+    std::fflush(nullptr); // or the child writes the buffer a second time
     const pid_t child = fork();
     if (child == 0)
         Become(process);

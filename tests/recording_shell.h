@@ -1,4 +1,4 @@
-// A shell that writes down what it is told, in place of the one that ignores it.
+// A shell that records its calls, in place of the one that ignores them.
 #pragma once
 
 #include "platform/system.h"

@@ -1,4 +1,4 @@
-// What an export can hold that no workstation of the scenarios has.
+// Contents of an exported hive that no scenario has.
 #include "platform/linux/registry_export.h"
 
 #include <gtest/gtest.h>
@@ -22,7 +22,7 @@ TEST(Registry, AnExportIsReadAsTheRegistryGivesIt)
     struct Export
     {
         Bytes bytes;
-        const char* value; // in hexadecimal, after its type; none: not there
+        const char* value; // in hexadecimal, after its type; null if there is no such value
     };
     for (const auto& [bytes, expected] :
          {Export{key + "\"v\"=\"a\\\\b \\\"c\\\"\"", "1:61005c0062002000220063002200"

@@ -1,4 +1,4 @@
-// The run log, line by line. One test, since the log of a process has one first line.
+// The run log, line by line. A single test, because the log of a process has only one first line.
 #include "run/run_log.h"
 #include "tests/text_files.h"
 

@@ -18,7 +18,7 @@ std::string WithLineEnds(std::string text)
     return text;
 }
 
-// The lines of a text with their ends, long ones in pieces.
+// The lines of a text with their line ends; long lines are cut into pieces.
 std::vector<std::string> Lines(const std::string& text)
 {
     constexpr size_t Longest = 200;
@@ -43,7 +43,7 @@ std::string Printable(const std::string& text)
     return result.str();
 }
 
-// The lines from the first to the last that differ, with one more on both sides.
+// The lines from the first to the last that differ, and one more on each side.
 std::string Difference(const std::string& expected, const std::string& actual)
 {
     const std::vector<std::string> left = Lines(expected);
@@ -79,7 +79,7 @@ Files Expected(const Workstation& workstation, const Files& before, const Scenar
         const std::string owner = entry->first.substr(0, entry->first.size() - 1);
         const bool isAttributes = entry->first.back() == '#';
         if (isAttributes && expected.count(owner) + expected.count(owner + "/") == 0)
-            ADD_FAILURE() << entry->first << " has the attributes of nothing";
+            ADD_FAILURE() << entry->first << " has attributes, but does not exist";
         entry = isAttributes && entry->second.empty() ? expected.erase(entry) : std::next(entry);
     }
     return expected;
@@ -126,7 +126,7 @@ constexpr bool HasSanitizer()
 #endif
 }
 
-// What the check says of a run in that direction. It changes nothing by itself.
+// What the check reports for a run in that direction. Fails if the check changes anything.
 CheckReport Check(Workstation& workstation, const Scenario& scenario)
 {
     const Files before = workstation.Snapshot();
@@ -141,7 +141,8 @@ bool IsRun(const Scenario& scenario)
     return !scenario.arguments.empty() && switches.count(scenario.arguments[0]) != 0;
 }
 
-// Before the run the check names what the run then changes, and after it nothing; where it names problems, at most.
+// The check has to name before the run what the run then changes, and nothing after it. If it names problems, the run
+// may change less.
 void CompareChecks(const CheckReport& first, const CheckReport& second, const std::set<std::string>& changed)
 {
     if (first.problems == 0)
@@ -181,7 +182,7 @@ void RunAndCompare(const Scenario& scenario)
     if (check)
         CompareChecks(*check, Check(workstation, scenario), ChangedPlaces(before, after));
 
-    // A second run in the same direction finds nothing to move.
+    // A second run in the same direction must find nothing to move.
     if (IsWindowsProgram())
         return;
     EXPECT_EQ(255, workstation.Start(scenario.arguments).process.exitStatus);

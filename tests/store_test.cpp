@@ -1,4 +1,4 @@
-// What no run shows: the readers' results and defaults, the lookups, and the writer's rarer forms.
+// What no run can show: the readers' results and defaults, the lookups, and rarer forms of the writer's output.
 #include "store/folder_cfg_reader.h"
 #include "store/folder_cfg_writer.h"
 #include "store/xml_lookup.h"
@@ -52,7 +52,7 @@ class Store : public testing::Test
 
 TEST_F(Store, TheChainOfAttributesEndsAtTheFirstGap)
 {
-    // The chain in the order in which it is read; server_version stands outside it.
+    // The chain in the order in which it is read, without server_version, which does not end it.
     const wxArrayString chain =
         wxSplit("name description server_ip server_name Enable BaseVirtualPrinter BaseVirtualPrinterName BaseVirtualPrinterDisplayName "
                 "HFPresetName Centralized Isjobpresetattached IsCustomInterval TimeInterval PPDVersion ServerTypeAndJPDefaultKeyInfo "
@@ -65,7 +65,7 @@ TEST_F(Store, TheChainOfAttributesEndsAtTheFirstGap)
             attributes += i == gap ? wxString() : " " + chain[i] + "='1'";
         HotFolderSettings read;
         EXPECT_EQ(gap < 4 ? -1 : 1, Load("<r" + attributes + " server_version='12'/>", read)) << gap;
-        size_t count = 0; // of the fields that were set
+        size_t count = 0; // the number of fields that were set
         for (const wxString& text :
              {read.name, read.description, read.server_ip, read.server_name, read.BaseVirtualPrinter, read.BaseVirtualPrinterName,
               read.BaseVirtualPrinterDisplayName, read.HFPresetName, read.TimeInterval, read.PPDVersion, read.ServerTypeAndJPDefaultKeyInfo,

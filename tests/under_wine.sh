@@ -3,17 +3,17 @@
 #
 #     tests/under_wine.sh PROGRAM_DIR TEST_DIR
 #
-# PROGRAM_DIR holds FolderUpgrade.exe and tests/unit_test.exe, TEST_DIR this machine's
-# tests/scenario_test. Makes two prefixes, root's and another user's, and a display of its own.
+# PROGRAM_DIR holds FolderUpgrade.exe and tests/unit_test.exe, TEST_DIR this machine's tests/scenario_test. Makes two
+# prefixes, root's and another user's, and its own display.
 set -euo pipefail
-[ "$(id -u)" = 0 ] || { echo "needs root: the rows about refusals run as another user" >&2; exit 1; }
+[ "$(id -u)" = 0 ] || { echo "needs root: the scenarios about refusals run as another user" >&2; exit 1; }
 program_dir=$(realpath "$1")
 test_dir=$(realpath "$2")
 wine=/usr/lib/wine/wine64
 server=/usr/lib/wine/wineserver64
 
 if [ -z "${UNDER_WINE_DISPLAY:-}" ]; then
-    # Without access control, since the other user has no cookie.
+    # Without access control, because the other user has no cookie.
     UNDER_WINE_DISPLAY=1 exec xvfb-run -a -s "-ac -screen 0 1024x768x24" "$0" "$@"
 fi
 
@@ -35,11 +35,11 @@ trap clean EXIT
 
 mkdir "$prefixes/root" "$prefixes/other"
 chown 65534:65534 "$prefixes/other"
-cd "$prefixes" # where the other user may be
+cd "$prefixes" # which the other user can enter
 WINEPREFIX=$prefixes/root timeout 120 "$wine" wineboot --init 2>/dev/null &
 as_other timeout 120 "$wine" wineboot --init 2>/dev/null &
 wait
-# The servers stay between the runs; each says no when wineboot's is still there, which does as well.
+# The servers keep running between the runs. Starting one fails if wineboot's still runs, which serves as well.
 WINEPREFIX=$prefixes/root "$server" -p || true
 as_other "$server" -p || true
 
@@ -54,6 +54,6 @@ count() {
 }
 ran=$(sed -n 's/^\[==========\] \([0-9]*\) tests\{0,1\} from .* ran\..*/\1/p' "$log" | wc -l)
 failed=$(count 'FAILED ')
-[ "$ran" = 2 ] || failed=$((failed + 1)) # one of the two did not come to its end
+[ "$ran" = 2 ] || failed=$((failed + 1)) # one of the two did not finish
 echo "$(count 'PASSED ') passed, $failed failed, $(count SKIPPED) skipped"
 [ "$failed" = 0 ]

@@ -1,5 +1,5 @@
 #!/usr/bin/env bash
-# Prints how many lines the product and its tests have, blank ones left out, and the share of the tests.
+# Prints how many lines the product and its tests have, without empty ones, and the share of the tests.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 count() {

@@ -20,7 +20,7 @@ std::string FromEnvironment(const char* name)
     return value ? value : "";
 }
 
-// Presses the button of a message box if there is one; what xdotool found to press is the answer.
+// Presses the button of a message box if there is one; returns what xdotool found.
 bool PressButton()
 {
     return std::system("xdotool search --onlyvisible --name '^FolderUpgrade' windowfocus key Return "
@@ -66,10 +66,10 @@ void Wine::ImportHives(const std::string& machineHive, const std::string& userHi
         text += std::string("[-") + key + "]\r\n\r\n";
     for (const std::string& hive : {machineHive, userHive})
     {
-        if (hive.find("\r\n") != std::string::npos) // what is not of the form is no hive
+        if (hive.find("\r\n") != std::string::npos) // a text in any other form is not a hive
             text += hive.substr(hive.find("\r\n")) + "\r\n";
     }
-    static std::string imported[2]; // an import takes longer than a run
+    static std::string imported[2]; // kept, because an import takes longer than a run
     if (imported[m_asOtherUser] == text)
         return;
     WriteFile(m_driveH / "hives.reg", ToUtf16(text));
@@ -92,7 +92,7 @@ ProcessResult Wine::Start(const std::vector<std::string>& commandLine, const fs:
                            if (seconds <= 1)
                                return;
                            const std::string text = TextIfThere(watched);
-                           // One box may have to be pressed more than once.
+                           // One box may need more than one press.
                            if (PressButton() && (boxes.empty() || boxes.back() != text))
                                boxes.push_back(text);
                        });

@@ -1,5 +1,5 @@
-// The Windows program under Wine, on the real registry, profile, attribute and shell functions that
-// Wine provides. Two prefixes serve, root's and another user's, since Wine refuses root nothing.
+// The Windows program under Wine, with Wine's registry, profile, attribute and shell functions. There are two prefixes,
+// root's and another user's, because root is refused nothing.
 #pragma once
 
 #include "tests/process.h"
@@ -8,10 +8,10 @@
 #include <string>
 #include <vector>
 
-/// The Windows program to test, from the environment; empty when the native one is meant.
+/// The Windows program to test, from the environment; empty to test the native one.
 std::filesystem::path WindowsProgram();
 
-/// One user's Wine, with drive H: on the workstation's root.
+/// One user's Wine prefix, whose drive H: is the workstation's root.
 class Wine
 {
   public:
@@ -21,11 +21,11 @@ class Wine
     std::filesystem::path MachineDataDir() const; // on this machine
     std::string UserDataPath() const;             // as a Windows program sees it
 
-    /// Makes the keys of the two hives in the registry editor's text form the only ones.
+    /// Replaces all keys with those of the two hives, which are in the registry editor's text form.
     void ImportHives(const std::string& machineHive, const std::string& userHive) const;
 
-    /// Starts a program and presses the button of every message box. The text of the watched file
-    /// while a box is there goes into boxes, once for as long as it stays the same.
+    /// Starts a program and presses the button of every message box. While a box is open, appends the text of the
+    /// watched file to boxes whenever it has changed.
     ProcessResult Start(const std::vector<std::string>& commandLine, const std::filesystem::path& output,
                         const std::filesystem::path& watched, std::vector<std::string>& boxes) const;
 

@@ -22,7 +22,7 @@ const char* const AttributeName = "user.DOSATTRIB";
 const std::string Link = "{link:";
 const std::string Fifo = "{fifo}";
 
-// The letters of a file or directory, and its mode where that is asked for.
+// The attribute letters of a file or directory, and its mode if requested.
 std::string Attributes(const fs::path& path, bool withMode)
 {
     struct stat status = {};
@@ -38,7 +38,7 @@ std::string Attributes(const fs::path& path, bool withMode)
     return attributes.str();
 }
 
-// Whether a path in an application data folder, which others use too, belongs to a scenario.
+// Whether a path in an application data folder, which other programs also use, belongs to a scenario.
 bool IsOurs(const std::string& path)
 {
     const std::string top = path.substr(0, path.find('/'));
@@ -113,7 +113,7 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser)
                 {"{user}", IsWindowsProgram() ? m_wine->UserDataPath() : m_hostDirs["user"].string()},
                 {"{/}", separator}};
     m_tokens["{default}"] = m_tokens["{app}"] + separator + "template";
-    // In capitals as the registry editor's text has them.
+    // In capitals, in the form of the registry editor's text.
     for (const auto& [token, value] : Files(m_tokens))
     {
         std::string capitals = token == "{/}" ? "{/2}" : token;
@@ -144,13 +144,13 @@ fs::path Workstation::HostPath(const std::string& place) const
     const size_t slash = place.find('/');
     const auto top = m_hostDirs.find(place.substr(0, slash));
     if (slash == std::string::npos || slash + 1 == place.size() || top == m_hostDirs.end())
-        throw std::runtime_error("\"" + place + "\" is no place on the workstation");
+        throw std::runtime_error("\"" + place + "\" is not a place on the workstation");
     std::string rest = place.substr(slash + 1);
     ReplaceAll(rest, "[P]", "[_ORX_HotFolder_]");
     return top->second / rest;
 }
 
-// The place of a path, and the path itself where it has none.
+// The place of a path, or the path itself if it has none.
 std::string Workstation::PlaceOf(const fs::path& path) const
 {
     for (const auto& [name, directory] : m_hostDirs)

@@ -1,23 +1,22 @@
 // A throw-away workstation on which a scenario starts the real executable.
 //
-// A scenario speaks of places on the workstation, not of paths:
+// A scenario uses places on the workstation, not paths:
 //   hot/NAME/...    the hot folder of that name, [P] is its private directory
 //   user/...        the per-user application data folder; machine/... the machine-wide one
 //   tool/...        the folder of the executable
-//   elsewhere/...   files that the tool has no reason to touch, as targets of links
-// A place that ends in a slash is a directory. One that ends in '#' is the attributes of the file or
-// directory before it, as letters: R read-only, H hidden, S system, X another user's, 0 no permission
-// at all ("hot/A/Desktop.ini#" -> "RS"). A snapshot of elsewhere/ has its modes there as well ("R mode 444").
+//   elsewhere/...   files that the tool has no reason to touch, for example targets of links
+// A place that ends in a slash is a directory. One that ends in '#' has the attributes of the file or directory before
+// it, as letters: R read-only, H hidden, S system, X another user's, 0 no permission at all ("hot/A/Desktop.ini#" ->
+// "RS"). A snapshot of elsewhere/ also has the modes there ("R mode 444").
 //
-// The texts contain what differs between systems as {hot}, {user}, {tool}, {app}, {previous},
-// {default} (each as the tool sees it) and {/}, the path separator; in capitals, {HOT} or {/2}, as
-// the registry editor's text has them. {repeat:COUNT:TEXT} is the text so many times, in each with its number, of
-// six digits, in place of '#'. A whole text can also be
+// In texts, {hot}, {user}, {tool}, {app}, {previous} and {default} are replaced with paths (as the tool sees them) and
+// {/} with the path separator; in capitals ({HOT}, {/2}) in the form of the registry editor's text. {repeat:COUNT:TEXT}
+// is the text COUNT times, with its six-digit number in place of '#'. A whole text can also be
 //   {utf16}TEXT     the text in UTF-16 with a byte-order mark
 //   {icon:NAME}     the bytes of a shipped icon
-//   {link:TARGET}   a symbolic link to another place or to an absolute path; to a directory, if its
-//                   own place ends in a slash. Links to files and dangling ones are for this machine only.
-//   {fifo}          a FIFO, for this machine only
+//   {link:TARGET}   a symbolic link to another place or to an absolute path; to a directory if its
+//                   own place ends in a slash. Links to files and dangling ones work only on this machine.
+//   {fifo}          a FIFO; only on this machine
 #pragma once
 
 #include "tests/process.h"
@@ -34,7 +33,7 @@ struct RunResult
 {
     ProcessResult process;
     std::string output;     // its standard output
-    std::string libraryLog; // what the library reported by itself, on Windows in message boxes
+    std::string libraryLog; // what the library reported, on Windows in message boxes
 };
 
 class Wine;
@@ -46,20 +45,20 @@ inline const char* const UserHive = "user/registry/HKEY_CURRENT_USER.reg";
 class Workstation
 {
   public:
-    /// With refusals in view, everything belongs to a user who is not root, and so does the run.
+    /// For tests of refusals, everything belongs to a user who is not root, and runs as that user.
     explicit Workstation(bool asOtherUser);
     ~Workstation();
     Workstation(const Workstation&) = delete;
     Workstation& operator=(const Workstation&) = delete;
 
     void LayOut(const Files& files);
-    /// Runs a program of the tool's folder to its end.
+    /// Runs a program in the tool's folder until it ends.
     RunResult Start(const std::vector<std::string>& arguments, const std::string& program = "FolderUpgrade");
     /// Every file with its text, every link, every directory and every attribute that is set. Links are not followed.
     Files Snapshot() const;
-    /// The text with everything in braces replaced, but for a link or a FIFO.
+    /// The text with everything in braces replaced, except for a link or a FIFO.
     std::string Expand(std::string text) const;
-    /// Throws, with its name, for what is no place.
+    /// Throws an error with the name if it is not a place.
     std::filesystem::path HostPath(const std::string& place) const;
 
   private:

@@ -1,6 +1,6 @@
 #!/usr/bin/env bash
-# Renders the SVG drawings beside this script and packs each into an .ico.
-# Size 16 comes from <name>.16.svg, all other sizes from <name>.svg. The README's picture of all four is made, too.
+# Renders the SVG drawings beside this script and packs each into an .ico. Size 16 comes from <name>.16.svg, all other
+# sizes from <name>.svg. It also makes the README's picture of all four.
 set -euo pipefail
 
 cd -- "$(dirname -- "${BASH_SOURCE[0]}")"
@@ -23,7 +23,7 @@ for name in *.16.svg; do
     [ "$size" -ne 16 ] || src=$name.16.svg
     rsvg-convert -w "$size" -h "$size" -o "$tmp/$size.png" "$src"
   done
-  # Force 32 bit, icotool would pick a palette for few colours; 256 stays PNG.
+  # Force 32 bits, because icotool would use a palette for few colours; size 256 stays PNG.
   icotool -c -b 32 -o "$tmp/$name.ico" \
     "$tmp/16.png" "$tmp/32.png" "$tmp/48.png" -r "$tmp/256.png"
   mv -- "$tmp/$name.ico" "$name.ico"

@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
 # Builds wxWidgets' Windows port and expat as static libraries for 64-bit Windows, from Debian's source packages (Debian
 # has no such package ready made), and prints the folder they are in: bin/wx-config, include, lib, licences, and BUILD,
-# which tells the versions and flags. The result is kept, so that only the first run takes minutes and needs the network.
+# which has the versions and flags. The result is kept, so that only the first run takes minutes and needs the network.
 set -euo pipefail
 export LC_ALL=C DEBIAN_FRONTEND=noninteractive
 
@@ -11,8 +11,8 @@ cache=${FOLDER_UPGRADE_CACHE:-${XDG_CACHE_HOME:-$HOME/.cache}/folder-upgrade}
 
 flags=(-O2 -DNDEBUG -ffunction-sections -fdata-sections)
 
-# What cannot be left out is the library's own error box and the dialogs it is made of. The precompiled headers halve
-# the time; the prefix is a placeholder, as wx-config finds its place by itself.
+# The library's own error box and the dialogs that it consists of cannot be left out. The precompiled headers halve the
+# time; the prefix is a placeholder, because wx-config finds its own location.
 options=(
     --prefix=/wxmsw --with-msw --disable-shared --disable-debug_flag --enable-repro-build --enable-pch
     --disable-dependency-tracking --disable-tests --without-subdirs --disable-sys-libs --with-expat=sys
@@ -32,7 +32,7 @@ cached() {
     [ -n "${prefix:-}" ]
 }
 
-# stage WHAT COMMAND...: runs the command with its output kept for the case of failure, with a sign of life meanwhile.
+# stage WHAT COMMAND...: runs the command, shows that it is alive meanwhile, and shows its output only if it fails.
 stage() {
     say "$1"
     beat "$1" >/dev/null 9>&- &
@@ -54,9 +54,9 @@ finish() {
     rm -rf "$work"
 }
 
-# The machine's apt sources need not include source packages, and are not to be changed: the places of Debian's own
-# suites are read from apt itself, whatever format they are written in, and put into a private list. Debian's key alone
-# is accepted for it. The rest of the machine's apt configuration (proxies, certificates) holds as it is.
+# The machine's apt sources may lack source packages, and must not be changed. So the locations of Debian's own suites
+# are read from apt itself, whatever format they are written in, and put into a private list, for which only Debian's
+# key is accepted. The rest of the machine's apt configuration (proxies, certificates) applies.
 update_sources() {
     local codename keyring=/usr/share/keyrings/debian-archive-keyring.gpg
     codename=$(sed -n 's/^VERSION_CODENAME=//p' /etc/os-release)
@@ -70,7 +70,7 @@ update_sources() {
     apt-get "${apt[@]}" update
 }
 
-# The newest version may be announced before its files are on the mirror, so older ones are tried too.
+# The newest version may be listed before its files are on the mirror, so older ones are tried too.
 fetch() {
     local version
     cd "$work"
@@ -85,7 +85,7 @@ fetch() {
     return 1
 }
 
-# The source package has no configure script, and making one takes more tools than compiling the three files.
+# The source package has no configure script, and making one takes more tools than compiling the three files by hand.
 build_expat() {
     cd "$work/expat/expat/lib"
     touch expat_config.h
@@ -109,7 +109,7 @@ make_wx() {
     make -C "$work/build" -j"$(nproc)" AROPTIONS=crD
 }
 
-# wx-config shall name neither the folder of the build nor a fixed prefix, so that the result may be moved and copied.
+# wx-config must not contain the build folder or a fixed prefix, so that the result can be moved and copied.
 install_wx() {
     local config
     make -C "$work/build" install DESTDIR="$work/dest"

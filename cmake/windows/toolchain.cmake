@@ -1,10 +1,10 @@
-# Cross-builds for 64-bit Windows with Debian's MinGW-w64, against the wxWidgets which build_wxwidgets.sh makes, or the
-# one in FOLDER_UPGRADE_WX_PREFIX. The program is linked statically, so that it is a single file, and is the same to the
-# byte wherever it is built.
+# Cross-builds for 64-bit Windows with Debian's MinGW-w64, against the wxWidgets that build_wxwidgets.sh builds, or the
+# one in FOLDER_UPGRADE_WX_PREFIX. The program is linked statically, so that it is a single file, and is identical
+# wherever it is built.
 set(CMAKE_SYSTEM_NAME Windows)
 set(CMAKE_SYSTEM_PROCESSOR x86_64)
 
-# Compilers are checked in projects of their own, which read this file again.
+# CMake checks the compilers in separate projects, which read this file again.
 list(APPEND CMAKE_TRY_COMPILE_PLATFORM_VARIABLES FOLDER_UPGRADE_WX_PREFIX)
 if(NOT FOLDER_UPGRADE_WX_PREFIX)
     execute_process(
@@ -14,7 +14,7 @@ if(NOT FOLDER_UPGRADE_WX_PREFIX)
 endif()
 set(wxWidgets_CONFIG_EXECUTABLE ${FOLDER_UPGRADE_WX_PREFIX}/bin/wx-config)
 
-# The variant with POSIX threads, which is the one with std::thread and the like.
+# The variant with POSIX threads, which has std::thread and the like.
 set(host x86_64-w64-mingw32)
 set(CMAKE_C_COMPILER ${host}-gcc-posix)
 set(CMAKE_CXX_COMPILER ${host}-g++-posix)
@@ -24,7 +24,7 @@ foreach(tool AR RANLIB STRIP OBJCOPY OBJDUMP DLLTOOL)
     find_program(CMAKE_${tool} ${host}-${name} REQUIRED)
 endforeach()
 
-# No folder of the building machine and no time may end in the program: __FILE__ is in every log message.
+# The program must not contain a folder of the build machine or a time: __FILE__ is in every log message.
 set(flags "")
 foreach(folder ${CMAKE_SOURCE_DIR} ${CMAKE_BINARY_DIR} ${FOLDER_UPGRADE_WX_PREFIX})
     string(APPEND flags " \"-ffile-prefix-map=${folder}=.\"")

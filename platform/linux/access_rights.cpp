@@ -3,8 +3,8 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-// The owner may change the mode. Attributes of a directory are extended ones only, for which the
-// right to write into it is enough.
+// The owner may change the mode. All attributes of a directory are extended attributes, for which
+// write permission is enough.
 bool MayChangeAttributes(const wxString& path)
 {
     struct stat status = {};

@@ -1,6 +1,6 @@
-// File attributes where the file system has none: READONLY of a file is its missing write
-// permission; every other one, and READONLY of a directory, is kept as hexadecimal text in the
-// extended attribute in which Wine and Samba keep them.
+// Windows file attributes on Linux: READONLY of a file is its missing write permission; every other
+// attribute, and READONLY of a directory, is kept as hexadecimal text in the extended attribute
+// that Wine and Samba use.
 #include "platform/linux/native_path.h"
 #include "platform/system.h"
 
@@ -19,8 +19,8 @@ namespace
 const char* const AttributeName = "user.DOSATTRIB";
 constexpr mode_t AnyWrite = S_IWUSR | S_IWGRP | S_IWOTH;
 
-// A file or directory that is looked at more than once, and is no link: as on Windows, attributes
-// are never those of what a link leads to.
+// A file or directory that is accessed more than once, never through a link: as on Windows,
+// attributes are not those of a link's target.
 class Node
 {
   public:
@@ -51,7 +51,7 @@ class Node
 
     DWORD ReadStored() const
     {
-        char text[256] = {}; // Samba puts more after the text and a NUL
+        char text[256] = {}; // Samba adds more after the text and a NUL
         const ssize_t length = getxattr(m_path.c_str(), AttributeName, text, sizeof text - 1);
         return length > 0 ? static_cast<DWORD>(std::strtoul(text, nullptr, 16)) : 0;
     }
@@ -82,7 +82,7 @@ mode_t FileModeMask()
     return mask;
 }
 
-// Write permission for those who may read, as far as the mask for new files lets it.
+// The mode with write permission for those who may read, as far as the umask permits.
 mode_t Writable(mode_t mode)
 {
     return mode | ((S_IRUSR | S_IWUSR | ((mode & (S_IRGRP | S_IROTH)) >> 1)) & ~FileModeMask());
@@ -122,7 +122,7 @@ BOOL SetFileAttributesW(LPCWSTR path, DWORD attributes)
     }
     if (stored == node.ReadStored())
         return node.ChangeMode(status.st_mode, mode) ? 1 : 0;
-    // Not even its owner can change an extended attribute of a file without write permission.
+    // Not even the owner can change an extended attribute of a file without write permission.
     const mode_t between =
         (status.st_mode & S_IWUSR) != 0 ? status.st_mode : status.st_mode | S_IWUSR;
     const DWORD before = node.ReadStored();

@@ -9,7 +9,7 @@
 namespace
 {
 
-// With a separator after it, a link would be followed.
+// With a separator at the end of the path, a link would be followed.
 wxString WithoutFinalSeparators(wxString path)
 {
     while (path.length() > 1 && path.EndsWith("/"))

@@ -1,7 +1,7 @@
-// Profile files (.ini): one key is read or changed, every other byte of the file stays.
+// Profile files (.ini): one key is read or changed; every other byte of the file stays.
 //
-// The text is handled in units, a byte each or, after a UTF-16LE byte-order mark, two, so that
-// bytes of any encoding come out as they went in. Of a repeated section or key the first counts.
+// The text is processed in units of one byte, or of two after a UTF-16LE byte-order mark, so that
+// text in any encoding is preserved. Of a repeated section or key, the first counts.
 #include "platform/linux/native_path.h"
 #include "platform/regular_file.h"
 #include "platform/system.h"
@@ -61,7 +61,7 @@ std::string Encode(const Text& text)
     return bytes + text.rest;
 }
 
-// A string of the caller's in the units of the file.
+// The caller's string in the units of the file.
 Units ToUnits(LPCWSTR string, bool isUtf16)
 {
     Units units;
@@ -130,7 +130,7 @@ bool Equals(const Units& units, size_t begin, size_t end, const Units& name)
                       [](char16_t left, char16_t right) { return Fold(left) == Fold(right); });
 }
 
-// Where a key is, or where it would have to be added.
+// Where a key is, or where it has to be added.
 struct Place
 {
     bool hasSection = false;
@@ -185,7 +185,7 @@ wxString NativeName(LPCWSTR path)
     return wxString::FromUTF8(NativePath(path));
 }
 
-// False for a read-only file, whoever asks; one that is not there is made.
+// Returns false for a read-only file, even for root; creates a missing file.
 bool OpenForWriting(LPCWSTR path, RegularFile& file)
 {
     const DWORD attributes = GetFileAttributesW(path);
@@ -195,7 +195,7 @@ bool OpenForWriting(LPCWSTR path, RegularFile& file)
            file.OpenForUpdate(NativeName(path), Links::Refuse) == RegularFile::Status::Open;
 }
 
-// Puts lines in at a place, after a line end if the text before it lacks one.
+// Inserts lines, after a line end if the text before them lacks one.
 void Insert(Units& units, size_t at, const Units& lines)
 {
     const bool needsEnd = at > 0 && units[at - 1] != '\n';

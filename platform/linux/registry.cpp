@@ -1,5 +1,5 @@
-// The registry of a machine without one: a hive is an export of the registry editor, read again
-// each time a key is opened.
+// The registry of a machine without one: a hive is a file exported by the registry editor, and is
+// read again each time a key is opened.
 #include "platform/linux/registry_export.h"
 #include "platform/regular_file.h"
 #include "platform/standard_folders.h"
@@ -14,7 +14,7 @@
 struct RegistryKey
 {
     std::string hive;
-    const char* lines = nullptr; // of the key, in the hive
+    const char* lines = nullptr; // the key's lines in the hive
 };
 
 LSTATUS RegOpenKeyExW(HKEY hive, LPCWSTR path, DWORD /*options*/, REGSAM /*access*/, HKEY* key)
@@ -30,7 +30,7 @@ LSTATUS RegOpenKeyExW(HKEY hive, LPCWSTR path, DWORD /*options*/, REGSAM /*acces
         return ERROR_FILE_NOT_FOUND;
     opened->hive = DecodeRegistryExport(std::move(opened->hive));
     opened->lines = FindRegistryKey(opened->hive, (name + "\\" + path).utf8_string());
-    *key = opened->lines ? opened.release() : nullptr; // the caller's until RegCloseKey
+    *key = opened->lines ? opened.release() : nullptr; // owned by the caller until RegCloseKey
     return *key ? ERROR_SUCCESS : ERROR_FILE_NOT_FOUND;
 }
 

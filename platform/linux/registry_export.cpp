@@ -14,21 +14,22 @@ constexpr DWORD TypeExpandableText = 2;
 constexpr DWORD TypeBinary = 3;
 constexpr DWORD TypeNumber = 4;
 
-// The text after a beginning, in any letter case; null when it begins otherwise.
+// The text after a prefix, which is compared ignoring case; null if the text does not begin with
+// it.
 const char* After(const std::string& beginning, const char* text)
 {
     const bool begins = strncasecmp(text, beginning.c_str(), beginning.length()) == 0;
     return begins ? text + beginning.length() : nullptr;
 }
 
-// Where the next line begins; at the end of the text when there is none.
+// Where the next line begins; the end of the text if there is none.
 const char* NextLine(const char* text)
 {
     const char* end = std::strchr(text, '\n');
     return end ? end + 1 : text + std::strlen(text);
 }
 
-// Text up to its quote, with a backslash before each backslash and quote in it.
+// Text up to the closing quote; each backslash and quote in it has a backslash before it.
 std::vector<BYTE> ReadText(const char* at)
 {
     std::string text;
@@ -43,7 +44,7 @@ std::vector<BYTE> ReadText(const char* at)
     return {bytes.data(), bytes.data() + bytes.length()};
 }
 
-// Bytes with commas between them; a backslash after a comma continues them in the next line.
+// Bytes separated by commas; after a comma, a backslash continues them on the next line.
 std::vector<BYTE> ReadBytes(const char* at)
 {
     std::vector<BYTE> bytes;
@@ -56,7 +57,8 @@ std::vector<BYTE> ReadBytes(const char* at)
     return bytes;
 }
 
-// The editor leaves the NUL at the end of text out, and adds one to bytes of text that lack it.
+// The editor leaves out the NUL at the end of a text, and adds one to a text given as bytes that
+// lacks it.
 RegistryValue Terminated(RegistryValue value)
 {
     std::vector<BYTE>& data = value.data;

@@ -13,11 +13,12 @@ struct RegistryValue
     std::vector<BYTE> data;
 };
 
-/// The text, in UTF-8, of an export in UTF-8 or UTF-16; empty when the bytes are none.
+/// The text, in UTF-8, of an export in UTF-8 or UTF-16; empty if the bytes are not an export.
 std::string DecodeRegistryExport(std::string bytes);
 
-/// The first line after that of a key; null when neither the key nor one below it is there. The
-/// path begins with the hive's full name. Names of keys and values are of ASCII, in any case.
+/// The first line after the line of a key; null if neither the key nor one below it exists. The
+/// path begins with the hive's full name. Names of keys and values are ASCII and compared ignoring
+/// case.
 const char* FindRegistryKey(const std::string& hive, const std::string& path);
 
 /// The value of that name in the lines of a key.

@@ -2,6 +2,8 @@
 
 #include "platform/access_rights.h"
 
+#include <wx/log.h>
+
 #include <cerrno>
 #include <fcntl.h>
 #include <sys/stat.h>
@@ -15,14 +17,14 @@ bool IsRegular(int descriptor, struct stat& status)
     return fstat(descriptor, &status) == 0 && S_ISREG(status.st_mode);
 }
 
-// Opened so that a pipe in the file's place does not make the tool wait.
+// Opened so that a pipe in place of the file does not block the tool.
 int OpenDescriptor(const wxString& path, Links links, int flags)
 {
     return open(path.utf8_str(),
                 flags | O_NONBLOCK | O_CLOEXEC | (links == Links::Refuse ? O_NOFOLLOW : 0));
 }
 
-// Whether the name, which may be no link, leads to that file. Keeps the error of the call before.
+// Whether the name leads to that file and is not a link. Preserves errno.
 bool IsSameFile(const wxString& path, int descriptor)
 {
     const int error = errno;
@@ -34,7 +36,7 @@ bool IsSameFile(const wxString& path, int descriptor)
     return isSame;
 }
 
-// Why the file did not open. Keeps the error of the opening.
+// Why the file did not open. Preserves errno.
 RegularFile::Status ReasonNotOpen(const wxString& path, Links links)
 {
     const int error = errno;
@@ -71,6 +73,7 @@ RegularFile::Status RegularFile::ReopenForUpdate()
     struct stat before = {};
     struct stat now = {};
     const int descriptor = OpenDescriptor(m_path, m_links, O_RDWR);
+    m_error = wxSysErrorCode();
     if (descriptor < 0)
         return IsSameFile(m_path, m_descriptor) ? Status::Refused : Status::Gone;
     if (!IsRegular(m_descriptor, before) || !IsRegular(descriptor, now) ||
@@ -137,7 +140,7 @@ bool RegularFile::Read(std::string& bytes, std::int64_t most) const
 
 bool RegularFile::Reserve(std::int64_t from, std::int64_t length)
 {
-    // Most file systems can; of what one that cannot says, only a full disk matters.
+    // Most file systems support this; if one does not, only the error of a full disk matters.
     return length == 0 || fallocate(m_descriptor, FALLOC_FL_KEEP_SIZE, from, length) == 0 ||
            (errno != ENOSPC && errno != EDQUOT);
 }

@@ -10,8 +10,8 @@
 namespace
 {
 
-// Made before main() runs. It is here because the linker takes this file from the library for the
-// functions below, and takes no file for the sake of a static object alone.
+// Constructed before main() runs. It is here because the linker takes this file from the library
+// for the functions below; it takes no file for a static object alone.
 const StartUp startUp;
 
 wxString FromEnvironment(const char* name)
@@ -20,7 +20,7 @@ wxString FromEnvironment(const char* name)
     return value ? wxString::FromUTF8(value) : wxString();
 }
 
-// A folder that the base directory convention names has to be absolute; others are to be ignored.
+// The XDG base directory convention requires an absolute path, and says to ignore others.
 bool IsUsable(const wxString& folder)
 {
     return folder.StartsWith("/");

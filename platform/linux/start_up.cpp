@@ -1,4 +1,4 @@
-// What has to be so before the library starts.
+// What has to be set up before the library starts.
 #include "platform/linux/start_up.h"
 
 #include <wx/strconv.h>
@@ -10,7 +10,7 @@
 namespace
 {
 
-// As much as the Windows program reserves: the library destroys documents by recursion.
+// As much as the Windows program reserves, because the library destroys documents by recursion.
 constexpr rlim_t StackBytes = 64UL * 1024 * 1024;
 
 void RaiseStackLimit()
@@ -26,8 +26,8 @@ void RaiseStackLimit()
 
 StartUp::StartUp()
 {
-    // Should the system lack it, names that are not ASCII stay what they were.
+    // If the system lacks this locale, the handling of names that are not ASCII does not change.
     static_cast<void>(std::setlocale(LC_CTYPE, "C.UTF-8"));
-    wxConvLocal = wxCSConv(wxFONTENCODING_UTF8); // by which the library reads the command line
+    wxConvLocal = wxCSConv(wxFONTENCODING_UTF8); // which the library uses to read the command line
     RaiseStackLimit();
 }

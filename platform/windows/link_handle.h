@@ -1,10 +1,10 @@
-// Whether an open handle is one of a link.
+// Whether an open handle is that of a link.
 #pragma once
 
 #include "platform/system.h"
 
-/// For a handle that was opened with FILE_FLAG_OPEN_REPARSE_POINT: whether it is one of a reparse
-/// point whose tag is a name surrogate. What the system does not say counts as one.
+/// For a handle that was opened with FILE_FLAG_OPEN_REPARSE_POINT: whether it is that of a reparse
+/// point whose tag is a name surrogate. True if the system does not say.
 inline bool IsLinkHandle(HANDLE handle)
 {
     FILE_ATTRIBUTE_TAG_INFO information = {};

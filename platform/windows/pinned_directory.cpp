@@ -10,7 +10,7 @@
 namespace
 {
 
-// With a separator after it, a link might be followed.
+// With a separator at the end of the path, a link might be followed.
 wxString WithoutFinalSeparators(wxString path)
 {
     while (!path.empty() && wxFileName::IsPathSeparator(path.Last()))
@@ -34,9 +34,9 @@ bool IsDirectory(HANDLE handle)
            (information.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY) != 0;
 }
 
-// Only a handle that may list the directory, or pass through it, keeps others from renaming it.
-// Once there is one, its name leads to the same directory or link. The name is asked, too, since
-// only that shows a link of the system below Wine.
+// Only a handle with the right to list or traverse the directory prevents others from renaming it.
+// While the handle is open, the name leads to the same directory or link. The name is checked too,
+// because under Wine only that reveals a link of the underlying system.
 HANDLE Pin(const wxString& path, Links links)
 {
     HANDLE handle = Open(path, FILE_LIST_DIRECTORY | FILE_READ_ATTRIBUTES, links);
@@ -50,8 +50,8 @@ HANDLE Pin(const wxString& path, Links links)
     return INVALID_HANDLE_VALUE;
 }
 
-// The path that leads over no link, for what is behind one may be exchanged. The given one, where
-// that is too long for calls that take no more than MAX_PATH characters, file names included.
+// The path without links, because a link's target may be exchanged. The given path if the other is
+// too long for calls that accept only MAX_PATH characters, including the file name.
 wxString FinalPath(HANDLE handle, const wxString& path)
 {
     constexpr DWORD Longest = MAX_PATH - 40;
@@ -75,7 +75,7 @@ bool IsLink(const wxString& path)
     if (search == INVALID_HANDLE_VALUE)
         return false;
     FindClose(search);
-    // A tag of 0 is how Wine shows a symbolic link of the system below it; Windows has no such tag.
+    // Wine shows a symbolic link of the underlying system with a tag of 0; Windows has no such tag.
     return (found.dwFileAttributes & FILE_ATTRIBUTE_REPARSE_POINT) != 0 &&
            (found.dwReserved0 == 0 || IsReparseTagNameSurrogate(found.dwReserved0));
 }
@@ -100,7 +100,7 @@ bool PinnedDirectory::IsOpen() const
 wxString PinnedDirectory::Reach(const wxString& name) const
 {
     if (!IsOpen())
-        return "|"; // in no file name
+        return "|"; // no file name has this character
     if (name.empty() || m_path.empty() || wxFileName::IsPathSeparator(m_path.Last()))
         return m_path + name;
     return m_path + wxFileName::GetPathSeparator() + name;
@@ -109,7 +109,7 @@ wxString PinnedDirectory::Reach(const wxString& name) const
 std::pair<std::uint64_t, std::uint64_t> PinnedDirectory::Identity() const
 {
     BY_HANDLE_FILE_INFORMATION information = {};
-    // Some network file systems number no files.
+    // Some network file systems do not number files.
     if (!IsOpen() || GetFileInformationByHandle(m_handle, &information) == 0 ||
         (information.nFileIndexHigh == 0 && information.nFileIndexLow == 0))
         return {};

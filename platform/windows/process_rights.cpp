@@ -33,7 +33,7 @@ wxString AccountName()
     if (!ReadToken(TokenUser, &token, sizeof token))
         return {};
 
-    wchar_t name[256 + 1] = {}; // the longest that the system has: UNLEN and 255 for a domain
+    wchar_t name[256 + 1] = {}; // the system's longest names: UNLEN, and 255 for a domain
     wchar_t domain[255 + 1] = {};
     DWORD nameSize = WXSIZEOF(name);
     DWORD domainSize = WXSIZEOF(domain);

@@ -3,13 +3,15 @@
 #include "platform/system.h"
 #include "platform/windows/link_handle.h"
 
+#include <wx/log.h>
+
 #include <algorithm>
 #include <limits>
 
 namespace
 {
 
-// What the C library gives others when it opens a file, too: they may read and write it.
+// The same sharing as when the C library opens a file: others may read and write it.
 constexpr DWORD Sharing = FILE_SHARE_READ | FILE_SHARE_WRITE;
 
 HANDLE OpenHandle(const wxString& path, DWORD access, DWORD flags)
@@ -26,7 +28,7 @@ bool IsReparsePoint(HANDLE handle)
            (information.dwFileAttributes & FILE_ATTRIBUTE_REPARSE_POINT) != 0;
 }
 
-// Why the file did not open. Keeps the error of the opening.
+// Why the file did not open. Preserves the last error.
 RegularFile::Status ReasonNotOpen(const wxString& path)
 {
     const DWORD error = GetLastError();
@@ -43,7 +45,7 @@ bool IsDiskFull(DWORD error)
            error == ERROR_NOT_ENOUGH_QUOTA;
 }
 
-// Where a transfer that is longer than one call can be goes on.
+// Where a transfer that is too long for a single call continues.
 OVERLAPPED At(std::int64_t offset)
 {
     OVERLAPPED place = {};
@@ -59,9 +61,9 @@ DWORD LengthOfCall(size_t rest)
 
 } // namespace
 
-// A link is opened as itself, so that it can be told from a file. While it, or the file, is open,
-// the name leads to nothing else; so a file whose content lies elsewhere (in a cloud) can be opened
-// by it again.
+// A link is opened as such, so that it can be distinguished from a file. While the link or the file
+// is open, the name leads to nothing else; so a file whose content is elsewhere (in a cloud) can be
+// opened again by its name.
 RegularFile::Status RegularFile::Open(const wxString& path, Links links, bool forUpdate)
 {
     Close();
@@ -91,9 +93,11 @@ RegularFile::Status RegularFile::Open(const wxString& path, Links links, bool fo
 RegularFile::Status RegularFile::ReopenForUpdate()
 {
     HANDLE handle = ReOpenFile(m_handle, GENERIC_READ | GENERIC_WRITE, Sharing, 0);
-    // Not every file system can do that. The open handle keeps the name from leading elsewhere.
+    // Not every file system supports that. The open handle ensures that the name leads to the same
+    // file.
     if (handle == INVALID_HANDLE_VALUE)
         handle = OpenHandle(m_path, GENERIC_READ | GENERIC_WRITE, 0);
+    m_error = wxSysErrorCode();
     if (!handle)
         return Status::Refused;
     CloseHandle(m_handle);
@@ -158,10 +162,10 @@ bool RegularFile::Read(std::string& bytes, std::int64_t most) const
 bool RegularFile::Reserve(std::int64_t from, std::int64_t length)
 {
     if (Length() >= from + length)
-        return true; // to allocate less than there is would cut the file
+        return true; // allocating less than the current size would cut the file
     FILE_ALLOCATION_INFO room = {};
     room.AllocationSize.QuadPart = from + length;
-    // Of what a file system that cannot do it says, only a full disk matters.
+    // If the file system does not support this, only the error of a full disk matters.
     return SetFileInformationByHandle(m_handle, FileAllocationInfo, &room, sizeof room) != 0 ||
            !IsDiskFull(GetLastError());
 }
@@ -199,7 +203,7 @@ void RegularFile::TakeAttributes(const RegularFile& source)
     if (GetFileInformationByHandleEx(source.m_handle, FileBasicInfo, &information,
                                      sizeof information) == 0)
         return;
-    // A time of 0 is left as it is.
+    // A time of 0 means that it stays as it is.
     information.CreationTime.QuadPart = 0;
     information.LastAccessTime.QuadPart = 0;
     information.ChangeTime.QuadPart = 0;

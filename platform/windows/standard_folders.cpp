@@ -10,6 +10,6 @@ wxString GetUserDataFolder()
 
 wxString GetMachineDataFolder()
 {
-    // Taken as a file's path, so that the application's name, whatever it is, falls away.
+    // Parsed as a file's path, which removes the application's name, whatever it is.
     return wxFileName(wxStandardPaths::Get().GetConfigDir()).GetPath(wxPATH_GET_VOLUME);
 }

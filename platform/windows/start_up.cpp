@@ -1,4 +1,4 @@
-// What has to be so before a program does anything else: which folder libraries come from, and
+// What has to be set up before a program does anything else: which folder libraries come from, and
 // which links an elevated process follows.
 #include "platform/process_rights.h"
 #include "platform/system.h"
@@ -6,16 +6,16 @@
 namespace
 {
 
-// Libraries that are loaded by name, and those that are loaded on their first use, come from the
-// system's directory: not from the executable's own, which for a downloaded installer is a folder
-// that anything may have been put into, nor from the current one.
+// Libraries that are loaded by name or on first use come from the system's directory: not from the
+// current one, nor from that of the executable, which may be a download folder where anybody could
+// have put anything.
 void LoadSystemLibrariesOnly()
 {
     SetDefaultDllDirectories(LOAD_LIBRARY_SEARCH_SYSTEM32);
 }
 
-// From now on the process refuses to pass junctions and symbolic links that a process without
-// administrator's rights has made. Windows 11 and Windows 10 22H2 know this policy; on an older
+// From now on the process refuses to follow junctions and symbolic links that a process without
+// administrator's rights has made. Windows 11 and Windows 10 22H2 have this policy; on an older
 // system the call fails and nothing changes. The policy holds for this process alone: a program
 // does not inherit it from the installer that starts it.
 void RefuseLinksOfOthers()
@@ -29,7 +29,7 @@ struct StartUp
 {
     StartUp()
     {
-        LoadSystemLibrariesOnly(); // first, in case that what follows loads one
+        LoadSystemLibrariesOnly(); // first, in case the next call loads one
         if (IsElevated())
             RefuseLinksOfOthers();
     }
@@ -37,18 +37,18 @@ struct StartUp
 
 } // namespace
 
-// Made before every other static object, those of the libraries included, in whatever order the
-// files are linked.
+// Constructed before every other static object, including those of the libraries, whatever the link
+// order.
 #ifdef _MSC_VER
 #pragma warning(disable : 4073) // says that this is for libraries
 #pragma init_seg(lib)
 #define MADE_FIRST
 #else
-#define MADE_FIRST [[gnu::init_priority(101)]] // 0 to 100 are the compiler's own
+#define MADE_FIRST [[gnu::init_priority(101)]] // 0 to 100 are reserved for the compiler
 #endif
 
-// Nothing refers to it. platform/CMakeLists.txt tells the linker to take it all the same; its name
-// there is this one, which is why it is a C name.
+// Nothing refers to this object. platform/CMakeLists.txt makes the linker include it by this name,
+// which is why it is a C name.
 extern "C"
 {
     extern const StartUp StartUpOfProgram;

@@ -1,13 +1,13 @@
-// Put in front of the C library with LD_PRELOAD: something happens at one of the program's calls.
+// Preloaded before the C library (LD_PRELOAD): makes something happen at one of the program's calls.
 //
-// Counted are the calls that concern a path below $FAULT_ROOT, by name or by descriptor, or those of them that
-// $FAULT_CALLS lists. What happens at number $FAULT_NUMBER, and at those that follow it, are the letters of
-// $FAULT_EVENTS:
+// It counts the calls that concern a path below $FAULT_ROOT, by name or by descriptor, or only those of them that
+// $FAULT_CALLS lists. The letters of $FAULT_EVENTS say what happens at call number $FAULT_NUMBER and at those that
+// follow it:
 //   f  the call does nothing and fails with the error number $FAULT_ERROR
 //   s  it writes half of what it is given
 //   e  the process ends before the call
 //   x  before the call, $FAULT_VICTIM is exchanged for a symbolic link to $FAULT_TARGET
-// The first of these calls and its path are then in the file $FAULT_REPORT.
+// The first of these calls and its path are written to the file $FAULT_REPORT.
 #include <cerrno>
 #include <csignal>
 #include <cstdarg>
@@ -37,7 +37,7 @@ int FailAfter(int /*result*/)
     return -1;
 }
 
-// Of a path that begins with a descriptor, the path to which that leads.
+// If the path begins with a descriptor, the path that it leads to.
 void Resolve(const char* path, char* resolved, size_t size)
 {
     const char* const descriptors = "/proc/self/fd/";
@@ -78,7 +78,7 @@ void Exchange()
         std::abort();
 }
 
-// What happens at this call; plain C, since calls come before main and after it, too.
+// What happens at this call; in plain C, because calls also come before and after main.
 char Event(const char* call, const char* path)
 {
     static const char* const root = std::getenv("FAULT_ROOT");
@@ -121,7 +121,7 @@ bool Fails(const char* call, int descriptor) { return Fails(call, PathOf(descrip
 
 } // namespace
 
-// The call with its parameters, what it is given, by what it is recognised, and how it fails.
+// Defines a call: its result, name and parameters, its arguments, what identifies its file, and how it fails.
 #define FAILING(result, name, parameters, arguments, subject, failure)                                                                     \
     extern "C" result name parameters                                                                                                      \
     {                                                                                                                                      \
@@ -151,7 +151,7 @@ FAILING(ssize_t, pread64, (int file, void* data, size_t size, off64_t offset), (
 FAILING(int, ftruncate64, (int file, off64_t length) noexcept, (file, length), file, -1)
 FAILING(int, fallocate64, (int file, int mode, off64_t from, off64_t length), (file, mode, from, length), file, -1)
 FAILING(int, fsync, (int file), (file), file, -1)
-FAILING(int, close, (int file), (file), file, FailAfter(real(file))) // it closes all the same
+FAILING(int, close, (int file), (file), file, FailAfter(real(file))) // it closes the file anyway
 FAILING(int, access, (const char* path, int mode) noexcept, (path, mode), path, -1)
 FAILING(int, stat64, (const char* path, struct stat64* status) noexcept, (path, status), path, -1)
 FAILING(int, lstat64, (const char* path, struct stat64* status) noexcept, (path, status), path, -1)

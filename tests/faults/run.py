@@ -1,15 +1,15 @@
 #!/usr/bin/env python3
-"""Runs the tool over and over on a small workstation, and each time something happens at another of its calls.
+"""Runs the tool many times on a small workstation; each time, something happens at a different call.
 
     tests/faults/run.py MODE PROGRAM FAILING_CALLS
 
-FAILING_CALLS is built of failing_calls.cpp. Whatever the mode, a run ends with -1 and no report of a sanitizer, and
-each Folder.cfg and each job preset is the old one or the new one, to the byte. MODE is one of
+FAILING_CALLS is built from failing_calls.cpp. In every mode, a run ends with -1 and no report of a sanitizer, and
+each Folder.cfg and each job preset is exactly the old one or the new one. MODE is one of
     EIO, ENOSPC, EACCES, EINTR   the call fails; only what it concerns differs from a run without a fault
-    SHORT, SHORT_ENOSPC          a write is half done; in the second, what should continue it fails
-    END                          the process is ended; a content may have line feeds up to the old length after it
+    SHORT, SHORT_ENOSPC          only half of a write is done; in the second, the write that should continue it also fails
+    END                          the process is ended; a content may be followed by line feeds up to the old length
     SWAP                         a file or directory is exchanged for a link; nothing outside the workstation changes
-    FULL_DISK                    no room is left, on a disk that only root can make; a line that was logged stays
+    FULL_DISK                    the disk (which only root can make) is full; a line that was logged stays
 """
 import contextlib
 import errno
@@ -29,7 +29,7 @@ LOG = LOG_DIR + "/UpgradeDowngrade.log"
 PRIVATE = "[_ORX_HotFolder_]"
 REWRITTEN = ("Folder.cfg", "presets.xml")
 
-# The event of failing_calls.cpp, and at which calls; none for all of them.
+# The event of failing_calls.cpp, and the calls at which it happens; None for all of them.
 MODES = {
     "EIO": ("f", ""),
     "ENOSPC": ("f", "open64 pwrite64 fallocate64 ftruncate64 setxattr "),
@@ -48,9 +48,9 @@ CFG = """<HotFolder name="%s" description="%s" server_ip="" server_name="PRESS1"
 PRESET = '<Presets><Setting Key="ORXImposeTemplate">"@/old/Booklet"</Setting></Presets>\r\n'
 HIVE = 'Windows Registry Editor Version 5.00\r\n\r\n[HKEY_%s]\r\n"%s"="@%s"\r\n'
 INI = "[.ShellClassInfo]\nIconFile=mine.ico\n[ViewState]\nMode=4\n"
-# The icon that a folder gets, the length of its description, and that of an attribute that is lost.
+# The icon that a folder gets, the length of its description, and the length of an attribute that is lost.
 FOLDERS = {"A": ("hf_folder", 1500, 0), "B": ("hf_error_inactive", 1500, 2000)}
-# Those of the second kind need another page when they are written.
+# Those of the second kind need one more page on the disk when they are written.
 MANY_FOLDERS = {**FOLDERS, **{f"F{number}": ("hf_folder", 3500, 0) for number in range(20)}}
 
 
@@ -91,7 +91,7 @@ def part(name):
 
 
 def look(root, but=(LOG, "program/FolderUpgrade")):
-    """Everything below the directory but for these names: content, mode, attributes."""
+    """Everything below the directory except these names: content, mode, attributes."""
     return {name: (path.is_file() and path.read_bytes(), path.stat().st_mode,
                    ATTRIBUTES in os.listxattr(path) and os.getxattr(path, ATTRIBUTES))
             for path in root.rglob("*") for name in [str(path.relative_to(root))] if not name.startswith(but)}
@@ -110,13 +110,13 @@ def torn(before, after, now, may_end_in_line_feeds):
 
 
 def judge(hit, before, after, now):
-    """What should not differ from the run without a fault, when the call concerned that path."""
+    """What differs from the run without a fault but should not, given the path that the call concerned."""
     changed = differences(after, now)
     parts = {part(name) for name in changed}
     if hit.startswith(LOG_DIR) or part(hit) != hit or hit in parts:
         return parts - {part(hit)}
-    # What all share: steps were not taken, at most those of one hot folder or of all job presets, but for
-    # the list itself; a source icon that cannot be read leaves a part of its copy.
+    # What several share: steps were skipped, at most those of one hot folder or of all job presets, except for
+    # the list itself; a source icon that cannot be read leaves part of its copy.
     if len(parts) > 1 and not hit.startswith("machine/hotfolder") and not all("JPData" in name for name in parts):
         return parts
     return {name for name in changed if now.get(name) != before.get(name) and not name.endswith(".ico")}
@@ -155,7 +155,7 @@ class Workstation:
         self.report.unlink(missing_ok=True)
 
     def run(self, number, events, calls="", error=0, below="", victim="", target="", prepare=lambda _: None):
-        """The finished process, and the call at which it happened with its path, or neither."""
+        """The finished process, and the call at which something happened with its path, or neither."""
         self.restore()
         prepare(self.root)
         process = subprocess.run(
@@ -168,7 +168,7 @@ class Workstation:
         return process, self.report.read_text().split("\t") if self.report.exists() else [None, None]
 
     def has_torn_line(self):
-        """Whether the log is neither the earlier run's nor made of whole lines."""
+        """Whether the log is neither that of the earlier run nor made of complete lines."""
         log = (self.root / LOG).read_bytes()
         return log != (self.original / LOG).read_bytes() and not log.endswith(b"\r\n") and log != b""
 
@@ -179,7 +179,7 @@ def complaints(process, status=FINISHED):
 
 
 def try_calls(station, mode):
-    """With a fault at each call in its turn: what was wrong, for each run."""
+    """Makes each call fail in turn; returns what was wrong in each run."""
     events, calls = MODES[mode]
     ends = mode == "END"
     for number in itertools.count(1):
@@ -197,7 +197,7 @@ def try_calls(station, mode):
 
 
 def victims():
-    """What is exchanged, and for a link to what; the second of a place does not exist."""
+    """What is exchanged, and the target of the link that replaces it; a place's second target does not exist."""
     for folder, (icon, *_) in FOLDERS.items():
         hot = f"Hot Folders/{folder}"
         yield hot, "empty"
@@ -214,7 +214,7 @@ def victims():
 
 
 def try_swaps(station):
-    """With each victim exchanged at each call by name that its step makes: what was wrong, for each run."""
+    """Exchanges each victim at each call by name that its step makes; returns what was wrong in each run."""
     outside = look(station.outside, ())
     for victim, target in victims():
         below = LOG_DIR if victim.startswith(LOG_DIR) else part(victim)
@@ -233,7 +233,7 @@ def fill_up(directory):
 
 
 def try_full_disk(station):
-    """With no room left: what was wrong with the run."""
+    """Fills the disk; returns what was wrong in the run."""
     process, _ = station.run(0, "f", prepare=fill_up)
     now = look(station.root)
     wrong = torn(station.before, station.after, now, False) | complaints(process)
@@ -257,7 +257,7 @@ def keeps_attributes(directory):
 
 @contextlib.contextmanager
 def small_disk(folder):
-    """Mounts one of 64 megabytes at the directory."""
+    """Mounts a disk of 64 megabytes at the directory."""
     folder.mkdir()
     subprocess.run(["mount", "-t", "tmpfs", "-o", "size=64m", "tmpfs", folder], check=True)
     try:

@@ -6,7 +6,7 @@ namespace
 
 Text Filter(const Text& content) { return "  <FilterSetting>" + content + "</FilterSetting>\n"; }
 
-// A chain of elements, as the library writes it: one below the other, the levels counted from 1.
+// A chain of nested elements, as the library writes it; levels are counted from 1.
 Text Nested(int levels)
 {
     Text opened;
@@ -20,7 +20,7 @@ Text Nested(int levels)
     return opened + closed + "\n  ";
 }
 
-// The same in one line.
+// The same on one line.
 Text Chain(int levels)
 {
     Text text;
@@ -60,7 +60,7 @@ std::vector<Scenario> FolderCfgs()
         elsewhere("ATemplateOnAServerStaysWithSlashes", "//host/share/B"),
         onShare("ATemplateOnTheShareThatIsLeftMoves", "share").FolderCfg(Written(onServer), Written("{default}{/}x")),
         onShare("ATemplateOnAnotherShareStays", "other").FolderCfg(Written(onServer)),
-        Scenario("HiddenAndSystemFilesAreWrittenAndStayThat")
+        Scenario("HiddenAndSystemFilesAreWrittenAndKeepTheirAttributes")
             .Before({{CfgPlace + "#", "HS"}, {PresetPlace + "#", "HS"}})
             .FolderCfg(Written(MovedFrom), Written(MovedTo))
             .Preset(Stored(MovedFrom), Stored(MovedTo))
@@ -88,7 +88,7 @@ std::vector<Scenario> FolderCfgs()
     };
 }
 
-// In these encodings only folders with ASCII names can be told apart.
+// In these encodings only folders with ASCII names can be distinguished.
 std::vector<Scenario> Encodings()
 {
     const auto declared = [](const Name& name, const Text& encoding, const Text& folder)
@@ -105,11 +105,11 @@ std::vector<Scenario> Encodings()
             .LogOfDisabledA(Found("{hot}{/}x"));
     };
     return {
-        ascii("AsciiInUtf8OfAnotherNameIsReadAsThat", "UTF8"),
-        ascii("AsciiInLatin1IsReadAsThat", "latin1"),
-        ascii("AsciiIsReadAsThat", "ASCII"),
-        ascii("AsciiInWindows1252IsReadAsThat", "windows-1252"),
-        ascii("AsciiInShiftJisIsReadAsThat", "Shift_JIS"),
+        ascii("AsciiInUtf8OfAnotherNameIsRead", "UTF8"),
+        ascii("AsciiInLatin1IsRead", "latin1"),
+        ascii("AsciiIsRead", "ASCII"),
+        ascii("AsciiInWindows1252IsRead", "windows-1252"),
+        ascii("AsciiInShiftJisIsRead", "Shift_JIS"),
         declared("Utf8OfAnotherNameStays", "='UTF8'", "\xC3\xA4"),
         declared("AWindows1252FolderCfgComesOutInUtf8", "='windows-1252'", "\x80\xE4")
             .After({{CfgPlace, MinimalWritten("{hot}{/}template{/}x", "€ä")}})

@@ -49,7 +49,7 @@ std::vector<Scenario> Icons()
     };
 }
 
-// The folder of a user who has a Desktop.ini already.
+// A folder that already has a user's Desktop.ini.
 std::vector<Scenario> DesktopInis()
 {
     const Text disabled = IconFile("hf_folder_disabled");
@@ -71,7 +71,7 @@ std::vector<Scenario> DesktopInis()
     return {
         refresh("OurDesktopIniIsRefreshed", Header + IconFile("hf_folder") + "IconIndex=00\r\nInfoTip=old\r\n", "RS",
                 Header + disabled + "IconIndex=00\r\n" + InfoTip, "R"),
-        refresh("AUsersDesktopIniKeepsAllElse", users, "", usersAfter, "RS"),
+        refresh("AUsersDesktopIniKeepsEverythingElse", users, "", usersAfter, "RS"),
         refresh("HiddenStaysOnTheFolderAlone", users, "HRS", usersAfter, "HR", "HS"),
         refresh("AReadOnlyDesktopIniIsWritten", users, "R", usersAfter),
         refresh("ASystemDesktopIniIsWritten", users, "S", usersAfter),
@@ -82,13 +82,16 @@ std::vector<Scenario> DesktopInis()
         refresh("AReadOnlyDesktopIniOfTheUsersIsWritten", "", "RS", Header + InfoTip + disabled)
             .AsOtherUser()
             .NotUnderWine(WineLosesSystem),
-        refresh("AnothersDesktopIniStays", "[x]\r\n", "X", "[x]\r\n").After({{Ini + "#", ""}}).AsOtherUser().NotUnderWine(WineLosesSystem),
+        refresh("ADesktopIniOfAnotherUserStays", "[x]\r\n", "X", "[x]\r\n")
+            .After({{Ini + "#", ""}})
+            .AsOtherUser()
+            .NotUnderWine(WineLosesSystem),
         refresh("AReadOnlyIconIsReplaced", Header + InfoTip + disabled, "", Header + InfoTip + disabled)
             .Before({{Icon("hf_folder_disabled") + "#", "R"}})
             .After({{Icon("hf_folder_disabled") + "#", ""}})
             .AsOtherUser()
             .NotUnderWine("Wine refuses another user than root to replace it, as Windows does"),
-        Scenario("AnothersFolderStays")
+        Scenario("AFolderOfAnotherUserStays")
             .Before({{Icon("hf_folder_disabled"), "old"}, {Icon("hf_folder_disabled") + "#", "X"}, {"hot/A#", "X"}, {"hot/A/[P]#", "X"}})
             .AsOtherUser()
             .Log(FolderLines("A", 1, Copied("hf_folder_disabled"), NoCfg()))

@@ -1,11 +1,11 @@
-// Links and pipes where an ordinary user can plant them. What is elsewhere stays as it is.
+// Links and pipes where an ordinary user can plant them. Files elsewhere stay as they are.
 #include "tests/scenarios/texts.h"
 
 namespace
 {
 
-const char* const WineFollowsLinks = "Wine shows no links to files, and no dangling ones";
-const char* const NoPipes = "there are no pipes among Windows files";
+const char* const WineFollowsLinks = "Wine shows neither links to files nor dangling ones as links";
+const char* const NoPipes = "Windows has no pipes among files";
 
 const Text LogDir = "user/ORX_Installers";
 const Text PresetDir = "user/ORX/JPData/.P/Presets";
@@ -15,7 +15,7 @@ const Text CannotOpenPreset = "Unable to open preset.xml for read : ";
 
 Text LinkTo(const Text& place) { return "{link:" + place + "}"; }
 
-// A link in that place, to a file or directory of its kind and to nothing.
+// Two links in that place: one to a file or directory, whichever belongs there, and a dangling one.
 std::vector<Scenario> BothLinks(const Scenario& scenario, const Text& place, const Text& target, const Text& text)
 {
     Scenario linked = scenario;
@@ -26,7 +26,7 @@ std::vector<Scenario> BothLinks(const Scenario& scenario, const Text& place, con
     return {linked, dangling};
 }
 
-// What a run without a Folder.cfg does to A, whose icon is there.
+// What a run without a Folder.cfg does to A, whose icon exists.
 Scenario WithIcon(const Name& name)
 {
     return Scenario(name)
@@ -43,13 +43,13 @@ std::vector<Scenario> PlantedLinks()
                      "InfoTip=This folder has been configured as an ORX hot folder.\r\n";
     const Text iniStays = "Desktop.ini left as it is (reached over a link): {hot}{/}A{/}Desktop.ini\n";
     std::vector<Scenario> scenarios = {
-        Scenario("APrivateDirectoryIsNoLink")
+        Scenario("ALinkedPrivateDirectoryIsMissing")
             .Before({{"elsewhere/P/Folder.cfg", cfg}, {"elsewhere/P/hf_folder_disabled.ico", "old"}, {"hot/A/[P]/", LinkTo("elsewhere/P")}})
             .LogOfDisabledA(NoCfg()),
         Scenario("ALinkedPresetDirectoryIsNotOpened")
             .Before({{"elsewhere/P/presets.xml", preset}, {PresetDir + "/", LinkTo("elsewhere/P")}})
             .LogOfPreset(CannotOpenPreset),
-        Scenario("ALinkedLogFolderHasNoLog")
+        Scenario("ALinkedLogFolderGetsNoLog")
             .Before({{LogPlace, Removed}, {"elsewhere/L/UpgradeDowngrade.log", "-"}, {LogDir + "/", LinkTo("elsewhere/L")}})
             .FolderCfg(cfg, Written(MovedTo)),
         Scenario("AHotFolderMayBeReachedOverALink")
@@ -60,7 +60,7 @@ std::vector<Scenario> PlantedLinks()
             .Before({{"elsewhere/P/Presets/presets.xml", preset}, {"user/ORX/JPData/.P/", LinkTo("elsewhere/P")}})
             .After({{"elsewhere/P/Presets/presets.xml", Stored(MovedTo)}})
             .LogOfPreset(Updated),
-        Scenario("TheFoldersAboveItMayBeLinks")
+        Scenario("TheFoldersAboveThePresetsMayBeLinks")
             .Before({{"user/ORX/JPData/", Removed},
                      {"elsewhere/ORX/other", ""},
                      {"elsewhere/JPData/.P/Presets/presets.xml", preset},
@@ -95,15 +95,15 @@ std::vector<Scenario> PlantedPipes()
         return Scenario(name).Before({{place, "{fifo}"}}).NotUnderWine(NoPipes).Within(10, 512);
     };
     return {
-        pipe("APipeIsNoFolderCfg", CfgPlace).LogOfDisabledA(NoCfg()),
-        pipe("APipeIsNoIcon", Icon).LogOfDisabledA(NoCfg()),
-        pipe("APipeIsNoDesktopIni", Ini)
+        pipe("APipeIsNotAFolderCfg", CfgPlace).LogOfDisabledA(NoCfg()),
+        pipe("APipeIsNotAnIcon", Icon).LogOfDisabledA(NoCfg()),
+        pipe("APipeIsNotADesktopIni", Ini)
             .Before({{Icon, "old"}})
             .After({{Icon, "{icon:hf_folder_disabled.ico}"}, {"hot/A#", "S"}})
             .Log(FolderLines("A", 1, Copied("hf_folder_disabled"), NoCfg())),
-        pipe("APipeIsNoPreset", PresetPlace).LogOfPreset(CannotOpenPreset),
-        pipe("APipeIsNoList", ListPlace).Before({{"hot/A/", ""}}).Log(""),
-        pipe("APipeIsNoLog", LogPlace).FolderCfg(cfg, Written(MovedTo)),
+        pipe("APipeIsNotAPreset", PresetPlace).LogOfPreset(CannotOpenPreset),
+        pipe("APipeIsNotAList", ListPlace).Before({{"hot/A/", ""}}).Log(""),
+        pipe("APipeIsNotALog", LogPlace).FolderCfg(cfg, Written(MovedTo)),
     };
 }
 

@@ -18,7 +18,7 @@ std::vector<Scenario> Presets()
     return {
         updated("EveryPathInTheFolderMoves", "\r\n" + from + near + "\r\n" + Stored("{previous}{/}Sub{/}x") + Stored("{previous}") + near,
                 "\r\n" + to + near + "\r\n" + Stored("{default}{/}Sub{/}x") + Stored("{default}") + near),
-        updated("APresetWithoutAPathIsUpdatedAllTheSame", near, near),
+        updated("APresetWithoutAPathIsStillUpdated", near, near),
         updated("AnEmptyPresetIsUpdated", "", ""),
         updated("AByteOrderMarkAloneGoes", "\xEF\xBB\xBF", ""),
         updated("AByteOrderMarkGoes", "\xEF\xBB\xBF" + from, to),

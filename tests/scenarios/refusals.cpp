@@ -1,4 +1,4 @@
-// Stored formats that are refused to a user who is not root; icons.cpp has the rest.
+// Stored files that a user who is not root cannot read or write; icons.cpp has the others.
 #include "tests/scenarios/texts.h"
 
 namespace

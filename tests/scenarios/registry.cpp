@@ -17,7 +17,7 @@ Text Bytes(const Text& name, const Text& type, const Text& bytes)
     return value;
 }
 
-// A hot folder and a preset that would move, and such a value of the key.
+// A hot folder and a preset whose paths would move, and this value in the key.
 Scenario Both(const Name& name, const Text& letter, const Files& hives)
 {
     const Text path = letter == "I" ? MovedFrom : MovedTo;
@@ -50,8 +50,8 @@ std::vector<Scenario> Registry()
             .LogOfA(found, updated),
         WithPrevious("ATextOf258CharactersIsTooLong", "\"Path\"=\"" + Text(258, 'x') + "\"").LogOfA(found + NoPrevious, NoPrevious),
         WithPrevious("ATextOf257CharactersIsRead", "\"Path\"=\"" + Text(257, 'x') + "\"").LogOfA(found, updated),
-        WithInstalled("ANumberIsNoFolderThatCanBeStored", "\"InstallPath\"=dword:00000001").LogOfA(unstorable, updated),
-        WithInstalled("ALoneSurrogateIsNoFolderThatCanBeStored", Bytes("InstallPath", "", Text("C\0\0\xD8:\0\0\0", 8)))
+        WithInstalled("ANumberAsTheNewFolderMovesNothing", "\"InstallPath\"=dword:00000001").LogOfA(unstorable, updated),
+        WithInstalled("ALoneSurrogateInTheNewFolderMovesNothing", Bytes("InstallPath", "", Text("C\0\0\xD8:\0\0\0", 8)))
             .LogOfA(unstorable, updated),
         WithPrevious("AnUnterminatedOddValueIsReadToItsLastWholeUnit", Bytes("Path", "(2)", Text("x\0y\0z", 5))).LogOfA(found, updated),
         WithPrevious("AFinalSeparatorMovesPresetsOnly", "\"Path\"=\"{PREVIOUS}{/2}\"")
@@ -61,7 +61,7 @@ std::vector<Scenario> Registry()
             .After({{CfgPlace, Written("{previous}{/}{/}Booklet.tpl")}, {PresetPlace, Stored(MovedFrom)}})
             .LogOfA(foundNew, updated),
         WithPrevious("AnEmptyPreviousFolderReplacesNothing", "\"Path\"=\"\"").LogOfA(found, updated),
-        Scenario("WithoutTheEntryNoFolderIsLookedUp")
+        Scenario("WithoutATemplateNoFolderIsLookedUp")
             .Before({{MachineHive, Removed}, {UserHive, "garbage"}})
             .FolderCfg("<H><ImposeSetting/></H>")
             .LogOfDisabledA(Found(""), NoDefault + NoPrevious),

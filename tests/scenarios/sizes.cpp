@@ -1,4 +1,4 @@
-// Contents that are made to exhaust the memory, the stack or the patience of whoever loads them.
+// Contents that are made to exhaust memory, stack or time when they are loaded.
 #include "tests/scenarios/texts.h"
 
 namespace
@@ -6,7 +6,7 @@ namespace
 
 Text Times(int count, const Text& text) { return "{repeat:" + std::to_string(count) + ":" + text + "}"; }
 
-// A Folder.cfg whose template moves if it can be loaded, with this beside.
+// A Folder.cfg whose template moves if it can be loaded, with this additional content.
 Text Cfg(const Text& content, const Text& documentType = "")
 {
     return documentType + "<HotFolder name='n'><ImposeSetting><K k='ORXImposeTemplate' v='" + MovedFrom + "'/></ImposeSetting>" + content +
@@ -15,7 +15,7 @@ Text Cfg(const Text& content, const Text& documentType = "")
 
 Text DocumentType(const Text& content) { return "<!DOCTYPE HotFolder [" + content + "]>"; }
 
-// Entities of which each is ten times the one before, so that aN is 10 to the N characters.
+// Entities that each repeat the previous one ten times, so that aN has 10 to the power of N characters.
 Text Entities(int count)
 {
     Text text = "<!ENTITY a0 'x'>";
@@ -24,7 +24,7 @@ Text Entities(int count)
     return text;
 }
 
-// Hot folders with these contents, each of which moves, or else is too large; and one before and one after them.
+// Hot folders with these contents, which either move or are too large; and one folder before and one after them.
 Scenario Folders(const Name& name, const std::vector<Text>& contents, bool isLoaded)
 {
     Scenario scenario(name);

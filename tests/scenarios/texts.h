@@ -1,4 +1,4 @@
-// The files and log lines that the scenarios are made of.
+// The files and log lines that the scenarios use.
 #pragma once
 
 #include "tests/scenario.h"
@@ -20,7 +20,7 @@ inline Text Hive(const Text& key, const Text& value)
 inline Text MachineValue(const Text& value) { return Hive("HKEY_LOCAL_MACHINE\\SOFTWARE\\Vantorix\\QZA", value); }
 inline Text UserValue(const Text& value) { return Hive("HKEY_CURRENT_USER\\SOFTWARE\\HF", value); }
 
-/// A file of tests/data, with what is in doubled braces replaced.
+/// A file of tests/data, with the parts in double braces replaced.
 inline Text Data(const Text& file, const Files& values)
 {
     Text text = ReadFile(Text(DATA_DIR) + "/" + file);
@@ -38,7 +38,7 @@ inline Text Written(const Text& path, const Text& filter = "  <FilterSetting mod
 /// The same settings as another program may write them.
 inline Text Foreign(const Text& path) { return Data("foreign.cfg", {{"path", path}}); }
 
-/// A Folder.cfg with an imposition entry alone, and the way it comes out.
+/// A Folder.cfg with only an imposition entry, and the same after a rewrite.
 inline Text Minimal(const Text& path, const Text& declaration = "", const Text& name = "n")
 {
     return declaration + "<HotFolder name=\"" + name + "\"><ImposeSetting><K k=\"ORXImposeTemplate\" v=\"" + path +
@@ -55,7 +55,7 @@ inline Text Stored(const Text& path) { return "<K n=\"ORXImposeTemplate\">\"" + 
 
 // Logs; {icons} is where the icons of the run's direction come from -----------------------------
 
-/// One folder's lines: what its icon and its template led to.
+/// One folder's lines: those of its icon and those of its template.
 inline Text FolderLines(const Text& name, int position, const Text& icon, const Text& impose)
 {
     const Text end = name + " count:  " + std::to_string(position) + "\n";
