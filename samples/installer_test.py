@@ -3,7 +3,8 @@
 
     samples/installer_test.py BUILD_DIR
 
-BUILD_DIR is the build folder of the preset "windows". Wine gets its own prefix and display. On the workstation are two hot folders, one whose template moves, and a job preset.
+BUILD_DIR is the build folder of the preset "windows". Wine gets its own prefix and display. On the workstation are two hot
+folders, one whose template moves, and a job preset.
 """
 import functools
 import os
