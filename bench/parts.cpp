@@ -4,14 +4,16 @@
 #include "migrate/preset_text.h"
 #include "run/run_log.h"
 #include "store/folder_cfg_format.h"
-#include "store/folder_cfg_reader.h"
 #include "store/folder_cfg_writer.h"
+#include "store/xml_document.h"
 
 #include <benchmark/benchmark.h>
 #include <wx/init.h>
 
 #include <cstdlib>
 #include <filesystem>
+#include <fstream>
+#include <iterator>
 #include <string>
 
 namespace
@@ -33,12 +35,13 @@ wxString CfgPath(const char* name)
 
 void LoadCfg(benchmark::State& state)
 {
-    const fs::path sample = fs::path(SAMPLE_HOT_FOLDER) / "[_ORX_HotFolder_]/Folder.cfg";
-    fs::copy_file(sample, root / "typical.cfg", fs::copy_options::overwrite_existing);
+    std::ifstream file(fs::path(SAMPLE_HOT_FOLDER) / "[_ORX_HotFolder_]/Folder.cfg",
+                       std::ios::binary);
+    const std::string bytes{std::istreambuf_iterator<char>(file), {}};
     for (auto _ : state)
     {
-        HotFolderSettings settings;
-        if (LoadHotFolderSettings(CfgPath("typical.cfg"), settings) != 1)
+        wxXmlDocument document;
+        if (LoadXml(bytes, document, wxXMLDOC_KEEP_WHITESPACE_NODES) != XmlLoad::Loaded)
             state.SkipWithError("not loaded");
     }
 }
