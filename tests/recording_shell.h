@@ -7,6 +7,5 @@
 #include <vector>
 
 extern std::vector<std::string> ShellCalls;
-extern DWORD ShellMajorVersion;
-extern DWORD ShellMinorVersion;
+extern DWORD ShellMajorVersion, ShellMinorVersion;
 extern HRESULT ShellVersionResult;
