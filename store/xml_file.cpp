@@ -21,7 +21,7 @@ XmlFile::State XmlFile::Load(const wxString& path, Links links, const wxString& 
     return State::NotReadable;
 }
 
-// The steps for one hot folder read the same Folder.cfg one after another, and most of their time
+// Both steps of a hot folder read the same Folder.cfg one after another, and most of their time
 // is the parser's. So the last document is kept, together with its bytes: the same bytes make the
 // same document. A large one is not kept, since it would take memory while another is loaded.
 XmlFile::State XmlFile::Parse()
