@@ -132,9 +132,9 @@ cmake/install_packages.sh build sample
 quietly cmake --preset program
 quietly cmake --build --preset program
 if [ "$fresh" = yes ]; then
-    samples/lay_out.sh --fresh "$workstation"
+    samples/lay_out.py --fresh "$workstation"
 elif [ ! -e "$workstation" ]; then
-    samples/lay_out.sh "$workstation"
+    samples/lay_out.py "$workstation"
 fi
 remember
 

@@ -16,7 +16,7 @@ import time
 
 import picture
 import preset
-from workstation import ICON, PRIVATE, WineWorkstation, Workstation, write
+from workstation import ICON, PRIVATE, WineWorkstation, Workstation
 
 TMPFS, DISK = '/dev/shm', None  # None: the temporary folder
 COUNTS = {'native': [10, 100, 1000, 10000], 'once': [10], 'windows': [10, 100, 1000]}
@@ -63,9 +63,10 @@ def check_outcome(build):
                 raise SystemExit(f'the {name} left something unchanged')
         if outcomes[0] != outcomes[1]:
             raise SystemExit('the tool and the script leave different files')
-        cfg, icon = (f'{station.root}/Hot Folders/Jobs 00003/{PRIVATE}/{name}' for name in ('Folder.cfg', ICON))
+        folder = f'Hot Folders/Jobs 00003/{PRIVATE}'
+        cfg = station.root / folder / 'Folder.cfg'
         os.utime(cfg, (0, 0))
-        write(icon, b'')
+        station.put(f'{folder}/{ICON}', b'')
         station.floor()
         if os.stat(cfg).st_mtime == 0 or station.outcome() != outcomes[1]:
             raise SystemExit('the floor does not do its work')

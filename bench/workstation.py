@@ -10,78 +10,50 @@ import time
 from lxml import etree
 
 HERE = os.path.dirname(os.path.abspath(__file__))
-SAMPLES = f'{HERE}/../samples/workstation'
+sys.path.insert(0, f'{HERE}/../samples')
+import lay_out
+from lay_out import ATTRIBUTES, PRIVATE
+
 SAMPLE = 'Flyers A4'
-PRIVATE = '[_ORX_HotFolder_]'
 ICON = 'hf_folder.ico'
 ICON_BYTES = 60 * 1024
-ATTRIBUTES = 'user.DOSATTRIB'
 STALE_INI = '[.ShellClassInfo]\r\nIconFile=.\\[_ORX_HotFolder_]\\hf_folder.ico\r\nIconIndex=00\r\nInfoTip=Stale\r\n'
 FINISHED = 255  # the tool's exit status on every path
 
 
-def write(path, content):
-    os.makedirs(os.path.dirname(path), exist_ok=True)
-    with open(path, 'wb') as file:
-        file.write(content)
-
-
-class Workstation:
-    """On this machine, below root: each hot folder is a copy of the sample's, with an icon of 60 KB.
+class Workstation(lay_out.Workstation):
+    """On this machine: each hot folder is a copy of the sample's, with an icon of 60 KB.
 
     Each program is a method that returns the seconds it took, including the start of its process.
     """
-    separator, executable, hive_encoding, is_quiet = '/', '', 'utf-8', True
-
-    def __init__(self, root):
-        self.root = self.seen_root = root
-        self.user, self.machine = f'{root}/user', f'{root}/machine'
-        self.environment = {'XDG_CONFIG_HOME': self.user, 'XDG_CONFIG_DIRS': self.machine}
-
-    def seen(self, *names):
-        """A path below root as the programs see it."""
-        return self.separator.join((self.seen_root, *names))
-
-    def render(self, relative, name=SAMPLE):
-        with open(f'{SAMPLES}/{relative}', encoding='utf-8') as file:
-            text = file.read()
-        escaped = self.separator.replace('\\', '\\\\')
-        return (text.replace(f'@Hot Folders@/@{SAMPLE}', f'@Hot Folders@/@{name}').replace('@//@', escaped)
-                .replace('@/@', self.separator).replace('@ROOT@', self.seen_root))
+    executable, is_quiet = '', True
 
     def lay_out(self, build, count, old_tool=None):
-        for path in ('machine/registry/HKEY_LOCAL_MACHINE.reg', 'user/registry/HKEY_CURRENT_USER.reg'):
-            self.add_hive(path, self.render(path).replace('\n', '\r\n').encode(self.hive_encoding))
-        for path in glob.glob('user/ORX/JPData/*/Presets/presets.xml', root_dir=SAMPLES):
-            write(f'{self.user}/{path[5:]}', self.render(path).encode())
-        os.makedirs(f'{self.user}/ORX_Installers', exist_ok=True)
+        for name in ('machine/registry/HKEY_LOCAL_MACHINE.reg', 'user/registry/HKEY_CURRENT_USER.reg'):
+            self.put_hive(name, lay_out.sample(name))
+        for name in glob.glob('user/ORX/JPData/*/Presets/presets.xml', root_dir=lay_out.TEXTS):
+            self.put(name, lay_out.sample(name))
+        (self.user / 'ORX_Installers').mkdir(exist_ok=True)
 
-        with open(f'{HERE}/../appearance/icons/{ICON}', 'rb') as file:
-            icon = (file.read() * 4)[:ICON_BYTES]
+        icon = ((lay_out.ICONS / ICON).read_bytes() * 4)[:ICON_BYTES]
         for directory in ('program', 'program/BundleIcons'):
-            write(f'{self.root}/{directory}/{ICON}', icon)
+            self.put(f'{directory}/{ICON}', icon)
         programs = {'FolderUpgrade': f'{build}/FolderUpgrade', 'floor': f'{build}/bench/floor', 'old': old_tool}
         for name, path in programs.items():
             if path:
                 shutil.copy(path + self.executable, f'{self.root}/program/{name}{self.executable}')
 
+        cfg = lay_out.sample(f'Hot Folders/{SAMPLE}/{PRIVATE}/Folder.cfg')
         names = [f'Jobs {number:05}' for number in range(1, count + 1)]
         for name in names:
-            self.add_folder(name, icon)
+            folder = f'Hot Folders/{name}'
+            self.put(f'{folder}/{PRIVATE}/Folder.cfg', cfg.replace(f'@Hot Folders@/@{SAMPLE}', f'@Hot Folders@/@{name}'))
+            self.put(f'{folder}/{PRIVATE}/{ICON}', icon[::-1])
+            self.put(f'{folder}/Desktop.ini', STALE_INI)
         folders = [self.seen('Hot Folders', name) for name in names]
-        write(f'{self.machine}/hotfolder/HotFolderList.cfg',
-              ('<HotFolderList>' + ''.join(f'<HotFolder path="{folder}"/>\n' for folder in folders)
-               + '</HotFolderList>\n').encode())
-        write(f'{self.root}/folders.txt', '\n'.join(folders).encode())
-
-    def add_hive(self, path, content):
-        write(f'{self.root}/{path}', content)
-
-    def add_folder(self, name, icon):
-        folder = f'{self.root}/Hot Folders/{name}'
-        write(f'{folder}/{PRIVATE}/Folder.cfg', self.render(f'Hot Folders/{SAMPLE}/{PRIVATE}/Folder.cfg', name).encode())
-        write(f'{folder}/{PRIVATE}/{ICON}', icon[::-1])
-        write(f'{folder}/Desktop.ini', STALE_INI.encode())
+        self.put('machine/hotfolder/HotFolderList.cfg', '<HotFolderList>'
+                 + ''.join(f'<HotFolder path="{folder}"/>\n' for folder in folders) + '</HotFolderList>\n')
+        self.put('folders.txt', '\n'.join(folders))
 
     def run(self, *command, status=0):
         with tempfile.TemporaryFile() as errors:  # not a pipe, because Wine's services would keep it open
@@ -136,29 +108,9 @@ class Workstation:
         pass
 
 
-class WineWorkstation(Workstation):
+class WineWorkstation(lay_out.WineWorkstation, Workstation):
     """In a Wine prefix whose drive C: is the root for the programs."""
-    separator, executable, hive_encoding, is_quiet = '\\', '.exe', 'utf-16', False
-    wine, server = '/usr/lib/wine/wine64', '/usr/lib/wine/wineserver64'
-
-    def __init__(self, root):
-        super().__init__(f'{root}/drive_c')
-        self.seen_root = 'C:'
-        self.user, self.machine = f'{self.root}/users/root/AppData/Roaming', f'{self.root}/ProgramData'
-        self.environment = dict(os.environ, WINEPREFIX=root, HOME=root, USER='root', LC_ALL='C.UTF-8', WINEDEBUG='-all',
-                                WINEDLLOVERRIDES='mscoree=;mshtml=')
-
-    def lay_out(self, build, count, old_tool=None):
-        self.run(self.server, '-p')  # it keeps running between the runs
-        self.run(self.wine, 'wineboot', '--init')
-        super().lay_out(build, count)
-
-    def add_hive(self, path, content):
-        super().add_hive('hive.reg', content)
-        self.run(self.wine, 'regedit', '/S', self.seen('hive.reg'))
+    executable, is_quiet = '.exe', False
 
     def start(self, program, *arguments, status=FINISHED):
-        return self.run(self.wine, self.seen('program', f'{program}.exe'), *arguments, status=status)
-
-    def close(self):
-        subprocess.run([self.server, '-k'], env=self.environment, check=False)
+        return self.run(self.loader, self.seen('program', f'{program}.exe'), *arguments, status=status)

@@ -10,7 +10,7 @@ set -euo pipefail
 packages() {
     case $1 in
         build) echo g++ cmake ninja-build libwxgtk3.2-dev libexpat1-dev ;;
-        sample) echo attr ;;
+        sample) echo attr python3 ;;
         test) echo libgtest-dev ;;
         fuzz) echo clang libclang-rt-dev python3 ;;
         checks) echo clang-format clang-tidy cppcheck shellcheck python3 ;;

@@ -15,8 +15,9 @@ import sys
 import tempfile
 import time
 
+import lay_out
+
 ROOT = pathlib.Path(__file__).resolve().parents[1]
-WINE, SERVER = "/usr/lib/wine/wine64", "/usr/lib/wine/wineserver64"
 PROGRAMS = ("FolderUpgrade.exe", "FolderUpgradeCheck.exe")
 PRODUCT = r"C:\Program Files\Vantorix\QZA"
 PREVIOUS, DEFAULT, ELSEWHERE = r"C:\Previous", PRODUCT + r"\template", r"C:\Elsewhere"
@@ -94,26 +95,17 @@ def try_signing(build, scratch):
 
 # Workstation --------------------------------------------------------------------------------------
 
-class Workstation:
-    def __init__(self, scratch):
-        self.prefix = scratch / "prefix"
-        os.environ.update(WINEPREFIX=str(self.prefix), HOME=str(scratch), LC_ALL="C.UTF-8", WINEDEBUG="-all",
-                          WINEDLLOVERRIDES="mscoree=;mshtml=")
-        self.wine("wineboot", "--init")
-        # The server stays between the commands. This says no if that of wineboot is still there, which is as good.
-        succeeds(SERVER, "-p")
-        self.drive = self.prefix / "drive_c"
-        (self.user,) = [path for path in self.drive.glob("users/*/AppData/Roaming") if path.parts[-3] != "Public"]
+class Workstation(lay_out.WineWorkstation):
+    def __init__(self, prefix):
+        super().__init__(prefix)
         self.logs = self.user / "ORX_Installers"
-        self.product = self.drive / "Program Files/Vantorix/QZA"
+        self.product = self.root / "Program Files/Vantorix/QZA"
 
-    @staticmethod
-    def wine(*command, output=subprocess.DEVNULL):
-        """The exit status. Wine's services keep the output open, so it must not be a pipe."""
-        start = functools.partial(subprocess.run, [WINE, *command], check=False, timeout=120, stdout=output, stderr=output)
+    def install(self, *command):
+        """The exit status."""
+        status = self.wine(*command)
         # Now and then Wine itself ends with 1 before the program has begun; none of ours gives that.
-        status = start().returncode
-        return start().returncode if status == 1 and command[0] == "msiexec" else status
+        return self.wine(*command) if status == 1 and command[0] == "msiexec" else status
 
     def files(self, template_dir, icon):
         cfg = (ROOT / "tests/data/written.cfg").read_text(encoding="utf-8")
@@ -121,15 +113,14 @@ class Workstation:
         return {"Hot Folders/A/[_ORX_HotFolder_]/Folder.cfg": cfg.replace("{{path}}", template_dir + r"\Booklet").encode(),
                 "Hot Folders/A/[_ORX_HotFolder_]/hf_folder.ico": icon,
                 "Hot Folders/B/[_ORX_HotFolder_]/Folder.cfg": cfg.replace("{{path}}", ELSEWHERE + r"\Booklet").encode(),
-                f"{self.user.relative_to(self.drive)}/ORX/JPData/P/Presets/presets.xml":
+                "user/ORX/JPData/P/Presets/presets.xml":
                     rf'<K n="ORXImposeTemplate">"{template_dir}\Sub\Booklet"</K>'.encode() + b"\r\n"}
 
     def lay_out(self, previous):
         """Restores the state before an upgrade, without reports and logs; previous is the registry's text or None."""
-        for name, text in {**self.files(PREVIOUS, b"an older picture"), "ProgramData/hotfolder/HotFolderList.cfg":
+        for name, text in {**self.files(PREVIOUS, b"an older picture"), "machine/hotfolder/HotFolderList.cfg":
                            rb'<L><HotFolder path="C:\Hot Folders\A"/><HotFolder path="C:\Hot Folders\B"/></L>'}.items():
-            (self.drive / name).parent.mkdir(parents=True, exist_ok=True)
-            (self.drive / name).write_bytes(text)
+            self.put(name, text)
         for path in self.logs.glob("*"):
             path.unlink()
         self.wine("reg", "delete", r"HKCU\SOFTWARE\HF", "/f")
@@ -138,8 +129,8 @@ class Workstation:
 
     def look(self):
         """The files of the hot folders and presets, except Desktop.ini, which Wine changes."""
-        return {str(path.relative_to(self.drive)): path.read_bytes() for folder in (self.drive / "Hot Folders", self.user / "ORX")
-                for path in folder.rglob("*") if path.is_file() and path.name != "Desktop.ini"}
+        return {f"{name}/{path}": text for name, folder in (("Hot Folders", self.root / "Hot Folders"), ("user/ORX", self.user / "ORX"))
+                for path, text in files_below(folder).items() if not path.endswith("Desktop.ini")}
 
     def registry(self):
         with tempfile.TemporaryFile("w+") as output:
@@ -193,13 +184,13 @@ def try_installer(name, build_installer, scratch, station):
     (install_old, _), (install_new, remove) = (build_installer(scratch, version) for version in ("1.1.0", "1.2.0"))
     shipped = {file: text for file, text in files_below(scratch / "package").items()
                if file.endswith((".exe", ".ico", "NOTICES.txt"))}
-    new_icon, user = shipped["hf_folder.ico"], "C:\\" + str(station.user.relative_to(station.drive)).replace("/", "\\")
+    new_icon, user = shipped["hf_folder.ico"], r"C:\users\root\AppData\Roaming"
 
     def check_step(step, command, version, files, reports=None, log=None):
         """reports: the direction, and the kinds of lines in both."""
         step = f"{name}, {step}"
         before = files_below(station.logs)
-        check(f"{step}: exit status", station.wine(*command), 0)
+        check(f"{step}: exit status", station.install(*command), 0)
         for _ in range(300 if version is None else 0):  # the uninstaller continues as a copy of itself
             if not station.product.exists():
                 break
@@ -235,7 +226,7 @@ def try_installer(name, build_installer, scratch, station):
     check_step("same version again", install_new, "1.2.0", station.files(PREVIOUS, b"an older picture"))
 
     for file, text in station.files(DEFAULT, b"an older picture").items():
-        (station.drive / file).write_bytes(text)
+        station.put(file, text)
     check_step("removal", remove, None, station.files(PREVIOUS, new_icon), ("downgrade", {"change"}, set()),
                log_lines(user, "U", PRODUCT + r"\BundleIcons", DEFAULT))
 
@@ -247,12 +238,12 @@ def main():
     with tempfile.TemporaryDirectory() as folder:
         scratch = pathlib.Path(folder)
         try_signing(pathlib.Path(sys.argv[1]).resolve(), scratch)
-        station = Workstation(scratch)
+        station = Workstation(scratch / "prefix")
         try:
             try_installer("MSI", build_msi, scratch, station)
             try_installer("NSIS", build_setup, scratch, station)
         finally:
-            succeeds(SERVER, "-k")
+            station.close()
     print(f"{passed} passed, {len(failures)} failed, 0 skipped")
     sys.exit(bool(failures))
 

@@ -21,12 +21,14 @@ import subprocess
 import sys
 import tempfile
 
+sys.path.insert(0, str(pathlib.Path(__file__).resolve().parents[2] / "samples"))
+import lay_out
+from lay_out import ATTRIBUTES, PRIVATE, READ_ONLY, SYSTEM
+
 FINISHED = 255  # the tool's exit status of -1, on every path
 KILLED = -9
-ATTRIBUTES = "user.DOSATTRIB"
 LOG_DIR = "user/ORX_Installers"
 LOG = LOG_DIR + "/UpgradeDowngrade.log"
-PRIVATE = "[_ORX_HotFolder_]"
 REWRITTEN = ("Folder.cfg", "presets.xml")
 
 # The event of failing_calls.cpp, and the calls at which it happens; None for all of them.
@@ -43,10 +45,10 @@ MODES = {
 
 CFG = """<HotFolder name="%s" description="%s" server_ip="" server_name="PRESS1" Enable="%d" unknown="%s">
 <JobSetting><KEYVALUE Key="ORXCopies" Value="500" KeyDisplayValue="" LocDisplayValue=""/></JobSetting>
-<ImposeSetting><KEYVALUE Key="ORXImposeTemplate" Value="@/old/Booklet" KeyDisplayValue=""/></ImposeSetting>
+<ImposeSetting><KEYVALUE Key="ORXImposeTemplate" Value="@ROOT@/old/Booklet" KeyDisplayValue=""/></ImposeSetting>
 <FilterSetting>text<Filter/></FilterSetting></HotFolder>"""
-PRESET = '<Presets><Setting Key="ORXImposeTemplate">"@/old/Booklet"</Setting></Presets>\r\n'
-HIVE = 'Windows Registry Editor Version 5.00\r\n\r\n[HKEY_%s]\r\n"%s"="@%s"\r\n'
+PRESET = '<Presets><Setting Key="ORXImposeTemplate">"@ROOT@/old/Booklet"</Setting></Presets>\r\n'
+HIVE = 'Windows Registry Editor Version 5.00\r\n\r\n[HKEY_%s]\r\n"%s"="@ROOT@%s"\r\n'
 INI = "[.ShellClassInfo]\nIconFile=mine.ico\n[ViewState]\nMode=4\n"
 # The icon that a folder gets, the length of its description, and the length of an attribute that is lost.
 FOLDERS = {"A": ("hf_folder", 1500, 0), "B": ("hf_error_inactive", 1500, 2000)}
@@ -55,10 +57,10 @@ MANY_FOLDERS = {**FOLDERS, **{f"F{number}": ("hf_folder", 3500, 0) for number in
 
 
 def files_of(folders):
-    """The workstation's files; @ is its root."""
+    """The workstation's files."""
     files = {
         "machine/hotfolder/HotFolderList.cfg":
-            "<HotFolderList>" + "".join(f'<HotFolder path="@/Hot Folders/{name}"/>' for name in folders) + "</HotFolderList>",
+            "<HotFolderList>" + "".join(f'<HotFolder path="@ROOT@/Hot Folders/{name}"/>' for name in folders) + "</HotFolderList>",
         "machine/registry/HKEY_LOCAL_MACHINE.reg": HIVE % (r"LOCAL_MACHINE\SOFTWARE\Vantorix\QZA", "InstallPath", ""),
         "user/registry/HKEY_CURRENT_USER.reg": HIVE % (r"CURRENT_USER\SOFTWARE\HF", "Path", "/old"),
         "user/ORX/JPData/P/Presets/presets.xml": PRESET,
@@ -75,12 +77,9 @@ def files_of(folders):
     return files
 
 
-def lay_out(root, files, at_root):
+def put_all(station, files):
     for name, text in files.items():
-        path = root / name
-        path.parent.mkdir(parents=True, exist_ok=True)
-        encoding = "utf-16-le" if text.startswith("\ufeff") else "utf-8"
-        path.write_bytes(text.replace("@", str(at_root)).encode(encoding))
+        station.put(name, text)
 
 
 def part(name):
@@ -127,16 +126,17 @@ class Workstation:
         self.failing_calls = failing_calls
         self.root, self.original, self.report = folder / "work station", folder / "original", folder / "report"
         self.outside, self.outside_before = folder / "outside", folder / "outside before"
-        lay_out(self.original, files_of(folders), self.root)
-        os.setxattr(self.original / "Hot Folders/B/Desktop.ini", ATTRIBUTES, b"0x4")
-        (self.original / "Hot Folders/B/Desktop.ini").chmod(0o444)
+        original = lay_out.Workstation(self.original, self.root)
+        put_all(original, files_of(folders))
+        original.set_attributes("Hot Folders/B/Desktop.ini", READ_ONLY | SYSTEM)
+        self.environment = lay_out.Workstation(self.root).environment
         (self.root / "program").mkdir(parents=True)
         for file in [program, *program.parent.glob("*.ico")]:
             shutil.copy2(file, self.root / "program")
-        lay_out(self.outside_before, {
+        put_all(lay_out.Workstation(self.outside_before, self.root), {
             # A hot folder with and one without a private directory, a job preset directory, the log's folder.
             **{name: text for name, text in files_of(folders).items() if name.startswith(("Hot", "user/ORX"))},
-            "empty/other": "a file"}, self.root)
+            "empty/other": "a file"})
         self.before = look(self.original)
         self.run(0, "f")
         self.after = look(self.root)
@@ -160,7 +160,7 @@ class Workstation:
         prepare(self.root)
         process = subprocess.run(
             [self.root / "program/FolderUpgrade", "I"], capture_output=True, text=True, timeout=60, check=False,
-            env={**os.environ, "XDG_CONFIG_DIRS": f"{self.root}/machine", "XDG_CONFIG_HOME": f"{self.root}/user",
+            env={**os.environ, **self.environment,
                  "LD_PRELOAD": self.failing_calls, "FAULT_ROOT": f"{self.root}/{below}", "FAULT_NUMBER": str(number),
                  "FAULT_EVENTS": events, "FAULT_CALLS": calls, "FAULT_ERROR": str(error),
                  "FAULT_VICTIM": f"{self.root}/{victim}", "FAULT_TARGET": f"{self.outside}/{target}",
