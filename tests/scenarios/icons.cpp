@@ -17,31 +17,29 @@ Text Cfg(const Text& enabled) { return "<H name='' description='' server_ip='' s
 
 std::vector<Scenario> Icons()
 {
-    const auto shows = [](const Name& name, const Text& icon, const Text& letter, const Text& enabled, bool isInError)
+    // The new icon is in the tool's folder, the previous version's in BundleIcons.
+    const auto shows = [](const Name& name, const Text& icon, const Text& copied)
     {
         return Scenario(name)
-            .Before({{Icon(icon), "old"},
-                     {Icon("other"), "stays"},
-                     {"hot/A/Error.er", ""},
-                     {Text("hot/A/[P]/Error.er") + (isInError ? "" : "/"), ""},
-                     {"tool/BundleIcons/" + icon + ".ico", "bundled"}})
-            .FolderCfg(Cfg(enabled))
-            .Run({letter})
-            .After({{"hot/A#", "S"},
-                    {Ini + "#", "RS"},
-                    {Icon(icon), letter == "I" ? "{icon:" + icon + ".ico}" : "bundled"},
-                    {Ini, Header + IconFile(icon) + "IconIndex=00\r\n" + InfoTip}})
+            .Before(
+                {{Icon(icon), "old"}, {Icon("other"), "stays"}, {"hot/A/Error.er", ""}, {"tool/BundleIcons/" + icon + ".ico", "bundled"}})
+            .After(
+                {{"hot/A#", "S"}, {Ini + "#", "RS"}, {Icon(icon), copied}, {Ini, Header + IconFile(icon) + "IconIndex=00\r\n" + InfoTip}})
             .Log(FolderLines("A", 1, Copied(icon), ""));
     };
+    const auto upgradeShows = [&](const Name& name, const Text& icon) { return shows(name, icon, "{icon:" + icon + ".ico}"); };
+    const auto downgradeShows = [&](const Name& name, const Text& icon) { return shows(name, icon, "bundled").Run({"U"}); };
+    const Files error = {{"hot/A/[P]/Error.er", ""}};
+    const Files noError = {{"hot/A/[P]/Error.er/", ""}}; // a directory of that name
     return {
-        shows("AnUpgradeShowsActive", "hf_folder", "I", "1", false),
-        shows("ADowngradeShowsActive", "hf_folder", "U", "1", false),
-        shows("AnUpgradeShowsDisabled", "hf_folder_disabled", "I", "01", false),
-        shows("ADowngradeShowsDisabled", "hf_folder_disabled", "U", "01", false),
-        shows("AnUpgradeShowsErrorActive", "hf_error_active", "I", "1", true),
-        shows("ADowngradeShowsErrorActive", "hf_error_active", "U", "1", true),
-        shows("AnUpgradeShowsErrorInactive", "hf_error_inactive", "I", "", true),
-        shows("ADowngradeShowsErrorInactive", "hf_error_inactive", "U", "", true),
+        upgradeShows("AnUpgradeShowsActive", "hf_folder").FolderCfg(Cfg("1")).Before(noError),
+        downgradeShows("ADowngradeShowsActive", "hf_folder").FolderCfg(Cfg("1")).Before(noError),
+        upgradeShows("AnUpgradeShowsDisabled", "hf_folder_disabled").FolderCfg(Cfg("01")).Before(noError),
+        downgradeShows("ADowngradeShowsDisabled", "hf_folder_disabled").FolderCfg(Cfg("01")).Before(noError),
+        upgradeShows("AnUpgradeShowsErrorActive", "hf_error_active").FolderCfg(Cfg("1")).Before(error),
+        downgradeShows("ADowngradeShowsErrorActive", "hf_error_active").FolderCfg(Cfg("1")).Before(error),
+        upgradeShows("AnUpgradeShowsErrorInactive", "hf_error_inactive").FolderCfg(Cfg("")).Before(error),
+        downgradeShows("ADowngradeShowsErrorInactive", "hf_error_inactive").FolderCfg(Cfg("")).Before(error),
         Scenario("WithoutItsIconAFolderStays")
             .Before({{Icon("hf_folder_disabled"), "old"}, {"tool/BundleIcons/hf_folder_disabled.ico", "-"}, {Ini, "; mine\n"}})
             .FolderCfg(Cfg("1"))
@@ -57,36 +55,39 @@ std::vector<Scenario> DesktopInis()
                        "IconResource=y,1\n\n[.ShellClassInfo]\nInfoTip=second\n";
     const Text usersAfter = "; mine\n[ViewState]\nMode=\n[.shellclassinfo]\n\n;IconFile=no\nICONFILE=" + disabled.substr(9) +
                             "IconIndex=3\nIconResource=y,1\n" + InfoTip + "\n[.ShellClassInfo]\nInfoTip=second\n";
-    const auto refresh = [](const Name& name, const Text& before, const Text& attributes, const Text& after,
-                            const Text& folderAttributes = "", const Text& folderAttributesAfter = "S")
+    const auto refresh = [](const Name& name, const Text& before, const Text& after)
     {
         return Scenario(name)
-            .Before({{Icon("hf_folder_disabled"), "old"}, {Ini, before}, {Ini + "#", attributes}, {"hot/A#", folderAttributes}})
-            .After({{"hot/A#", folderAttributesAfter},
-                    {Ini + "#", "RS"},
-                    {Ini, after},
-                    {Icon("hf_folder_disabled"), "{icon:hf_folder_disabled.ico}"}})
+            .Before({{Icon("hf_folder_disabled"), "old"}, {Ini, before}})
+            .After({{"hot/A#", "S"}, {Ini + "#", "RS"}, {Ini, after}, {Icon("hf_folder_disabled"), "{icon:hf_folder_disabled.ico}"}})
             .Log(FolderLines("A", 1, Copied("hf_folder_disabled"), NoCfg()));
     };
+    const auto has = [](const Text& letters) { return Files{{Ini + "#", letters}}; };
+    const auto folderHas = [](const Text& letters) { return Files{{"hot/A#", letters}}; };
     return {
-        refresh("OurDesktopIniIsRefreshed", Header + IconFile("hf_folder") + "IconIndex=00\r\nInfoTip=old\r\n", "RS",
-                Header + disabled + "IconIndex=00\r\n" + InfoTip, "R"),
-        refresh("AUsersDesktopIniKeepsEverythingElse", users, "", usersAfter, "RS"),
-        refresh("HiddenStaysOnTheFolderAlone", users, "HRS", usersAfter, "HR", "HS"),
-        refresh("AReadOnlyDesktopIniIsWritten", users, "R", usersAfter),
-        refresh("ASystemDesktopIniIsWritten", users, "S", usersAfter),
-        refresh("AMissingSectionIsAddedAfterTheLastLine", "[x]\r\na=b", "", "[x]\r\na=b\r\n" + Header + InfoTip + disabled),
-        refresh("AUtf16DesktopIniStaysUtf16", "{utf16}" + Header + "IconFile=ü.ico\r\nInfoTip=old\r\n", "RS",
-                "{utf16}" + Header + disabled + InfoTip),
-        refresh("AnEmptyDesktopIniIsFilled", "", "RS", Header + InfoTip + disabled),
-        refresh("AReadOnlyDesktopIniOfTheUsersIsWritten", "", "RS", Header + InfoTip + disabled)
+        refresh("OurDesktopIniIsRefreshed", Header + IconFile("hf_folder") + "IconIndex=00\r\nInfoTip=old\r\n",
+                Header + disabled + "IconIndex=00\r\n" + InfoTip)
+            .Before(has("RS"))
+            .Before(folderHas("R")),
+        refresh("AUsersDesktopIniKeepsEverythingElse", users, usersAfter).Before(folderHas("RS")),
+        refresh("HiddenStaysOnTheFolderAlone", users, usersAfter).Before(has("HRS")).Before(folderHas("HR")).After(folderHas("HS")),
+        refresh("AReadOnlyDesktopIniIsWritten", users, usersAfter).Before(has("R")),
+        refresh("ASystemDesktopIniIsWritten", users, usersAfter).Before(has("S")),
+        refresh("AMissingSectionIsAddedAfterTheLastLine", "[x]\r\na=b", "[x]\r\na=b\r\n" + Header + InfoTip + disabled),
+        refresh("AUtf16DesktopIniStaysUtf16", "{utf16}" + Header + "IconFile=ü.ico\r\nInfoTip=old\r\n",
+                "{utf16}" + Header + disabled + InfoTip)
+            .Before(has("RS")),
+        refresh("AnEmptyDesktopIniIsFilled", "", Header + InfoTip + disabled).Before(has("RS")),
+        refresh("AReadOnlyDesktopIniOfTheUsersIsWritten", "", Header + InfoTip + disabled)
+            .Before(has("RS"))
             .AsOtherUser()
             .NotUnderWine(WineLosesSystem),
-        refresh("ADesktopIniOfAnotherUserStays", "[x]\r\n", "X", "[x]\r\n")
-            .After({{Ini + "#", ""}})
+        refresh("ADesktopIniOfAnotherUserStays", "[x]\r\n", "[x]\r\n")
+            .Before(has("X"))
+            .After(has(""))
             .AsOtherUser()
             .NotUnderWine(WineLosesSystem),
-        refresh("AReadOnlyIconIsReplaced", Header + InfoTip + disabled, "", Header + InfoTip + disabled)
+        refresh("AReadOnlyIconIsReplaced", Header + InfoTip + disabled, Header + InfoTip + disabled)
             .Before({{Icon("hf_folder_disabled") + "#", "R"}})
             .After({{Icon("hf_folder_disabled") + "#", ""}})
             .AsOtherUser()
