@@ -141,6 +141,28 @@ TEST_F(Store, SectionsThatAreMissingLeaveTheirValues)
     EXPECT_TRUE(jobs.empty());
 }
 
+TEST_F(Store, WithoutARootNothingIsReadOrWritten)
+{
+    JobSettingTable jobs = {{"kept", {}}};
+    ImposeSettingTable impose = {{"kept", {}}};
+    std::vector<InputFormat> formats(1);
+    wxXmlNode filter(wxXML_ELEMENT_NODE, "kept");
+    HotFolderSettings settings;
+    ReadJobSettings(nullptr, jobs);
+    ReadImposeSettings(nullptr, impose);
+    ReadInputFormats(nullptr, formats);
+    ReadFilterSetting(nullptr, filter);
+    ReadHotFolderSettings(nullptr, settings);
+    EXPECT_EQ(1U, jobs.size() * impose.size() * formats.size());
+    EXPECT_EQ("kept", filter.GetName());
+    EXPECT_EQ(-1, settings.server_version);
+    WriteJobSettings(nullptr, jobs);
+    WriteImposeSettings(nullptr, impose);
+    WriteInputFormats(nullptr, formats);
+    WritePaths(nullptr, {});
+    WritePreflightSettings(nullptr, PreflightSettingList(1));
+}
+
 TEST_F(Store, AnEntryWithoutAShortNameHasNoNames)
 {
     std::vector<InputFormat> formats;

@@ -118,6 +118,8 @@ std::vector<Scenario> Encodings()
         declared("AFolderCfgInShiftJisStays", "='Shift_JIS'", "\x93\xFA\x96\x7B"),
         declared("ShiftJisStaysWithSpacesInItsDeclaration", " = 'Shift_JIS'", "\x93\xFA"),
         declared("AFolderCfgInAnEncodingOfItsOwnStays", "='x-own'", "x"),
+        declared("AnEncodingOfItsOwnIsSeenAfterAByteOrderMark", "", "")
+            .FolderCfg("\xEF\xBB\xBF" + Minimal("{hot}{/}x", "<?xml version='1.0' encoding='x-own'?>")),
     };
 }
 

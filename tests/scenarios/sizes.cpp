@@ -72,6 +72,8 @@ std::vector<Scenario> Sizes()
                 true)
             .Within(5, 512),
         Folders("ADepthOf100000IsLoaded", {Cfg(Times(100000, "<e>") + Times(100000, "</e>"))}, true).Within(10, 512),
+        Folders("ManyShortTextsAndCommentsAreLoaded", {Cfg("<a>" + Times(60000, "x<!--c-->") + "</a>", DocumentType(""))}, true)
+            .Within(10, 512),
         Scenario("100000EntriesAndFiltersAreWrittenAgain")
             .FolderCfg(Cfg("<JobSetting>" + entries + "</JobSetting>" + filter), written)
             .LogOfDisabledA(Found(MovedFrom))
