@@ -5,8 +5,8 @@
 
 Faults are planted in every module that is shipped; those in platform/windows are looked for under Wine. A fault that
 does not compile is replaced by another one. The same seed gives the same faults, as long as the sources are the same. A
-survivor is either a missing test or a fault that changes nothing. What fuzzing, failing calls and the trial of the
-installers would find is not counted.
+survivor is either a missing test or a fault that changes nothing. What fuzzing and the trial of the installers would
+find is not counted.
 """
 import os
 import pathlib
@@ -22,6 +22,7 @@ import tempfile
 ROOT = pathlib.Path(__file__).resolve().parents[1]
 MODULES = ("app", "check", "run", "store", "migrate", "appearance", "platform")
 NOT_SHIPPED, UNDER_WINE = "platform/linux/", "platform/windows/"
+FAILING_CALLS = ("EIO", "ENOSPC", "EACCES", "EINTR", "SHORT", "SHORT_ENOSPC", "END", "SWAP", "FULL_DISK")  # modes of tests/faults/run.py
 TIME_LIMIT = 600  # seconds for a build or a part of the tests
 STRING = r'"(?:[^"\\]|\\.)*"'
 NEXT = {"true": "false", "==": "!=", "&&": "||", "<": "<=", ">": ">=", "+": "-", "++": "--", "&": "|"}
@@ -39,7 +40,7 @@ RULES = (
 
 
 def run(command, **options):
-    """Whether the command succeeds. Afterwards everything that it started has ended."""
+    """Whether the command succeeds. On a timeout, everything that it started is killed."""
     process = subprocess.Popen(command, stdout=subprocess.DEVNULL, stderr=subprocess.DEVNULL, start_new_session=True, **options)
     try:
         return process.wait(TIME_LIMIT) == 0
@@ -74,19 +75,21 @@ def passes(root, is_under_wine):
     """Whether all tests pass in this copy of the project."""
     scratch = root / "scratch"
     scratch.mkdir()
-    scratch.chmod(0o1777)  # Wine's server of another user makes files there
+    scratch.chmod(0o1777)  # another user's Wine server creates files there
     memory = 4 << 30  # some faults make a loop that never stops allocating
     environment = {**os.environ, "TMPDIR": str(scratch), "GTEST_FAIL_FAST": "1"}
     if is_under_wine:
         programs = [root / "windows" / name for name in ("FolderUpgrade.exe", "FolderUpgradeCheck.exe")]
         command = [root / "tests/under_wine.sh", root / "windows", root / "native"]
-        # Now and then Wine lets a test fail that passes the next time.
+        # Now and then a test fails under Wine and then passes.
         passed = (run([root / "tests/import_tables.sh", *programs]) and
                   any(run(command, env={**environment, "GTEST_FILTER": "-Sizes/*"}) for _ in range(2)))
     else:
         passed = all(run([root / "native/tests" / test], cwd=scratch, env={**environment, "GTEST_FILTER": tests},
                          preexec_fn=lambda: resource.setrlimit(resource.RLIMIT_AS, (memory, memory)))
                      for test, tests in (("unit_test", "*"), ("scenario_test", "-Sizes/*"), ("scenario_test", "Sizes/*")))
+        passed = passed and all(run([root / "tests/faults/run.py", mode, root / "native/FolderUpgrade", root / "failing_calls.so"])
+                                for mode in FAILING_CALLS)
     shutil.rmtree(scratch)
     return passed
 
@@ -104,6 +107,7 @@ def plant_all(root, drawn, wanted):
         subprocess.check_call(["cmake", "-S", root, "-B", root / folder, "-G", "Ninja", "-DCMAKE_BUILD_TYPE=Debug",
                                "-DCMAKE_CXX_FLAGS_DEBUG=-O0 -DNDEBUG -w", "-DCMAKE_GTEST_DISCOVER_TESTS_DISCOVERY_MODE=PRE_TEST", "--no-warn-unused-cli", *options],
                               stdout=subprocess.DEVNULL)
+    subprocess.check_call(["c++", "-shared", "-fPIC", root / "tests/faults/failing_calls.cpp", "-o", root / "failing_calls.so", "-ldl"])
     for is_under_wine in (False, True):
         if not build(root, is_under_wine) or not passes(root, is_under_wine):
             sys.exit("without any fault, the build or the tests fail" + " under Wine" * is_under_wine)

@@ -16,8 +16,15 @@ const Text LogFolder = "user/ORX_Installers";
 const char* const NoLinks = "Wine does not show links to files as links";
 const char* const NoRefusal = "Wine lets every user open a directory for writing";
 
-// A workstation, and all its report lines of one kind ("problem" alone: there is no such line). A line that ends in *
-// continues in the system's own words.
+const Text TemplateMoves = "change   Folder.cfg: " + MovedFrom + " -> " + MovedTo;
+const Text NoTarget = "note     no such file: " + MovedTo;
+const Text IsElsewhere = "note     template elsewhere: ";
+const Text NoIcon = "note     no copy of the icon to replace: hf_folder.ico";
+const Text NoDisabledIcon = "note     no copy of the icon to replace: hf_folder_disabled.ico";
+const Text NoPresets = "note     there are no presets in {user}{/}ORX{/}JPData{/}";
+
+// A workstation, and all its report lines. TemplateMoves and NoTarget may be left out. A line that ends in * continues
+// in the system's own words.
 struct Finding
 {
     Scenario workstation;
@@ -66,7 +73,9 @@ std::vector<Finding> Lists()
         {Done("AListCannotBeRead").Before({{Text(ListPlace) + "#", "0"}}).AsOtherUser(), "problem  HotFolderList.cfg: can't open file*"},
         {Done("TheListsFolderCannotBeEntered").Before({{"machine/hotfolder#", "0"}}).AsOtherUser(),
          "problem  HotFolderList.cfg: its folder cannot be entered"},
-        {lists("NoListedFolderIsThere", "BC"), "problem  none of the listed hot folders exists (another account? mapped drives?)"},
+        {lists("NoListedFolderIsThere", "BC"),
+         "problem  none of the listed hot folders exists (another account? mapped drives?)\n"
+         "note     listed hot folder does not exist: {hot}{/}B\nnote     listed hot folder does not exist: {hot}{/}C"},
         {lists("AListedFolderIsMissing", "AB"), "note     listed hot folder does not exist: {hot}{/}B"},
         {lists("AFolderIsListedTwice", "AA"), "note     hot folder is listed twice: {hot}{/}A"},
         {lists("AListIsEmpty", ""), "note     HotFolderList.cfg lists no hot folder"},
@@ -84,22 +93,24 @@ std::vector<Finding> Registry()
     const auto withPath = [](const Name& name, const Text& value, const Text& letter = "I") {
         return Moving(name).Before({{UserHive, UserValue("\"Path\"=\"" + value + "\"")}}).Run({letter});
     };
+    const Text stays = IsElsewhere + MovedFrom;
     const Files noPresets = {{PresetPlace, Removed}};
     return {
-        {Moving("PathIsMissing").Before({{UserHive, Removed}, {"hot/B/[P]/Folder.cfg", Written(MovedFrom)}}), path + unknown},
+        {Moving("PathIsMissing").Before({{UserHive, Removed}, {"hot/B/[P]/Folder.cfg", Written(MovedFrom)}}),
+         path + unknown + "\n" + NoIcon},
         {Moving("InstallPathIsMissing").Before({{MachineHive, Removed}}), installPath + unknown},
-        {Done("NothingAsksForInstallPath").Before({{MachineHive, Removed}}).Before(noPresets), "problem"},
-        {withPath("PathEndsInASeparator", "{PREVIOUS}{/2}"), path + "ends in a separator; no template of a hot folder moves"},
+        {Done("NothingAsksForInstallPath").Before({{MachineHive, Removed}}).Before(noPresets), IsElsewhere + MovedTo + "\n" + NoPresets},
+        {withPath("PathEndsInASeparator", "{PREVIOUS}{/2}"), path + "ends in a separator; no template of a hot folder moves\n" + stays},
         {withPath("PathEndsInASeparatorOnTheWayBack", "{PREVIOUS}{/2}", "U"),
-         path + "ends in a separator; it is doubled in the paths of hot folders"},
-        {withPath("PathIsEmpty", ""), path + "empty; only templates stored without a folder move"},
-        {withPath("PathIsEmptyOnTheWayBack", "", "U"), path + "empty; templates move to the root of the drive"},
-        {withPath("PathHoldsAnAmpersand", "{PREVIOUS}&"), path + "holds & or <, which presets store in another form"},
-        {withPath("WithoutPresetsAnAmpersandIsHarmless", "{PREVIOUS}&").Before(noPresets), "problem"},
-        {withPath("TheNewFolderIsBelowTheOld", "{APP}"), below},
-        {withPath("TheOldFolderIsBelowTheNew", "{APP}{/2}template{/2}old", "U"), below},
-        {withPath("WithoutPresetsAFolderBelowIsHarmless", "{APP}").Before(noPresets), "problem"},
-        {withPath("BothFoldersAreTheSame", "{APP}{/2}template").FolderCfg(Written(MovedTo)).Preset(Stored(MovedTo)), "change"},
+         path + "ends in a separator; it is doubled in the paths of hot folders\n" + stays},
+        {withPath("PathIsEmpty", ""), path + "empty; only templates stored without a folder move\n" + stays},
+        {withPath("PathIsEmptyOnTheWayBack", "", "U"), path + "empty; templates move to the root of the drive\n" + stays},
+        {withPath("PathHoldsAnAmpersand", "{PREVIOUS}&"), stays + "\n" + path + "holds & or <, which presets store in another form"},
+        {withPath("WithoutPresetsAnAmpersandIsHarmless", "{PREVIOUS}&").Before(noPresets), stays + "\n" + NoPresets},
+        {withPath("TheNewFolderIsBelowTheOld", "{APP}"), stays + "\n" + below},
+        {withPath("TheOldFolderIsBelowTheNew", "{APP}{/2}template{/2}old", "U"), stays + "\n" + below},
+        {withPath("WithoutPresetsAFolderBelowIsHarmless", "{APP}").Before(noPresets), stays + "\n" + NoPresets},
+        {withPath("BothFoldersAreTheSame", "{APP}{/2}template").FolderCfg(Written(MovedTo)).Preset(Stored(MovedTo)), ""},
         {Moving("InstallPathIsANumber").Before({{MachineHive, MachineValue("\"InstallPath\"=dword:00000001")}}),
          "problem  Folder.cfg: left as it is (new path holds a character that XML cannot store)\n"
          "problem  the folder being installed holds a character that XML cannot store; no path of a preset moves"},
@@ -109,30 +120,31 @@ std::vector<Finding> Registry()
 std::vector<Finding> FolderCfgs()
 {
     const Text privateDir = "hot/A/[P]";
-    const Text noIcon = "note     no copy of the icon to replace: hf_folder";
-    const Text noTarget = "note     no such file: " + MovedTo;
     const Text hidden = Changed(Written(MovedTo), " description=\"\"", "");
     const Text utf16 = "{utf16}" + Changed(Changed(Written(MovedFrom), "UTF-8", "UTF-16"), "𝄞", "");
     const Files linkedDir = {
         {CfgPlace, Removed}, {Icon, Removed}, {privateDir + "/", "{link:elsewhere/d}"}, {"elsewhere/d/Folder.cfg", Written(MovedFrom)}};
     return {
-        {Done("ItIsMissing").Before({{CfgPlace, Removed}}), "note     no Folder.cfg\n" + noIcon + "_disabled.ico"},
-        {Done("ItIsMalformed").FolderCfg("<a><b></a>"), "problem  Folder.cfg: XML parsing error: 'mismatched tag' at line 1"},
-        {Done("ItIsALink").Before({{CfgPlace, "{link:elsewhere/a}"}}).NotUnderWine(NoLinks), "problem  Folder.cfg: reached over a link"},
-        {Done("ItIsADirectory").Before({{CfgPlace, Removed}, {CfgPlace + "/", ""}}), "problem  Folder.cfg: is not a file"},
+        {Done("ItIsMissing").Before({{CfgPlace, Removed}}), "note     no Folder.cfg\n" + NoDisabledIcon},
+        {Done("ItIsMalformed").FolderCfg("<a><b></a>"),
+         "problem  Folder.cfg: XML parsing error: 'mismatched tag' at line 1\n" + NoDisabledIcon},
+        {Done("ItIsALink").Before({{CfgPlace, "{link:elsewhere/a}"}}).NotUnderWine(NoLinks),
+         "problem  Folder.cfg: reached over a link\n" + NoDisabledIcon},
+        {Done("ItIsADirectory").Before({{CfgPlace, Removed}, {CfgPlace + "/", ""}}),
+         "problem  Folder.cfg: is not a file\n" + NoDisabledIcon},
         {Done("ThePrivateDirectoryIsALink").Before(linkedDir), "problem  [_ORX_HotFolder_]: reached over a link"},
         {Done("ThePrivateDirectoryCannotBeEntered").Before({{privateDir + "#", "0"}}).AsOtherUser(),
          "problem  [_ORX_HotFolder_]: cannot be entered"},
         {Done("TheHotFolderCannotBeEntered").Before({{"hot/A#", "0"}}).AsOtherUser(), "problem  the hot folder cannot be entered"},
         {Moving("ItsEncodingIsUnknown").FolderCfg(Minimal(MovedFrom, "<?xml version='1.0' encoding='x-unknown'?>", "\xC3\xA4")),
-         "problem  Folder.cfg: left as it is (unknown encoding)"},
-        {Moving("ItIsNotInUtf8").FolderCfg(utf16), "note     Folder.cfg: comes out as UTF-8\n" + noTarget},
-        {Moving("NothingIsAtTheNewPath"), noTarget},
-        {Done("ItHidesThatItIsEnabled").FolderCfg(hidden),
-         "problem  Folder.cfg: lacks the attribute \"description\", so the enabled folder shows as disabled"},
-        {Done("ItIsDisabledAnyway").FolderCfg(Changed(hidden, "Enable=\"1\"", "Enable=\"0\"")), "problem"},
-        {Done("TheTemplateIsElsewhere").FolderCfg(Written("{hot}{/}T")), "note     template elsewhere: {hot}{/}T"},
-        {Done("ThereIsNoIconToReplace").Before({{Icon, Removed}}), noIcon + ".ico"},
+         "problem  Folder.cfg: left as it is (unknown encoding)\n" + NoDisabledIcon},
+        {Moving("ItIsNotInUtf8").FolderCfg(utf16), "note     Folder.cfg: comes out as UTF-8\n" + NoTarget},
+        {Moving("NothingIsAtTheNewPath"), NoTarget},
+        {Done("EnabledShowsAsDisabled").FolderCfg(hidden),
+         "problem  Folder.cfg: lacks the attribute \"description\", so the enabled folder shows as disabled\n" + NoDisabledIcon},
+        {Done("ItIsDisabledAnyway").FolderCfg(Changed(hidden, "Enable=\"1\"", "Enable=\"0\"")), NoDisabledIcon},
+        {Done("TheTemplateIsElsewhere").FolderCfg(Written("{hot}{/}T")), IsElsewhere + "{hot}{/}T"},
+        {Done("ThereIsNoIconToReplace").Before({{Icon, Removed}}), NoIcon},
     };
 }
 
@@ -147,18 +159,16 @@ std::vector<Finding> Losses()
     Text alike;
     for (int i = 0; i < 2000; ++i)
         alike += "<r kind=\"alike\" number=\"" + std::to_string(i) + "\" empty=\"\"/>";
-    const auto changed = [](const Name& name, const Text& from, const Text& to, const Text& loss)
-    {
-        return Finding{Moving(name).FolderCfg(Changed(Written(MovedFrom), from, to)),
-                       loss.empty() ? "problem" : "problem  Folder.cfg: " + loss};
+    const auto changed = [](const Name& name, const Text& from, const Text& to, const Text& loss) {
+        return Finding{Moving(name).FolderCfg(Changed(Written(MovedFrom), from, to)), loss.empty() ? "" : "problem  Folder.cfg: " + loss};
     };
     return {
         changed("ADescription", " description=\"\"", "",
-                "lacks the attribute \"description\"" + defaults + " (the folder comes out disabled)"),
+                "lacks the attribute \"description\"" + defaults + " (the folder comes out disabled)\n" + NoDisabledIcon),
         changed("AQuickset", " Quickset=\"q\"", "", "lacks the attribute \"Quickset\"" + defaults),
-        changed("AWordForAFlag", "Enable=\"1\"", "Enable=\"true\"", "Enable=\"true\" comes out as \"0\""),
+        changed("AWordForAFlag", "Enable=\"1\"", "Enable=\"true\"", "Enable=\"true\" comes out as \"0\"\n" + NoDisabledIcon),
         changed("ANumberWithALetter", "server_version=\"-5\"", "server_version=\"5b\"", "server_version=\"5b\" comes out as \"5\""),
-        changed("NoSpaceAfterAFlag", "Centralized=\"1\"", "Centralized=\"1 \"", ""),
+        changed("ASpaceIsNoLoss", "Centralized=\"1\"", "Centralized=\"1 \"", ""),
         changed("AnUnknownAttribute", start, start + "mine=\"7\" ", "loses the attribute mine=\"7\""),
         changed("TheNameOfTheRoot", "HotFolder", "Mine", "its root <Mine> comes out as <HotFolder>"),
         changed("AnUnknownElement", end, "<Mine><a/></Mine>" + end,
@@ -171,13 +181,14 @@ std::vector<Finding> Losses()
         changed("AnInstruction", end, "<?mine?>" + end, "loses the instruction <?mine?>"),
         changed("AnEntity", start, "<!DOCTYPE HotFolder [<!ENTITY e \"text\">]>" + start,
                 "loses its document type, and with it the entities in its texts"),
-        changed("NoComment", end, "<!-- c -->" + end, ""),
-        changed("NothingOfManyEqualElements", "<a/>", alike, ""),
+        changed("ACommentIsNoLoss", end, "<!-- c -->" + end, ""),
+        changed("ManyEqualElementsAreNoLoss", "<a/>", alike, ""),
     };
 }
 
 std::vector<Finding> Icons()
 {
+    const Text noSource = "problem  source icon missing: {tool}{/}BundleIcons{/}";
     return {
         {Done("TheCopyIsRefused").Before({{Icon, "old"}, {Icon + "#", "R"}, {"hot/A/[P]#", "X"}}).AsOtherUser(),
          "problem  hf_folder.ico: the copy would be refused"},
@@ -187,8 +198,8 @@ std::vector<Finding> Icons()
              .Before({{"tool/BundleIcons#", "0"}, {"hot/B/[P]/hf_folder_disabled.ico", ""}, {"hot/C/[P]/hf_folder_disabled.ico", ""}})
              .Run({"U"})
              .AsOtherUser(),
-         "problem  source icon missing: {tool}{/}BundleIcons{/}hf_folder.ico\nproblem  source icon missing: "
-         "{tool}{/}BundleIcons{/}hf_folder_disabled.ico"},
+         noSource + "hf_folder.ico\nchange   Folder.cfg: " + MovedTo + " -> " + MovedFrom + "\nnote     no such file: " + MovedFrom + "\n" +
+             noSource + "hf_folder_disabled.ico\nnote     no Folder.cfg\nnote     no Folder.cfg"},
         {Done("TheIconIsALink").Before({{Icon, "{link:elsewhere/a}"}}).NotUnderWine(NoLinks),
          "problem  hf_folder.ico: reached over a link"},
         {Done("DesktopIniIsALink").Before({{Ini, "{link:elsewhere/a}"}, {Ini + "#", Removed}}).NotUnderWine(NoLinks),
@@ -212,32 +223,34 @@ std::vector<Finding> PresetsAndLogs()
 {
     const Text problem = "problem  .P{/}Presets{/}presets.xml: ";
     const Text change = "change   .P{/}Presets{/}presets.xml: ";
+    const Text comesOut = "comes out as UTF-8";
     const Text noLog = "problem  there will be no run log: ";
     const Text jobs = "{user}{/}ORX{/}JPData{/}";
     return {
-        {Done("ThereIsNoPreset").Before({{PresetPlace, Removed}}), "note     there are no presets in " + jobs},
+        {Done("ThereIsNoPreset").Before({{PresetPlace, Removed}}), NoPresets},
         {Moving("NothingCanBeRead").Before({{PresetPlace + "#", "0"}, {CfgPlace + "#", "0"}}).AsOtherUser(),
-         "problem  Folder.cfg: can't open file*\n" + problem + "cannot be opened for reading (can't open file*"},
+         "problem  Folder.cfg: can't open file*\n" + NoDisabledIcon + "\n" + problem + "cannot be opened for reading (can't open file*"},
         {Moving("EverythingIsReadOnly")
              .Before({{PresetPlace + "#", "R"}, {CfgPlace + "#", "R"}, {Text(LogPlace) + "#", "R"}})
              .AsOtherUser(),
          noLog + "can't open file*\nproblem  Folder.cfg: cannot be opened for writing (can't open file*\n" + problem +
              "cannot be opened for writing (can't open file*"},
-        {Done("WhatStaysNeedNotBeWritten").Before({{CfgPlace + "#", "R"}}).AsOtherUser(), "problem"},
-        {Done("APresetsDirectoryCannotBeEntered").Before({{Jobs + "/.P#", "0"}}).AsOtherUser(), problem + jobs + ".P cannot be entered"},
-        {Done("JPDataCannotBeListed").Before({{Jobs + "#", "0"}}).AsOtherUser(), "problem  " + jobs + " cannot be entered"},
+        {Done("WhatStaysMayBeReadOnly").Before({{CfgPlace + "#", "R"}}).AsOtherUser(), ""},
+        {Done("AJobPresetDirCannotBeEntered").Before({{Jobs + "/.P#", "0"}}).AsOtherUser(), problem + jobs + ".P cannot be entered"},
+        {Done("JPDataCannotBeEntered").Before({{Jobs + "#", "0"}}).AsOtherUser(), "problem  " + jobs + " cannot be entered"},
         {Done("APresetIsADirectory").Before({{PresetPlace, Removed}, {PresetPlace + "/", ""}}),
          problem + "reached over a link, or not a file"},
         {Done("PresetsIsALink").Before({{PresetPlace, Removed}, {Jobs + "/.P/Presets/", "{link:elsewhere/d}"}, {"elsewhere/d/", ""}}),
          problem + "reached over a link, or not a file"},
         {Done("APresetIsNotText").Preset(Text("\xFF\xFE\0", 3)), problem + "left as it is (cannot be decoded)"},
-        {Done("AByteIsWrong").Preset("<p>\xC3\xA4 \xE4</p>"), problem + "is not UTF-8, so the whole file is read as Latin-1"},
+        {Done("AByteIsWrong").Preset("<p>\xC3\xA4 \xE4</p>"),
+         problem + "is not UTF-8, so the whole file is read as Latin-1\n" + change + comesOut},
         {Done("APresetDeclaresLatin1").Preset("<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?><p>\xE4</p>"),
-         problem + "declares the encoding ISO-8859-1, but comes out as UTF-8"},
+         problem + "declares the encoding ISO-8859-1, but comes out as UTF-8\n" + change + comesOut},
         {Done("TwoPathsMove").Preset(Stored(MovedFrom) + Stored(MovedFrom)), change + "2 paths"},
-        {Done("AMarkGoes").Preset("\xEF\xBB\xBF<p/>"), change + "loses its byte-order mark"},
+        {Done("AByteOrderMarkIsLost").Preset("\xEF\xBB\xBF<p/>"), change + "loses its byte-order mark"},
         {Done("TheEncodingChanges").Preset("{utf16}<p>ä</p>"), change + "comes out as UTF-8, without byte-order mark"},
-        {Done("LineEndsChange").Preset("<p>\n</p>"), IsWindowsProgram() ? change + "its line ends become CR LF" : "change"},
+        {Done("LineEndsChange").Preset("<p>\n</p>"), IsWindowsProgram() ? change + "its line ends become CR LF" : ""},
         {Done("TheLogIsALink").Before({{LogPlace, "{link:elsewhere/a}"}}).NotUnderWine(NoLinks),
          noLog + "it is reached over a link: {user}{/}ORX_Installers{/}UpgradeDowngrade.log"},
         {Done("TheLogFolderCannotBeEntered").Before({{LogFolder + "#", "0"}}).AsOtherUser(),
@@ -252,16 +265,17 @@ std::vector<Finding> PresetsAndLogs()
     };
 }
 
-std::vector<Text> LinesOf(const CheckReport& report, const Text& kind)
+// The lines of a report about its workstation, without the titles and the system's own words.
+Text LinesOf(const CheckReport& report)
 {
-    std::vector<Text> lines;
+    Text lines;
     std::istringstream text(report.text);
     for (Text line; std::getline(text, line);)
     {
-        if (StartsWith(line, "  " + kind))
-            lines.push_back(line.substr(2, line.find_last_not_of('\r') - 1));
+        if (StartsWith(line, "  "))
+            lines += line.substr(2, line.find_last_not_of('\r') - 1) + "\n";
     }
-    return lines;
+    return std::regex_replace(lines, std::regex("can't open file[^\n]*"), "can't open file*");
 }
 
 class Findings : public testing::TestWithParam<Finding>
@@ -280,17 +294,13 @@ TEST_P(Findings, AreReported)
     workstation.LayOut(WorkstationBefore(scenario));
     const CheckReport report(workstation, workstation.Start(scenario.arguments, "FolderUpgradeCheck"));
 
-    const Text kind = lines.substr(0, lines.find(' '));
-    std::vector<Text> actual = LinesOf(report, kind);
-    std::istringstream expected(lines == kind ? "" : workstation.Expand(lines));
-    size_t count = 0;
-    for (Text line; std::getline(expected, line); ++count)
+    Text actual = LinesOf(report);
+    for (const Text& usual : {TemplateMoves, NoTarget})
     {
-        if (line.back() == '*' && count < actual.size())
-            actual[count].replace(std::min(line.size() - 1, actual[count].size()), Text::npos, "*");
-        EXPECT_EQ(line, count < actual.size() ? actual[count] : "") << report.text;
+        if (lines.find(usual) == Text::npos)
+            ReplaceAll(actual, workstation.Expand(usual + "\n"), "");
     }
-    EXPECT_EQ(count, actual.size()) << report.text;
+    EXPECT_EQ(workstation.Expand(lines.empty() ? "" : lines + "\n"), actual);
 }
 
 TEST(Check, ReportsInBlocks)

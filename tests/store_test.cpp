@@ -1,7 +1,9 @@
-// What no run can show: the readers' results and defaults, the lookups, and rarer forms of the writer's output.
+// What no run can show: the results and defaults of readers, lookups, rarer forms of the output, and what counts as text.
+#include "platform/unicode_text.h"
 #include "store/folder_cfg_reader.h"
 #include "store/folder_cfg_writer.h"
 #include "store/xml_lookup.h"
+#include "store/xml_text.h"
 #include "store/xml_tree.h"
 
 #include <gtest/gtest.h>
@@ -83,7 +85,7 @@ TEST_F(Store, TheChainOfAttributesEndsAtTheFirstGap)
     }
 }
 
-TEST_F(Store, ValuesHaveTheirForms)
+TEST_F(Store, FlagsAndNumbersAreRead)
 {
     const std::set<std::string> numericFlags = {"1", "1 \t", " 1", "01", "-1", "12x"};
     const std::set<std::string> textFlags = {"1", "1 \t"};
@@ -107,7 +109,7 @@ TEST_F(Store, ValuesHaveTheirForms)
     }
 }
 
-TEST_F(Store, WhatCannotBeLoadedLeavesTheValues)
+TEST_F(Store, AFailedLoadLeavesTheValues)
 {
     const wxLogNull quiet;
     HotFolderSettings settings;
@@ -123,7 +125,7 @@ TEST_F(Store, WhatCannotBeLoadedLeavesTheValues)
     EXPECT_TRUE(settings.InputFormatsSummary.empty());
 }
 
-TEST_F(Store, SectionsThatAreMissingLeaveTheirValues)
+TEST_F(Store, MissingSectionsLeaveTheirValues)
 {
     HotFolderPaths paths;
     paths.Workfolder = "kept";
@@ -192,6 +194,30 @@ TEST_F(Store, DefaultsAreWrittenAndAFilterOfAnotherNameIsNot)
                                 "    <Movefolder path=\"\"/>\n    <Hotfolder path=\"\"/>\n  </Paths>\n"
                                 "  <JobSetting/>\n  <ImposeSetting/>\n  <PreflightSettings/>\n</HotFolder>\n"));
     EXPECT_TRUE(Text().Contains("server_version=\"-1\""));
+}
+
+TEST(UnicodeText, ALoneSurrogateIsNotText)
+{
+    using Units = std::vector<unsigned>;
+    const auto text = [](const Units& units)
+    {
+        std::vector<unsigned char> bytes;
+        for (const unsigned unit : units)
+            bytes.insert(bytes.end(), {static_cast<unsigned char>(unit), static_cast<unsigned char>(unit >> 8)});
+        bytes.push_back('x'); // half a unit
+        return FromUtf16Bytes(bytes.data(), bytes.size());
+    };
+    EXPECT_EQ(wxString::FromUTF8("a\U0001D11Eb\U0010FFFF\U00010000"),
+              text({'a', 0xD834, 0xDD1E, 'b', 0xDBFF, 0xDFFF, 0xD800, 0xDC00, 0, 'c'}));
+    for (const Units& units :
+         {Units{0xD834, 0xDD1E}, {0xDBFF, 0xDFFF}, {0xD800, 0xDC00}, {0xD7FF, 0xE000, 0xFFFD}, {0x20, '\t', '\r', '\n'}})
+        EXPECT_TRUE(IsXmlText(text(units))) << std::hex << units[0];
+    for (const Units& units : {Units{0xD834}, {0xD834, 'a'}, {0xDD1E}, {0xDC00, 0xD800}, {0xD800, 0xD800}, {0xDFFF, 'a'}, {0xD834, 0xE000}})
+        EXPECT_FALSE(IsUnicodeText(text(units)) || IsXmlText(text(units))) << std::hex << units[0];
+    for (const unsigned unit : {0x1FU, 1U, 8U, 0xBU, 0xFFFEU, 0xFFFFU})
+        EXPECT_TRUE(IsUnicodeText(text({unit})) && !IsXmlText(text({unit}))) << std::hex << unit;
+    EXPECT_EQ(wxString::FromUTF8("\t \uFFFD~\uFFFD\uFFFD\u00A0\u2027\uFFFD\uFFFD\u202A\uFFFD"),
+              ToOneLine(text({'\t', ' ', 0x1F, '~', 0x7F, 0x9F, 0xA0, 0x2027, 0x2028, 0x2029, 0x202A, 0xD834})));
 }
 
 } // namespace
