@@ -18,10 +18,7 @@ std::wstring TakeLine(std::wstring& text)
     return line;
 }
 
-std::wstring WithoutFinalSeparators(std::wstring folder)
-{
-    return folder.erase(folder.find_last_not_of(L'/') + 1);
-}
+std::wstring WithoutFinalSeparators(std::wstring folder) { return folder.erase(folder.find_last_not_of(L'/') + 1); }
 
 // The text with every path in the folder moved, computed one character at a time.
 std::wstring Moved(const std::wstring& text, const std::wstring& from, const std::wstring& to)

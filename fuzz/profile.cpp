@@ -42,10 +42,7 @@ void Try(const std::string& input)
     for (const LPCWSTR key : {L"IconFile", L"IconIndex", L"InfoTip"})
     {
         WriteBytes(path, input);
-        const auto write = [&]()
-        {
-            return WritePrivateProfileStringW(Section, key, Value, widePath.c_str()) != 0;
-        };
+        const auto write = [&]() { return WritePrivateProfileStringW(Section, key, Value, widePath.c_str()) != 0; };
         Check(write(), "a file that can be written is");
         const std::string after = ReadBytes(path);
         CheckOneLineChanged(input, after);

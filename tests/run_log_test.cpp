@@ -3,9 +3,12 @@
 #include "tests/text_files.h"
 
 #include <gtest/gtest.h>
+#include <wx/log.h>
 
+#include <csignal>
 #include <cstdlib>
 #include <filesystem>
+#include <sys/resource.h>
 
 TEST(RunLogFile, EveryEntryIsOneLineAtTheEndOfTheFile)
 {
@@ -29,5 +32,19 @@ TEST(RunLogFile, EveryEntryIsOneLineAtTheEndOfTheFile)
     WriteFile(log, "another's\r\n");
     RunLog("added", 1);
     EXPECT_EQ("another's\r\nadded count:  1\r\n", ReadFile(log));
+
+    std::signal(SIGXFSZ, SIG_IGN);
+    rlimit unlimited = {};
+    getrlimit(RLIMIT_FSIZE, &unlimited);
+    const rlimit full = {40, unlimited.rlim_max};
+    wxLogBuffer errors;
+    wxLog* const target = wxLog::SetActiveTarget(&errors);
+    setrlimit(RLIMIT_FSIZE, &full);
+    RunLog("not added, because the file is as long as it may be");
+    RunLog("not added either, and not reported again");
+    setrlimit(RLIMIT_FSIZE, &unlimited);
+    EXPECT_EQ("another's\r\nadded count:  1\r\n", ReadFile(log));
+    EXPECT_EQ(1, errors.GetBuffer().Freq('\n')) << errors.GetBuffer();
+    wxLog::SetActiveTarget(target);
     fs::remove_all(folder);
 }

@@ -1,6 +1,8 @@
 #include "tests/text_files.h"
 
+#include <codecvt>
 #include <fstream>
+#include <locale>
 #include <sstream>
 #include <stdexcept>
 
@@ -32,15 +34,7 @@ bool StartsWith(const std::string& text, const std::string& start) { return text
 std::string ToUtf16(const std::string& text)
 {
     std::string result = "\xFF\xFE";
-    for (size_t i = 0; i < text.size();)
-    {
-        const auto lead = static_cast<unsigned char>(text[i]);
-        const size_t length = lead < 0x80 ? 1 : lead < 0xE0 ? 2 : 3;
-        unsigned code = length == 1 ? lead : lead & (length == 2 ? 0x1FU : 0x0FU);
-        for (size_t k = 1; k < length; ++k)
-            code = code << 6 | (static_cast<unsigned char>(text[i + k]) & 0x3FU);
-        result += {static_cast<char>(code & 0xFF), static_cast<char>(code >> 8)};
-        i += length;
-    }
+    for (const char16_t unit : std::wstring_convert<std::codecvt_utf8_utf16<char16_t>, char16_t>().from_bytes(text))
+        result += {static_cast<char>(unit & 0xFF), static_cast<char>(unit >> 8)};
     return result;
 }

@@ -27,7 +27,9 @@ std::vector<Scenario> Icons()
                 {{"hot/A#", "S"}, {Ini + "#", "RS"}, {Icon(icon), copied}, {Ini, Header + IconFile(icon) + "IconIndex=00\r\n" + InfoTip}})
             .Log(FolderLines("A", 1, Copied(icon), ""));
     };
-    const auto upgradeShows = [&](const Name& name, const Text& icon) { return shows(name, icon, "{icon:" + icon + ".ico}"); };
+    const auto upgradeShows = [&](const Name& name, const Text& icon) {
+        return shows(name, icon, "{icon:" + icon + ".ico}").Before({{"tool/" + icon + ".ico#", "R"}}).After({{Icon(icon) + "#", "R"}});
+    };
     const auto downgradeShows = [&](const Name& name, const Text& icon) { return shows(name, icon, "bundled").Run({"U"}); };
     const Files error = {{"hot/A/[P]/Error.er", ""}};
     const Files noError = {{"hot/A/[P]/Error.er/", ""}}; // a directory of that name
