@@ -20,10 +20,7 @@ export TMPDIR
 trap 'rm -rf "$TMPDIR"' EXIT
 
 mkdir -p "$findings" "$TMPDIR"/{found,samples}
-number=0
-while IFS= read -r -d '' sample; do
-    cp "$sample" "$TMPDIR/samples/$((number += 1))"
-done < <(find samples/workstation -name "${3-}" -print0)
+find samples/workstation -name "${3-}" -exec cp --backup=numbered -t "$TMPDIR/samples" {} +
 inputs=(fuzz/corpus/"$target" "$TMPDIR/samples")
 limits=(-runs=0)
 if [ "$1" = fuzz ]; then

@@ -51,6 +51,15 @@ std::string ReachedOverLinks(std::string place, const Files& files)
     return place;
 }
 
+// The relevant part of the text at a place. Wine does not show that a directory is read-only.
+std::string Meaning(const std::string& place, const std::string& text)
+{
+    const bool isHotFolder = place.back() == '#' && std::count(place.begin(), place.end(), '/') == 1;
+    if (IsWindowsProgram() && isHotFolder && StartsWith(text, "R"))
+        return text.substr(1);
+    return place.find("Desktop.ini") != std::string::npos && place.back() != '#' ? ProfileMeaning(text) : text;
+}
+
 } // namespace
 
 CheckReport::CheckReport(const Workstation& workstation, const RunResult& run) : text(run.output)
@@ -75,20 +84,6 @@ CheckReport::CheckReport(const Workstation& workstation, const RunResult& run) :
     EXPECT_EQ(problems > 0 ? 2 : changes.empty() ? 0 : 1, run.process.exitStatus) << text << run.libraryLog;
     EXPECT_EQ("", run.libraryLog);
 }
-
-namespace
-{
-
-// The relevant part of the text at a place. Wine does not show that a directory is read-only.
-std::string Meaning(const std::string& place, const std::string& text)
-{
-    const bool isHotFolder = place.back() == '#' && std::count(place.begin(), place.end(), '/') == 1;
-    if (IsWindowsProgram() && isHotFolder && StartsWith(text, "R"))
-        return text.substr(1);
-    return place.find("Desktop.ini") != std::string::npos && place.back() != '#' ? ProfileMeaning(text) : text;
-}
-
-} // namespace
 
 std::set<std::string> ChangedPlaces(const Files& before, const Files& after)
 {

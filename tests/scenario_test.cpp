@@ -108,23 +108,11 @@ void Compare(const Files& expected, const Files& actual, const std::string& when
     }
 }
 
-Files FolderCfgsOf(Files files)
-{
-    for (auto file = files.begin(); file != files.end();)
-        file = file->first.find("Folder.cfg") == std::string::npos ? files.erase(file) : std::next(file);
-    return files;
-}
-
-constexpr bool HasSanitizer()
-{
-#if defined(__SANITIZE_ADDRESS__)
-    return true;
-#elif defined(__has_feature)
-    return __has_feature(address_sanitizer);
+#ifdef __SANITIZE_ADDRESS__
+constexpr bool HasSanitizer = true;
 #else
-    return false;
+constexpr bool HasSanitizer = false;
 #endif
-}
 
 // What the check reports for a run in that direction. Fails if the check changes anything.
 CheckReport Check(Workstation& workstation, const Scenario& scenario)
@@ -166,7 +154,7 @@ void RunAndCompare(const Scenario& scenario)
     const RunResult run = workstation.Start(scenario.arguments);
     EXPECT_EQ(255, run.process.exitStatus) << run.libraryLog;
     EXPECT_EQ(scenario.libraryReports, !run.libraryLog.empty()) << run.libraryLog;
-    if (scenario.seconds > 0 && !HasSanitizer())
+    if (scenario.seconds > 0 && !HasSanitizer)
     {
         EXPECT_LE(run.process.seconds, scenario.seconds);
         EXPECT_TRUE(IsWindowsProgram() || run.process.megabytes <= scenario.megabytes) << run.process.megabytes << " megabytes";
@@ -186,7 +174,9 @@ void RunAndCompare(const Scenario& scenario)
     if (IsWindowsProgram())
         return;
     EXPECT_EQ(255, workstation.Start(scenario.arguments).process.exitStatus);
-    Compare(FolderCfgsOf(after), FolderCfgsOf(workstation.Snapshot()), "after a second run");
+    const Files again = workstation.Snapshot();
+    for (const auto& [place, text] : after)
+        EXPECT_TRUE(place.find("Folder.cfg") == std::string::npos || again.at(place) == text) << place << " after a second run";
 }
 
 } // namespace

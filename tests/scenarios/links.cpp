@@ -97,10 +97,7 @@ std::vector<Scenario> PlantedPipes()
     return {
         pipe("APipeIsNotAFolderCfg", CfgPlace).LogOfDisabledA(NoCfg()),
         pipe("APipeIsNotAnIcon", Icon).LogOfDisabledA(NoCfg()),
-        pipe("APipeIsNotADesktopIni", Ini)
-            .Before({{Icon, "old"}})
-            .After({{Icon, "{icon:hf_folder_disabled.ico}"}, {"hot/A#", "S"}})
-            .Log(FolderLines("A", 1, Copied("hf_folder_disabled"), NoCfg())),
+        WithIcon("APipeIsNotADesktopIni").Before({{Ini, "{fifo}"}}).NotUnderWine(NoPipes).Within(10, 512),
         pipe("APipeIsNotAPreset", PresetPlace).LogOfPreset(CannotOpenPreset),
         pipe("APipeIsNotAList", ListPlace).Before({{"hot/A/", ""}}).Log(""),
         pipe("APipeIsNotALog", LogPlace).FolderCfg(cfg, Written(MovedTo)),

@@ -4,19 +4,6 @@
 namespace
 {
 
-Text Bytes(const Text& name, const Text& type, const Text& bytes)
-{
-    static const char* const digits = "0123456789abcdef";
-    Text value = "\"" + name + "\"=hex" + type + ":";
-    for (const char byte : bytes)
-    {
-        const auto number = static_cast<unsigned char>(byte);
-        value += Text(1, digits[number / 16]) + digits[number % 16] + ",";
-    }
-    value.pop_back();
-    return value;
-}
-
 // A hot folder and a preset whose paths would move, and this value in the key.
 Scenario Both(const Name& name, const Text& letter, const Files& hives)
 {
@@ -51,9 +38,9 @@ std::vector<Scenario> Registry()
         WithPrevious("ATextOf258CharactersIsTooLong", "\"Path\"=\"" + Text(258, 'x') + "\"").LogOfA(found + NoPrevious, NoPrevious),
         WithPrevious("ATextOf257CharactersIsRead", "\"Path\"=\"" + Text(257, 'x') + "\"").LogOfA(found, updated),
         WithInstalled("ANumberAsTheNewFolderMovesNothing", "\"InstallPath\"=dword:00000001").LogOfA(unstorable, updated),
-        WithInstalled("ALoneSurrogateInTheNewFolderMovesNothing", Bytes("InstallPath", "", Text("C\0\0\xD8:\0\0\0", 8)))
+        WithInstalled("ALoneSurrogateInTheNewFolderMovesNothing", "\"InstallPath\"=hex:43,00,00,d8,3a,00,00,00")
             .LogOfA(unstorable, updated),
-        WithPrevious("AnUnterminatedOddValueIsReadToItsLastWholeUnit", Bytes("Path", "(2)", Text("x\0y\0z", 5))).LogOfA(found, updated),
+        WithPrevious("AnUnterminatedOddValueIsReadToItsLastWholeUnit", "\"Path\"=hex(2):78,00,79,00,7a").LogOfA(found, updated),
         WithPrevious("AFinalSeparatorMovesPresetsOnly", "\"Path\"=\"{PREVIOUS}{/2}\"")
             .After({{PresetPlace, Stored(MovedTo)}})
             .LogOfA(found, updated),
