@@ -29,8 +29,8 @@ void CheckOneLineChanged(const std::string& before, const std::string& after)
     size_t rest = 0;
     while (rest < shorter - same && before[before.size() - 1 - rest] == after[after.size() - 1 - rest])
         ++rest;
-    Check(CountLineFeeds(before, same, before.size() - rest) == 0, "what goes is of one line");
-    Check(CountLineFeeds(after, same, after.size() - rest) <= 3, "what comes is a line's end, a section and a key");
+    Check(CountLineFeeds(before, same, before.size() - rest) == 0, "only one line loses text");
+    Check(CountLineFeeds(after, same, after.size() - rest) <= 3, "at most a line end, a section and a key are added");
 }
 
 } // namespace
@@ -46,7 +46,7 @@ void Try(const std::string& input)
         {
             return WritePrivateProfileStringW(Section, key, Value, widePath.c_str()) != 0;
         };
-        Check(write(), "a file that can be written is");
+        Check(write(), "a writable file is written");
         const std::string after = ReadBytes(path);
         CheckOneLineChanged(input, after);
 
