@@ -146,7 +146,7 @@ echo "== FolderUpgrade $switch${verbosity[0]+ ${verbosity[0]}}"
 status=0
 on_workstation "$programs/FolderUpgrade" "$switch" ${verbosity[@]+"${verbosity[@]}"} || status=$?
 if [ $status != $finished ]; then
-    echo "Exit status $status, not $finished: it did not finish." >&2
+    echo "Exit status $status, not $finished: the run did not finish." >&2
     exit 1
 fi
 echo "Exit status $status (that is -1), as on every run"

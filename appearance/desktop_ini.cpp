@@ -78,8 +78,8 @@ bool RefreshDesktopIni(const PinnedDirectory& directory, const wxString& hotFold
     RegularFile ini; // as above; the profile functions cannot write what cannot be read
     if (ini.OpenForReading(path, Links::Refuse) != RegularFile::Status::Open)
         return true;
-    // Both bits are removed even if only one is set. If one stayed, the writes that follow would
-    // fail, and the icon that the user chose would be overwritten with a default.
+    // Both bits are removed even if only one is set. If read-only stayed, the writes would fail,
+    // and the shell would be given an old icon or the default.
     ChangeAttributes(path, 0, ReadOnlyAndSystem);
     WriteKeys(path, DesktopIniKeys(true, iconName));
 

@@ -8,7 +8,7 @@
 /// Copies the icon for the folder's state over the icon of the same name in its private directory,
 /// and refreshes Desktop.ini, attributes and Explorer. An upgrade takes the icon from the
 /// executable's directory, a downgrade from the bundle icons directory in it. If either icon is
-/// missing, nothing changes. Reports to the run log only; a failed copy is not reported.
+/// missing, nothing changes. Reports to the run log; the library reports a failed copy.
 void UpdateFolderIcon(const FolderUpgradeApp& app, const wxString& hotFolder);
 
 /// Writes or refreshes the folder's Desktop.ini, makes the folder a system folder that is not

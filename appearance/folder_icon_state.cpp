@@ -22,9 +22,8 @@ bool IsEnabled(const PinnedHotFolder& folder, const wxString& hotFolder)
     return settings.Enable;
 }
 
-// The library reports an error for a directory that it cannot open, so that is checked first.
-// Before that it is checked whether the file exists at all, which is quicker than listing the
-// directory.
+// The library reports an error for a directory that it cannot open, so that is checked before
+// listing. The check for the file comes first because it is quicker.
 bool HasError(const PinnedHotFolder& folder)
 {
     const wxString path = folder.privateDir.Reach(L"");

@@ -16,7 +16,7 @@ enum class FolderIconState
 /// Gives the file name, without a directory, of the icon for the folder's current state, which
 /// depends on whether its Folder.cfg enables it and whether its private directory holds a file
 /// "Error.er". A folder whose Folder.cfg cannot be read is not enabled; one whose private directory
-/// is missing or cannot be listed is not in error. Changes and logs nothing; returns true.
+/// is missing or cannot be listed is not in error. Changes nothing; returns true.
 bool GetFolderIconName(const wxString& hotFolder, wxString& iconName);
 
 /// The same for a pinned hot folder; its path is for messages.

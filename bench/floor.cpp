@@ -1,4 +1,4 @@
-// The floor: the work that no run can avoid, done with the library's calls and nothing else.
+// The floor: a run's essential work, done with the library's calls and nothing else.
 //
 //     floor FOLDERS ICON        loads each Folder.cfg three times, saves it to memory once, writes
 //                               it once and waits for the disk, and copies the icon over the

@@ -60,8 +60,8 @@ void SaveCfg(benchmark::State& state)
 }
 BENCHMARK(SaveCfg)->Arg(30)->Arg(10000)->Unit(benchmark::kMicrosecond);
 
-// A template path every this many lines, or none. Moves forth and back, so that each call finds the
-// same number.
+// A template path every N lines, or none. Moves back and forth, so that each call finds the same
+// number.
 void MovePaths(benchmark::State& state)
 {
     const wxString path =

@@ -1,4 +1,4 @@
-"""The picture of the whole runs: seconds over hot folders, both axes logarithmic."""
+"""The chart of the whole runs: seconds against hot folders, both axes logarithmic."""
 import math
 
 WIDTH, HEIGHT = 760, 440

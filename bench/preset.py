@@ -10,7 +10,7 @@ KEY = 'ORXImposeTemplate">"'
 PATH = f'    <Setting Key="{KEY}/old/Booklet"</Setting>\r\n'.encode()
 LINE = b'    <Setting Key="ORXMediaType">"Plain"</Setting>\r\n'
 TEXTS = {'no hits': LINE, '8 hits': PATH + LINE * (BYTES // 8 // len(LINE)),
-         'a hit each KiB': PATH + LINE * (1024 // len(LINE))}
+         'a hit every KiB': PATH + LINE * (1024 // len(LINE))}
 PRESET = 'user/ORX/JPData/P/Presets/presets.xml'
 HIVE = 'Windows Registry Editor Version 5.00\n\n[HKEY_{}]\n"{}"="{}"\n'
 

@@ -6,7 +6,7 @@
 #     bench/run.sh windows [COUNT...]    whole runs of the Windows program under Wine, over 10, 100 and 1,000
 #
 # On Debian 12 it first installs what it needs. The tables are kept in build/bench/results.md and windows.md, the
-# picture in build/bench/results.svg. The machine should have nothing else to do, and /dev/shm needs 1 GB of free space.
+# chart in build/bench/results.svg. The machine should have nothing else to do, and /dev/shm needs 1 GB of free space.
 set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")/.."
 

@@ -8,9 +8,9 @@
 
 #include <string>
 
-/// One sentence for each part of the document that is lost or changed in its rewrite (these bytes,
-/// with the same template path). Comments, white space and order are ignored. The document has to
-/// be loaded with wxXMLDOC_KEEP_WHITESPACE_NODES.
+/// One phrase for each part of the document that the rewritten bytes lose or change. Both have the
+/// same template path. Comments, white space and order are ignored. The document has to be loaded
+/// with wxXMLDOC_KEEP_WHITESPACE_NODES.
 wxArrayString FindFolderCfgLosses(const wxXmlDocument& document, const std::string& rewritten);
 
 /// The missing attribute that ends the chain of root attributes before Enable, although Enable is

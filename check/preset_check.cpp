@@ -100,7 +100,7 @@ wxString WhyMissing(const JobPresetFile& preset, const wxString& directory)
     return {};
 }
 
-// False when there is none.
+// False if there is no preset.
 bool CheckDirectory(const wxString& directory, const wxString& root, const TemplateFolders& folders,
                     Report& report)
 {

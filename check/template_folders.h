@@ -17,10 +17,10 @@ class TemplateFolders
     const wxString& To() const;
     bool AreKnown() const;
 
-    /// Reports what is wrong with the previous version's folder, whatever it is used for.
+    /// Reports what is wrong with the previous version's folder, whether or not a template moves.
     void ReportPath(Report& report) const;
-    /// For a hot folder with a template, or for a preset: reports an unknown folder once. A folder
-    /// that is looked up only when a template is about to move may not be needed at all.
+    /// For a hot folder with a template, or for a preset: reports an unknown folder once. The
+    /// folder moved to is needed only when a template moves.
     void ReportFrom(Report& report) const;
     void ReportTo(Report& report) const;
     /// Does both, and reports what matters only in the text of presets.

@@ -18,7 +18,7 @@ endif()
 #     osslsigncode sign -key key.pem -certs certificate.pem -h sha256 -in "$1" -out "$1.signed"
 #     mv "$1.signed" "$1"
 #
-# and this makes a certificate for trials:
+# and this makes a test certificate:
 #
 #     openssl req -x509 -newkey rsa:2048 -nodes -days 30 -subj /CN=Trial -addext extendedKeyUsage=codeSigning \
 #         -keyout key.pem -out certificate.pem

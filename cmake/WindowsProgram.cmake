@@ -18,9 +18,9 @@ function(add_windows_resources target description)
     endif()
 endfunction()
 
-# The stack is for the XML library, which destroys a document by recursion: with 64 MiB, elements nested 600,000 deep do
-# no harm (1,000,000 do); with 2 MiB, 60,000 crash the run. Only the used part takes memory. The module platform does
-# what has to be done before main().
+# The stack is for the XML library, which destroys a document by recursion: 64 MiB is enough for all that xml_limits.cpp
+# admits; with 2 MiB, 60,000 levels crash the run. Only the used part takes memory. The module platform does what has to
+# be done before main().
 function(harden_windows_program target)
     if(MSVC)
         target_link_options(${target} PRIVATE

@@ -2,7 +2,7 @@
 # core library with the GUI application class. Elsewhere wxUSE_GUI=0 makes wxApp the console application class, which
 # needs no display.
 function(add_wx_target name)
-    find_package(wxWidgets 3.1 REQUIRED COMPONENTS ${ARGN})
+    find_package(wxWidgets 3.2 REQUIRED COMPONENTS ${ARGN})
     add_library(${name} INTERFACE)
     # As system headers, because they do not compile without warnings.
     target_include_directories(${name} SYSTEM INTERFACE ${wxWidgets_INCLUDE_DIRS})

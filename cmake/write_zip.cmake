@@ -1,5 +1,5 @@
 # Packs the staged files so that one commit gives identical zip files, whenever, wherever and by whom it is packed.
-# CPack's own zip files depend on the order of the files on the disk and on the user's number.
+# CPack's own zip files depend on the order of the files on the disk and on the user's ID.
 execute_process(
     COMMAND git -C ${CMAKE_CURRENT_LIST_DIR} log -1 --format=%ct
     OUTPUT_VARIABLE date OUTPUT_STRIP_TRAILING_WHITESPACE ERROR_QUIET RESULT_VARIABLE failed)

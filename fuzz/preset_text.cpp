@@ -60,7 +60,7 @@ void Try(const std::string& input)
     wxString preset = text;
     MovePresetPaths(preset, from, to);
     const std::wstring upgraded = canMove ? Moved(text, left, entered) : text;
-    Check(preset == upgraded, "just the paths in the folder move");
+    Check(preset == upgraded, "only the paths in the folder move");
     if (!canMove || !IsPlain(left) || !IsPlain(entered) || LiesIn(left, entered) || LiesIn(entered, left))
         return;
     Check(MovePresetPaths(preset, from, to) == 0 && preset == upgraded, "a second upgrade changes nothing");

@@ -4,7 +4,7 @@
 #     fuzz/run.sh corpus|fuzz PROGRAM [SAMPLES]
 #
 #     corpus   over its corpus, and over those files of the sample workstation whose name is SAMPLES
-#     fuzz     over inputs derived from them, for FUZZ_SECONDS (20)
+#     fuzz     over inputs derived from them, for FUZZ_SECONDS (default 20)
 #
 # An input that breaks a promise is kept in findings/ beside the program; once fixed, it goes into the target's corpus
 # and stays a test.

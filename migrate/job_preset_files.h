@@ -29,7 +29,7 @@ class JobPresetFile
     /// Presets is a link: its target is not accessed.
     bool IsThere() const;
 
-    /// Also refused for anything but a regular file. The library reports an error if a regular file
+    /// NotThere for anything but a regular file. The library reports an error if a regular file
     /// does not open.
     RegularFile::Status OpenForReading();
 

@@ -10,8 +10,8 @@
 namespace
 {
 
-// The file is read once, through the handle that it is then written with; that one is opened first,
-// but what is wrong with the content is logged before what is wrong with the handle.
+// Opened for update before it is read, so that one handle serves both; but an error in the content
+// is logged instead of one in opening.
 void UpdatePreset(JobPresetFile& preset, const wxString& from, const wxString& to)
 {
     const wxString& path = preset.GetPath();

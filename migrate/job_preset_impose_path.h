@@ -7,7 +7,7 @@
 
 /// Moves every template path that lies in the template folder of the version being left, at any
 /// depth, to that of the version being installed, in the text of every job preset file. Reports to
-/// the run log only.
+/// the run log.
 ///
 /// A path is the text directly after the search text ORXImposeTemplate">". It moves if it begins
 /// with the folder's text, followed by a path separator or the closing double quote. A preset file

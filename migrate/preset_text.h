@@ -8,8 +8,8 @@
 /// Replaces the first folder with the second in every template path of the text that lies in it:
 /// where the search text ORXImposeTemplate">" is directly followed by the folder's text, and that
 /// by a path separator or the closing double quote. Separators at the end of either folder are
-/// ignored. Replaces nothing if the folder is empty, or if XML cannot hold the text of the new one.
-/// Returns the number of replacements. Takes time proportional to the length of the text.
+/// ignored. Replaces nothing if either folder is empty, or if XML cannot hold the text of the new
+/// one. Returns the number of replacements. Takes time proportional to the length of the text.
 size_t MovePresetPaths(wxString& text, wxString from, wxString to);
 
 /// A preset file's new content, or why the file has to stay as it is.

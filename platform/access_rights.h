@@ -3,8 +3,7 @@
 
 #include <wx/string.h>
 
-/// Whether SetFileAttributesW would be permitted. Changes nothing; of a link, checks the link
-/// itself.
+/// Whether SetFileAttributesW would be permitted. Changes nothing and does not follow a link.
 bool MayChangeAttributes(const wxString& path);
 
 /// Whether a file can be created in the directory.

@@ -1,4 +1,4 @@
-// A directory that cannot be exchanged while it is in use; one source for each system.
+// A directory that cannot be replaced while it is in use; one source for each system.
 #pragma once
 
 #include <wx/string.h>
@@ -7,17 +7,18 @@
 #include <utility>
 
 /// Whether the last part of a path may be a link: a symbolic link, on Windows any reparse point
-/// whose tag says that it names another file or directory. A cloud file's placeholder is no link.
+/// whose tag says that it names another file or directory. A cloud file's placeholder is not a
+/// link.
 enum class Links
 {
     Follow,
     Refuse
 };
 
-/// Whether the name is that of a link. Checks the name itself, not a link's target.
+/// Whether the path itself, not its target, is a link.
 bool IsLink(const wxString& path);
 
-/// Prevents a directory from being exchanged for another one, or for a link, between two accesses.
+/// Prevents a directory from being replaced with another one, or with a link, between two accesses.
 ///
 /// Windows: a handle without FILE_SHARE_DELETE, so that neither the directory nor one above it can
 /// be renamed or removed. Elsewhere: a descriptor; entries are reached through /proc/self/fd.
@@ -29,7 +30,7 @@ class PinnedDirectory
     PinnedDirectory(const PinnedDirectory&) = delete;
     PinnedDirectory& operator=(const PinnedDirectory&) = delete;
 
-    /// Returns false if there is no such directory, if it cannot be entered, or if it is a refused
+    /// Returns false if there is no such directory, if it cannot be opened, or if it is a refused
     /// link.
     bool IsOpen() const;
 

@@ -10,7 +10,7 @@ bool IsElevated();
 
 /// The account that the process runs as: the domain or the computer, a backslash, the user, for
 /// example "DESK7\anna" or "NT AUTHORITY\SYSTEM". Elsewhere: the host and the effective user, or
-/// the user's number if it has no name. Empty if the system does not say.
+/// the user ID if there is no name. Empty if the system does not say.
 wxString AccountName();
 
 /// Whether the process refuses to follow links made by processes without administrator's rights: an

@@ -59,8 +59,8 @@ class RegularFile
 
     /// In bytes; -1 if it cannot be determined.
     std::int64_t Length() const;
-    /// Reads the whole current content; returns false if it is longer than that, or cannot be read
-    /// to its end.
+    /// Reads the whole current content; returns false if it is longer than `most`, or cannot be
+    /// read to its end.
     bool Read(std::string& bytes, std::int64_t most = LongestFile) const;
 
     /// Replaces the whole content. The first text must be the current content, the second is the
@@ -77,7 +77,7 @@ class RegularFile
     /// Copies what wxCopyFile copies in addition to the content. Windows: the attributes and the
     /// time of the last change. Elsewhere: the mode.
     void TakeAttributes(const RegularFile& source);
-    /// Whether TakeAttributes would change neither read-only, hidden and system nor the mode.
+    /// Whether both have the same read-only, hidden and system attributes, or mode.
     bool HasAttributesOf(const RegularFile& source) const;
 
     /// Has the library report, under that path, why the file could not be opened for update as
@@ -103,7 +103,7 @@ class RegularFile
 
     Status m_status = Status::NotOpen;
     wxString m_path;
-    unsigned long m_error = 0; // of the last failed write, as the system numbers it
+    unsigned long m_error = 0; // of the last failed reopening or write, as the system numbers it
 #ifdef _WIN32
     void* m_handle = nullptr;
 #else

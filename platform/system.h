@@ -1,8 +1,8 @@
 // The operating system calls that the tool makes, under their real names.
 //
 // On Windows this header only includes the system's own. Elsewhere it declares the same names with
-// the same contracts, and platform/linux/ answers them: the hives are text files, attributes live
-// in file modes and extended attributes, a profile file is a file, and there is no shell to notify.
+// the same contracts, and platform/linux/ implements them: the hives are text files, attributes
+// live in file modes and extended attributes, a profile file is a file, and there is no shell.
 #pragma once
 
 #ifdef _WIN32

@@ -14,6 +14,6 @@ bool IsUnicodeText(const wxString& text);
 wxString FromUtf16Bytes(const unsigned char* bytes, size_t count);
 
 /// The text as one line of Unicode, for a log or a report: U+FFFD replaces every control character
-/// except tab (U+0000 to U+001F, U+007F to U+009F), U+2028 and U+2029, which also end lines, and
-/// everything that is not Unicode.
+/// (U+0000 to U+001F, U+007F to U+009F) but tab; the line ends U+2028 and U+2029; and what is not
+/// Unicode.
 wxString ToOneLine(const wxString& text);

@@ -12,7 +12,7 @@ class FolderUpgradeApp : public wxApp
     ~FolderUpgradeApp() override;
 
     /// The whole run. Returns false on every path, so that the library enters no event loop and the
-    /// process ends with exit status -1; the run log is the only report.
+    /// process ends with exit status -1; the run log says what happened.
     bool OnInit() override;
 
     /// Upgrade (switch "I") or downgrade (switch "U"); set before any step reads it.

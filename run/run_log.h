@@ -1,5 +1,5 @@
-// The run log, the tool's only report: UpgradeDowngrade.log in the folder ORX_Installers of the
-// per-user application data folder. UTF-8 without byte-order mark, CR LF line ends.
+// The run log: UpgradeDowngrade.log in the folder ORX_Installers of the per-user application data
+// folder. UTF-8 without byte-order mark, CR LF line ends.
 #pragma once
 
 #include <wx/string.h>
@@ -10,11 +10,11 @@ extern bool RunLogEnabled;
 /// The count to pass for a line without one.
 constexpr int NoCount = -1;
 
-/// Appends one line: the message, then the count unless it is NoCount. A character that would end
-/// the line, or that is not Unicode, is logged as U+FFFD. The first line of a run empties the file,
-/// and creates it if its folder exists. The file is closed between lines; if it is removed
-/// meanwhile, it is not created again. If the folder or the file is a link, or the file is not a
-/// regular file, there is no log. A line that cannot be written completely is left out. Nothing is
-/// reported to the caller; the library reports the first such failure. Does nothing while
-/// RunLogEnabled is false.
+/// Appends one line: the message, then the count unless it is NoCount. A control character except
+/// tab, a line separator, or what is not Unicode, is logged as U+FFFD. The first line of a run
+/// empties the file, and creates it if its folder exists. The file is closed between lines; if it
+/// is removed meanwhile, it is not created again. If the folder or the file is a link, or the file
+/// is not a regular file, there is no log. A line that cannot be written completely is left out.
+/// Nothing is reported to the caller; the library reports the first such failure. Does nothing
+/// while RunLogEnabled is false.
 void RunLog(const wxString& message, int count = NoCount);

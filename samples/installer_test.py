@@ -3,8 +3,8 @@
 
     samples/installer_test.py BUILD_DIR
 
-BUILD_DIR is the build folder of the preset "windows". Wine gets its own prefix and display. On the workstation are two hot
-folders, one whose template moves, and a job preset.
+BUILD_DIR is the build folder of the preset "windows". Wine gets its own prefix and display. The workstation has two hot
+folders (one template moves) and a job preset.
 """
 import functools
 import os
@@ -56,7 +56,7 @@ def files_below(folder):
 # Package ------------------------------------------------------------------------------------------
 
 def pack(build, scratch, sign):
-    """Makes the package apart from that of the build folder, whose settings stay as they are."""
+    """Makes a package outside the build folder, whose settings stay as they are."""
     run("cpack", "--config", build / "CPackConfig.cmake", "-D", f"CPACK_FOLDER_UPGRADE_SIGN_COMMAND={sign}", "-B", scratch / "packing")
     (package,) = (scratch / "packing").glob("FolderUpgrade-*-win64.zip")
     return package.read_bytes()

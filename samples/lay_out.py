@@ -1,11 +1,11 @@
 #!/usr/bin/env python3
-"""Creates in a folder what a hot folder user's machine looks like before an upgrade:
+"""Lays out in a folder a hot folder user's machine as it is before an upgrade:
 
     samples/lay_out.py [--fresh] DIR
 
 Use DIR/machine as $XDG_CONFIG_DIRS and DIR/user as $XDG_CONFIG_HOME. The texts come from samples/workstation/, the icons
-from appearance/icons/. DIR has to be missing or empty. --fresh first removes what an earlier call created there, never
-another folder.
+from appearance/icons/. DIR has to be missing or empty. --fresh first empties DIR, but only if an earlier call
+created it.
 
 As a module, it lays out the workstations of the tests and benchmarks that are not written in C++.
 """
@@ -23,7 +23,7 @@ ATTRIBUTES = "user.DOSATTRIB"
 READ_ONLY, HIDDEN, SYSTEM = 1, 2, 4
 MARKER = ".sample-workstation"
 
-# Hot folder, the icon in its private directory, the picture in this outdated copy.
+# Hot folder, the icon in its private directory, and whose image this outdated copy has.
 STALE_ICONS = (
     ("Flyers A4", "hf_folder", "hf_folder_disabled"),
     ("Broschüren Köln", "hf_folder_disabled", "hf_folder"),
@@ -39,7 +39,7 @@ SHOWN = {"Flyers A4": SYSTEM, "名刺 両面": READ_ONLY | SYSTEM, "Manuals 2019
 
 
 class Workstation:
-    """A workstation of this machine's programs in a folder, which may not exist yet."""
+    """A workstation of this machine's programs in a folder, which need not exist yet."""
     separator = "/"
 
     def __init__(self, root, seen_root=None):
@@ -135,7 +135,7 @@ def lay_out_sample(station):
 
 
 def clear(directory):
-    """Removes what is in a directory, which may be the user's own and stays."""
+    """Empties a directory, which may be the user's own."""
     for path in directory.iterdir():
         if path.is_dir() and not path.is_symlink():
             shutil.rmtree(path)
@@ -151,7 +151,7 @@ def main(arguments):
     directory = pathlib.Path(arguments[-1]).resolve()
     marker = directory / MARKER
     if any(character in str(directory) for character in '\\"<>&@\n'):
-        return f'lay_out.py: a path with one of \\ " < > & @ or a line break does not fit into the files: {directory}'
+        return f'lay_out.py: a path with one of \\ " < > & @ or a line break cannot be stored in the files: {directory}'
     if is_fresh and marker.is_file():
         clear(directory)
     if marker.exists():

@@ -1,4 +1,4 @@
-// Reading Folder.cfg, part by part. Nothing is thrown or logged for bad content.
+// Reading Folder.cfg, part by part. Nothing is thrown for bad content.
 #pragma once
 
 #include "store/hot_folder_settings.h"

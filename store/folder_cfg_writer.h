@@ -9,8 +9,8 @@
 #include <string>
 #include <vector>
 
-/// The content of a Folder.cfg with the six values, and nothing else. A filter setting with another
-/// name than "FilterSetting" is left out. It must not be deeper than MaxFilterLevels. It is moved
+/// The content of a Folder.cfg with the six values, and nothing else. A filter setting whose name
+/// is not "FilterSetting" is left out. It must not be deeper than MaxFilterLevels. It is moved
 /// from, and empty afterwards.
 std::string FolderCfgBytes(const HotFolderSettings& settings, const JobSettingTable& jobSettings,
                            const HotFolderPaths& paths, wxXmlNode& filterSetting,

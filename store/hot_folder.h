@@ -16,8 +16,8 @@ wxString PrivateDirPath(const wxString& hotFolder);
 /// The path of the hot folder's Folder.cfg, in its private directory.
 wxString FolderCfgPath(const wxString& hotFolder);
 
-/// A hot folder and its private directory, which cannot be exchanged while a step works in them.
-/// The hot folder may be reached over links; a private directory that is a link counts as missing.
+/// A hot folder and its private directory, which cannot be replaced while a step works in them. The
+/// hot folder may be reached over links; a private directory that is a link counts as missing.
 struct PinnedHotFolder
 {
     explicit PinnedHotFolder(const wxString& path);

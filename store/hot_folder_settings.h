@@ -86,6 +86,6 @@ using PreflightSettingList = std::vector<PreflightSetting>;
 void SetImposeSetting(ImposeSettingTable& table, const wxString& key, const wxString& value,
                       const wxString& keyDisplayValue);
 
-/// Guards Folder.cfg: held while the settings are loaded and during a whole rewrite, always through
-/// a wxCriticalSectionLocker.
+/// Guards Folder.cfg while the icon's state is read and during a whole rewrite, always through a
+/// wxCriticalSectionLocker.
 extern wxCriticalSection FolderCfgLock;

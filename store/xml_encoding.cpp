@@ -27,8 +27,8 @@ bool IsSingleByte(const wxString& encoding)
            (code >= wxFONTENCODING_CP1250 && code <= wxFONTENCODING_CP1258);
 }
 
-// An encoding that the library does not know is never read correctly: it is read as Latin-1, which
-// is right only for those names of Latin-1 that the library does not know on Windows.
+// The library reads an encoding that it does not know as Latin-1, which is right only for "latin1"
+// (unknown to it on Windows).
 bool IsReadAsAscii(const std::string& document, const wxString& encoding)
 {
     if (!wxCSConv(encoding).IsOk() && encoding.CmpNoCase("latin1") != 0)

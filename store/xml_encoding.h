@@ -7,7 +7,7 @@
 #include <string>
 
 /// For each byte, the character that the library passes to the parser for it, in an encoding that
-/// the parser does not know by itself; -1 for none.
+/// the parser does not know by itself; the previous one for an undefined byte.
 using EncodingMap = std::array<int, 256>;
 
 EncodingMap GetEncodingMap(const wxString& encoding);

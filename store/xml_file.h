@@ -1,4 +1,4 @@
-// An XML file that is opened and parsed once, and perhaps rewritten through the same file.
+// An XML file that is opened and parsed once, and perhaps reopened and rewritten.
 #pragma once
 
 #include "platform/regular_file.h"
@@ -14,7 +14,7 @@ class XmlFile
   public:
     enum class State
     {
-        Missing,     // no regular file of that name, or a link
+        Missing,     // no regular file of that name, or a refused link
         NotReadable, // refused or malformed; the library has reported the reason
         TooLarge,    // see store/xml_limits.h
         Loaded
@@ -26,7 +26,8 @@ class XmlFile
     /// Also opens the same file for writing. If that is refused, has the library report it.
     RegularFile::Status ReopenForUpdate();
 
-    /// Reads the file again, and parses it unless it is unchanged; returns false if that fails.
+    /// Reads the file again, and parses it again unless an unchanged document was kept; returns
+    /// false if that fails.
     bool LoadAgain();
 
     /// Makes these bytes the whole content, as RegularFile::Rewrite does; the library reports a

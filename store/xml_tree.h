@@ -17,8 +17,8 @@ int CountLevels(const wxXmlNode& root);
 
 /// Removes from a document loaded with wxXMLDOC_KEEP_WHITESPACE_NODES what loading without that
 /// flag removes: texts that are only white space, and the empty lines before any other text. The
-/// library does this for each piece of a text that the parser delivers, so it loses spaces at the
-/// beginning of a text before an escaped character or at a border of its read buffer; here, these
+/// library does this for each piece of a text that the parser delivers, so it loses spaces that are
+/// a piece of their own (before an escaped character, at a border of its read buffer). Here they
 /// stay.
 void RemoveIgnoredWhiteSpace(wxXmlNode& root);
 

@@ -58,7 +58,7 @@ TEST_F(Appearance, ANewDesktopIniIsAnnouncedButNotForced)
     EXPECT_EQ(Calls(false, ""), ShellCalls);
 }
 
-TEST_F(Appearance, AnExistingOneIsForcedWithTheValueReadBack)
+TEST_F(Appearance, AnExistingIniIsForcedWithTheValueRead)
 {
     const wxString name = wxString('n', 300) + ".ico";
     WriteIni("");
@@ -66,7 +66,7 @@ TEST_F(Appearance, AnExistingOneIsForcedWithTheValueReadBack)
     EXPECT_EQ(Calls(true, (".\\[_ORX_HotFolder_]\\" + name).Left(199).utf8_string()), ShellCalls);
 }
 
-TEST_F(Appearance, AnOldOrUnknownShellGetsNothingButTheAttributes)
+TEST_F(Appearance, WithAnOldOrUnknownShellOnlyAttributesChange)
 {
     const auto isCustomised = [&](DWORD major, DWORD minor, HRESULT result = 0)
     {

@@ -49,7 +49,7 @@ class Scenario
     /// The same for presets.xml of the one directory with presets.
     Scenario& Preset(const std::string& text) { return Before({{PresetPlace, text}}); }
     Scenario& Preset(const std::string& text, const std::string& becomes) { return Preset(text).After({{PresetPlace, becomes}}); }
-    /// For tests of refusals, which root would not notice.
+    /// For tests of refusals: root is refused nothing.
     Scenario& AsOtherUser() { return Set(asOtherUser, true); }
 
     /// The command line arguments; {"I"} if not given.

@@ -39,7 +39,7 @@ cd "$prefixes" # which the other user can enter
 WINEPREFIX=$prefixes/root timeout 120 "$wine" wineboot --init 2>/dev/null &
 as_other timeout 120 "$wine" wineboot --init 2>/dev/null &
 wait
-# The servers keep running between the runs. Starting one fails if wineboot's still runs, which serves as well.
+# The servers keep running between the runs. Starting one fails if wineboot's is still running, which is just as good.
 WINEPREFIX=$prefixes/root "$server" -p || true
 as_other "$server" -p || true
 

@@ -20,7 +20,7 @@ std::string FromEnvironment(const char* name)
     return value ? value : "";
 }
 
-// Presses the button of a message box if there is one; returns what xdotool found.
+// Presses the button of a message box if there is one; returns whether there was one.
 bool PressButton()
 {
     return std::system("xdotool search --onlyvisible --name '^FolderUpgrade' windowfocus key Return "

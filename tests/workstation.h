@@ -11,7 +11,7 @@
 //
 // In texts, {hot}, {user}, {tool}, {app}, {previous} and {default} are replaced with paths (as the tool sees them) and
 // {/} with the path separator; in capitals ({HOT}, {/2}) in the form of the registry editor's text. {repeat:COUNT:TEXT}
-// is the text COUNT times, with its six-digit number in place of '#'. A whole text can also be
+// is the text COUNT times, with the repetition's six-digit number in place of '#'. A whole text can also be
 //   {utf16}TEXT     the text in UTF-16 with a byte-order mark
 //   {icon:NAME}     the bytes of a shipped icon
 //   {link:TARGET}   a symbolic link to another place or to an absolute path; to a directory if its

@@ -145,7 +145,7 @@ work=$(mktemp -d "$cache/build-XXXXXX")
 touch "$work/log"
 trap finish EXIT
 
-stage "installing what is missing of Debian's packages" "$install_packages" mingw
+stage "installing missing Debian packages" "$install_packages" mingw
 stage "looking up the source packages" update_sources
 stage "downloading wxWidgets" fetch wxwidgets3.2
 stage "downloading expat" fetch expat

@@ -24,7 +24,7 @@ foreach(tool AR RANLIB STRIP OBJCOPY OBJDUMP DLLTOOL)
     find_program(CMAKE_${tool} ${host}-${name} REQUIRED)
 endforeach()
 
-# The program must not contain a folder of the build machine or a time: __FILE__ is in every log message.
+# The program must not contain a folder of the build machine or a time: the library's log calls contain __FILE__.
 set(flags "")
 foreach(folder ${CMAKE_SOURCE_DIR} ${CMAKE_BINARY_DIR} ${FOLDER_UPGRADE_WX_PREFIX})
     string(APPEND flags " \"-ffile-prefix-map=${folder}=.\"")

@@ -1,4 +1,4 @@
-// Windows file attributes on Linux: READONLY of a file is its missing write permission; every other
+// Windows file attributes on Linux: a file is READONLY if nobody may write it; every other
 // attribute, and READONLY of a directory, is kept as hexadecimal text in the extended attribute
 // that Wine and Samba use.
 #include "platform/linux/native_path.h"

@@ -138,7 +138,7 @@ struct Place
     size_t valueBegin = 0; // after the equals sign, if there is one
     size_t valueEnd = 0;   // without white space and line end
     bool hasEqualsSign = false;
-    size_t addAt = 0; // after the last line of the section that is not empty
+    size_t addAt = 0; // after the section's last non-empty line
 };
 
 Place Find(const Units& units, const Units& section, const Units& key)

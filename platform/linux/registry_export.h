@@ -16,9 +16,9 @@ struct RegistryValue
 /// The text, in UTF-8, of an export in UTF-8 or UTF-16; empty if the bytes are not an export.
 std::string DecodeRegistryExport(std::string bytes);
 
-/// The first line after the line of a key; null if neither the key nor one below it exists. The
-/// path begins with the hive's full name. Names of keys and values are ASCII and compared ignoring
-/// case.
+/// The first line after a key's line; the end of the text if only a key below it exists; else null.
+/// The path begins with the hive's full name. Names of keys and values are ASCII and compared
+/// ignoring case.
 const char* FindRegistryKey(const std::string& hive, const std::string& path);
 
 /// The value of that name in the lines of a key.

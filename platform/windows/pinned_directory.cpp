@@ -50,7 +50,7 @@ HANDLE Pin(const wxString& path, Links links)
     return INVALID_HANDLE_VALUE;
 }
 
-// The path without links, because a link's target may be exchanged. The given path if the other is
+// The path without links, because a link's target may be replaced. The given path if the other is
 // too long for calls that accept only MAX_PATH characters, including the file name.
 wxString FinalPath(HANDLE handle, const wxString& path)
 {

@@ -62,8 +62,8 @@ DWORD LengthOfCall(size_t rest)
 } // namespace
 
 // A link is opened as such, so that it can be distinguished from a file. While the link or the file
-// is open, the name leads to nothing else; so a file whose content is elsewhere (in a cloud) can be
-// opened again by its name.
+// is open, the name leads to nothing else; so a file whose content is elsewhere (in the cloud) can
+// be opened again by its name.
 RegularFile::Status RegularFile::Open(const wxString& path, Links links, bool forUpdate)
 {
     Close();

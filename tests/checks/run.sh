@@ -1,5 +1,5 @@
 #!/usr/bin/env bash
-# Runs one of the format and static checks of everything hand-written, as a test:
+# Runs one of the format and static checks, as a test:
 #
 #     tests/checks/run.sh CHECK BUILD_DIR
 #
@@ -14,7 +14,7 @@ find_files() {
 }
 mapfile -t sources < <(find_files \( -name '*.cpp' -o -name '*.h' \))
 mapfile -t scripts < <(find_files -name '*.sh'; echo .ci/run)
-# What this machine's program is built of.
+# What this machine's program is built from.
 mapfile -t native < <(find_files -name '*.cpp' -not -path './platform/windows/*' \
     -not -path './bench/*' -not -path './fuzz/*' -not -path './tests/*')
 

@@ -6,7 +6,7 @@
 //   f  the call does nothing and fails with the error number $FAULT_ERROR
 //   s  it writes half of what it is given
 //   e  the process ends before the call
-//   x  before the call, $FAULT_VICTIM is exchanged for a symbolic link to $FAULT_TARGET
+//   x  before the call, $FAULT_VICTIM is replaced with a symbolic link to $FAULT_TARGET
 // The first of these calls and its path are written to the file $FAULT_REPORT.
 #include <cerrno>
 #include <csignal>

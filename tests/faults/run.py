@@ -3,12 +3,12 @@
 
     tests/faults/run.py MODE PROGRAM FAILING_CALLS
 
-FAILING_CALLS is built from failing_calls.cpp. In every mode, a run ends with -1 and no report of a sanitizer, and
-each Folder.cfg and each job preset is exactly the old one or the new one. MODE is one of
+FAILING_CALLS is built from failing_calls.cpp. Except in END, a run ends with -1; in all modes, no sanitizer reports
+anything, and each Folder.cfg and each job preset is exactly the old one or the new one. MODE is one of
     EIO, ENOSPC, EACCES, EINTR   the call fails; only what it concerns differs from a run without a fault
     SHORT, SHORT_ENOSPC          only half of a write is done; in the second, the write that should continue it also fails
     END                          the process is ended; a content may be followed by line feeds up to the old length
-    SWAP                         a file or directory is exchanged for a link; nothing outside the workstation changes
+    SWAP                         a file or directory is replaced with a link; nothing outside the workstation changes
     FULL_DISK                    the disk (which only root can make) is full; a line that was logged stays
 """
 import contextlib
@@ -52,7 +52,7 @@ HIVE = 'Windows Registry Editor Version 5.00\r\n\r\n[HKEY_%s]\r\n"%s"="@ROOT@%s"
 INI = "[.ShellClassInfo]\nIconFile=mine.ico\n[ViewState]\nMode=4\n"
 # The icon that a folder gets, the length of its description, and the length of an attribute that is lost.
 FOLDERS = {"A": ("hf_folder", 1500, 0), "B": ("hf_error_inactive", 1500, 2000)}
-# Those of the second kind need one more page on the disk when they are written.
+# The F folders need one more page on the disk when they are written.
 MANY_FOLDERS = {**FOLDERS, **{f"F{number}": ("hf_folder", 3500, 0) for number in range(20)}}
 
 
@@ -114,8 +114,8 @@ def judge(hit, before, after, now):
     parts = {part(name) for name in changed}
     if hit.startswith(LOG_DIR) or part(hit) != hit or hit in parts:
         return parts - {part(hit)}
-    # What several share: steps were skipped, at most those of one hot folder or of all job presets, except for
-    # the list itself; a source icon that cannot be read leaves part of its copy.
+    # A path that several parts share: at most one hot folder, or all job presets, may be skipped (without the list,
+    # everything); an unreadable source icon leaves part of its copy.
     if len(parts) > 1 and not hit.startswith("machine/hotfolder") and not all("JPData" in name for name in parts):
         return parts
     return {name for name in changed if now.get(name) != before.get(name) and not name.endswith(".ico")}
@@ -155,7 +155,7 @@ class Workstation:
         self.report.unlink(missing_ok=True)
 
     def run(self, number, events, calls="", error=0, below="", victim="", target="", prepare=lambda _: None):
-        """The finished process, and the call at which something happened with its path, or neither."""
+        """The finished process, and the call at which something happened and its path, or two Nones."""
         self.restore()
         prepare(self.root)
         process = subprocess.run(
@@ -197,7 +197,7 @@ def try_calls(station, mode):
 
 
 def victims():
-    """What is exchanged, and the target of the link that replaces it; a place's second target does not exist."""
+    """What is replaced, and the target of the link that replaces it; a place's second target does not exist."""
     for folder, (icon, *_) in FOLDERS.items():
         hot = f"Hot Folders/{folder}"
         yield hot, "empty"
@@ -214,7 +214,7 @@ def victims():
 
 
 def try_swaps(station):
-    """Exchanges each victim at each call by name that its step makes; returns what was wrong in each run."""
+    """Replaces each victim at each call by path that its step makes; returns what was wrong in each run."""
     outside = look(station.outside, ())
     for victim, target in victims():
         below = LOG_DIR if victim.startswith(LOG_DIR) else part(victim)
@@ -270,7 +270,7 @@ def main():
     mode, program, failing_calls = sys.argv[1:]
     in_memory = "/dev/shm" if keeps_attributes("/dev/shm") else None
     if mode == "FULL_DISK" and not (in_memory and os.geteuid() == 0):
-        print("skipped faults.FULL_DISK: only root can make a small disk, and not every system has one that keeps attributes\n"
+        print("skipped faults.FULL_DISK: needs root, and a tmpfs that keeps attributes\n"
               "0 passed, 0 failed, 1 skipped")
         return 0
     passed = failed = 0

@@ -50,7 +50,7 @@ std::vector<Scenario> FolderCfgs()
         Scenario("ADocumentTypeIsNotCarriedOver")
             .FolderCfg(Minimal(MovedFrom, "<!DOCTYPE h [<!ENTITY e 'x'>]>", "&e;"), MinimalWritten(MovedTo, "x"))
             .LogOfDisabledA(found),
-        Scenario("AByteOrderMarkGoesFromFolderCfg")
+        Scenario("FolderCfgLosesItsByteOrderMark")
             .FolderCfg("\xEF\xBB\xBF" + Minimal(MovedFrom, "<?xml version='1.0' encoding='utf-8'?>"), written)
             .LogOfDisabledA(found),
         Scenario("AUtf16FolderCfgComesOutInUtf8").FolderCfg("{utf16}" + Minimal(MovedFrom), written).LogOfDisabledA(found),
@@ -58,7 +58,7 @@ std::vector<Scenario> FolderCfgs()
         elsewhere("ATemplateElsewhereStays", "{previous}2{/}x"),
         elsewhere("ATemplateOnAServerStays", "\\\\host\\share\\x\\B"),
         elsewhere("ATemplateOnAServerStaysWithSlashes", "//host/share/B"),
-        onShare("ATemplateOnTheShareThatIsLeftMoves", "share").FolderCfg(Written(onServer), Written("{default}{/}x")),
+        onShare("ATemplateOnTheShareBeingLeftMoves", "share").FolderCfg(Written(onServer), Written("{default}{/}x")),
         onShare("ATemplateOnAnotherShareStays", "other").FolderCfg(Written(onServer)),
         Scenario("HiddenAndSystemFilesAreWrittenAndKeepTheirAttributes")
             .Before({{CfgPlace + "#", "HS"}, {PresetPlace + "#", "HS"}})
@@ -84,11 +84,11 @@ std::vector<Scenario> FolderCfgs()
             .FolderCfg(Written("{app}{/}.{/}template{/}x"), Written("{previous}{/}x"))
             .Run({"U"})
             .LogOfA(Found("{app}{/}.{/}template{/}x")),
-        Scenario("NoFolderCfgIsLogged").Before({{"hot/A/[P]/", ""}}).LogOfDisabledA(NoCfg()),
+        Scenario("AMissingFolderCfgIsLogged").Before({{"hot/A/[P]/", ""}}).LogOfDisabledA(NoCfg()),
     };
 }
 
-// In these encodings only folders with ASCII names can be distinguished.
+// The paths are ASCII, because nothing else can be compared in these encodings.
 std::vector<Scenario> Encodings()
 {
     const auto declared = [](const Name& name, const Text& encoding, const Text& folder)
@@ -117,8 +117,8 @@ std::vector<Scenario> Encodings()
         declared("AFolderCfgInWindows1253Stays", "='windows-1253'", "\xE1\xD2"),
         declared("AFolderCfgInShiftJisStays", "='Shift_JIS'", "\x93\xFA\x96\x7B"),
         declared("ShiftJisStaysWithSpacesInItsDeclaration", " = 'Shift_JIS'", "\x93\xFA"),
-        declared("AFolderCfgInAnEncodingOfItsOwnStays", "='x-own'", "x"),
-        declared("AnEncodingOfItsOwnIsSeenAfterAByteOrderMark", "", "")
+        declared("AFolderCfgInAnUnknownEncodingStays", "='x-own'", "x"),
+        declared("AnUnknownEncodingIsSeenAfterAByteOrderMark", "", "")
             .FolderCfg("\xEF\xBB\xBF" + Minimal("{hot}{/}x", "<?xml version='1.0' encoding='x-own'?>")),
     };
 }

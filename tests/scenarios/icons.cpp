@@ -93,7 +93,7 @@ std::vector<Scenario> DesktopInis()
             .Before({{Icon("hf_folder_disabled") + "#", "R"}})
             .After({{Icon("hf_folder_disabled") + "#", ""}})
             .AsOtherUser()
-            .NotUnderWine("Wine refuses another user than root to replace it, as Windows does"),
+            .NotUnderWine("Wine, like Windows, lets no user but root replace it"),
         Scenario("AFolderOfAnotherUserStays")
             .Before({{Icon("hf_folder_disabled"), "old"}, {Icon("hf_folder_disabled") + "#", "X"}, {"hot/A#", "X"}, {"hot/A/[P]#", "X"}})
             .AsOtherUser()

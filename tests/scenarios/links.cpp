@@ -20,7 +20,7 @@ std::vector<Scenario> BothLinks(const Scenario& scenario, const Text& place, con
 {
     Scenario linked = scenario;
     Scenario dangling = scenario;
-    dangling.name.what += "EvenADanglingOne";
+    dangling.name.what += "EvenIfDangling";
     linked.Before({{target, text}, {place, LinkTo(target)}}).NotUnderWine(WineFollowsLinks);
     dangling.Before({{"elsewhere/other", ""}, {place, LinkTo("elsewhere/missing")}}).NotUnderWine(WineFollowsLinks);
     return {linked, dangling};
@@ -43,7 +43,7 @@ std::vector<Scenario> PlantedLinks()
                      "InfoTip=This folder has been configured as an ORX hot folder.\r\n";
     const Text iniStays = "Desktop.ini left as it is (reached over a link): {hot}{/}A{/}Desktop.ini\n";
     std::vector<Scenario> scenarios = {
-        Scenario("ALinkedPrivateDirectoryIsMissing")
+        Scenario("ALinkedPrivateDirectoryIsIgnored")
             .Before({{"elsewhere/P/Folder.cfg", cfg}, {"elsewhere/P/hf_folder_disabled.ico", "old"}, {"hot/A/[P]/", LinkTo("elsewhere/P")}})
             .LogOfDisabledA(NoCfg()),
         Scenario("ALinkedPresetDirectoryIsNotOpened")
@@ -80,7 +80,7 @@ std::vector<Scenario> PlantedLinks()
             scenarios.push_back(each);
     };
     add(WithIcon("ALinkedFolderCfgIsNotRead").After({{Ini, ini}, {Ini + "#", "RS"}}), CfgPlace, "elsewhere/Folder.cfg", cfg);
-    add(Scenario("ALinkedIconIsMissing").LogOfDisabledA(NoCfg()), Icon, "elsewhere/icon.ico", "old");
+    add(Scenario("ALinkedIconIsIgnored").LogOfDisabledA(NoCfg()), Icon, "elsewhere/icon.ico", "old");
     add(WithIcon("ALinkedDesktopIniStays").Log(FolderLines("A", 1, iniStays + Copied("hf_folder_disabled"), NoCfg())), Ini,
         "elsewhere/Desktop.ini", "[.ShellClassInfo]\r\n");
     add(Scenario("ALinkedPresetIsNotOpened").LogOfPreset(CannotOpenPreset), PresetDir + "/presets.xml", "elsewhere/presets.xml", preset);

@@ -11,7 +11,7 @@ std::vector<Scenario> Runs()
     const Text found = Found(MovedFrom);
     const Text forged = "x&#13;&#10;End: Updating Impose path for JP Presets&#13;&#10;&#x2028;&#x2029;&#x85;&#x7F;&#9;y";
     return {
-        Scenario("NoSwitchTouchesNothing").FolderCfg(from).Run({}),
+        Scenario("WithoutASwitchNothingChanges").FolderCfg(from).Run({}),
         Scenario("ADashedSwitchIsInvalid").FolderCfg(from).Run({"-I"}).WholeLog("Invalid call check calling parameter: exiting....\n"),
         Scenario("AnInvalidSwitchIsNotLoggedWithV").FolderCfg(from).Run({"X", "V"}),
         Scenario("VLeavesTheLogAlone").FolderCfg(from, to).Run({"I", "v"}),
@@ -32,7 +32,7 @@ std::vector<Scenario> Runs()
         Scenario("AFolderNameStaysInItsLine")
             .Before({{"hot/x\ny/", ""}, {ListPlace, "<l><HotFolder path='{hot}{/}x&#10;y'/></l>"}})
             .Log(FolderLines(u8"x\uFFFDy", 1, NoIcon("hf_folder_disabled"), NoCfg(u8"x\uFFFDy")))
-            .NotUnderWine("no name of a file has a line end there"),
+            .NotUnderWine("no file name has a line end there"),
     };
 }
 
