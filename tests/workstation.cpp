@@ -76,12 +76,6 @@ std::string Repeat(const std::string& text)
     return result.append(text, done);
 }
 
-std::string ExpandedAt(const Workstation& workstation, const Files& files, const char* place)
-{
-    const auto found = files.find(place);
-    return found == files.end() ? std::string() : workstation.Expand(found->second);
-}
-
 } // namespace
 
 bool IsWindowsProgram() { return !WindowsProgram().empty(); }
@@ -125,9 +119,8 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser)
     const fs::path programs = IsWindowsProgram() ? WindowsProgram().parent_path() : built;
     fs::create_directories(m_hostDirs["tool"]);
     fs::create_directories(m_root / "Vorige 版");
-    fs::copy(programs / ProgramFile("FolderUpgrade"), m_hostDirs["tool"]);
-    if (fs::exists(programs / ProgramFile("FolderUpgradeCheck")))
-        fs::copy(programs / ProgramFile("FolderUpgradeCheck"), m_hostDirs["tool"]);
+    for (const char* program : {"FolderUpgrade", "FolderUpgradeCheck"})
+        fs::copy(programs / ProgramFile(program), m_hostDirs["tool"]);
     fs::copy(built / "BundleIcons", m_hostDirs["tool"] / "BundleIcons");
     for (const auto& icon : fs::directory_iterator(built / "BundleIcons"))
         fs::copy(icon, m_hostDirs["tool"]);
@@ -241,8 +234,9 @@ void Workstation::LayOut(const Files& files)
             GiveAway(directory);
         ForEachEntry([](const std::string&, const fs::directory_entry& entry) { GiveAway(entry.path()); });
     }
+    Files hives = files;
     if (m_wine)
-        m_wine->ImportHives(ExpandedAt(*this, files, MachineHive), ExpandedAt(*this, files, UserHive));
+        m_wine->ImportHives(Expand(hives[MachineHive]), Expand(hives[UserHive]));
     for (const auto& [place, text] : files)
     {
         if (place.back() == '#')

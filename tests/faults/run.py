@@ -77,11 +77,6 @@ def files_of(folders):
     return files
 
 
-def put_all(station, files):
-    for name, text in files.items():
-        station.put(name, text)
-
-
 def part(name):
     """The hot folder or job preset directory to which the path belongs; else the path itself."""
     pieces = name.split("/")
@@ -127,16 +122,18 @@ class Workstation:
         self.root, self.original, self.report = folder / "work station", folder / "original", folder / "report"
         self.outside, self.outside_before = folder / "outside", folder / "outside before"
         original = lay_out.Workstation(self.original, self.root)
-        put_all(original, files_of(folders))
+        for name, text in files_of(folders).items():
+            original.put(name, text)
         original.set_attributes("Hot Folders/B/Desktop.ini", READ_ONLY | SYSTEM)
         self.environment = lay_out.Workstation(self.root).environment
         (self.root / "program").mkdir(parents=True)
         for file in [program, *program.parent.glob("*.ico")]:
             shutil.copy2(file, self.root / "program")
-        put_all(lay_out.Workstation(self.outside_before, self.root), {
-            # A hot folder with and one without a private directory, a job preset directory, the log's folder.
-            **{name: text for name, text in files_of(folders).items() if name.startswith(("Hot", "user/ORX"))},
-            "empty/other": "a file"})
+        outside = lay_out.Workstation(self.outside_before, self.root)
+        outside.put("empty/other", "a file")
+        for name, text in files_of(folders).items():
+            if name.startswith(("Hot", "user/ORX")):  # hot folders, one without a private directory, presets, the log's folder
+                outside.put(name, text)
         self.before = look(self.original)
         self.run(0, "f")
         self.after = look(self.root)

@@ -15,17 +15,6 @@ const Text CannotOpenPreset = "Unable to open preset.xml for read : ";
 
 Text LinkTo(const Text& place) { return "{link:" + place + "}"; }
 
-// Two links in that place: one to a file or directory, whichever belongs there, and a dangling one.
-std::vector<Scenario> BothLinks(const Scenario& scenario, const Text& place, const Text& target, const Text& text)
-{
-    Scenario linked = scenario;
-    Scenario dangling = scenario;
-    dangling.name.what += "EvenIfDangling";
-    linked.Before({{target, text}, {place, LinkTo(target)}}).NotUnderWine(WineFollowsLinks);
-    dangling.Before({{"elsewhere/other", ""}, {place, LinkTo("elsewhere/missing")}}).NotUnderWine(WineFollowsLinks);
-    return {linked, dangling};
-}
-
 // What a run without a Folder.cfg does to A, whose icon exists.
 Scenario WithIcon(const Name& name)
 {
@@ -74,10 +63,15 @@ std::vector<Scenario> PlantedLinks()
             .LogOfA(Found(MovedFrom), "", "hf_error_active")
             .NotUnderWine(WineFollowsLinks),
     };
+    // Two links in that place: one to a file, and a dangling one.
     const auto add = [&](const Scenario& scenario, const Text& place, const Text& target, const Text& text)
     {
-        for (const Scenario& each : BothLinks(scenario, place, target, text))
-            scenarios.push_back(each);
+        for (const Text& pointsTo : {target, Text("elsewhere/missing")})
+        {
+            scenarios.push_back(scenario);
+            scenarios.back().Before({{target, text}, {place, LinkTo(pointsTo)}}).NotUnderWine(WineFollowsLinks);
+        }
+        scenarios.back().name.what += "EvenIfDangling";
     };
     add(WithIcon("ALinkedFolderCfgIsNotRead").After({{Ini, ini}, {Ini + "#", "RS"}}), CfgPlace, "elsewhere/Folder.cfg", cfg);
     add(Scenario("ALinkedIconIsIgnored").LogOfDisabledA(NoCfg()), Icon, "elsewhere/icon.ico", "old");
