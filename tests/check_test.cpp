@@ -98,6 +98,8 @@ std::vector<Finding> Registry()
     return {
         {Moving("PathIsMissing").Before({{UserHive, Removed}, {"hot/B/[P]/Folder.cfg", Written(MovedFrom)}}),
          path + unknown + "\n" + NoIcon},
+        {Done("OnlyAPresetAsksForPath").Before({{UserHive, Removed}, {CfgPlace, Removed}}),
+         "note     no Folder.cfg\n" + NoDisabledIcon + "\n" + path + unknown},
         {Moving("InstallPathIsMissing").Before({{MachineHive, Removed}}), installPath + unknown},
         {Done("NothingAsksForInstallPath").Before({{MachineHive, Removed}}).Before(noPresets), IsElsewhere + MovedTo + "\n" + NoPresets},
         {withPath("PathEndsInASeparator", "{PREVIOUS}{/2}"), path + "ends in a separator; no template of a hot folder moves\n" + stays},
@@ -249,6 +251,8 @@ std::vector<Finding> PresetsAndLogs()
          problem + "declares the encoding ISO-8859-1, but comes out as UTF-8\n" + change + comesOut},
         {Done("TwoPathsMove").Preset(Stored(MovedFrom) + Stored(MovedFrom)), change + "2 paths"},
         {Done("AByteOrderMarkIsLost").Preset("\xEF\xBB\xBF<p/>"), change + "loses its byte-order mark"},
+        {Done("AByteOrderMarkAndLineEndsAreLost").Preset("\xEF\xBB\xBF<p>\n</p>"),
+         change + "loses its byte-order mark" + (IsWindowsProgram() ? ", and its line ends become CR LF" : "")},
         {Done("TheEncodingChanges").Preset("{utf16}<p>ä</p>"), change + "comes out as UTF-8, without byte-order mark"},
         {Done("LineEndsChange").Preset("<p>\n</p>"), IsWindowsProgram() ? change + "its line ends become CR LF" : ""},
         {Done("TheLogIsALink").Before({{LogPlace, "{link:elsewhere/a}"}}).NotUnderWine(NoLinks),
