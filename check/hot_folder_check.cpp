@@ -128,7 +128,7 @@ void CheckIcon(const PinnedHotFolder& folder, const wxString& hotFolder, bool is
 {
     wxString name;
     GetFolderIconName(folder, hotFolder, name);
-    TakeLibraryErrors(); // errors about Folder.cfg are reported again, with the template
+    TakeLibraryErrors(); // errors about Folder.cfg were reported with the template
     const wxString destination = folder.privateDir.Reach(name);
     const wxString source = SourceIconPath(name, isUpgrade, BundleIconsDirName);
     if (IsLink(destination))

@@ -38,7 +38,7 @@ function(split_symbols target)
         return()
     endif()
     set(program $<TARGET_FILE:${target}>)
-    # Its copies have no date, like the linker's output.
+    # objcopy's output has no date, like the linker's.
     set(objcopy ${CMAKE_COMMAND} -E env SOURCE_DATE_EPOCH=0 ${CMAKE_OBJCOPY})
     add_custom_command(TARGET ${target} POST_BUILD
         COMMAND ${objcopy} --only-keep-debug ${program} ${program}.debug

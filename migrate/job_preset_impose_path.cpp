@@ -10,8 +10,8 @@
 namespace
 {
 
-// Opened for update before it is read, so that one handle serves both; but an error in the content
-// is logged instead of one in opening.
+// Opened for update before it is read, so that one handle serves both. If both fail, only the fault
+// in the content is logged.
 void UpdatePreset(JobPresetFile& preset, const wxString& from, const wxString& to)
 {
     const wxString& path = preset.GetPath();

@@ -49,8 +49,8 @@ class RegularFile
     /// Creates an empty file and opens it for update; fails and changes nothing if anything of that
     /// name exists (CREATE_NEW, O_EXCL).
     Status CreateNew(const wxString& path);
-    /// Replaces a file that cannot be written with a new, empty one. Not on Windows, where a file's
-    /// own permissions prevent that.
+    /// Puts a new, empty file in place of one that cannot be written. Not on Windows, where a
+    /// file's own permissions prevent that.
     Status Replace(const wxString& path);
     static bool MayReplace(const wxString& path);
     /// Returns false if the system reports an error, which does not matter: all bytes have already

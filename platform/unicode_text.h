@@ -13,7 +13,7 @@ bool IsUnicodeText(const wxString& text);
 /// partner stays as it is.
 wxString FromUtf16Bytes(const unsigned char* bytes, size_t count);
 
-/// The text as one line of Unicode, for a log or a report: U+FFFD replaces every control character
-/// (U+0000 to U+001F, U+007F to U+009F) but tab; the line ends U+2028 and U+2029; and what is not
-/// Unicode.
+/// The text as one line of Unicode, for a log or a report: U+FFFD replaces the line ends U+2028 and
+/// U+2029, what is not Unicode, and every control character (U+0000 to U+001F, U+007F to U+009F)
+/// but tab.
 wxString ToOneLine(const wxString& text);

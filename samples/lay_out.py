@@ -1,5 +1,5 @@
 #!/usr/bin/env python3
-"""Lays out in a folder a hot folder user's machine as it is before an upgrade:
+"""Creates in DIR a hot folder user's machine as it is before an upgrade:
 
     samples/lay_out.py [--fresh] DIR
 

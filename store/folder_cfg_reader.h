@@ -33,6 +33,6 @@ int ReadPaths(const wxXmlNode* root, HotFolderPaths& paths);
 /// If a key is repeated, the first entry stays.
 void ReadJobSettings(const wxXmlNode* root, JobSettingTable& table);
 void ReadImposeSettings(const wxXmlNode* root, ImposeSettingTable& table);
+void ReadPreflightSettings(const wxXmlNode* root, PreflightSettingList& list);
 /// Appends to the list.
 void ReadInputFormats(const wxXmlNode* root, std::vector<InputFormat>& formats);
-void ReadPreflightSettings(const wxXmlNode* root, PreflightSettingList& list);

@@ -11,5 +11,5 @@ void WriteFile(const std::filesystem::path& path, const std::string& text);
 void ReplaceAll(std::string& text, const std::string& from, const std::string& to);
 bool StartsWith(const std::string& text, const std::string& start);
 
-/// Converts UTF-8 to UTF-16LE with a byte-order mark; does not support characters beyond U+FFFF.
+/// Converts UTF-8 to UTF-16LE with a byte-order mark.
 std::string ToUtf16(const std::string& text);

@@ -110,7 +110,7 @@ def judge(hit, before, after, now):
     if hit.startswith(LOG_DIR) or part(hit) != hit or hit in parts:
         return parts - {part(hit)}
     # A path that several parts share: at most one hot folder, or all job presets, may be skipped (without the list,
-    # everything); an unreadable source icon leaves part of its copy.
+    # everything); a fault at a source icon may change its copy.
     if len(parts) > 1 and not hit.startswith("machine/hotfolder") and not all("JPData" in name for name in parts):
         return parts
     return {name for name in changed if now.get(name) != before.get(name) and not name.endswith(".ico")}

@@ -4,7 +4,7 @@
 namespace
 {
 
-// A hot folder and a preset whose paths would move, and this value in the key.
+// A hot folder and a preset whose paths would move, and these hives.
 Scenario Both(const Name& name, const Text& letter, const Files& hives)
 {
     const Text path = letter == "I" ? MovedFrom : MovedTo;

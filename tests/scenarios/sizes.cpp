@@ -74,7 +74,7 @@ std::vector<Scenario> Sizes()
         Folders("ADepthOf100000IsLoaded", {Cfg(Times(100000, "<e>") + Times(100000, "</e>"))}, true).Within(10, 512),
         Folders("ManyShortTextsAndCommentsAreLoaded", {Cfg("<a>" + Times(60000, "x<!--c-->") + "</a>", DocumentType(""))}, true)
             .Within(10, 512),
-        Scenario("100000EntriesAndFilterElementsStay")
+        Scenario("100000EntriesAndElementsAreKept")
             .FolderCfg(Cfg("<JobSetting>" + entries + "</JobSetting>" + filter), written)
             .LogOfDisabledA(Found(MovedFrom))
             .Within(10, 512),
