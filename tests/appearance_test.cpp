@@ -1,6 +1,7 @@
 // Calls to the shell, which leave no trace on the workstation, and the bytes of profile files.
 #include "appearance/folder_icon.h"
 #include "tests/recording_shell.h"
+#include "tests/text_files.h"
 
 #include <gtest/gtest.h>
 #include <wx/ffile.h>
@@ -27,12 +28,7 @@ class Appearance : public testing::Test
 
     void WriteIni(const wxString& text) const { wxFFile(Ini(), "wb").Write(text); }
 
-    wxString Text() const
-    {
-        wxString text;
-        wxFFile(Ini(), "rb").ReadAll(&text);
-        return text;
-    }
+    wxString Text() const { return wxString::FromUTF8(ReadFile(Ini().utf8_string())); }
 
     static std::vector<std::string> Version() { return {"load shell32.dll", "find DllGetVersion", "free"}; }
 

@@ -1,5 +1,6 @@
 // Contents of an exported hive that no scenario has.
 #include "platform/linux/registry_export.h"
+#include "tests/text_files.h"
 
 #include <gtest/gtest.h>
 
@@ -11,13 +12,6 @@ TEST(Registry, AnExportIsReadAsTheRegistryGivesIt)
     using Bytes = std::string;
     const Bytes heading = "Windows Registry Editor Version 5.00\r\n\r\n";
     const Bytes key = heading + "[HKEY_CURRENT_USER\\A\\K]\r\n";
-    const auto inUtf16 = [](const Bytes& text)
-    {
-        Bytes units = "\xFF\xFE";
-        for (const char character : text)
-            units += {character, '\0'};
-        return units;
-    };
     const char* const none = nullptr;
     struct Export
     {
@@ -25,10 +19,9 @@ TEST(Registry, AnExportIsReadAsTheRegistryGivesIt)
         const char* value; // in hexadecimal, after its type; null if there is no such value
     };
     for (const auto& [bytes, expected] :
-         {Export{key + "\"v\"=\"a\\\\b \\\"c\\\"\"", "1:61005c0062002000220063002200"
-                                                     "0000"},
+         {Export{key + "\"v\"=\"a\\\\b \\\"c\\\"\"", "1:61005c00620020002200630022000000"},
           Export{key + "\"v\"=\"\U0001F600\"", "1:3dd800de0000"}, Export{"\xEF\xBB\xBF" + key + "\"V\"=\"x\"", "1:78000000"},
-          Export{inUtf16(key + "\"v\"=\"x\""), "1:78000000"}, Export{key + "@=\"x\"\r\n\"vv\"=\"x\"\r\n\"v\"=\"y\"", "1:79000000"},
+          Export{ToUtf16(key + "\"v\"=\"x\""), "1:78000000"}, Export{key + "@=\"x\"\r\n\"vv\"=\"x\"\r\n\"v\"=\"y\"", "1:79000000"},
           Export{key + "\"v\"=hex(2):78,00,\\\r\n  79,00,00,00\r\n\"w\"=\"x\"", "2:780079000000"},
           Export{key + "\"v\"=hex(2):78,00", "2:78000000"}, Export{key + "\"v\"=hex(1):78,00,79", "1:780079"},
           Export{key + "\"v\"=hex(1):", "1:0000"}, Export{key + "\"v\"=hex(7):78,00", "7:7800"}, Export{key + "\"v\"=hex:78,00", "3:7800"},

@@ -3,10 +3,8 @@
 #include "tests/text_files.h"
 
 #include <algorithm>
-#include <iomanip>
 #include <optional>
 #include <set>
-#include <sstream>
 
 namespace
 {
@@ -28,21 +26,6 @@ std::vector<std::string> Lines(const std::string& text)
     return lines;
 }
 
-std::string Printable(const std::string& text)
-{
-    std::ostringstream result;
-    for (const char character : text)
-    {
-        if (character >= ' ' && character <= '~')
-            result << character;
-        else if (character == '\r' || character == '\n')
-            result << (character == '\r' ? "\\r" : "\\n");
-        else
-            result << "\\x" << std::hex << std::setw(2) << std::setfill('0') << (character & 0xFF);
-    }
-    return result.str();
-}
-
 // The lines from the first to the last that differ, and one more on each side.
 std::string Difference(const std::string& expected, const std::string& actual)
 {
@@ -57,7 +40,7 @@ std::string Difference(const std::string& expected, const std::string& actual)
     {
         constexpr int Most = 10;
         for (int count = 0; from != to && count < Most; ++from, ++count)
-            text += sign + Printable(*from) + "\n";
+            text += sign + testing::PrintToString(*from) + "\n";
     };
     add(' ', leftBegin - (leftBegin == left.begin() ? 0 : 1), leftBegin);
     add('-', leftBegin, leftEnd.base());

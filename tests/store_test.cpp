@@ -1,10 +1,13 @@
-// What no run can show: the results and defaults of readers, lookups, rarer forms of the output, and what counts as text.
+// What no run can show: the results and defaults of readers, lookups, rarer forms of the output, files, and what counts as text.
+#include "platform/regular_file.h"
+#include "platform/system.h"
 #include "platform/unicode_text.h"
 #include "store/folder_cfg_reader.h"
 #include "store/folder_cfg_writer.h"
 #include "store/xml_lookup.h"
 #include "store/xml_text.h"
 #include "store/xml_tree.h"
+#include "tests/text_files.h"
 
 #include <gtest/gtest.h>
 #include <wx/arrstr.h>
@@ -13,7 +16,6 @@
 #include <wx/log.h>
 #include <wx/sstream.h>
 
-#include <map>
 #include <set>
 
 namespace
@@ -32,12 +34,7 @@ class Store : public testing::Test
         return m_path;
     }
 
-    wxString Text() const
-    {
-        wxString text;
-        wxFFile(m_path, "rb").ReadAll(&text);
-        return text;
-    }
+    wxString Text() const { return wxString::FromUTF8(ReadFile(m_path.utf8_string())); }
 
     int Load(const wxString& text, HotFolderSettings& settings)
     {
@@ -87,12 +84,13 @@ TEST_F(Store, TheChainOfAttributesEndsAtTheFirstGap)
 
 TEST_F(Store, FlagsAndNumbersAreRead)
 {
-    const std::set<std::string> numericFlags = {"1", "1 \t", " 1", "01", "-1", "12x"};
+    const std::set<std::string> numericFlags = {"2147483647", "-2147483648", "1", "1 \t", " 1", "01", "-1", "12x"};
     const std::set<std::string> textFlags = {"1", "1 \t"};
-    const std::map<std::string, int> numbers = {{"1", 1},    {"1 \t", 1}, {" 1", 1},         {"01", 1},
-                                                {"-1", -1},  {"0", 0},    {"", 0},           {"true", 0},
-                                                {"12x", 12}, {"x1", 0},   {"2147483648", 0}, {"99999999999999999999", 0}};
-    for (const auto& [value, number] : numbers)
+    using Number = std::pair<std::string, int>;
+    for (const auto& [value, number] :
+         {Number{"1", 1}, Number{"1 \t", 1}, Number{" 1", 1}, Number{"01", 1}, Number{"-1", -1}, Number{"0", 0}, Number{"", 0},
+          Number{"true", 0}, Number{"12x", 12}, Number{"x1", 0}, Number{"2147483647", 2147483647}, Number{"-2147483648", -2147483647 - 1},
+          Number{"2147483648", 0}, Number{"99999999999999999999", 0}})
     {
         HotFolderSettings read;
         Load(wxString::Format("<r name='' description='' server_ip='' server_name='' Enable='%s' "
@@ -194,6 +192,32 @@ TEST_F(Store, DefaultsAreWrittenAndAFilterOfAnotherNameIsNot)
                                 "    <Movefolder path=\"\"/>\n    <Hotfolder path=\"\"/>\n  </Paths>\n"
                                 "  <JobSetting/>\n  <ImposeSetting/>\n  <PreflightSettings/>\n</HotFolder>\n"));
     EXPECT_TRUE(Text().Contains("server_version=\"-1\""));
+}
+
+TEST_F(Store, AFileIsRewrittenInPlace)
+{
+    using Status = RegularFile::Status;
+    RegularFile file;
+    EXPECT_EQ(Status::NotThere, file.OpenForReading(m_path + "missing", Links::Refuse));
+    EXPECT_EQ(Status::NotThere, file.OpenForReading(wxFileName::GetTempDir(), Links::Refuse));
+    EXPECT_EQ(Status::Refused, file.CreateNew(File("12345")));
+    ASSERT_EQ(Status::Open, file.OpenForUpdate(m_path, Links::Refuse));
+    EXPECT_TRUE(file.Append("6") && file.Rewrite("123456", "12") && file.Rewrite("12", "1234567"));
+    std::string bytes;
+    EXPECT_FALSE(file.Read(bytes, 6));
+    EXPECT_TRUE(file.Read(bytes, 7));
+    EXPECT_EQ("1234567", bytes);
+    RegularFile copy;
+    ASSERT_EQ(Status::Open, copy.CreateNew(m_path + "copy"));
+    for (const DWORD attributes : {FILE_ATTRIBUTE_READONLY, FILE_ATTRIBUTE_HIDDEN})
+    {
+        EXPECT_NE(0, SetFileAttributesW(m_path.wc_str(), attributes));
+        EXPECT_FALSE(copy.HasAttributesOf(file)) << attributes;
+        copy.TakeAttributes(file);
+        EXPECT_TRUE(copy.HasAttributesOf(file)) << attributes;
+    }
+    copy.Close();
+    EXPECT_TRUE(wxRemoveFile(m_path + "copy"));
 }
 
 TEST(UnicodeText, ALoneSurrogateIsNotText)

@@ -21,42 +21,36 @@ def read_table():
     return {folder.strip(): allowed.split() for folder, allowed in rows}
 
 
-def files(*patterns):
+def files(pattern):
     """The files of the table's folders and of new ones, with the folder of each."""
-    for pattern in patterns:
-        for path in sorted(ROOT.glob('*/' + pattern)):
-            folder = path.parent.relative_to(ROOT).as_posix()
-            if not folder.startswith(('build', '.')):
-                yield path, folder, path.read_text(encoding='utf-8')
+    for path in sorted(ROOT.glob(f'*/**/{pattern}')):
+        folder = path.parent.relative_to(ROOT).as_posix()
+        if not folder.startswith(('build', '.')):
+            yield path.relative_to(ROOT), folder, path.read_text(encoding='utf-8')
 
 
 def is_allowed(table, folder, other):
-    allowed = table.get(folder, [])
-    return other in (folder, *allowed) or '*' in allowed
+    return other == folder or not {other, '*'}.isdisjoint(table.get(folder, []))
 
 
 def wrong_includes(table):
-    for path, folder, text in files('**/*.h', '**/*.cpp'):
+    for path, folder, text in (*files('*.h'), *files('*.cpp')):
         for number, line in enumerate(text.splitlines(), 1):
             match = INCLUDE.match(line)
-            if not match:
-                continue
-            other = pathlib.PurePosixPath(match[2]).parent.as_posix()
-            is_ours = match[1] == '"' or other in table
-            if is_ours and not is_allowed(table, folder, other):
-                yield f'{path.relative_to(ROOT)}:{number}: {folder} must not include {match[2]}'
+            other = pathlib.PurePosixPath(match[2]).parent.as_posix() if match else folder
+            if (match and match[1] == '"' or other in table) and not is_allowed(table, folder, other):
+                yield f'{path}:{number}: {folder} must not include {match[2]}'
 
 
 def wrong_links(table):
-    for path, folder, text in files('**/CMakeLists.txt'):
+    for path, folder, text in files('CMakeLists.txt'):
         text = re.sub(r'#.*', '', text)
-        own = set(MAKES_TARGET.findall(text))
         for command, target, words in CHANGES_TARGET.findall(text):
-            if target not in own:
-                yield f'{path.relative_to(ROOT)}: target_{command} on {target}, which is of another folder'
-            for library in set(words.split()) & table.keys() if command == 'link_libraries' else ():
-                if not is_allowed(table, folder, library):
-                    yield f'{path.relative_to(ROOT)}: {folder} must not link {library}'
+            if target not in MAKES_TARGET.findall(text):
+                yield f'{path}: target_{command} on {target}, which is of another folder'
+            for library in words.split() if command == 'link_libraries' else ():
+                if library in table and not is_allowed(table, folder, library):
+                    yield f'{path}: {folder} must not link {library}'
 
 
 def main():

@@ -252,17 +252,6 @@ def keeps_attributes(directory):
     return True
 
 
-@contextlib.contextmanager
-def small_disk(folder):
-    """Mounts a disk of 64 megabytes at the directory."""
-    folder.mkdir()
-    subprocess.run(["mount", "-t", "tmpfs", "-o", "size=64m", "tmpfs", folder], check=True)
-    try:
-        yield folder
-    finally:
-        subprocess.run(["umount", folder], check=True)
-
-
 def main():
     mode, program, failing_calls = sys.argv[1:]
     in_memory = "/dev/shm" if keeps_attributes("/dev/shm") else None
@@ -274,7 +263,10 @@ def main():
     with tempfile.TemporaryDirectory(dir=in_memory) as name, contextlib.ExitStack() as disk:
         folder, folders, runs = pathlib.Path(name), FOLDERS, {"SWAP": try_swaps, "FULL_DISK": try_full_disk}
         if mode == "FULL_DISK":
-            folder, folders = disk.enter_context(small_disk(folder / "disk")), MANY_FOLDERS
+            folder, folders = folder / "disk", MANY_FOLDERS
+            folder.mkdir()
+            subprocess.run(["mount", "-t", "tmpfs", "-o", "size=64m", "tmpfs", folder], check=True)
+            disk.callback(subprocess.run, ["umount", folder], check=True)
         station = Workstation(folder, pathlib.Path(program), failing_calls, folders)
         for what, wrong in runs[mode](station) if mode in runs else try_calls(station, mode):
             passed += not wrong

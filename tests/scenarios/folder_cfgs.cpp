@@ -60,6 +60,10 @@ std::vector<Scenario> FolderCfgs()
         elsewhere("ATemplateOnAServerStaysWithSlashes", "//host/share/B"),
         onShare("ATemplateOnTheShareBeingLeftMoves", "share").FolderCfg(Written(onServer), Written("{default}{/}x")),
         onShare("ATemplateOnAnotherShareStays", "other").FolderCfg(Written(onServer)),
+        Scenario("ATemplateInARelativeFolderMoves")
+            .Before({{UserHive, UserValue("\"Path\"=\"x\"")}})
+            .FolderCfg(Written("x{/}B"), Written("{default}{/}B"))
+            .LogOfA(Found("x{/}B")),
         Scenario("HiddenAndSystemFilesAreWrittenAndKeepTheirAttributes")
             .Before({{CfgPlace + "#", "HS"}, {PresetPlace + "#", "HS"}})
             .FolderCfg(Written(MovedFrom), Written(MovedTo))
