@@ -71,6 +71,8 @@ std::vector<Finding> Lists()
         {Done("AListIsCutOff").Before({{ListPlace, "<HotFolders>"}}),
          "problem  HotFolderList.cfg: XML parsing error: 'no element found' at line 1"},
         {Done("AListCannotBeRead").Before({{Text(ListPlace) + "#", "0"}}).AsOtherUser(), "problem  HotFolderList.cfg: can't open file*"},
+        {Done("TheListIsADirectory").Before({{ListPlace, Removed}, {Text(ListPlace) + "/", ""}}),
+         "problem  HotFolderList.cfg: is not a file"},
         {Done("TheListsFolderCannotBeEntered").Before({{"machine/hotfolder#", "0"}}).AsOtherUser(),
          "problem  HotFolderList.cfg: its folder cannot be entered"},
         {lists("NoListedFolderIsThere", "BC"),
