@@ -72,8 +72,8 @@ TEST_F(Appearance, WithAnOldOrUnknownShellOnlyAttributesChange)
         ShellVersionResult = result;
         ShellCalls.clear();
         EXPECT_TRUE(ApplyFolderIcon(m_folder, "i.ico"));
-        EXPECT_EQ(ShellCalls == Version(), Text().empty());
-        EXPECT_EQ(FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_SYSTEM, GetFileAttributesW(Ini().wc_str()));
+        EXPECT_EQ(ShellCalls == Version(), Text().empty()) << major << "." << minor;
+        EXPECT_EQ(FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_SYSTEM, GetFileAttributesW(Ini().wc_str())) << major << "." << minor;
         wxRemoveFile(Ini());
         return ShellCalls != Version();
     };

@@ -58,3 +58,23 @@ Text LogAfter(const Scenario& scenario)
     ReplaceAll(log, "{icons}", isUpgrade ? "" : "BundleIcons{/}");
     return log;
 }
+
+void TestOn(const Scenario& scenario, const std::string& program, const std::function<void(Workstation&)>& test)
+{
+    if (IsWindowsProgram() && !scenario.notUnderWine.empty())
+        GTEST_SKIP() << scenario.notUnderWine;
+    Text description = scenario.name.what + ": " + program;
+    for (const Text& argument : scenario.arguments)
+        description += " " + argument;
+    const testing::ScopedTrace trace(scenario.name.file, scenario.name.line, description);
+    try
+    {
+        Workstation workstation(scenario.asOtherUser);
+        workstation.LayOut(WorkstationBefore(scenario));
+        test(workstation);
+    }
+    catch (const std::exception& exception)
+    {
+        FAIL() << exception.what();
+    }
+}

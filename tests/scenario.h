@@ -10,6 +10,7 @@
 
 #include <gtest/gtest.h>
 
+#include <functional>
 #include <string>
 #include <vector>
 
@@ -100,6 +101,9 @@ class Scenario
 Files WorkstationBefore(const Scenario& scenario);
 /// The whole log after the run; empty for that of the earlier run.
 std::string LogAfter(const Scenario& scenario);
+
+/// Calls the test with the scenario's workstation. A failure names the scenario, its line and the command.
+void TestOn(const Scenario& scenario, const std::string& program, const std::function<void(Workstation&)>& test);
 
 class Workstations : public testing::TestWithParam<Scenario>
 {

@@ -1,8 +1,6 @@
 #include "tests/text_files.h"
 
-#include <codecvt>
 #include <fstream>
-#include <locale>
 #include <sstream>
 #include <stdexcept>
 
@@ -34,7 +32,7 @@ bool StartsWith(const std::string& text, const std::string& start) { return text
 std::string ToUtf16(const std::string& text)
 {
     std::string result = "\xFF\xFE";
-    for (const char16_t unit : std::wstring_convert<std::codecvt_utf8_utf16<char16_t>, char16_t>().from_bytes(text))
+    for (const char16_t unit : std::filesystem::path(text).u16string()) // as the names of files are in UTF-8
         result += {static_cast<char>(unit & 0xFF), static_cast<char>(unit >> 8)};
     return result;
 }
