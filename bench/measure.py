@@ -188,6 +188,10 @@ def measure_windows(build, counts):
     for count in counts:
         print(f'{count:,} hot folders under Wine', file=sys.stderr, flush=True)
         with workstation(TMPFS, WineWorkstation, build, count) as station:
+            station.tool()
+            if station.moved() != count:
+                raise SystemExit('the tool does not move the templates')
+            station.back()
             results.append(measure(station, count, ('tool', 'logged', 'floor'), ROUNDS_UNDER_WINE))
     print('The Windows program under Wine, on a tmpfs')
     print_runs(results, {'logged': 'Tool, log on', 'floor': 'Floor'})

@@ -69,6 +69,11 @@ class Workstation(lay_out.Workstation):
     def start(self, program, *arguments, status=FINISHED):
         return self.run(f'{self.root}/program/{program}', *arguments, status=status)
 
+    def moved(self):
+        """The number of hot folders whose template is in the new folder."""
+        new = self.seen('Program Files', 'Vantorix', 'QZA', 'template').encode()
+        return sum(new in path.read_bytes() for path in self.root.glob(f'Hot Folders/*/{glob.escape(PRIVATE)}/Folder.cfg'))
+
     def tool(self):
         return self.start('FolderUpgrade', 'I', 'V')
 

@@ -23,7 +23,7 @@ class TemplateFolders
     /// folder moved to is needed only when a template moves.
     void ReportFrom(Report& report) const;
     void ReportTo(Report& report) const;
-    /// Does both, and reports what matters only in the text of presets.
+    /// Reports both if they are unknown, and what matters only in the text of presets.
     void ReportForPresets(Report& report) const;
 
   private:

@@ -4,7 +4,8 @@
 #     cmake/install_packages.sh GROUP...
 #
 # The groups are the names in packages(), below. It runs apt-get as root, or with sudo if that needs no password.
-# Otherwise it says what is missing and fails. If nothing is missing, it does not use the network. Without dpkg it only names the packages.
+# Otherwise it says what is missing and fails. If nothing is missing, it does not use the network. Without dpkg it only
+# names the packages.
 set -euo pipefail
 
 packages() {

@@ -9,8 +9,10 @@ created it.
 
 As a module, it lays out the workstations of the tests and benchmarks that are not written in C++.
 """
+import errno
 import os
 import pathlib
+import re
 import shutil
 import subprocess
 import sys
@@ -96,7 +98,9 @@ class WineWorkstation(Workstation):
         self.environment = {**os.environ, "WINEPREFIX": str(prefix), "HOME": str(prefix), "USER": "root", "LC_ALL": "C.UTF-8",
                             "WINEDEBUG": "-all", "WINEDLLOVERRIDES": "mscoree=;mshtml="}
         subprocess.run([self.server, "-p"], env=self.environment, check=True)  # it keeps running between the programs
-        self.wine("wineboot", "--init")
+        if self.wine("wineboot", "--init") != 0:
+            self.close()
+            raise RuntimeError("Wine made no prefix")
 
     def wine(self, *command, output=subprocess.DEVNULL):
         """The exit status. The output must not be a pipe, because Wine's services keep it open."""
@@ -104,8 +108,9 @@ class WineWorkstation(Workstation):
                               stderr=output).returncode
 
     def put_hive(self, name, text):
-        self.put(name, "\ufeff" + text)
-        if self.wine("regedit", "/S", self.seen(*name.split("/"))) != 0:
+        self.put("hive.reg", "\ufeff" + text)
+        self.wine("regedit", "/S", self.seen("hive.reg"))
+        if self.wine("reg", "query", re.search(r"^\[(.*)\]", text, re.MULTILINE)[1]) != 0:
             raise RuntimeError(f"{name} was not imported")
 
     def close(self):
@@ -150,22 +155,24 @@ def main(arguments):
         return 2
     directory = pathlib.Path(arguments[-1]).resolve()
     marker = directory / MARKER
-    if any(character in str(directory) for character in '\\"<>&@\n'):
-        return f'lay_out.py: a path with one of \\ " < > & @ or a line break cannot be stored in the files: {directory}'
+    if any(character in str(directory) for character in '\\"<>&\n'):
+        return f'lay_out.py: a path with one of \\ " < > & or a line break cannot be stored in the files: {directory}'
     if is_fresh and marker.is_file():
         clear(directory)
     if marker.exists():
         return f"lay_out.py: already created (--fresh creates it again): {directory}"
     if directory.exists() and not (directory.is_dir() and not any(directory.iterdir())):
         return f"lay_out.py: already exists, but is not a sample workstation: {directory}"
-    directory.mkdir(parents=True, exist_ok=True)
     try:
+        directory.mkdir(parents=True, exist_ok=True)
         marker.write_text("Created by samples/lay_out.py, which may remove this folder.\n", encoding="utf-8")
         lay_out_sample(Workstation(directory))
     except BaseException as error:
-        clear(directory)
+        if marker.is_file():
+            clear(directory)
         if isinstance(error, OSError):
-            return f"lay_out.py: {error} (the file system has to support extended attributes)"
+            hint = " (the file system has to support extended attributes)" if error.errno == errno.ENOTSUP else ""
+            return f"lay_out.py: {error}{hint}"
         raise
     return 0
 
