@@ -106,7 +106,8 @@ std::vector<Finding> Registry()
         {withPath("PathEndsInASeparator", "{PREVIOUS}{/2}"), path + "ends in a separator; no template of a hot folder moves\n" + stays},
         {withPath("PathEndsInASeparatorOnTheWayBack", "{PREVIOUS}{/2}", "U"),
          path + "ends in a separator; it is doubled in the paths of hot folders\n" + stays},
-        {withPath("PathIsEmpty", ""), path + "empty; only templates stored without a folder move\n" + stays},
+        {withPath("PathIsEmpty", "").Preset("\xEF\xBB\xBF<p/>"), path + "empty; only templates stored without a folder move\n" + stays +
+                                                                     "\nchange   .P{/}Presets{/}presets.xml: loses its byte-order mark"},
         {withPath("PathIsEmptyOnTheWayBack", "", "U"), path + "empty; templates move to the root of the drive\n" + stays},
         {withPath("PathHoldsAnAmpersand", "{PREVIOUS}&"), stays + "\n" + path + "holds & or <, which presets store in another form"},
         {withPath("WithoutPresetsAnAmpersandIsHarmless", "{PREVIOUS}&").Before(noPresets), stays + "\n" + NoPresets},
@@ -248,6 +249,7 @@ std::vector<Finding> PresetsAndLogs()
         {Done("WhatStaysMayBeReadOnly").Before({{CfgPlace + "#", "R"}}).AsOtherUser(), ""},
         {Done("AJobPresetDirCannotBeEntered").Before({{Jobs + "/.P#", "0"}}).AsOtherUser(), problem + jobs + ".P cannot be entered"},
         {Done("JPDataCannotBeEntered").Before({{Jobs + "#", "0"}}).AsOtherUser(), "problem  " + jobs + " cannot be entered"},
+        {Done("JPDataCannotBeListed").Before({{Jobs + "#", "L"}}).AsOtherUser(), "problem  " + jobs + " cannot be listed"},
         {Done("APresetIsADirectory").Before({{PresetPlace, Removed}, {PresetPlace + "/", ""}}),
          problem + "reached over a link, or not a file"},
         {Done("PresetsIsALink").Before({{PresetPlace, Removed}, {Jobs + "/.P/Presets/", "{link:elsewhere/d}"}, {"elsewhere/d/", ""}}),

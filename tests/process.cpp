@@ -14,7 +14,6 @@ namespace
 
 [[noreturn]] void Become(const Process& process)
 {
-    constexpr unsigned TimeLimitSeconds = 120;
     for (const auto& [name, value] : process.environment)
         setenv(name.c_str(), value.c_str(), 1);
     if (!std::freopen(process.output.c_str(), "w", stdout) ||
@@ -22,7 +21,7 @@ namespace
         _exit(125);
     if (process.asOtherUser && geteuid() == 0 && (setgroups(0, nullptr) != 0 || setgid(OtherUser) != 0 || setuid(OtherUser) != 0))
         _exit(126);
-    alarm(TimeLimitSeconds);
+    alarm(120);
     std::vector<char*> argv;
     for (const std::string& argument : process.commandLine)
         argv.push_back(const_cast<char*>(argument.c_str()));

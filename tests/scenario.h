@@ -1,7 +1,4 @@
 // The end-to-end scenarios: a workstation before, the command line, the workstation after.
-//
-//     Scenario("ADowngradeMovesTheTemplateBack").FolderCfg(Written(MovedTo), Written(MovedFrom)).Run({"U"}).LogOfA(Found(MovedTo))
-//
 // What a scenario does not mention has its usual value. tests/scenarios/ has one file for each subject, and texts.h,
 // with the files and log lines that the scenarios use.
 #pragma once

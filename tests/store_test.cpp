@@ -4,6 +4,7 @@
 #include "platform/unicode_text.h"
 #include "store/folder_cfg_reader.h"
 #include "store/folder_cfg_writer.h"
+#include "store/root_attributes.h"
 #include "store/xml_lookup.h"
 #include "store/xml_text.h"
 #include "store/xml_tree.h"
@@ -14,7 +15,6 @@
 #include <wx/ffile.h>
 #include <wx/filename.h>
 #include <wx/log.h>
-#include <wx/sstream.h>
 
 #include <set>
 
@@ -60,6 +60,9 @@ TEST_F(Store, TheChainOfAttributesEndsAtTheFirstGap)
                 "HFPresetName Centralized Isjobpresetattached IsCustomInterval TimeInterval PPDVersion ServerTypeAndJPDefaultKeyInfo "
                 "server_textversion server_type Quickset Quickset_Supported Quickset_Enabled IsWidthBased",
                 ' ');
+    std::set<int> places;
+    for (const RootAttribute& attribute : RootAttributes())
+        EXPECT_TRUE(places.insert(attribute.chainPlace).second) << attribute.name << " shares its place";
     for (size_t gap = 0; gap <= chain.size(); ++gap)
     {
         wxString attributes;

@@ -183,8 +183,8 @@ void Workstation::SetAttributes(const std::string& place, const std::string& let
         throw std::runtime_error("only root can give files away");
     if (has('R') && !isDirectory)
         fs::permissions(path, fs::perms(0444));
-    if (has('0'))
-        fs::permissions(path, fs::perms::none);
+    if (has('0') || has('L'))
+        fs::permissions(path, has('0') ? fs::perms::none : fs::perms::owner_exec);
 }
 
 template <typename Visit>

@@ -6,8 +6,8 @@
 //   tool/...        the folder of the executable
 //   elsewhere/...   files that the tool has no reason to touch, for example targets of links
 // A place that ends in a slash is a directory. One that ends in '#' has the attributes of the file or directory before
-// it, as letters: R read-only, H hidden, S system, X another user's, 0 no permission at all ("hot/A/Desktop.ini#" ->
-// "RS"). A snapshot of elsewhere/ also has the modes there ("R mode 444").
+// it, as letters: R read-only, H hidden, S system, X another user's, 0 no permission at all, L a directory that cannot be listed
+// ("hot/A/Desktop.ini#" -> "RS"). A snapshot of elsewhere/ also has the modes there ("R mode 444").
 //
 // In texts, {hot}, {user}, {tool}, {app}, {previous} and {default} are replaced with paths (as the tool sees them) and
 // {/} with the path separator; in capitals ({HOT}, {/2}) in the form of the registry editor's text. {repeat:COUNT:TEXT}

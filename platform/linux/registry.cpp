@@ -17,14 +17,15 @@ struct RegistryKey
     const char* lines = nullptr; // the key's lines in the hive
 };
 
-LSTATUS RegOpenKeyExW(HKEY hive, LPCWSTR path, DWORD /*options*/, REGSAM /*access*/, HKEY* key)
+LSTATUS RegOpenKeyExW(HKEY hive, LPCWSTR path, DWORD options, REGSAM /*access*/, HKEY* key)
 {
     const bool isMachine = hive == HKEY_LOCAL_MACHINE;
     const wxString name = isMachine ? "HKEY_LOCAL_MACHINE" : "HKEY_CURRENT_USER";
     const wxString folder = isMachine ? GetMachineDataFolder() : GetUserDataFolder();
     auto opened = std::make_unique<RegistryKey>();
     RegularFile file;
-    if (file.OpenForReading(folder + "/registry/" + name + ".reg", Links::Follow) !=
+    if (options != 0 || // none is supported
+        file.OpenForReading(folder + "/registry/" + name + ".reg", Links::Follow) !=
             RegularFile::Status::Open ||
         !file.Read(opened->hive))
         return ERROR_FILE_NOT_FOUND;

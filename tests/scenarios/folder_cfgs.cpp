@@ -61,9 +61,9 @@ std::vector<Scenario> FolderCfgs()
         onShare("ATemplateOnTheShareBeingLeftMoves", "share").FolderCfg(Written(onServer), Written("{default}{/}x")),
         onShare("ATemplateOnAnotherShareStays", "other").FolderCfg(Written(onServer)),
         Scenario("ATemplateInARelativeFolderMoves")
-            .Before({{UserHive, UserValue("\"Path\"=\"x\"")}})
-            .FolderCfg(Written("x{/}B"), Written("{default}{/}B"))
-            .LogOfA(Found("x{/}B")),
+            .Before({{UserHive, UserValue("\"Path\"=\"x{/2}y\"")}})
+            .FolderCfg(Written("x{/}y{/}B"), Written("{default}{/}B"))
+            .LogOfA(Found("x{/}y{/}B")),
         Scenario("HiddenAndSystemFilesAreWrittenAndKeepTheirAttributes")
             .Before({{CfgPlace + "#", "HS"}, {PresetPlace + "#", "HS"}})
             .FolderCfg(Written(MovedFrom), Written(MovedTo))

@@ -69,6 +69,7 @@ std::vector<Scenario> Sizes()
         loaded("SixteenKilobytesAreHarmless", {Cfg(Times(2300, "<e>") + Times(2300, "</e>")), Cfg("<a>" + Times(16000, "\n") + "</a>"),
                                                Cfg("<a" + Times(1200, " b#=''") + "/>"), Cfg("<a b='&a6;'/>", DocumentType(Entities(6))),
                                                Cfg(Times(1900, "<a/>"), DocumentType("<!ATTLIST a b CDATA '" + Times(8000, "x") + "'>"))}),
+        loaded("ATextOf9000LinesIsLoaded", {Cfg("<a>" + Times(9000, "123456789\n") + "</a>")}),
         loaded("ADepthOf100000IsLoaded", {Cfg(Times(100000, "<e>") + Times(100000, "</e>"))}),
         loaded("ManyShortTextsAndCommentsAreLoaded", {Cfg("<a>" + Times(60000, "x<!--c-->") + "</a>", DocumentType(""))}),
         Scenario("100000EntriesAndElementsAreKept")
