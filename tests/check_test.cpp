@@ -14,6 +14,7 @@ const Text Ini = "hot/A/Desktop.ini";
 const Text Jobs = "user/ORX/JPData";
 const Text LogFolder = "user/ORX_Installers";
 const char* const NoLinks = "Wine does not show links to files as links";
+const char* const CannotEnter = "Wine cannot enter a directory that it cannot list";
 const char* const NoRefusal = "Wine lets every user open a directory for writing";
 
 const Text Moves = "change   Folder.cfg: " + MovedFrom + " -> " + MovedTo + "\n";
@@ -249,7 +250,8 @@ std::vector<Finding> PresetsAndLogs()
         {Done("WhatStaysMayBeReadOnly").Before({{CfgPlace + "#", "R"}}).AsOtherUser(), ""},
         {Done("AJobPresetDirCannotBeEntered").Before({{Jobs + "/.P#", "0"}}).AsOtherUser(), problem + jobs + ".P cannot be entered"},
         {Done("JPDataCannotBeEntered").Before({{Jobs + "#", "0"}}).AsOtherUser(), "problem  " + jobs + " cannot be entered"},
-        {Done("JPDataCannotBeListed").Before({{Jobs + "#", "L"}}).AsOtherUser(), "problem  " + jobs + " cannot be listed"},
+        {Done("JPDataCannotBeListed").Before({{Jobs + "#", "L"}}).AsOtherUser().NotUnderWine(CannotEnter),
+         "problem  " + jobs + " cannot be listed"},
         {Done("APresetIsADirectory").Before({{PresetPlace, Removed}, {PresetPlace + "/", ""}}),
          problem + "reached over a link, or not a file"},
         {Done("PresetsIsALink").Before({{PresetPlace, Removed}, {Jobs + "/.P/Presets/", "{link:elsewhere/d}"}, {"elsewhere/d/", ""}}),
