@@ -11,7 +11,6 @@
 #include "tests/text_files.h"
 
 #include <gtest/gtest.h>
-#include <wx/arrstr.h>
 #include <wx/ffile.h>
 #include <wx/filename.h>
 #include <wx/log.h>

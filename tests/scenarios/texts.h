@@ -9,8 +9,6 @@ using Text = std::string;
 inline const Text MovedFrom = "{previous}{/}Booklet.tpl";
 inline const Text MovedTo = "{default}{/}Booklet.tpl";
 
-// Files ------------------------------------------------------------------------------------------
-
 inline Text Hive(const Text& key, const Text& value)
 {
     return "Windows Registry Editor Version 5.00\r\n\r\n[" + key + "]\r\n\"Other\"=dword:00000001\r\n" + value + "\r\n";
@@ -53,7 +51,7 @@ inline Text MinimalWritten(const Text& path, const Text& name = "n")
 /// A template path as a preset stores it.
 inline Text Stored(const Text& path) { return "<K n=\"ORXImposeTemplate\">\"" + path + "\"</K>\r\n"; }
 
-// Logs; {icons} is where the icons of the run's direction come from -----------------------------
+// Log lines; {icons} is where the icons of the run's direction come from.
 
 /// One folder's lines: those of its icon and those of its template.
 inline Text FolderLines(const Text& name, int position, const Text& icon, const Text& impose)
