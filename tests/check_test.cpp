@@ -3,7 +3,6 @@
 #include "tests/check_report.h"
 #include "tests/scenarios/texts.h"
 
-#include <regex>
 #include <sstream>
 
 namespace
@@ -297,8 +296,12 @@ TEST_P(Findings, AreReported)
                Text actual;
                std::istringstream text(report.text);
                for (Text line; std::getline(text, line);)
-                   actual += StartsWith(line, "  ") ? line.substr(2, line.find_last_not_of('\r') - 1) + "\n" : ""; // without the titles
-               actual = std::regex_replace(actual, std::regex("can't open file[^\n]*"), "can't open file*");
+               {
+                   line.erase(line.find_last_not_of('\r') + 1);
+                   if (line.find("can't open file '") != Text::npos)
+                       line.replace(line.find(" '"), Text::npos, "*");
+                   actual += StartsWith(line, "  ") ? line.substr(2) + "\n" : ""; // without the titles
+               }
                EXPECT_EQ(workstation.Expand(lines.empty() ? "" : lines + "\n"), actual) << report.text;
            });
 }
@@ -313,10 +316,9 @@ TEST(Check, ReportsInBlocks)
     Text report = CheckReport(workstation, workstation.Start({"i"}, "FolderUpgradeCheck")).text;
     ReplaceAll(report, "\r\n", "\n");
     const size_t head = report.find('\n') + 1;
-    EXPECT_TRUE(std::regex_match(
-        report.substr(0, head),
-        std::regex("FolderUpgradeCheck [0-9]+\\.[0-9]+\\.[0-9]+, upgrade, 20[0-9-]+ [0-9]+:[0-9]+, [^,]+, (not )?elevated\n")))
-        << report;
+    const testing::Matcher<const Text&> isHead =
+        testing::MatchesRegex("FolderUpgradeCheck [0-9]+\\.[0-9]+\\.[0-9]+, upgrade, 20[0-9-]+ [0-9]+:[0-9]+, [^,]+, (not )?elevated\n");
+    EXPECT_TRUE(isHead.Matches(report.substr(0, head))) << report;
     EXPECT_EQ(workstation.Expand("From {previous} to {default}\n\nWorkstation\n"
                                  "  note     there will be no run log: there is no folder {user}{/}ORX_Installers{/}\n\n{hot}{/}A\n"
                                  "  problem  Folder.cfg: Centralized=\"2x\" comes out as \"0\"\n"

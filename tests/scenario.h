@@ -69,7 +69,6 @@ class Scenario
     /// Limits of the run. None applies in a build with sanitizers, and no memory limit under Wine. The measured memory
     /// is never below that of the test program at the start, about 25 megabytes.
     Scenario& Within(double most, long mostMegabytes) { return Set(seconds, most).Set(megabytes, mostMegabytes); }
-    /// Why the scenario cannot work there.
     Scenario& NotUnderWine(const std::string& reason) { return Set(notUnderWine, reason); }
 
     Name name;

@@ -76,5 +76,4 @@ class Workstation
     Files m_tokens;
 };
 
-/// Whether the executable under test is the Windows program.
 bool IsWindowsProgram();
