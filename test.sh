@@ -40,6 +40,7 @@ build() {
 count() {
     awk '
         /<testcase / { status = $0; sub(/.* status="/, "", status); sub(/".*/, "", status); own = "" }
+        { sub(/^[ \t]*<system-out>/, "") }
         /^skipped / { print }
         /^[0-9]+ passed, [0-9]+ failed, [0-9]+ skipped$/ { own = $0 }
         /<skipped message/ { status = "skipped" }
