@@ -31,7 +31,7 @@ LOG_DIR = "user/ORX_Installers"
 LOG = LOG_DIR + "/UpgradeDowngrade.log"
 REWRITTEN = ("Folder.cfg", "presets.xml")
 
-# The event of failing_calls.cpp, and the calls at which it happens; None for all of them.
+# The event of failing_calls.cpp, and the calls at which it happens, "" for all of them.
 MODES = {
     "EIO": ("f", ""),
     "ENOSPC": ("f", "open64 pwrite64 fallocate64 ftruncate64 setxattr "),
@@ -130,9 +130,9 @@ class Workstation:
         for file in [program, *program.parent.glob("*.ico")]:
             shutil.copy2(file, self.root / "program")
         outside = lay_out.Workstation(self.outside_before, self.root)
-        outside.put("empty/other", "a file")
+        outside.put("empty/other", "a file")  # a hot folder without a private directory
         for name, text in files_of(folders).items():
-            if name.startswith(("Hot", "user/ORX")):  # hot folders, one without a private directory, presets, the log's folder
+            if name.startswith(("Hot", "user/ORX")):  # hot folders, job presets, the log's folder
                 outside.put(name, text)
         self.before = look(self.original)
         self.run(0, "f")
