@@ -29,12 +29,13 @@ Switch ReadSwitch(const wxString& text)
     return text.CmpNoCase("U") == 0 ? Switch::Downgrade : Switch::Invalid;
 }
 
-void UpdateHotFolder(const FolderUpgradeApp& app, const wxString& folder, int position)
+void UpdateHotFolder(const FolderUpgradeApp& app, const wxString& path, int position)
 {
+    HotFolder folder(path);
     UpdateFolderIcon(app, folder);
-    RunLog(L"Updated icon for hf" + folder, position);
+    RunLog(L"Updated icon for hf" + path, position);
     UpdateHotFolderImposePath(app, folder);
-    RunLog(L"updated Impose path for hf" + folder, position);
+    RunLog(L"updated Impose path for hf" + path, position);
 }
 
 } // namespace

@@ -6,31 +6,35 @@
 #include <wx/hashmap.h>
 
 #include <algorithm>
-#include <functional>
-#include <unordered_map>
+#include <initializer_list>
+#include <unordered_set>
 #include <vector>
 
 namespace
 {
 
-size_t Mix(size_t left, size_t right)
-{
-    constexpr size_t Odd = 0x9E3779B9; // spreads the bits
-    return (left ^ (right + Odd + (left << 6) + (left >> 2))) * Odd;
-}
+using Texts = std::initializer_list<const wchar_t*>;
 
-size_t Hash(const wxString& text)
+bool IsOneOf(const Texts& texts, const wxString& text)
 {
-    return wxStringHash()(text);
+    return std::any_of(texts.begin(), texts.end(),
+                       [&](const wchar_t* each) { return text == each; });
 }
 
 bool IsSection(const wxString& name)
 {
-    const auto sections = {FolderCfg::InputFormatsSection,  FolderCfg::PathsSection,
-                           FolderCfg::JobSettingSection,    FolderCfg::ImposeSettingSection,
-                           FolderCfg::FilterSettingSection, FolderCfg::PreflightSection};
-    return std::any_of(sections.begin(), sections.end(),
-                       [&](const wchar_t* section) { return name == section; });
+    return IsOneOf({FolderCfg::InputFormatsSection, FolderCfg::PathsSection,
+                    FolderCfg::JobSettingSection, FolderCfg::ImposeSettingSection,
+                    FolderCfg::FilterSettingSection, FolderCfg::PreflightSection},
+                   name);
+}
+
+// The writer adds these attributes where they are missing.
+bool IsAdded(const wxString& name)
+{
+    return IsOneOf({FolderCfg::Path, FolderCfg::ShortName, FolderCfg::DisplayName, FolderCfg::Key,
+                    FolderCfg::Value, FolderCfg::KeyDisplayValue, FolderCfg::LocDisplayValue},
+                   name);
 }
 
 wxString WithoutWhiteSpace(const wxString& text)
@@ -44,13 +48,13 @@ wxString WithoutWhiteSpace(const wxString& text)
     return result;
 }
 
-// A node below the root, with a hash of everything that identifies it: its name and attributes or
-// its text, and the names of the nodes above it up to its section. A section counts as directly
-// below the root wherever it is, as it does for the readers.
+// A node below the root, with a text that identifies it: its name and attributes or its text, and
+// the names of the nodes above it up to its section. A section counts as directly below the root
+// wherever it is, as it does for the readers.
 struct Thing
 {
     const wxXmlNode* node;
-    size_t fingerprint;
+    wxString identity;
 };
 
 bool IsElement(const wxXmlNode& node)
@@ -58,16 +62,22 @@ bool IsElement(const wxXmlNode& node)
     return node.GetType() == wxXML_ELEMENT_NODE;
 }
 
-// The same in any order. Outside the filter setting the writer adds empty attributes.
-size_t AttributesFingerprint(const wxXmlNode& element, bool withEmpty)
+// The same in any order.
+wxString AttributesIdentity(const wxXmlNode& element, bool isInFilter)
 {
-    size_t sum = 0;
-    for (const wxXmlAttribute* each = element.GetAttributes(); each; each = each->GetNext())
+    AttributeMap attributes;
+    CollectAttributes(element, attributes);
+    const wxXmlAttribute* first = element.GetAttributes();
+    if (element.GetParent()->GetName() == FolderCfg::ImposeSettingSection && first &&
+        first->GetNext() && first->GetValue() == FolderCfg::ImposeTemplateKey)
+        attributes[first->GetNext()->GetName()].clear(); // the path that is meant to change
+    wxString identity;
+    for (const auto& [name, value] : attributes)
     {
-        if (withEmpty || !each->GetValue().empty())
-            sum += Mix(Hash(each->GetName()), Hash(each->GetValue()));
+        if (isInFilter || !value.empty() || !IsAdded(name))
+            identity += "\n" + name + "=" + value;
     }
-    return sum;
+    return identity;
 }
 
 // Comments and white space are left out.
@@ -76,11 +86,11 @@ std::vector<Thing> Collect(const wxXmlNode& root)
     struct Open
     {
         const wxXmlNode* next;
-        size_t place;
+        wxString place;
         bool isInFilter;
     };
     std::vector<Thing> things;
-    std::vector<Open> open = {{root.GetChildren(), 0, false}};
+    std::vector<Open> open = {{root.GetChildren(), wxString(), false}};
     while (!open.empty())
     {
         const wxXmlNode* node = open.back().next;
@@ -94,8 +104,8 @@ std::vector<Thing> Collect(const wxXmlNode& root)
         if (IsElement(*node))
         {
             const bool isSection = !isInFilter && IsSection(node->GetName());
-            const size_t own = Mix(isSection ? 0 : place, Hash(node->GetName()));
-            things.push_back({node, Mix(own, AttributesFingerprint(*node, isInFilter))});
+            const wxString own = (isSection ? wxString() : place) + "/" + node->GetName();
+            things.push_back({node, own + AttributesIdentity(*node, isInFilter)});
             open.push_back(
                 {node->GetChildren(), own,
                  isInFilter || (isSection && node->GetName() == FolderCfg::FilterSettingSection)});
@@ -104,20 +114,9 @@ std::vector<Thing> Collect(const wxXmlNode& root)
         const wxString text = WithoutWhiteSpace(node->GetContent());
         if (node->GetType() == wxXML_PI_NODE ||
             (node->GetType() != wxXML_COMMENT_NODE && !text.empty()))
-            things.push_back(
-                {node, Mix(Mix(place, static_cast<size_t>(node->GetType())), Hash(text))});
+            things.push_back({node, place + wxString::Format("\r%d\r", node->GetType()) + text});
     }
     return things;
-}
-
-bool HasAll(const wxXmlNode& element, const wxXmlNode& wanted)
-{
-    for (const wxXmlAttribute* each = wanted.GetAttributes(); each; each = each->GetNext())
-    {
-        if (!element.HasAttribute(each->GetName()))
-            return false;
-    }
-    return true;
 }
 
 // As much of a text as is readable in one line.
@@ -143,13 +142,13 @@ wxString Describe(const wxXmlNode& node)
 void FindLostThings(const wxXmlNode& before, const wxXmlNode& after, wxArrayString& losses)
 {
     // Each node of the new document can match one of the old.
-    std::unordered_multimap<size_t, const wxXmlNode*> pool;
+    std::unordered_multiset<wxString, wxStringHash> pool;
     for (const Thing& thing : Collect(after))
-        pool.emplace(thing.fingerprint, thing.node);
+        pool.insert(thing.identity);
     for (const Thing& thing : Collect(before))
     {
-        const auto found = pool.find(thing.fingerprint);
-        if (found != pool.end() && HasAll(*found->second, *thing.node))
+        const auto found = pool.find(thing.identity);
+        if (found != pool.end())
             pool.erase(found);
         else
             losses.Add("loses " + Describe(*thing.node));
@@ -158,22 +157,22 @@ void FindLostThings(const wxXmlNode& before, const wxXmlNode& after, wxArrayStri
 
 void FindLostAttributes(const wxXmlNode& root, wxArrayString& losses)
 {
+    const AttributeGap gap = FindAttributeGap(root);
+    if (!gap.reset.empty())
+        losses.Add("lacks \"" + gap.missing + "\", so the rewrite resets: " + gap.reset +
+                   (gap.isDisabled ? " (the folder ends up disabled)" : ""));
     AttributeMap attributes;
     CollectAttributes(root, attributes);
     HotFolderSettings settings;
-    const RootAttribute* gap = ReadRootAttributes(attributes, settings);
-    if (gap)
-        losses.Add(wxString("lacks the attribute \"") + gap->name +
-                   "\"; the rewrite sets it and all that follow it to their defaults" +
-                   (FindGapBeforeEnable(root) ? " (the folder comes out disabled)" : ""));
-    for (const RootAttribute& each : RootAttributes())
+    const size_t read = ReadRootAttributes(attributes, settings);
+    for (size_t i = 0; i < RootAttributes().size(); ++i)
     {
+        const RootAttribute& each = RootAttributes()[i];
         const auto found = attributes.find(each.name);
         if (found == attributes.end())
             continue;
-        const bool isRead = !gap || each.chainPlace < gap->chainPlace;
         const wxString now = each.Format(settings);
-        if (isRead && each.form != AttributeForm::Text &&
+        if (i < read && each.form != AttributeForm::Text &&
             wxString(found->second).Trim().Trim(false) != now)
             losses.Add(wxString(each.name) + "=\"" + Shown(found->second) + "\" comes out as \"" +
                        now + "\"");
@@ -201,24 +200,30 @@ wxArrayString FindFolderCfgLosses(const wxXmlDocument& document, const std::stri
         losses.Add("its root <" + root.GetName() + "> comes out as <" + FolderCfg::Root + ">");
     FindLostAttributes(root, losses);
     wxXmlDocument after;
-    if (LoadXml(rewritten, after, wxXMLDOC_KEEP_WHITESPACE_NODES) == XmlLoad::Loaded)
+    if (LoadXml(rewritten, after).state == XmlLoad::State::Loaded)
         FindLostThings(root, *after.GetRoot(), losses);
     return losses;
 }
 
-const RootAttribute* FindGapBeforeEnable(const wxXmlNode& root)
+AttributeGap FindAttributeGap(const wxXmlNode& root)
 {
     AttributeMap attributes;
     CollectAttributes(root, attributes);
     HotFolderSettings settings;
-    const RootAttribute* gap = ReadRootAttributes(attributes, settings);
-    if (!gap || gap->chainPlace > EnablePlace)
-        return nullptr;
-    for (const RootAttribute& each : RootAttributes())
+    const size_t read = ReadRootAttributes(attributes, settings);
+    AttributeGap gap;
+    for (size_t i = read; i < RootAttributes().size(); ++i)
     {
+        const RootAttribute& each = RootAttributes()[i];
         const auto found = attributes.find(each.name);
-        if (each.chainPlace == EnablePlace && found != attributes.end())
-            each.Read(found->second, settings);
+        HotFolderSettings stored;
+        if (found != attributes.end())
+            each.Read(found->second, stored);
+        if (each.Format(stored) == each.Format(settings))
+            continue;
+        gap.missing = RootAttributes()[read].name;
+        gap.reset += (gap.reset.empty() ? wxString() : wxString(", ")) + each.name;
+        gap.isDisabled = gap.isDisabled || stored.Enable;
     }
-    return settings.Enable ? gap : nullptr;
+    return gap;
 }

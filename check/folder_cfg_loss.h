@@ -13,6 +13,12 @@
 /// with wxXMLDOC_KEEP_WHITESPACE_NODES.
 wxArrayString FindFolderCfgLosses(const wxXmlDocument& document, const std::string& rewritten);
 
-/// The missing attribute that ends the chain of root attributes before Enable, although Enable is
-/// set; null if there is none.
-const RootAttribute* FindGapBeforeEnable(const wxXmlNode& root);
+/// The missing attribute that ends the chain of root attributes, if values are lost by it.
+struct AttributeGap
+{
+    wxString missing;
+    wxString reset;          // the names of those values
+    bool isDisabled = false; // whether the folder was enabled, and comes out disabled
+};
+
+AttributeGap FindAttributeGap(const wxXmlNode& root);

@@ -2,9 +2,8 @@
 #pragma once
 
 #include "check/report.h"
-#include "check/template_folders.h"
-
-#include <wx/string.h>
+#include "migrate/template_folders.h"
+#include "store/hot_folder.h"
 
 /// Changes nothing.
-void CheckHotFolder(const wxString& hotFolder, const TemplateFolders& folders, Report& report);
+void CheckHotFolder(HotFolder& folder, TemplateFolders& folders, Report& report);

@@ -1,10 +1,8 @@
 #include "check/preset_check.h"
 
-#include "check/library_errors.h"
 #include "check/reach.h"
+#include "check/template_folders_check.h"
 #include "migrate/job_preset_files.h"
-#include "migrate/preset_text.h"
-#include "platform/unicode_text.h"
 #include "store/xml_encoding.h"
 
 #include <wx/convauto.h>
@@ -43,9 +41,9 @@ bool IsTakenAsLatin1(const std::string& bytes)
            wxString::FromUTF8(bytes.data(), bytes.size()).empty();
 }
 
-void CheckContent(const wxString& name, const std::string& before, const RewrittenPreset& rewritten,
-                  Report& report)
+void CheckContent(const wxString& name, const RewrittenPreset& rewritten, Report& report)
 {
+    const std::string& before = rewritten.before;
     const wxString encoding = DeclaredEncoding(rewritten.bytes);
     if (!encoding.empty() && encoding.CmpNoCase("UTF-8") != 0)
         report.Problem(name + ": declares the encoding " + encoding + ", but comes out as UTF-8");
@@ -60,32 +58,29 @@ void CheckContent(const wxString& name, const std::string& before, const Rewritt
                                        rewritten.movedPaths == 1 ? "" : "s"));
 }
 
-void CheckPreset(JobPresetFile& preset, const wxString& name, const TemplateFolders& folders,
+void CheckPreset(JobPresetFile& preset, const wxString& name, TemplateFolders& folders,
                  Report& report)
 {
-    const RegularFile::Status status = preset.OpenForReading();
-    if (status == RegularFile::Status::Refused)
-        report.Problem(name + ": cannot be opened for reading (" + TakeLibraryErrors() + ")");
-    else if (status != RegularFile::Status::Open)
-        report.Problem(name + ": reached over a link, or not a file");
-    if (status != RegularFile::Status::Open)
-        return;
-    std::string before;
-    if (!preset.GetFile().Read(before))
+    const RegularFile& file = preset.GetFile();
+    const RegularFile::Status opened = preset.OpenForReading();
+    if (opened != RegularFile::Status::Open)
     {
-        report.Problem(name + ": left as it is (cannot be read)");
+        report.Problem(name + (opened == RegularFile::Status::Refused
+                                   ? ": cannot be opened for reading (" +
+                                         file.GetFailure().Describe(preset.GetPath()) + ")"
+                                   : wxString(": reached over a link, or not a file")));
         return;
     }
-    const RewrittenPreset rewritten = RewritePreset(before, folders.From(), folders.To());
+    const RegularFile::Status reopened = preset.GetFile().ReopenForUpdate();
+    const FailedCall reopening = file.GetFailure();
+    const RewrittenPreset rewritten = preset.Decide(folders.From().path, folders.To().path);
     if (rewritten.reasonToStay)
         report.Problem(name + ": left as it is (" + rewritten.reasonToStay + ")");
-    else if (preset.GetFile().ReopenForUpdate() != RegularFile::Status::Open)
-    {
-        preset.GetFile().ReportNotReopened(preset.GetPath()); // for the system's reason
-        report.Problem(name + ": cannot be opened for writing (" + TakeLibraryErrors() + ")");
-    }
+    else if (reopened != RegularFile::Status::Open)
+        report.Problem(name + ": cannot be opened for writing (" +
+                       reopening.Describe(preset.GetPath()) + ")");
     else
-        CheckContent(name, before, rewritten, report);
+        CheckContent(name, rewritten, report);
 }
 
 // Why a presets.xml that may exist cannot be seen; empty if it does not exist.
@@ -101,17 +96,16 @@ wxString WhyMissing(const JobPresetFile& preset, const wxString& directory)
 }
 
 // False if there is no preset.
-bool CheckDirectory(const wxString& directory, const wxString& root, const TemplateFolders& folders,
+bool CheckDirectory(const wxString& directory, const wxString& root, TemplateFolders& folders,
                     Report& report)
 {
     JobPresetFile preset(directory);
     const wxString name = preset.GetPath().Mid(root.length());
     if (preset.IsThere())
     {
-        folders.ReportForPresets(report);
-        if (folders.AreKnown())
+        CheckFoldersForPresets(folders, report);
+        if (folders.From().isKnown && folders.To().isKnown)
             CheckPreset(preset, name, folders, report);
-        TakeLibraryErrors();
         return true;
     }
     const wxString obstacle = WhyMissing(preset, directory);
@@ -122,24 +116,20 @@ bool CheckDirectory(const wxString& directory, const wxString& root, const Templ
 
 } // namespace
 
-void CheckPresets(const TemplateFolders& folders, Report& report)
+void CheckPresets(TemplateFolders& folders, Report& report)
 {
     const wxString root = JobPresetRoot();
-    wxArrayString directories;
-    const bool isThere = ListJobPresetDirs(root, directories);
-    const wxString errors = TakeLibraryErrors();
+    const JobPresetDirs directories = ListJobPresetDirs(root);
     const wxString obstacle = WhyOutOfReach(root);
     if (!obstacle.empty())
         report.Problem(root + " " + obstacle);
-    else if (!errors.empty())
-        report.Problem(root + ": " + errors);
-    else if (isThere && !wxFileName::IsDirReadable(root))
+    else if (directories.failure)
         report.Problem(root + " cannot be listed");
-    bool hasPresets = false;
-    for (const wxString& directory : directories)
+    bool hasPresets = !obstacle.empty() || directories.failure;
+    for (const wxString& directory : directories.paths)
         hasPresets = CheckDirectory(directory, root, folders, report) || hasPresets;
-    if (!hasPresets && errors.empty() && obstacle.empty() &&
-        (!isThere || wxFileName::IsDirReadable(root)))
-        report.Note(isThere ? "there are no presets in " + root
-                            : "there are no presets, because there is no folder " + root);
+    if (!hasPresets)
+        report.Note(directories.isThere
+                        ? "there are no presets in " + root
+                        : "there are no presets, because there is no folder " + root);
 }

@@ -2,6 +2,6 @@
 #pragma once
 
 #include "check/report.h"
-#include "check/template_folders.h"
+#include "migrate/template_folders.h"
 
-void CheckPresets(const TemplateFolders& folders, Report& report);
+void CheckPresets(TemplateFolders& folders, Report& report);

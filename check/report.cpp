@@ -3,6 +3,7 @@
 #include "platform/standard_output.h"
 #include "platform/unicode_text.h"
 
+#include <wx/filename.h>
 #include <wx/textbuf.h>
 
 namespace
@@ -17,8 +18,16 @@ wxString Count(size_t number, const wxString& what)
 
 Report::Report(const wxString& fileName) : m_toFile(!fileName.empty())
 {
-    if (m_toFile)
-        m_isWritten = m_file.Open(fileName, "wb");
+    if (!m_toFile)
+        return;
+    wxFileName path(fileName);
+    path.MakeAbsolute();
+    const PinnedDirectory directory(path.GetPath(wxPATH_GET_VOLUME | wxPATH_GET_SEPARATOR),
+                                    Links::Follow);
+    const wxString name = path.GetFullName();
+    m_isWritten = (m_file.OpenForUpdate(directory, name) == RegularFile::Status::Open &&
+                   m_file.SetLength(0)) ||
+                  m_file.CreateNew(directory, name) == RegularFile::Status::Open;
 }
 
 void Report::Head(const wxString& text)
@@ -59,11 +68,6 @@ bool Report::End()
     Write("");
     Write(Count(m_counts[Changes], "change") + ", " + Count(m_counts[Problems], "problem") + ", " +
           Count(m_counts[Notes], "note"));
-    if (m_file.IsOpened() && !m_file.Close())
-    {
-        m_file.Detach(); // or the library closes it again
-        m_isWritten = false;
-    }
     return m_isWritten;
 }
 
@@ -106,5 +110,5 @@ void Report::Write(const wxString& text)
     if (!m_toFile)
         m_isWritten = WriteStandardOutput(line) && m_isWritten;
     else if (m_isWritten)
-        m_isWritten = m_file.Write(line, wxConvUTF8);
+        m_isWritten = m_file.Append(line.utf8_string());
 }

@@ -2,8 +2,9 @@
 // knowing.
 #pragma once
 
+#include "platform/regular_file.h"
+
 #include <wx/arrstr.h>
-#include <wx/ffile.h>
 #include <wx/string.h>
 
 #include <array>
@@ -12,7 +13,8 @@
 class Report
 {
   public:
-    /// Writes to the file, or to the standard output if the name is empty.
+    /// Writes to the file, or to the standard output if the name is empty. A link or a pipe in
+    /// place of the file is not written to.
     explicit Report(const wxString& fileName);
 
     /// Writes a line of the head, which comes before all blocks.
@@ -47,7 +49,7 @@ class Report
     void EndBlock();
     void Write(const wxString& text);
 
-    wxFFile m_file;
+    RegularFile m_file;
     const bool m_toFile;
     bool m_isWritten = true;
     wxString m_title;

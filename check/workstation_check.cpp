@@ -1,6 +1,5 @@
 #include "check/workstation_check.h"
 
-#include "check/library_errors.h"
 #include "check/reach.h"
 #include "platform/access_rights.h"
 #include "platform/regular_file.h"
@@ -33,7 +32,6 @@ void CheckEntries(const HotFolderList& list, Report& report)
 
 void CheckHotFolderList(const HotFolderList& list, Report& report)
 {
-    const wxString errors = TakeLibraryErrors();
     const wxString obstacle = WhyOutOfReach(GetHotFolderDataDir());
     switch (list.state)
     {
@@ -47,7 +45,7 @@ void CheckHotFolderList(const HotFolderList& list, Report& report)
             report.Note("there is no HotFolderList.cfg");
         break;
     case XmlFile::State::NotReadable:
-        report.Problem("HotFolderList.cfg: " + errors);
+        report.Problem("HotFolderList.cfg: " + list.whyNotReadable);
         break;
     case XmlFile::State::TooLarge:
         report.Problem("HotFolderList.cfg: too large to read safely");
@@ -79,12 +77,10 @@ void CheckRunLog(Report& report)
         return;
     }
     RegularFile log;
-    const RegularFile::Status status = log.OpenForUpdate(path, Links::Refuse);
+    const RegularFile::Status status =
+        log.OpenForUpdate(PinnedDirectory(folder, Links::Refuse), RunLogFileName);
     if (status == RegularFile::Status::Refused)
-    {
-        ReportNotOpened(path); // to get the system's reason
-        report.Problem("there will be no run log: " + TakeLibraryErrors());
-    }
+        report.Problem("there will be no run log: " + log.GetFailure().Describe(path));
     else if (status == RegularFile::Status::NotThere && wxFileName::Exists(path))
         report.Note("there will be no run log: something else has its name: " + path);
     else if (status == RegularFile::Status::NotThere && !MayCreateIn(folder))

@@ -1,5 +1,6 @@
 #include "migrate/job_preset_files.h"
 
+#include "platform/access_rights.h"
 #include "platform/standard_folders.h"
 
 #include <wx/dir.h>
@@ -53,15 +54,21 @@ wxString JobPresetRoot()
     return root.GetFullPath();
 }
 
-bool ListJobPresetDirs(const wxString& root, wxArrayString& directories)
+JobPresetDirs ListJobPresetDirs(const wxString& root)
 {
-    if (!wxFileName::DirExists(root))
-        return false;
+    JobPresetDirs directories;
+    directories.isThere = wxFileName::DirExists(root);
+    if (!directories.isThere)
+        return directories;
+    // The library would report it by itself.
+    directories.failure = WhyNotListed(root);
+    if (directories.failure)
+        return directories;
     const wxDir directory(root);
-    wxDirTraverserSimple collector(directories);
+    wxDirTraverserSimple collector(directories.paths);
     if (directory.IsOpened())
         directory.Traverse(collector, wxString(), wxDIR_FILES | wxDIR_DIRS | wxDIR_HIDDEN);
-    return true;
+    return directories;
 }
 
 JobPresetFile::JobPresetFile(const wxString& directory)
@@ -84,11 +91,19 @@ bool JobPresetFile::IsThere() const
 
 RegularFile::Status JobPresetFile::OpenForReading()
 {
-    const RegularFile::Status status =
-        m_file.OpenForReading(m_presets.Reach(PresetFileName), Links::Refuse);
-    if (status == RegularFile::Status::Refused)
-        ReportNotOpened(m_path);
-    return status;
+    return m_file.OpenForReading(m_presets, PresetFileName);
+}
+
+RewrittenPreset JobPresetFile::Decide(const wxString& from, const wxString& to)
+{
+    std::string before;
+    RewrittenPreset preset;
+    if (m_file.Read(before))
+        preset = RewritePreset(before, from, to);
+    else
+        preset.reasonToStay = PresetStays::NotRead;
+    preset.before.swap(before);
+    return preset;
 }
 
 RegularFile& JobPresetFile::GetFile()

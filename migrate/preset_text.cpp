@@ -1,11 +1,11 @@
 #include "migrate/preset_text.h"
 
+#include "platform/path_normal_form.h"
 #include "platform/unicode_text.h"
 #include "store/folder_cfg_format.h"
 #include "store/xml_text.h"
 
 #include <wx/convauto.h>
-#include <wx/filename.h>
 #include <wx/textbuf.h>
 
 #include <vector>
@@ -14,12 +14,6 @@ namespace
 {
 
 const char* const PathIntroduction = "\">\"";
-
-void TrimSeparators(wxString& folder)
-{
-    while (!folder.empty() && wxFileName::IsPathSeparator(folder.Last()))
-        folder.RemoveLast();
-}
 
 bool EndsFolder(const wxString& text, size_t position)
 {
@@ -67,18 +61,18 @@ const char* Decode(const std::string& bytes, wxString& text)
         return nullptr;
     wxString(bytes.data(), wxConvAuto(), bytes.length()).swap(text); // assigning would copy it
     if (text.empty())
-        return "cannot be decoded";
+        return PresetStays::NotDecoded;
     if (wxTextBuffer::typeDefault == wxTextFileType_Dos)
         text.Replace("\r\n", "\n");
-    return IsUnicodeText(text) ? nullptr : "cannot be encoded again";
+    return IsUnicodeText(text) ? nullptr : PresetStays::NotEncodedAgain;
 }
 
 } // namespace
 
-size_t MovePresetPaths(wxString& text, wxString from, wxString to)
+size_t MovePresetPaths(wxString& text, const wxString& oldFolder, const wxString& newFolder)
 {
-    TrimSeparators(from);
-    TrimSeparators(to);
+    const wxString from = WithoutFinalSeparators(oldFolder);
+    const wxString to = WithoutFinalSeparators(newFolder);
     if (from.empty() || to.empty() || !IsXmlText(to))
         return 0;
     const std::vector<size_t> folders = FindFolders(text, from);

@@ -10,13 +10,24 @@
 /// by a path separator or the closing double quote. Separators at the end of either folder are
 /// ignored. Replaces nothing if either folder is empty, or if XML cannot hold the text of the new
 /// one. Returns the number of replacements. Takes time proportional to the length of the text.
-size_t MovePresetPaths(wxString& text, wxString from, wxString to);
+size_t MovePresetPaths(wxString& text, const wxString& from, const wxString& to);
+
+/// Why a preset file stays as it is.
+namespace PresetStays
+{
+
+constexpr const char* NotRead = "cannot be read";
+constexpr const char* NotDecoded = "cannot be decoded";
+constexpr const char* NotEncodedAgain = "cannot be encoded again";
+
+} // namespace PresetStays
 
 /// A preset file's new content, or why the file has to stay as it is.
 struct RewrittenPreset
 {
     const char* reasonToStay = nullptr;
     size_t movedPaths = 0;
+    std::string before;
     std::string bytes;
 };
 

@@ -1,9 +1,9 @@
 #include "migrate/template_move.h"
 
-#include "migrate/install_locations.h"
+#include "store/folder_cfg_format.h"
 #include "store/folder_cfg_reader.h"
 #include "store/folder_cfg_writer.h"
-#include "store/xml_encoding.h"
+#include "store/xml_lookup.h"
 #include "store/xml_text.h"
 #include "store/xml_tree.h"
 
@@ -13,8 +13,6 @@
 
 namespace
 {
-
-using Lookup = bool (*)(wxFileName&);
 
 bool IsAnySeparator(wxUniChar character)
 {
@@ -59,53 +57,36 @@ bool IsElsewhereByName(const wxString& stored, const wxString& folder)
     return folded.GetExt().CmpNoCase("lnk") == 0;
 }
 
-// The folder that holds the template, without a final separator.
-wxString FolderOf(const wxFileName& templateFile)
+void Stay(TemplateMove& move, const wchar_t* reason)
 {
-    return templateFile.GetPath(wxPATH_GET_VOLUME, wxPATH_NATIVE);
+    move.outcome = TemplateMove::Outcome::Stays;
+    move.reasonToStay = reason;
 }
 
-} // namespace
-
-bool IsSameFolder(const wxString& stored, const wxString& folder)
+void DecideFolder(const XmlFile& cfg, TemplateFolders& folders, TemplateMove& move)
 {
-    const wxFileName left(stored, wxPATH_NATIVE);
-    const wxFileName right(folder, wxPATH_NATIVE);
-    return left.GetFullName().empty() == right.GetFullName().empty() &&
-           !IsElsewhereByName(stored, folder) && right.SameAs(left, wxPATH_NATIVE);
-}
-
-TemplateMove DecideTemplateMove(const wxString& storedPath, const std::string& folderCfg,
-                                bool isUpgrade)
-{
-    using Outcome = TemplateMove::Outcome;
-    const Lookup lookUpFrom =
-        isUpgrade ? GetPreviousImposeTemplatePath : GetDefaultImposeTemplatePath;
-    const Lookup lookUpTo =
-        isUpgrade ? GetDefaultImposeTemplatePath : GetPreviousImposeTemplatePath;
-    wxFileName from;
-    if (!lookUpFrom(from))
-        return {Outcome::NoFromFolder, {}};
-    const wxString fromPath = from.GetFullPath(wxPATH_NATIVE);
-    const wxFileName templateFile(storedPath, wxPATH_NATIVE);
-    const bool isInFolder = IsSameFolder(FolderOf(templateFile), fromPath);
+    move.outcome = TemplateMove::Outcome::FromUnknown;
+    if (!folders.From().isKnown)
+        return;
+    const bool isInFolder = IsSameFolder(FolderOfTemplate(move.storedPath), folders.From().path);
+    move.outcome = TemplateMove::Outcome::Elsewhere;
     // In an unknown encoding, only ASCII is read correctly.
-    if (!isInFolder && storedPath.IsAscii())
-        return {Outcome::Elsewhere, {}};
-    if (!IsReadFaithfully(folderCfg))
-        return {Outcome::UnknownEncoding, {}};
-    if (!isInFolder)
-        return {Outcome::Elsewhere, {}};
-    wxFileName to;
-    if (!lookUpTo(to))
-        return {Outcome::NoToFolder, {}};
-    const wxString newPath = to.GetFullPath(wxPATH_NATIVE) +
-                             wxFileName::GetPathSeparator(wxPATH_NATIVE) +
-                             templateFile.GetFullName();
-    return {IsXmlText(newPath) ? Outcome::Moves : Outcome::NotStorable, newPath};
+    if (!cfg.IsFaithful() && (isInFolder || !move.storedPath.IsAscii()))
+        Stay(move, CfgStays::UnknownEncoding);
+    else if (isInFolder)
+        move.outcome =
+            folders.To().isKnown ? TemplateMove::Outcome::Moves : TemplateMove::Outcome::ToUnknown;
+    if (move.outcome != TemplateMove::Outcome::Moves)
+        return;
+    move.newPath = folders.To().path + wxFileName::GetPathSeparator(wxPATH_NATIVE) +
+                   wxFileName(move.storedPath, wxPATH_NATIVE).GetFullName();
+    if (!IsXmlText(move.newPath))
+        Stay(move, CfgStays::NotStorable);
 }
 
-RewrittenFolderCfg RewriteFolderCfg(const wxXmlNode& root, const ImposeSettingTable& imposeSettings)
+// The content of Folder.cfg with the root's settings and this imposition table.
+void MakeContent(const wxXmlNode& root, const ImposeSettingTable& imposeSettings,
+                 TemplateMove& move)
 {
     JobSettingTable jobSettings;
     HotFolderPaths paths;
@@ -118,7 +99,45 @@ RewrittenFolderCfg RewriteFolderCfg(const wxXmlNode& root, const ImposeSettingTa
     ReadPreflightSettings(&root, preflightSettings);
     ReadHotFolderSettings(&root, settings);
     if (CountLevels(filterSetting) > MaxFilterLevels)
-        return {L"filter setting nested too deep", {}};
-    return {nullptr, FolderCfgBytes(settings, jobSettings, paths, filterSetting, imposeSettings,
-                                    preflightSettings)};
+        return Stay(move, CfgStays::TooDeep);
+    move.newContent = FolderCfgBytes(settings, jobSettings, paths, filterSetting, imposeSettings,
+                                     preflightSettings);
+}
+
+} // namespace
+
+bool IsSameFolder(const wxString& stored, const wxString& folder)
+{
+    const wxFileName left(stored, wxPATH_NATIVE);
+    const wxFileName right(folder, wxPATH_NATIVE);
+    return left.GetFullName().empty() == right.GetFullName().empty() &&
+           !IsElsewhereByName(stored, folder) && right.SameAs(left, wxPATH_NATIVE);
+}
+
+wxString FolderOfTemplate(const wxString& path)
+{
+    return wxFileName(path, wxPATH_NATIVE).GetPath(wxPATH_GET_VOLUME, wxPATH_NATIVE);
+}
+
+TemplateMove DecideTemplateMove(const XmlFile& cfg, TemplateFolders& folders)
+{
+    using Outcome = TemplateMove::Outcome;
+    TemplateMove move;
+    if (!FindElement(cfg.GetRoot(), FolderCfg::ImposeSettingSection, true))
+        return move;
+    ImposeSettingTable table;
+    ReadImposeSettings(cfg.GetRoot(), table);
+    const auto entry = table.find(FolderCfg::ImposeTemplateKey);
+    move.outcome = Outcome::NoTemplate;
+    if (entry == table.end())
+        return move;
+    move.storedPath = entry->second.Value;
+    DecideFolder(cfg, folders, move);
+    if (move.outcome == Outcome::Moves)
+    {
+        SetImposeSetting(table, FolderCfg::ImposeTemplateKey, move.newPath,
+                         entry->second.KeyDisplayValue);
+        MakeContent(*cfg.GetRoot(), table, move);
+    }
+    return move;
 }

@@ -2,18 +2,17 @@
 
 #include "platform/regular_file.h"
 
-bool CopyOver(const wxString& source, const wxString& destination)
+bool CopyOver(const wxString& source, const PinnedDirectory& directory, const wxString& name)
 {
     RegularFile from;
     RegularFile to;
     std::string before;
     std::string after;
-    if (from.OpenForReading(source, Links::Follow) != RegularFile::Status::Open ||
-        !from.Read(after))
+    if (from.OpenForReading(source) != RegularFile::Status::Open || !from.Read(after))
         return false;
-    RegularFile::Status status = to.OpenForUpdate(destination, Links::Refuse);
+    RegularFile::Status status = to.OpenForUpdate(directory, name);
     if (status == RegularFile::Status::Refused)
-        status = to.Replace(destination);
+        status = to.Replace(directory, name);
     if (status != RegularFile::Status::Open)
         return false;
     if (!to.Read(before))
@@ -28,24 +27,24 @@ bool CopyOver(const wxString& source, const wxString& destination)
     return true;
 }
 
-bool MayCopyOver(const wxString& source, const wxString& destination)
+bool MayCopyOver(const wxString& source, const PinnedDirectory& directory, const wxString& name)
 {
     RegularFile from;
     RegularFile to;
-    if (from.OpenForReading(source, Links::Follow) != RegularFile::Status::Open)
+    if (from.OpenForReading(source) != RegularFile::Status::Open)
         return false;
-    const RegularFile::Status status = to.OpenForUpdate(destination, Links::Refuse);
+    const RegularFile::Status status = to.OpenForUpdate(directory, name);
     return status == RegularFile::Status::Open ||
-           (status == RegularFile::Status::Refused && RegularFile::MayReplace(destination));
+           (status == RegularFile::Status::Refused && RegularFile::MayReplace(directory));
 }
 
-bool IsCopy(const wxString& source, const wxString& destination)
+bool IsCopy(const wxString& source, const PinnedDirectory& directory, const wxString& name)
 {
     RegularFile from;
     RegularFile to;
     std::string wanted;
     std::string there;
-    return from.OpenForReading(source, Links::Follow) == RegularFile::Status::Open &&
-           to.OpenForReading(destination, Links::Refuse) == RegularFile::Status::Open &&
+    return from.OpenForReading(source) == RegularFile::Status::Open &&
+           to.OpenForReading(directory, name) == RegularFile::Status::Open &&
            to.HasAttributesOf(from) && from.Read(wanted) && to.Read(there) && wanted == there;
 }

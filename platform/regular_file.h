@@ -9,11 +9,33 @@
 #include <cstdint>
 #include <string>
 
+/// The last call of the system that failed.
+struct FailedCall
+{
+    enum class Kind
+    {
+        Open,
+        List, // the names in a directory
+        Read,
+        Write
+    };
+
+    Kind kind = Kind::Open;
+    unsigned long error = 0; // as the system numbers it
+
+    /// Of this kind, with the system's last error.
+    static FailedCall Now(Kind kind);
+
+    /// The words in which wxLogSysError reports it.
+    wxString Describe(const wxString& shownPath) const;
+};
+
 /// Bytes. A longer file is not read into memory: a planted file of terabytes must not crash a run.
 constexpr std::int64_t LongestFile = std::int64_t{256} * 1024 * 1024;
 
-/// A file that is opened without waiting (a pipe in its place would block) and, if links are
-/// refused, not through a link. No call reports an error by itself.
+/// A file that is opened without waiting (a pipe in its place would block). In a pinned directory
+/// it is not opened through a link. No call reports an error by itself; after one that failed,
+/// GetFailure says why.
 ///
 /// As long as it is open, it is the same file, whatever happens to its name; on Windows no program
 /// can rename or remove it meanwhile (it is opened without FILE_SHARE_DELETE).
@@ -22,7 +44,6 @@ class RegularFile
   public:
     enum class Status
     {
-        NotOpen,
         NotThere, // no such file, not a regular file, or a refused link
         Refused,  // it exists, but access is denied or another program blocks it
         Gone,     // the name no longer leads to the same file
@@ -40,19 +61,21 @@ class RegularFile
     RegularFile(const RegularFile&) = delete;
     RegularFile& operator=(const RegularFile&) = delete;
 
-    Status OpenForReading(const wxString& path, Links links);
+    /// Follows links.
+    Status OpenForReading(const wxString& path);
+    Status OpenForReading(const PinnedDirectory& directory, const wxString& name);
     /// Opens for reading and writing. The content stays as it is.
-    Status OpenForUpdate(const wxString& path, Links links);
+    Status OpenForUpdate(const PinnedDirectory& directory, const wxString& name);
     /// Also opens the same file for update (ReOpenFile; elsewhere the name has to lead to the same
     /// device and inode). If the result is not Open, the file stays open for reading.
     Status ReopenForUpdate();
     /// Creates an empty file and opens it for update; fails and changes nothing if anything of that
     /// name exists (CREATE_NEW, O_EXCL).
-    Status CreateNew(const wxString& path);
+    Status CreateNew(const PinnedDirectory& directory, const wxString& name);
     /// Puts a new, empty file in place of one that cannot be written. Not on Windows, where a
     /// file's own permissions prevent that.
-    Status Replace(const wxString& path);
-    static bool MayReplace(const wxString& path);
+    Status Replace(const PinnedDirectory& directory, const wxString& name);
+    static bool MayReplace(const PinnedDirectory& directory);
     /// Returns false if the system reports an error, which does not matter: all bytes have already
     /// been written.
     bool Close();
@@ -80,13 +103,7 @@ class RegularFile
     /// Whether both have the same read-only, hidden and system attributes, or mode.
     bool HasAttributesOf(const RegularFile& source) const;
 
-    /// Has the library report, under that path, why the file could not be opened for update as
-    /// well.
-    void ReportNotReopened(const wxString& shownPath) const;
-
-    /// Has the library report that the file could not be written, under that path and with the
-    /// error of the call that failed.
-    void ReportNotWritten(const wxString& shownPath) const;
+    const FailedCall& GetFailure() const;
 
     /// Cuts the file, or extends it with zeros.
     bool SetLength(std::int64_t length);
@@ -96,14 +113,16 @@ class RegularFile
     bool Append(const std::string& bytes);
 
   private:
+    Status Open(const wxString& path, Links links, bool forUpdate);
     bool Reserve(std::int64_t from, std::int64_t length);
     bool Write(std::int64_t offset, const std::string& bytes);
     void WaitForDisk();
-    Status Open(const wxString& path, Links links, bool forUpdate);
-
-    Status m_status = Status::NotOpen;
+    // The number of bytes that were read or written, at least one; 0 if there are none or the call
+    // fails.
+    size_t ReadSome(std::int64_t offset, char* bytes, size_t count) const;
+    size_t WriteSome(std::int64_t offset, const char* bytes, size_t count);
     wxString m_path;
-    unsigned long m_error = 0; // of the last failed reopening or write, as the system numbers it
+    mutable FailedCall m_failure;
 #ifdef _WIN32
     void* m_handle = nullptr;
 #else
@@ -111,8 +130,3 @@ class RegularFile
     Links m_links = Links::Refuse;
 #endif
 };
-
-/// Has the library report that the file could not be opened or read, with the system's last error:
-/// on Windows in a message box after the run.
-void ReportNotOpened(const wxString& path);
-void ReportNotRead(const wxString& path);

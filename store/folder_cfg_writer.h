@@ -1,9 +1,9 @@
 // Writing Folder.cfg.
 #pragma once
 
+#include "store/hot_folder.h"
 #include "store/hot_folder_settings.h"
 
-#include <wx/string.h>
 #include <wx/xml/xml.h>
 
 #include <string>
@@ -17,13 +17,9 @@ std::string FolderCfgBytes(const HotFolderSettings& settings, const JobSettingTa
                            const ImposeSettingTable& imposeSettings,
                            const PreflightSettingList& preflightSettings);
 
-/// Writes that content to the file, as RegularFile::Rewrite does; creates the file if it does not
-/// exist. If it cannot be opened or written, it stays as it was. Holds FolderCfgLock throughout.
-/// Always returns 0; the library reports an error if the file cannot be opened or written.
-int SaveHotFolderSettings(const wxString& path, const HotFolderSettings& settings,
-                          const JobSettingTable& jobSettings, const HotFolderPaths& paths,
-                          const wxXmlNode& filterSetting, const ImposeSettingTable& imposeSettings,
-                          const PreflightSettingList& preflightSettings);
+/// Makes that content the hot folder's Folder.cfg, if it still has the loaded content. Holds
+/// FolderCfgLock throughout.
+XmlFile::Saved SaveHotFolderSettings(HotFolder& folder, const std::string& content);
 
 /// How many levels below a filter setting can be saved: wxXmlDocument::Save recurses, and the time
 /// and size of the indentation grow with the square of the depth.

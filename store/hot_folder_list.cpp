@@ -5,6 +5,7 @@
 
 #include <wx/filename.h>
 #include <wx/hashmap.h>
+#include <wx/log.h>
 
 #include <unordered_set>
 
@@ -70,7 +71,9 @@ HotFolderList LoadHotFolderList()
     HotFolderList list;
     XmlFile file;
     const wxString path = GetHotFolderListPath();
-    list.state = file.Load(path, Links::Follow, path);
+    list.state = file.Load(path);
+    if (list.state == XmlFile::State::NotReadable)
+        list.whyNotReadable = file.WhyNotReadable(path);
     if (list.state != XmlFile::State::Loaded)
         return list;
     PathSet known;
@@ -92,8 +95,11 @@ HotFolderList LoadHotFolderList()
 
 void ReadHotFolderList(wxArrayString& folders)
 {
+    const HotFolderList list = LoadHotFolderList();
+    if (!list.whyNotReadable.empty())
+        wxLogError("%s", list.whyNotReadable);
     PathSet known(folders.begin(), folders.end());
-    for (const wxString& folder : LoadHotFolderList().folders)
+    for (const wxString& folder : list.folders)
     {
         if (known.insert(folder).second)
             folders.Add(folder);

@@ -1,75 +1,83 @@
 #include "store/xml_file.h"
 
-#include "store/xml_document.h"
-#include "store/xml_limits.h"
+#include "store/xml_encoding.h"
 
 #include <cstdint>
 
-XmlFile::State XmlFile::Load(const wxString& path, Links links, const wxString& shownPath)
+XmlFile::State XmlFile::Load(const wxString& path)
 {
-    m_shownPath = shownPath;
-    const RegularFile::Status status = m_file.OpenForReading(path, links);
-    if (status == RegularFile::Status::Refused)
-        ReportNotOpened(shownPath);
-    if (status != RegularFile::Status::Open)
-        return status == RegularFile::Status::Refused ? State::NotReadable : State::Missing;
-    if (m_file.Length() > static_cast<std::int64_t>(MaxXmlBytes))
-        return State::TooLarge;
-    if (m_file.Read(m_bytes))
-        return Parse();
-    ReportNotRead(shownPath);
-    return State::NotReadable;
+    return m_state = Load(m_file.OpenForReading(path));
 }
 
-// Both steps of a hot folder read the same Folder.cfg one after another, and most of their time
-// is the parser's. So the last document is kept, together with its bytes: the same bytes make the
-// same document. A large one is not kept, since it would take memory while another is loaded.
+XmlFile::State XmlFile::Load(const PinnedDirectory& directory, const wxString& name)
+{
+    return m_state = Load(m_file.OpenForReading(directory, name));
+}
+
+// Most of the time of a run is the parser's, and the steps of a hot folder read the same file one
+// after another. The same bytes make the same document.
+XmlFile::State XmlFile::Load(RegularFile::Status status)
+{
+    std::string bytes;
+    State state = State::Loaded;
+    if (status != RegularFile::Status::Open)
+        state = status == RegularFile::Status::Refused ? State::NotReadable : State::Missing;
+    else if (m_file.Length() > static_cast<std::int64_t>(MaxXmlBytes))
+        state = State::TooLarge;
+    else if (!m_file.Read(bytes))
+        state = State::NotReadable;
+    if (state == State::Loaded && m_document && bytes == m_bytes)
+        return state;
+    m_document = nullptr;
+    m_error = {};
+    m_bytes.swap(bytes);
+    return state == State::Loaded ? Parse() : state;
+}
+
 XmlFile::State XmlFile::Parse()
 {
-    constexpr size_t LongestKept = size_t{64} * 1024;
-    static std::string lastBytes;
-    static std::shared_ptr<const wxXmlDocument> lastDocument;
-    if (lastDocument && m_bytes == lastBytes)
-    {
-        m_document = lastDocument;
-        return State::Loaded;
-    }
-    m_document = nullptr;
-    lastDocument = nullptr;
-    auto document = std::make_shared<wxXmlDocument>();
-    const XmlLoad result = LoadXml(m_bytes, *document, wxXMLDOC_KEEP_WHITESPACE_NODES);
-    if (result != XmlLoad::Loaded)
-        return result == XmlLoad::TooLarge ? State::TooLarge : State::NotReadable;
-    m_document = document;
-    if (m_bytes.size() <= LongestKept)
-    {
-        lastBytes = m_bytes;
-        lastDocument = m_document;
-    }
+    auto document = std::make_unique<wxXmlDocument>();
+    const XmlLoad load = LoadXml(m_bytes, *document);
+    m_error = load.error;
+    if (load.state != XmlLoad::State::Loaded)
+        return load.state == XmlLoad::State::TooLarge ? State::TooLarge : State::NotReadable;
+    m_isFaithful = IsReadFaithfully(m_bytes);
+    m_document = std::move(document);
     return State::Loaded;
 }
 
-RegularFile::Status XmlFile::ReopenForUpdate()
+void XmlFile::Close()
+{
+    m_file.Close();
+}
+
+XmlFile::Saved XmlFile::Save(const std::string& bytes)
 {
     const RegularFile::Status status = m_file.ReopenForUpdate();
     if (status == RegularFile::Status::Refused)
-        m_file.ReportNotReopened(m_shownPath);
-    return status;
-}
-
-bool XmlFile::LoadAgain()
-{
+        return Saved::Refused;
     std::string now;
-    if (m_file.Length() > static_cast<std::int64_t>(MaxXmlBytes) || !m_file.Read(now))
-        return false;
-    m_bytes.swap(now);
-    return Parse() == State::Loaded;
+    if (status != RegularFile::Status::Open ||
+        !m_file.Read(now, static_cast<std::int64_t>(MaxXmlBytes)))
+        return Saved::NotReadAgain;
+    if (now != m_bytes)
+        return Saved::Changed;
+    return m_file.Rewrite(m_bytes, bytes) ? Saved::Done : Saved::Refused;
 }
 
-void XmlFile::Rewrite(const std::string& bytes)
+XmlFile::State XmlFile::GetState() const
 {
-    if (!m_file.Rewrite(m_bytes, bytes))
-        m_file.ReportNotWritten(m_shownPath);
+    return m_state;
+}
+
+wxString XmlFile::WhyNotReadable(const wxString& shownPath) const
+{
+    return m_error.message.empty() ? m_file.GetFailure().Describe(shownPath) : m_error.Describe();
+}
+
+RegularFile& XmlFile::GetFile()
+{
+    return m_file;
 }
 
 const wxXmlNode* XmlFile::GetRoot() const
@@ -85,4 +93,9 @@ const wxXmlDocument& XmlFile::GetDocument() const
 const std::string& XmlFile::GetBytes() const
 {
     return m_bytes;
+}
+
+bool XmlFile::IsFaithful() const
+{
+    return m_isFaithful;
 }

@@ -2,6 +2,8 @@
 
 #include "store/xml_encoding.h"
 
+#include <wx/intl.h>
+
 #include <algorithm>
 #include <cstdint>
 #include <cstring>
@@ -227,21 +229,30 @@ void SetHandlers(XML_Parser parser, Look& look)
 
 } // namespace
 
-bool IsWithinXmlLimits(const std::string& bytes)
+wxString XmlSyntaxError::Describe() const
+{
+    return wxString::Format(_("XML parsing error: '%s' at line %d"), message,
+                            static_cast<int>(line));
+}
+
+XmlLook LookAtXml(const std::string& bytes, Harmless harmless)
 {
     // UTF-16, in which a document type would look different, has NULs.
-    if (bytes.size() <= HarmlessBytes && bytes.find("<!DOCTYPE") == std::string::npos &&
-        bytes.find('\0') == std::string::npos)
-        return true;
+    if (harmless == Harmless::Skip && bytes.size() <= HarmlessBytes &&
+        bytes.find("<!DOCTYPE") == std::string::npos && bytes.find('\0') == std::string::npos)
+        return {};
     if (bytes.size() > MaxXmlBytes)
-        return false;
+        return {false, {}};
     const std::unique_ptr<XML_ParserStruct, void (*)(XML_Parser)> parser(XML_ParserCreate(nullptr),
                                                                          XML_ParserFree);
     Look look(parser.get(), bytes.size());
     SetHandlers(parser.get(), look);
     // In one piece, so that nothing is read twice here.
-    if (XML_Parse(parser.get(), bytes.data(), static_cast<int>(bytes.size()), XML_TRUE) !=
+    if (XML_Parse(parser.get(), bytes.data(), static_cast<int>(bytes.size()), XML_TRUE) ==
         XML_STATUS_OK)
-        look.Fail(bytes.size());
-    return look.IsWithinLimits();
+        return {look.IsWithinLimits(), {}};
+    look.Fail(bytes.size());
+    return {look.IsWithinLimits(),
+            {wxString::FromUTF8(XML_ErrorString(XML_GetErrorCode(parser.get()))),
+             static_cast<unsigned long>(XML_GetCurrentLineNumber(parser.get()))}};
 }

@@ -180,19 +180,30 @@ void SkipBlanks(const Units& units, size_t& begin, size_t end)
         ++begin;
 }
 
-wxString NativeName(LPCWSTR path)
+struct ProfilePath
 {
-    return wxString::FromUTF8(NativePath(path));
-}
+    explicit ProfilePath(const wxString& path)
+        : directory(path.BeforeLast('/'), Links::Follow), name(path.AfterLast('/'))
+    {
+    }
+
+    explicit ProfilePath(LPCWSTR path) : ProfilePath(wxString::FromUTF8(NativePath(path)))
+    {
+    }
+
+    const PinnedDirectory directory;
+    const wxString name;
+};
 
 // Returns false for a read-only file, even for root; creates a missing file.
 bool OpenForWriting(LPCWSTR path, RegularFile& file)
 {
+    const ProfilePath profile(path);
     const DWORD attributes = GetFileAttributesW(path);
     if (attributes == INVALID_FILE_ATTRIBUTES)
-        return file.CreateNew(NativeName(path)) == RegularFile::Status::Open;
+        return file.CreateNew(profile.directory, profile.name) == RegularFile::Status::Open;
     return (attributes & FILE_ATTRIBUTE_READONLY) == 0 &&
-           file.OpenForUpdate(NativeName(path), Links::Refuse) == RegularFile::Status::Open;
+           file.OpenForUpdate(profile.directory, profile.name) == RegularFile::Status::Open;
 }
 
 // Inserts lines, after a line end if the text before them lacks one.
@@ -235,8 +246,9 @@ DWORD GetPrivateProfileStringW(LPCWSTR section, LPCWSTR key, LPCWSTR defaultValu
 {
     std::string bytes;
     wxString value = defaultValue;
+    const ProfilePath profile(path);
     RegularFile file;
-    if (file.OpenForReading(NativeName(path), Links::Refuse) == RegularFile::Status::Open &&
+    if (file.OpenForReading(profile.directory, profile.name) == RegularFile::Status::Open &&
         file.Read(bytes))
     {
         const Text text = Decode(bytes);

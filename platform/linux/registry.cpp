@@ -25,8 +25,7 @@ LSTATUS RegOpenKeyExW(HKEY hive, LPCWSTR path, DWORD options, REGSAM /*access*/,
     auto opened = std::make_unique<RegistryKey>();
     RegularFile file;
     if (options != 0 || // none is supported
-        file.OpenForReading(folder + "/registry/" + name + ".reg", Links::Follow) !=
-            RegularFile::Status::Open ||
+        file.OpenForReading(folder + "/registry/" + name + ".reg") != RegularFile::Status::Open ||
         !file.Read(opened->hive))
         return ERROR_FILE_NOT_FOUND;
     opened->hive = DecodeRegistryExport(std::move(opened->hive));

@@ -1,5 +1,6 @@
 #include "platform/pinned_directory.h"
 
+#include "platform/path_normal_form.h"
 #include "platform/system.h"
 #include "platform/windows/link_handle.h"
 
@@ -11,13 +12,6 @@ namespace
 {
 
 // With a separator at the end of the path, a link might be followed.
-wxString WithoutFinalSeparators(wxString path)
-{
-    while (!path.empty() && wxFileName::IsPathSeparator(path.Last()))
-        path.RemoveLast();
-    return path;
-}
-
 HANDLE Open(const wxString& path, DWORD access, Links links)
 {
     const DWORD flags =

@@ -3,8 +3,6 @@
 #include "platform/system.h"
 #include "platform/windows/link_handle.h"
 
-#include <wx/log.h>
-
 #include <algorithm>
 #include <limits>
 
@@ -26,17 +24,6 @@ bool IsReparsePoint(HANDLE handle)
     BY_HANDLE_FILE_INFORMATION information = {};
     return GetFileInformationByHandle(handle, &information) != 0 &&
            (information.dwFileAttributes & FILE_ATTRIBUTE_REPARSE_POINT) != 0;
-}
-
-// Why the file did not open. Preserves the last error.
-RegularFile::Status ReasonNotOpen(const wxString& path)
-{
-    const DWORD error = GetLastError();
-    const DWORD attributes = GetFileAttributesW(path.wc_str());
-    SetLastError(error);
-    return attributes == INVALID_FILE_ATTRIBUTES || (attributes & FILE_ATTRIBUTE_DIRECTORY) != 0
-               ? RegularFile::Status::NotThere
-               : RegularFile::Status::Refused;
 }
 
 bool IsDiskFull(DWORD error)
@@ -71,23 +58,27 @@ RegularFile::Status RegularFile::Open(const wxString& path, Links links, bool fo
     const DWORD access = forUpdate ? GENERIC_READ | GENERIC_WRITE : GENERIC_READ;
     const DWORD flags = links == Links::Refuse ? FILE_FLAG_OPEN_REPARSE_POINT : 0;
     m_handle = OpenHandle(path, access, flags);
+    m_failure = FailedCall::Now(FailedCall::Kind::Open);
     if (!m_handle)
-        return m_status = ReasonNotOpen(path);
-    m_status = Status::Open;
+    {
+        const DWORD attributes = GetFileAttributesW(path.wc_str());
+        return attributes == INVALID_FILE_ATTRIBUTES || (attributes & FILE_ATTRIBUTE_DIRECTORY) != 0
+                   ? Status::NotThere
+                   : Status::Refused;
+    }
     if (GetFileType(m_handle) != FILE_TYPE_DISK ||
         (links == Links::Refuse && (IsLinkHandle(m_handle) || IsLink(path))))
     {
         Close();
-        m_status = Status::NotThere;
+        return Status::NotThere;
     }
-    else if (flags != 0 && IsReparsePoint(m_handle))
-    {
-        const HANDLE content = OpenHandle(path, access, 0);
-        CloseHandle(m_handle);
-        m_handle = content;
-        m_status = content ? Status::Open : Status::Refused;
-    }
-    return m_status;
+    if (flags == 0 || !IsReparsePoint(m_handle))
+        return Status::Open;
+    const HANDLE content = OpenHandle(path, access, 0);
+    m_failure = FailedCall::Now(FailedCall::Kind::Open);
+    CloseHandle(m_handle);
+    m_handle = content;
+    return content ? Status::Open : Status::Refused;
 }
 
 RegularFile::Status RegularFile::ReopenForUpdate()
@@ -97,7 +88,7 @@ RegularFile::Status RegularFile::ReopenForUpdate()
     // file.
     if (handle == INVALID_HANDLE_VALUE)
         handle = OpenHandle(m_path, GENERIC_READ | GENERIC_WRITE, 0);
-    m_error = wxSysErrorCode();
+    m_failure = FailedCall::Now(FailedCall::Kind::Open);
     if (!handle)
         return Status::Refused;
     CloseHandle(m_handle);
@@ -105,23 +96,25 @@ RegularFile::Status RegularFile::ReopenForUpdate()
     return Status::Open;
 }
 
-RegularFile::Status RegularFile::CreateNew(const wxString& path)
+RegularFile::Status RegularFile::CreateNew(const PinnedDirectory& directory, const wxString& name)
 {
     Close();
-    m_path = path;
+    m_path = directory.Reach(name);
     const HANDLE handle =
-        CreateFileW(path.wc_str(), GENERIC_READ | GENERIC_WRITE, Sharing, nullptr, CREATE_NEW,
+        CreateFileW(m_path.wc_str(), GENERIC_READ | GENERIC_WRITE, Sharing, nullptr, CREATE_NEW,
                     FILE_ATTRIBUTE_NORMAL | FILE_FLAG_OPEN_REPARSE_POINT, nullptr);
+    m_failure = FailedCall::Now(FailedCall::Kind::Open);
     m_handle = handle == INVALID_HANDLE_VALUE ? nullptr : handle;
-    return m_status = m_handle ? Status::Open : Status::Refused;
+    return m_handle ? Status::Open : Status::Refused;
 }
 
-RegularFile::Status RegularFile::Replace(const wxString& /*path*/)
+RegularFile::Status RegularFile::Replace(const PinnedDirectory& /*directory*/,
+                                         const wxString& /*name*/)
 {
-    return m_status = Status::Refused;
+    return Status::Refused;
 }
 
-bool RegularFile::MayReplace(const wxString& /*path*/)
+bool RegularFile::MayReplace(const PinnedDirectory& /*directory*/)
 {
     return false;
 }
@@ -130,7 +123,6 @@ bool RegularFile::Close()
 {
     const bool isDone = !m_handle || CloseHandle(m_handle) != 0;
     m_handle = nullptr;
-    m_status = Status::NotOpen;
     return isDone;
 }
 
@@ -140,23 +132,18 @@ std::int64_t RegularFile::Length() const
     return GetFileSizeEx(m_handle, &length) != 0 ? length.QuadPart : -1;
 }
 
-bool RegularFile::Read(std::string& bytes, std::int64_t most) const
+size_t RegularFile::ReadSome(std::int64_t offset, char* bytes, size_t count) const
 {
-    const std::int64_t length = Length();
-    if (length < 0 || length > most)
-        return false;
-    bytes.resize(static_cast<size_t>(length));
-    for (size_t done = 0; done < bytes.size();)
-    {
-        OVERLAPPED place = At(static_cast<std::int64_t>(done));
-        DWORD count = 0;
-        if (ReadFile(m_handle, &bytes[done], LengthOfCall(bytes.size() - done), &count, &place) ==
-                0 ||
-            count == 0)
-            return false;
-        done += count;
-    }
-    return true;
+    OVERLAPPED place = At(offset);
+    DWORD done = 0;
+    return ReadFile(m_handle, bytes, LengthOfCall(count), &done, &place) != 0 ? done : 0;
+}
+
+size_t RegularFile::WriteSome(std::int64_t offset, const char* bytes, size_t count)
+{
+    OVERLAPPED place = At(offset);
+    DWORD done = 0;
+    return WriteFile(m_handle, bytes, LengthOfCall(count), &done, &place) != 0 ? done : 0;
 }
 
 bool RegularFile::Reserve(std::int64_t from, std::int64_t length)
@@ -168,21 +155,6 @@ bool RegularFile::Reserve(std::int64_t from, std::int64_t length)
     // If the file system does not support this, only the error of a full disk matters.
     return SetFileInformationByHandle(m_handle, FileAllocationInfo, &room, sizeof room) != 0 ||
            !IsDiskFull(GetLastError());
-}
-
-bool RegularFile::Write(std::int64_t offset, const std::string& bytes)
-{
-    for (size_t done = 0; done < bytes.size();)
-    {
-        OVERLAPPED place = At(offset + static_cast<std::int64_t>(done));
-        DWORD count = 0;
-        if (WriteFile(m_handle, &bytes[done], LengthOfCall(bytes.size() - done), &count, &place) ==
-                0 ||
-            count == 0)
-            return false;
-        done += count;
-    }
-    return true;
 }
 
 bool RegularFile::SetLength(std::int64_t length)
