@@ -62,7 +62,7 @@ bool ApplyFolderIcon(const HotFolder& folder, const wxString& iconName)
 void UpdateFolderIcon(const FolderUpgradeApp& app, HotFolder& folder)
 {
     const IconCopy copy = DecideIconCopy(folder, app.m_isUpgrade, app.m_bundleIconsDir);
-    if (folder.cfg.GetState() == XmlFile::State::NotReadable)
+    if (folder.cfg.state == XmlFile::State::NotReadable)
         wxLogError("%s", folder.cfg.WhyNotReadable(FolderCfgPath(folder.path)));
     if (copy.name.empty())
     {

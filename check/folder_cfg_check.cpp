@@ -38,18 +38,18 @@ void CheckShownState(const wxXmlNode& root, Report& report)
 bool CheckMove(HotFolder& folder, const TemplateMove& move, Report& report)
 {
     XmlFile& cfg = folder.cfg;
-    if (cfg.GetFile().ReopenForUpdate() != RegularFile::Status::Open)
+    if (cfg.file.ReopenForUpdate() != RegularFile::Status::Open)
     {
         report.Problem("Folder.cfg: cannot be opened for writing (" +
-                       cfg.GetFile().GetFailure().Describe(FolderCfgPath(folder.path)) + ")");
+                       cfg.file.GetFailure().Describe(FolderCfgPath(folder.path)) + ")");
         return false;
     }
-    if (move.storedPath == move.newPath && move.newContent == cfg.GetBytes())
+    if (move.storedPath == move.newPath && move.newContent == cfg.bytes)
         return true;
-    for (const wxString& loss : FindFolderCfgLosses(cfg.GetDocument(), move.newContent))
+    for (const wxString& loss : FindFolderCfgLosses(*cfg.document, move.newContent))
         report.Problem("Folder.cfg: " + loss);
     report.Change("Folder.cfg: " + move.storedPath + " -> " + move.newPath);
-    if (!IsUtf8(cfg.GetBytes()))
+    if (!IsUtf8(cfg.bytes))
         report.Note("Folder.cfg: comes out as UTF-8");
     if (!wxFileName::Exists(move.newPath))
         report.Note("no such file: " + move.newPath);
@@ -103,7 +103,7 @@ void CheckFolderCfg(HotFolder& folder, TemplateFolders& folders, Report& report)
         break;
     case XmlFile::State::Loaded:
         if (!CheckTemplate(folder, folders, report))
-            CheckShownState(*folder.cfg.GetRoot(), report);
+            CheckShownState(*folder.cfg.Root(), report);
         break;
     }
 }

@@ -13,20 +13,10 @@
 namespace
 {
 
-using Texts = std::initializer_list<const wchar_t*>;
-
-bool IsOneOf(const Texts& texts, const wxString& text)
+bool IsOneOf(std::initializer_list<const wchar_t*> texts, const wxString& text)
 {
     return std::any_of(texts.begin(), texts.end(),
                        [&](const wchar_t* each) { return text == each; });
-}
-
-bool IsSection(const wxString& name)
-{
-    return IsOneOf({FolderCfg::InputFormatsSection, FolderCfg::PathsSection,
-                    FolderCfg::JobSettingSection, FolderCfg::ImposeSettingSection,
-                    FolderCfg::FilterSettingSection, FolderCfg::PreflightSection},
-                   name);
 }
 
 // The writer adds these attributes where they are missing.
@@ -37,86 +27,12 @@ bool IsAdded(const wxString& name)
                    name);
 }
 
-wxString WithoutWhiteSpace(const wxString& text)
+bool IsSection(const wxString& name)
 {
-    wxString result;
-    for (const wxUniChar character : text)
-    {
-        if (!wxIsspace(character))
-            result += character;
-    }
-    return result;
-}
-
-// A node below the root, with a text that identifies it: its name and attributes or its text, and
-// the names of the nodes above it up to its section. A section counts as directly below the root
-// wherever it is, as it does for the readers.
-struct Thing
-{
-    const wxXmlNode* node;
-    wxString identity;
-};
-
-bool IsElement(const wxXmlNode& node)
-{
-    return node.GetType() == wxXML_ELEMENT_NODE;
-}
-
-// The same in any order.
-wxString AttributesIdentity(const wxXmlNode& element, bool isInFilter)
-{
-    AttributeMap attributes;
-    CollectAttributes(element, attributes);
-    const wxXmlAttribute* first = element.GetAttributes();
-    if (element.GetParent()->GetName() == FolderCfg::ImposeSettingSection && first &&
-        first->GetNext() && first->GetValue() == FolderCfg::ImposeTemplateKey)
-        attributes[first->GetNext()->GetName()].clear(); // the path that is meant to change
-    wxString identity;
-    for (const auto& [name, value] : attributes)
-    {
-        if (isInFilter || !value.empty() || !IsAdded(name))
-            identity += "\n" + name + "=" + value;
-    }
-    return identity;
-}
-
-// Comments and white space are left out.
-std::vector<Thing> Collect(const wxXmlNode& root)
-{
-    struct Open
-    {
-        const wxXmlNode* next;
-        wxString place;
-        bool isInFilter;
-    };
-    std::vector<Thing> things;
-    std::vector<Open> open = {{root.GetChildren(), wxString(), false}};
-    while (!open.empty())
-    {
-        const wxXmlNode* node = open.back().next;
-        if (!node)
-        {
-            open.pop_back();
-            continue;
-        }
-        open.back().next = node->GetNext();
-        const auto [next, place, isInFilter] = open.back();
-        if (IsElement(*node))
-        {
-            const bool isSection = !isInFilter && IsSection(node->GetName());
-            const wxString own = (isSection ? wxString() : place) + "/" + node->GetName();
-            things.push_back({node, own + AttributesIdentity(*node, isInFilter)});
-            open.push_back(
-                {node->GetChildren(), own,
-                 isInFilter || (isSection && node->GetName() == FolderCfg::FilterSettingSection)});
-            continue;
-        }
-        const wxString text = WithoutWhiteSpace(node->GetContent());
-        if (node->GetType() == wxXML_PI_NODE ||
-            (node->GetType() != wxXML_COMMENT_NODE && !text.empty()))
-            things.push_back({node, place + wxString::Format("\r%d\r", node->GetType()) + text});
-    }
-    return things;
+    return IsOneOf({FolderCfg::InputFormatsSection, FolderCfg::PathsSection,
+                    FolderCfg::JobSettingSection, FolderCfg::ImposeSettingSection,
+                    FolderCfg::FilterSettingSection, FolderCfg::PreflightSection},
+                   name);
 }
 
 // As much of a text as is readable in one line.
@@ -126,32 +42,87 @@ wxString Shown(const wxString& text)
     return text.length() <= Longest ? text : text.Left(Longest) + "...";
 }
 
-wxString Describe(const wxXmlNode& node)
+// The path in the template's entry is meant to change.
+bool IsTemplatePath(const wxXmlNode& element, const wxXmlAttribute& attribute)
 {
-    if (node.GetType() == wxXML_PI_NODE)
-        return "the instruction <?" + node.GetName() + "?>";
-    const wxString place = " in <" + node.GetParent()->GetName() + ">";
-    if (!IsElement(node))
-        return "the text \"" + Shown(wxString(node.GetContent()).Trim().Trim(false)) + "\"" + place;
-    wxString tag = "<" + node.GetName();
-    for (const wxXmlAttribute* each = node.GetAttributes(); each; each = each->GetNext())
-        tag += " " + each->GetName() + "=\"" + each->GetValue() + "\"";
-    return Shown(tag) + ">" + place;
+    const wxXmlAttribute* first = element.GetAttributes();
+    return first->GetNext() == &attribute && first->GetValue() == FolderCfg::ImposeTemplateKey &&
+           element.GetParent()->GetName() == FolderCfg::ImposeSettingSection;
 }
 
-void FindLostThings(const wxXmlNode& before, const wxXmlNode& after, wxArrayString& losses)
+// The same whatever the order of the attributes.
+wxString DescribeElement(const wxXmlNode& element, bool isInFilter)
 {
-    // Each node of the new document can match one of the old.
-    std::unordered_multiset<wxString, wxStringHash> pool;
-    for (const Thing& thing : Collect(after))
-        pool.insert(thing.identity);
-    for (const Thing& thing : Collect(before))
+    std::vector<wxString> attributes;
+    for (const wxXmlAttribute* each = element.GetAttributes(); each; each = each->GetNext())
     {
-        const auto found = pool.find(thing.identity);
+        const bool isKept =
+            !isInFilter && ((each->GetValue().empty() && IsAdded(each->GetName())) ||
+                            IsTemplatePath(element, *each));
+        if (!isKept)
+            attributes.push_back(" " + each->GetName() + "=\"" + each->GetValue() + "\"");
+    }
+    std::sort(attributes.begin(), attributes.end());
+    wxString description = "<" + element.GetName();
+    for (const wxString& attribute : attributes)
+        description += attribute;
+    return description + ">";
+}
+
+// What is below the root, but for comments and white space. The readers find a section wherever it
+// is, and the root may come out under another name.
+std::vector<wxString> DescribeContent(const wxXmlNode& root)
+{
+    struct Open
+    {
+        const wxXmlNode* next;
+        bool isInFilter;
+    };
+    std::vector<wxString> content;
+    std::vector<Open> open = {{root.GetChildren(), false}};
+    while (!open.empty())
+    {
+        const auto [node, isInFilter] = open.back();
+        if (!node)
+        {
+            open.pop_back();
+            continue;
+        }
+        open.back().next = node->GetNext();
+        wxString what;
+        if (node->GetType() == wxXML_ELEMENT_NODE)
+        {
+            what = DescribeElement(*node, isInFilter);
+            open.push_back({node->GetChildren(),
+                            isInFilter || node->GetName() == FolderCfg::FilterSettingSection});
+        }
+        else if (node->GetType() == wxXML_PI_NODE)
+            what = "the instruction <?" + node->GetName() + "?>";
+        else if (node->GetType() != wxXML_COMMENT_NODE)
+            what = wxString(node->GetContent()).Trim().Trim(false);
+        if (what.empty())
+            continue;
+        if (node->GetType() == wxXML_TEXT_NODE || node->GetType() == wxXML_CDATA_SECTION_NODE)
+            what = "the text \"" + what + "\"";
+        const wxXmlNode* parent = node->GetParent();
+        content.push_back(parent == &root || IsSection(node->GetName())
+                              ? what
+                              : what + " in <" + parent->GetName() + ">");
+    }
+    return content;
+}
+
+void FindLostContent(const wxXmlNode& before, const wxXmlNode& after, wxArrayString& losses)
+{
+    const std::vector<wxString> kept = DescribeContent(after);
+    std::unordered_multiset<wxString, wxStringHash> pool(kept.begin(), kept.end());
+    for (const wxString& each : DescribeContent(before))
+    {
+        const auto found = pool.find(each);
         if (found != pool.end())
             pool.erase(found);
         else
-            losses.Add("loses " + Describe(*thing.node));
+            losses.Add("loses " + Shown(each));
     }
 }
 
@@ -193,7 +164,7 @@ wxArrayString FindFolderCfgLosses(const wxXmlDocument& document, const std::stri
          node = node->GetNext())
     {
         if (node->GetType() == wxXML_PI_NODE)
-            losses.Add("loses " + Describe(*node));
+            losses.Add("loses the instruction <?" + node->GetName() + "?>");
     }
     const wxXmlNode& root = *document.GetRoot();
     if (root.GetName() != FolderCfg::Root)
@@ -201,7 +172,7 @@ wxArrayString FindFolderCfgLosses(const wxXmlDocument& document, const std::stri
     FindLostAttributes(root, losses);
     wxXmlDocument after;
     if (LoadXml(rewritten, after).state == XmlLoad::State::Loaded)
-        FindLostThings(root, *after.GetRoot(), losses);
+        FindLostContent(root, *after.GetRoot(), losses);
     return losses;
 }
 

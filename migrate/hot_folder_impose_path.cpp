@@ -19,7 +19,7 @@ void Save(HotFolder& folder, const std::string& content, const wxString& cfgPath
     switch (SaveHotFolderSettings(folder, content))
     {
     case XmlFile::Saved::Refused:
-        wxLogError("%s", folder.cfg.GetFile().GetFailure().Describe(cfgPath));
+        wxLogError("%s", folder.cfg.file.GetFailure().Describe(cfgPath));
         break;
     case XmlFile::Saved::NotReadAgain:
         LogUntouched(cfgPath, CfgStays::NotLoadedAgain);

@@ -71,7 +71,7 @@ void DecideFolder(const XmlFile& cfg, TemplateFolders& folders, TemplateMove& mo
     const bool isInFolder = IsSameFolder(FolderOfTemplate(move.storedPath), folders.From().path);
     move.outcome = TemplateMove::Outcome::Elsewhere;
     // In an unknown encoding, only ASCII is read correctly.
-    if (!cfg.IsFaithful() && (isInFolder || !move.storedPath.IsAscii()))
+    if (!cfg.isFaithful && (isInFolder || !move.storedPath.IsAscii()))
         Stay(move, CfgStays::UnknownEncoding);
     else if (isInFolder)
         move.outcome =
@@ -123,10 +123,10 @@ TemplateMove DecideTemplateMove(const XmlFile& cfg, TemplateFolders& folders)
 {
     using Outcome = TemplateMove::Outcome;
     TemplateMove move;
-    if (!FindElement(cfg.GetRoot(), FolderCfg::ImposeSettingSection, true))
+    if (!FindElement(cfg.Root(), FolderCfg::ImposeSettingSection, true))
         return move;
     ImposeSettingTable table;
-    ReadImposeSettings(cfg.GetRoot(), table);
+    ReadImposeSettings(cfg.Root(), table);
     const auto entry = table.find(FolderCfg::ImposeTemplateKey);
     move.outcome = Outcome::NoTemplate;
     if (entry == table.end())
@@ -137,7 +137,7 @@ TemplateMove DecideTemplateMove(const XmlFile& cfg, TemplateFolders& folders)
     {
         SetImposeSetting(table, FolderCfg::ImposeTemplateKey, move.newPath,
                          entry->second.KeyDisplayValue);
-        MakeContent(*cfg.GetRoot(), table, move);
+        MakeContent(*cfg.Root(), table, move);
     }
     return move;
 }

@@ -79,9 +79,9 @@ void ReadPath(const wxXmlNode& section, const wchar_t* name, wxString& path)
 int LoadHotFolderSettings(HotFolder& folder, HotFolderSettings& settings)
 {
     const XmlFile::State state = folder.LoadCfg();
-    folder.cfg.Close();
+    folder.cfg.file.Close();
     return state == XmlFile::State::Missing ? 0
-                                            : ReadHotFolderSettings(folder.cfg.GetRoot(), settings);
+                                            : ReadHotFolderSettings(folder.cfg.Root(), settings);
 }
 
 int ReadHotFolderSettings(const wxXmlNode* root, HotFolderSettings& settings)

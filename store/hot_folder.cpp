@@ -23,5 +23,5 @@ HotFolder::HotFolder(const wxString& listedPath)
 
 XmlFile::State HotFolder::LoadCfg()
 {
-    return cfg.Load(privateDir, FolderCfgName);
+    return cfg.Load(cfg.file.OpenForReading(privateDir, FolderCfgName));
 }

@@ -71,13 +71,13 @@ HotFolderList LoadHotFolderList()
     HotFolderList list;
     XmlFile file;
     const wxString path = GetHotFolderListPath();
-    list.state = file.Load(path);
+    list.state = file.Load(file.file.OpenForReading(path));
     if (list.state == XmlFile::State::NotReadable)
         list.whyNotReadable = file.WhyNotReadable(path);
     if (list.state != XmlFile::State::Loaded)
         return list;
     PathSet known;
-    const wxXmlNode* element = FirstNamed(file.GetRoot()->GetChildren(), FolderElement);
+    const wxXmlNode* element = FirstNamed(file.Root()->GetChildren(), FolderElement);
     for (; element; element = FirstNamed(element->GetNext(), FolderElement))
     {
         const wxString folder = ReadPath(*element);

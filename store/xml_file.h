@@ -9,9 +9,8 @@
 #include <memory>
 #include <string>
 
-class XmlFile
+struct XmlFile
 {
-  public:
     enum class State
     {
         Missing,     // no regular file of that name, or a refused link
@@ -23,44 +22,30 @@ class XmlFile
     enum class Saved
     {
         Done,
-        Refused,      // it cannot be opened for writing, or not be written; see GetFile
+        Refused,      // the file cannot be opened for writing, or not be written; it knows why
         NotReadAgain, // it is gone, or cannot be read
         Changed       // its bytes are no longer those that were loaded
     };
 
-    /// Opens the file and reads it. Parses it unless its bytes are those of the document that is
-    /// already here. The file stays open.
-    State Load(const wxString& path);
-    State Load(const PinnedDirectory& directory, const wxString& name);
-    void Close();
+    /// Reads a file that was just opened. Parses it unless its bytes are those of the document that
+    /// is already here.
+    State Load(RegularFile::Status opened);
 
     /// Makes these bytes the whole content, as RegularFile::Rewrite does, if the content is still
     /// what was loaded.
-    Saved Save(const std::string& bytes);
+    Saved Save(const std::string& newBytes);
 
-    State GetState() const;
     /// The library's words for the call that failed or for the syntax error.
     wxString WhyNotReadable(const wxString& shownPath) const;
 
-    RegularFile& GetFile();
     /// The root of the loaded document, or null; it includes the text nodes that are only white
     /// space.
-    const wxXmlNode* GetRoot() const;
-    /// Of a loaded file only.
-    const wxXmlDocument& GetDocument() const;
-    /// The content as it was loaded.
-    const std::string& GetBytes() const;
-    /// Whether the document is what its author meant; see IsReadFaithfully in store/xml_encoding.h.
-    bool IsFaithful() const;
+    const wxXmlNode* Root() const;
 
-  private:
-    State Load(RegularFile::Status status);
-    State Parse();
-
-    RegularFile m_file;
-    std::string m_bytes;
-    std::unique_ptr<const wxXmlDocument> m_document;
-    State m_state = State::Missing;
-    XmlSyntaxError m_error;
-    bool m_isFaithful = false;
+    RegularFile file;
+    State state = State::Missing;
+    std::string bytes; // as they were loaded
+    std::unique_ptr<const wxXmlDocument> document;
+    bool isFaithful = false; // whether the document is what its author meant: IsReadFaithfully
+    XmlSyntaxError error;
 };

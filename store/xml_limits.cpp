@@ -241,7 +241,7 @@ XmlLook LookAtXml(const std::string& bytes, Harmless harmless)
     if (harmless == Harmless::Skip && bytes.size() <= HarmlessBytes &&
         bytes.find("<!DOCTYPE") == std::string::npos && bytes.find('\0') == std::string::npos)
         return {};
-    if (bytes.size() > MaxXmlBytes)
+    if (static_cast<std::int64_t>(bytes.size()) > LongestXml)
         return {false, {}};
     const std::unique_ptr<XML_ParserStruct, void (*)(XML_Parser)> parser(XML_ParserCreate(nullptr),
                                                                          XML_ParserFree);

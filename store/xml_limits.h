@@ -3,10 +3,11 @@
 
 #include <wx/string.h>
 
+#include <cstdint>
 #include <string>
 
 /// The longest document, in bytes, that is examined at all.
-constexpr size_t MaxXmlBytes = size_t{64} * 1024 * 1024;
+constexpr std::int64_t LongestXml = std::int64_t{64} * 1024 * 1024;
 
 /// Where and why a document is not well-formed, in the parser's words.
 struct XmlSyntaxError
