@@ -6,6 +6,7 @@
 #include <wx/filename.h>
 
 #include <array>
+#include <cstdint>
 
 namespace
 {
@@ -18,23 +19,31 @@ const wchar_t* const IconIndexValue = L"00";
 const wchar_t* const HotFolderInfoTip = L"This folder has been configured as an ORX hot folder.";
 const wchar_t* const DefaultIconFile = L"00";
 
+// Bytes. Every change of a key reads and writes the whole file; Explorer's own has some hundred.
+constexpr std::int64_t LongestIni = std::int64_t{4} * 1024 * 1024;
+
 using Kind = DesktopIniChange::Kind;
 
-Kind DecideKind(const HotFolder& folder, bool isCustomised)
+void DecideKind(const HotFolder& folder, DesktopIniChange& change)
 {
     const wxString path = folder.directory.Reach(DesktopIniName);
-    if (IsLink(path))
-        return Kind::Linked;
-    if (!isCustomised)
-        return Kind::Nothing;
-    if (!wxFileName::Exists(path))
-        return Kind::Create;
-    if (!wxFileExists(path))
-        return Kind::NotAFile;
     RegularFile ini;
-    return ini.OpenForReading(folder.directory, DesktopIniName) == RegularFile::Status::Open
-               ? Kind::Refresh
-               : Kind::NotReadable;
+    if (IsLink(path))
+        change.reasonToStay = L"reached over a link";
+    else if (!change.isCustomised)
+        change.kind = Kind::Nothing;
+    else if (!wxFileName::Exists(path))
+        change.kind = Kind::Create;
+    else if (!wxFileExists(path))
+        change.kind = Kind::NotAFile;
+    else if (ini.OpenForReading(folder.directory, DesktopIniName) != RegularFile::Status::Open)
+        change.kind = Kind::NotReadable;
+    else if (ini.Length() > LongestIni)
+        change.reasonToStay = L"too large";
+    else
+        change.kind = Kind::Refresh;
+    if (change.reasonToStay)
+        change.kind = Kind::Stays;
 }
 
 std::vector<DesktopIniKey> Keys(Kind kind, const wxString& iconName)
@@ -63,17 +72,18 @@ void WriteKeys(const wxString& path, const std::vector<DesktopIniKey>& keys)
         WriteIniString(Section, each.key, each.value, path);
 }
 
-void ForceFolderIcon(const wxString& hotFolder, const wxString& iconFile)
+void ForceFolderIcon(const HotFolder& folder, const wxString& iconFile)
 {
-    // The shell's own buffers end here.
-    if (hotFolder.length() >= MAX_PATH)
+    // The shell's own buffers end at that length. A link in the path may lead elsewhere by now.
+    if (folder.path.length() >= MAX_PATH ||
+        PinnedDirectory(folder.path, Links::Follow).Identity() != folder.directory.Identity())
         return;
     std::wstring text = iconFile.ToStdWstring();
     SHFOLDERCUSTOMSETTINGS settings = {};
     settings.dwSize = sizeof settings;
     settings.dwMask = FCSM_ICONFILE;
     settings.pszIconFile = text.data();
-    SHGetSetFolderCustomSettings(&settings, hotFolder.wc_str(), FCS_FORCEWRITE);
+    SHGetSetFolderCustomSettings(&settings, folder.path.wc_str(), FCS_FORCEWRITE);
 }
 
 } // namespace
@@ -83,7 +93,7 @@ DesktopIniChange DecideDesktopIni(const HotFolder& folder, const wxString& iconN
     const wxString path = folder.directory.Reach(DesktopIniName);
     DesktopIniChange change;
     change.isCustomised = GetPackedShellVersion() >= CustomFolderVersion;
-    change.kind = DecideKind(folder, change.isCustomised);
+    DecideKind(folder, change);
     if (change.isCustomised)
         change.folder = DecideAttributes(folder.directory.Reach(L""), FILE_ATTRIBUTE_SYSTEM,
                                          FILE_ATTRIBUTE_READONLY);
@@ -91,7 +101,7 @@ DesktopIniChange DecideDesktopIni(const HotFolder& folder, const wxString& iconN
     const DWORD removed = change.kind == Kind::Refresh ? ~ReadOnlyAndSystem : 0;
     if (change.kind == Kind::Create)
         change.ini.after = ReadOnlyAndSystem;
-    else if (change.kind != Kind::Linked)
+    else if (change.kind != Kind::Stays)
         change.ini = DecideAttributes(path, ReadOnlyAndSystem, removed);
     for (const DesktopIniKey& key : Keys(change.kind, iconName))
     {
@@ -135,6 +145,6 @@ bool RefreshDesktopIni(const HotFolder& folder, const std::vector<DesktopIniKey>
     WriteKeys(path, keys);
     const wxString iconFile = ReadKey(path, IconFileKey);
     ChangeAttributes(path, FILE_ATTRIBUTE_NORMAL, ~DWORD{FILE_ATTRIBUTE_NORMAL});
-    ForceFolderIcon(folder.path, iconFile);
+    ForceFolderIcon(folder, iconFile);
     return true;
 }

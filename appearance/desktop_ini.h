@@ -22,7 +22,7 @@ struct DesktopIniChange
     enum class Kind
     {
         Nothing,     // the shell takes no settings from it
-        Linked,      // reached over a link, so it stays as it is
+        Stays,       // for reasonToStay
         NotAFile,    // stays as it is, apart from its attributes
         NotReadable, // the same
         Create,
@@ -30,6 +30,7 @@ struct DesktopIniChange
     };
 
     Kind kind = Kind::Nothing;
+    const wchar_t* reasonToStay = nullptr;
     bool isCustomised = false; // whether the shell takes settings from it; before 4.72 it does not
     std::vector<DesktopIniKey> keys; // to be written, in this order
     AttributeChange ini;

@@ -2,12 +2,12 @@
 
 #include "appearance/icon_copy.h"
 #include "platform/file_copy.h"
+#include "platform/library_log.h"
 #include "platform/system.h"
 #include "run/run_log.h"
 
 #include <wx/filename.h>
 #include <wx/intl.h>
-#include <wx/log.h>
 
 #include <cstdint>
 
@@ -44,8 +44,9 @@ bool ApplyFolderIcon(const HotFolder& folder, const wxString& iconName)
     const wxString reachedIni = folder.directory.Reach(DesktopIniName);
     const wxString reachedFolder = folder.directory.Reach(L"");
     const DesktopIniChange change = DecideDesktopIni(folder, iconName);
-    if (change.kind == Kind::Linked)
-        RunLog(L"Desktop.ini left as it is (reached over a link): " + iniPath);
+    if (change.kind == Kind::Stays)
+        RunLog(
+            wxString::Format(L"Desktop.ini left as it is (%s): %s", change.reasonToStay, iniPath));
     else if (change.kind == Kind::Create)
         CreateDesktopIni(folder, change.keys);
     else if (change.kind == Kind::Refresh)
@@ -56,14 +57,14 @@ bool ApplyFolderIcon(const HotFolder& folder, const wxString& iconName)
         TellShell(iniPath);
         ChangeAttributes(reachedFolder, 0, FILE_ATTRIBUTE_READONLY);
     }
-    return change.kind != Kind::Linked && ChangeAttributes(reachedIni, ReadOnlyAndSystem, 0);
+    return change.kind != Kind::Stays && ChangeAttributes(reachedIni, ReadOnlyAndSystem, 0);
 }
 
 void UpdateFolderIcon(const FolderUpgradeApp& app, HotFolder& folder)
 {
     const IconCopy copy = DecideIconCopy(folder, app.m_isUpgrade, app.m_bundleIconsDir);
     if (folder.cfg.state == XmlFile::State::NotReadable)
-        wxLogError("%s", folder.cfg.WhyNotReadable(FolderCfgPath(folder.path)));
+        ReportError(folder.cfg.WhyNotReadable(FolderCfgPath(folder.path)));
     if (copy.name.empty())
     {
         RunLog(L"Unable to get Icon filename " + copy.name);
@@ -75,8 +76,10 @@ void UpdateFolderIcon(const FolderUpgradeApp& app, HotFolder& folder)
         return;
     }
     const wxString destination = PrivateDirPath(folder.path) + copy.name;
-    if (!CopyOver(copy.source, folder.privateDir, copy.name))
-        wxLogSysError(_("Failed to copy the file '%s' to '%s'"), copy.source, destination);
+    if (const auto failure = CopyOver(copy.source, folder.privateDir, copy.name))
+        ReportError(
+            wxString::Format(_("Failed to copy the file '%s' to '%s'"), copy.source, destination) +
+            failure->Reason());
     ApplyFolderIcon(folder, copy.name);
     RunLog(L"Icon  copied from : " + copy.source + L" To " + destination + L" ");
 }

@@ -2,7 +2,6 @@
 
 #include "store/folder_cfg_reader.h"
 
-#include <wx/dir.h>
 #include <wx/filename.h>
 
 namespace
@@ -19,16 +18,14 @@ bool IsEnabled(HotFolder& folder)
     return settings.Enable;
 }
 
-// The library reports an error for a directory that it cannot open, so that is checked before
-// listing. The check for the file comes first because it is quicker.
+// A link counts by its name: its target may be on a drive that does not answer.
 bool HasError(const HotFolder& folder)
 {
-    const wxString path = folder.privateDir.Reach(L"");
-    if (!wxFileName::Exists(folder.privateDir.Reach(ErrorFileName), wxFILE_EXISTS_ANY) ||
-        !wxFileName::IsDirReadable(path))
-        return false;
-    const wxDir directory(path);
-    return directory.IsOpened() && directory.HasFiles(ErrorFileName);
+    const wxString path = folder.privateDir.Reach(ErrorFileName);
+    return wxFileName::IsDirReadable(folder.privateDir.Reach(L"")) &&
+           (IsLink(path) ||
+            (wxFileName::Exists(path, wxFILE_EXISTS_ANY | wxFILE_EXISTS_NO_FOLLOW) &&
+             !wxDirExists(path)));
 }
 
 const wchar_t* IconBaseName(FolderIconState state)

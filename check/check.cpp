@@ -40,7 +40,7 @@ void CheckHotFolders(const HotFolderList& list, TemplateFolders& folders, Report
         if (isNew || identity == std::pair<std::uint64_t, std::uint64_t>())
             CheckHotFolder(folder, folders, report);
         else
-            report.Note("the same directory as " + list.folders[first->second]);
+            report.Note("the same directory as " + Shown(list.folders[first->second]));
     }
 }
 

@@ -34,6 +34,15 @@ void CheckShownState(const wxXmlNode& root, Report& report)
                        "\", so the enabled folder shows as disabled");
 }
 
+void ReportLosses(const wxArrayString& losses, Report& report)
+{
+    constexpr size_t Most = 20;
+    for (size_t i = 0; i < losses.size() && i < Most; ++i)
+        report.Problem("Folder.cfg: " + losses[i]);
+    if (losses.size() > Most)
+        report.Problem(wxString::Format("Folder.cfg: and %zu more", losses.size() - Most));
+}
+
 // False if the file is not rewritten.
 bool CheckMove(HotFolder& folder, const TemplateMove& move, Report& report)
 {
@@ -46,13 +55,12 @@ bool CheckMove(HotFolder& folder, const TemplateMove& move, Report& report)
     }
     if (move.storedPath == move.newPath && move.newContent == cfg.bytes)
         return true;
-    for (const wxString& loss : FindFolderCfgLosses(*cfg.document, move.newContent))
-        report.Problem("Folder.cfg: " + loss);
-    report.Change("Folder.cfg: " + move.storedPath + " -> " + move.newPath);
+    ReportLosses(FindFolderCfgLosses(*cfg.document, move.newContent), report);
+    report.Change("Folder.cfg: " + Shown(move.storedPath) + " -> " + Shown(move.newPath));
     if (!IsUtf8(cfg.bytes))
         report.Note("Folder.cfg: comes out as UTF-8");
     if (!wxFileName::Exists(move.newPath))
-        report.Note("no such file: " + move.newPath);
+        report.Note("no such file: " + Shown(move.newPath));
     return true;
 }
 
@@ -73,9 +81,8 @@ bool CheckTemplate(HotFolder& folder, TemplateFolders& folders, Report& report)
         CheckIsKnown(folders.To(), report);
         break;
     case Outcome::Elsewhere:
-        if (!move.storedPath.empty() &&
-            !IsSameFolder(FolderOfTemplate(move.storedPath), folders.To().path))
-            report.Note("template elsewhere: " + move.storedPath);
+        if (!move.storedPath.empty() && !IsDirectlyIn(move.storedPath, folders.To().path))
+            report.Note("template elsewhere: " + Shown(move.storedPath));
         break;
     case Outcome::Stays:
         ReportLeft(move.reasonToStay, report);

@@ -1,5 +1,6 @@
 #include "check/folder_cfg_loss.h"
 
+#include "check/report.h"
 #include "store/folder_cfg_format.h"
 #include "store/xml_document.h"
 
@@ -33,13 +34,6 @@ bool IsSection(const wxString& name)
                     FolderCfg::JobSettingSection, FolderCfg::ImposeSettingSection,
                     FolderCfg::FilterSettingSection, FolderCfg::PreflightSection},
                    name);
-}
-
-// As much of a text as is readable in one line.
-wxString Shown(const wxString& text)
-{
-    constexpr size_t Longest = 200;
-    return text.length() <= Longest ? text : text.Left(Longest) + "...";
 }
 
 // The path in the template's entry is meant to change.
@@ -171,7 +165,7 @@ wxArrayString FindFolderCfgLosses(const wxXmlDocument& document, const std::stri
         losses.Add("its root <" + root.GetName() + "> comes out as <" + FolderCfg::Root + ">");
     FindLostAttributes(root, losses);
     wxXmlDocument after;
-    if (LoadXml(rewritten, after).state == XmlLoad::State::Loaded)
+    if (LoadXml(rewritten, FolderCfgLimits, after).state == XmlLoad::State::Loaded)
         FindLostContent(root, *after.GetRoot(), losses);
     return losses;
 }

@@ -67,8 +67,8 @@ void CheckDesktopIni(const HotFolder& folder, const wxString& iconName, Report& 
     const wxString path = folder.directory.Reach(L"");
     switch (change.kind)
     {
-    case Kind::Linked:
-        report.Problem("Desktop.ini: left as it is (reached over a link)");
+    case Kind::Stays:
+        report.Problem(wxString("Desktop.ini: left as it is (") + change.reasonToStay + ")");
         break;
     case Kind::NotAFile:
         report.Problem("Desktop.ini: is not a file");

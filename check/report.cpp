@@ -16,6 +16,12 @@ wxString Count(size_t number, const wxString& what)
 
 } // namespace
 
+wxString Shown(const wxString& text)
+{
+    constexpr size_t Longest = 300;
+    return text.length() <= Longest ? text : text.Left(Longest) + "...";
+}
+
 Report::Report(const wxString& fileName) : m_toFile(!fileName.empty())
 {
     if (!m_toFile)
@@ -38,7 +44,7 @@ void Report::Head(const wxString& text)
 void Report::Begin(const wxString& title)
 {
     EndBlock();
-    m_title = title;
+    m_title = Shown(title);
 }
 
 void Report::Problem(const wxString& text)

@@ -10,6 +10,9 @@
 #include <array>
 #include <set>
 
+/// As much of a text as is readable in one line.
+wxString Shown(const wxString& text);
+
 class Report
 {
   public:

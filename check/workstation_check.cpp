@@ -20,12 +20,12 @@ void CheckEntries(const HotFolderList& list, Report& report)
     {
         const wxString obstacle = WhyOutOfReach(folder);
         if (!obstacle.empty())
-            report.Problem("listed hot folder " + folder + " " + obstacle);
+            report.Problem("listed hot folder " + Shown(folder) + " " + obstacle);
         else
-            report.Note("listed hot folder does not exist: " + folder);
+            report.Note("listed hot folder does not exist: " + Shown(folder));
     }
     for (const wxString& folder : list.repeated)
-        report.Note("hot folder is listed twice: " + folder);
+        report.Note("hot folder is listed twice: " + Shown(folder));
 }
 
 } // namespace

@@ -1,10 +1,9 @@
 #include "migrate/hot_folder_impose_path.h"
 
 #include "migrate/template_move.h"
+#include "platform/library_log.h"
 #include "run/run_log.h"
 #include "store/folder_cfg_writer.h"
-
-#include <wx/log.h>
 
 namespace
 {
@@ -19,7 +18,7 @@ void Save(HotFolder& folder, const std::string& content, const wxString& cfgPath
     switch (SaveHotFolderSettings(folder, content))
     {
     case XmlFile::Saved::Refused:
-        wxLogError("%s", folder.cfg.file.GetFailure().Describe(cfgPath));
+        ReportError(folder.cfg.file.GetFailure().Describe(cfgPath));
         break;
     case XmlFile::Saved::NotReadAgain:
         LogUntouched(cfgPath, CfgStays::NotLoadedAgain);
@@ -76,7 +75,7 @@ void UpdateHotFolderImposePath(const FolderUpgradeApp& app, HotFolder& folder)
         LogUntouched(cfgPath, CfgStays::TooLarge);
         break;
     case XmlFile::State::NotReadable:
-        wxLogError("%s", folder.cfg.WhyNotReadable(cfgPath));
+        ReportError(folder.cfg.WhyNotReadable(cfgPath));
         break;
     case XmlFile::State::Loaded:
         MoveTemplate(folder, cfgPath, app.m_isUpgrade);

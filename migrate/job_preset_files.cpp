@@ -1,6 +1,7 @@
 #include "migrate/job_preset_files.h"
 
 #include "platform/access_rights.h"
+#include "platform/memory.h"
 #include "platform/standard_folders.h"
 
 #include <wx/dir.h>
@@ -96,8 +97,13 @@ RegularFile::Status JobPresetFile::OpenForReading()
 
 RewrittenPreset JobPresetFile::Decide(const wxString& from, const wxString& to)
 {
+    // As it is, as wide characters twice, and one byte to spare.
+    constexpr std::uint64_t MemoryForEachByte = 10;
     std::string before;
     RewrittenPreset preset;
+    const std::int64_t length = m_file.Length();
+    if (length > 0 && length <= LongestFile)
+        RequireMemory(static_cast<std::uint64_t>(length) * MemoryForEachByte);
     if (m_file.Read(before))
         preset = RewritePreset(before, from, to);
     else

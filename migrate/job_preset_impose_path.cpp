@@ -2,16 +2,15 @@
 
 #include "migrate/job_preset_files.h"
 #include "migrate/template_folders.h"
-#include "run/run_log.h"
-
-#include <wx/log.h>
+#include "platform/library_log.h"
+#include "run/attempt.h"
 
 namespace
 {
 
 void LogFailure(const RegularFile& file, const wxString& path)
 {
-    wxLogError("%s", file.GetFailure().Describe(path));
+    ReportError(file.GetFailure().Describe(path));
 }
 
 // Opened for update before it is read, so that one handle serves both. If both fail, only the fault
@@ -36,7 +35,7 @@ void UpdatePreset(JobPresetFile& preset, const wxString& from, const wxString& t
     else if (reopened != RegularFile::Status::Open)
     {
         if (reopened == RegularFile::Status::Refused)
-            wxLogError("%s", reopening.Describe(path));
+            ReportError(reopening.Describe(path));
         RunLog("Unable to open preset.xml for write : " + path);
     }
     else
@@ -68,7 +67,7 @@ void FindJobPresetDirs(wxArrayString& directories)
     if (!found.isThere)
         RunLog("Preset dirctory  not exist: " + root);
     if (found.failure)
-        wxLogError("%s", found.failure->Describe(root));
+        ReportError(found.failure->Describe(root));
     for (const wxString& path : found.paths)
         directories.Add(path);
 }
@@ -84,6 +83,7 @@ void UpdateJobPresetImposePath(const FolderUpgradeApp& app)
     {
         JobPresetFile preset(directory);
         if (preset.IsThere())
-            UpdatePreset(preset, folders.From().path, folders.To().path);
+            Attempt(L"preset.xml", preset.GetPath(),
+                    [&]() { UpdatePreset(preset, folders.From().path, folders.To().path); });
     }
 }

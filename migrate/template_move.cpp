@@ -1,15 +1,17 @@
 #include "migrate/template_move.h"
 
+#include "platform/path_normal_form.h"
 #include "store/folder_cfg_format.h"
 #include "store/folder_cfg_reader.h"
 #include "store/folder_cfg_writer.h"
 #include "store/xml_lookup.h"
 #include "store/xml_text.h"
-#include "store/xml_tree.h"
 
 #include <wx/confbase.h>
 #include <wx/filename.h>
 #include <wx/tokenzr.h>
+
+#include <algorithm>
 
 namespace
 {
@@ -41,6 +43,18 @@ wxString Share(const wxString& path)
     return share;
 }
 
+// Windows has no longer path than 32,767 characters. The library copies the rest of the path for
+// every variable in it.
+bool IsTooLong(const wxString& path)
+{
+    constexpr size_t LongestPath = 32767;
+    constexpr std::ptrdiff_t MostVariables = 100;
+    return path.length() > LongestPath ||
+           std::count_if(path.begin(), path.end(),
+                         [](wxUniChar character)
+                         { return character == '$' || character == '%'; }) > MostVariables;
+}
+
 // A variable may also expand to a server or a drive.
 bool IsElsewhereByName(const wxString& stored, const wxString& folder)
 {
@@ -68,7 +82,7 @@ void DecideFolder(const XmlFile& cfg, TemplateFolders& folders, TemplateMove& mo
     move.outcome = TemplateMove::Outcome::FromUnknown;
     if (!folders.From().isKnown)
         return;
-    const bool isInFolder = IsSameFolder(FolderOfTemplate(move.storedPath), folders.From().path);
+    const bool isInFolder = IsDirectlyIn(move.storedPath, folders.From().path);
     move.outcome = TemplateMove::Outcome::Elsewhere;
     // In an unknown encoding, only ASCII is read correctly.
     if (!cfg.isFaithful && (isInFolder || !move.storedPath.IsAscii()))
@@ -98,25 +112,27 @@ void MakeContent(const wxXmlNode& root, const ImposeSettingTable& imposeSettings
     ReadFilterSetting(&root, filterSetting);
     ReadPreflightSettings(&root, preflightSettings);
     ReadHotFolderSettings(&root, settings);
-    if (CountLevels(filterSetting) > MaxFilterLevels)
-        return Stay(move, CfgStays::TooDeep);
     move.newContent = FolderCfgBytes(settings, jobSettings, paths, filterSetting, imposeSettings,
                                      preflightSettings);
+    if (move.newContent.empty())
+        Stay(move, CfgStays::NewTooLarge);
 }
 
 } // namespace
 
-bool IsSameFolder(const wxString& stored, const wxString& folder)
+bool IsDirectlyIn(const wxString& stored, const wxString& folder)
 {
-    const wxFileName left(stored, wxPATH_NATIVE);
-    const wxFileName right(folder, wxPATH_NATIVE);
-    return left.GetFullName().empty() == right.GetFullName().empty() &&
-           !IsElsewhereByName(stored, folder) && right.SameAs(left, wxPATH_NATIVE);
-}
-
-wxString FolderOfTemplate(const wxString& path)
-{
-    return wxFileName(path, wxPATH_NATIVE).GetPath(wxPATH_GET_VOLUME, wxPATH_NATIVE);
+    if (IsTooLong(stored))
+        return false;
+    wxFileName left(wxFileName(stored, wxPATH_NATIVE).GetPath(wxPATH_GET_VOLUME, wxPATH_NATIVE),
+                    wxPATH_NATIVE);
+    wxFileName right(folder, wxPATH_NATIVE);
+    if (left.GetFullName().empty() != right.GetFullName().empty() ||
+        IsElsewhereByName(left.GetFullPath(), folder))
+        return false;
+    for (wxFileName* each : {&left, &right})
+        each->Normalize(NormalizeAll | wxPATH_NORM_CASE, wxString(), wxPATH_NATIVE);
+    return left.GetFullPath() == right.GetFullPath();
 }
 
 TemplateMove DecideTemplateMove(const XmlFile& cfg, TemplateFolders& folders)

@@ -15,7 +15,7 @@ namespace CfgStays
 constexpr const wchar_t* TooLarge = L"too large to read safely";
 constexpr const wchar_t* UnknownEncoding = L"unknown encoding";
 constexpr const wchar_t* NotStorable = L"new path holds a character that XML cannot store";
-constexpr const wchar_t* TooDeep = L"filter setting nested too deep";
+constexpr const wchar_t* NewTooLarge = L"the new content would be too large";
 constexpr const wchar_t* NotLoadedAgain = L"cannot be loaded again";
 constexpr const wchar_t* Changed = L"changed meanwhile";
 
@@ -45,11 +45,9 @@ struct TemplateMove
 /// decision still depends on it.
 TemplateMove DecideTemplateMove(const XmlFile& cfg, TemplateFolders& folders);
 
-/// Whether both names lead to the same folder. Like wxFileName::SameAs, but a stored name never
-/// causes access to a server: a name on a server counts as another folder unless both are on the
-/// same share, and so do a name on another drive and a name that leads over a shortcut (.lnk). A
-/// name with a final separator is not the same as one without.
-bool IsSameFolder(const wxString& stored, const wxString& folder);
-
-/// The folder that holds the template, without a final separator.
-wxString FolderOfTemplate(const wxString& path);
+/// Whether the stored path names something directly in the folder. Only names are compared, as
+/// wxFileName::SameAs does on Windows, and a stored path never causes access to a server: a path on
+/// a server is elsewhere unless both are on the same share, and so are a path on another drive, one
+/// that leads over a shortcut (.lnk), and one that is too long. A folder with a final separator is
+/// not the same as one without.
+bool IsDirectlyIn(const wxString& stored, const wxString& folder);

@@ -2,29 +2,20 @@
 
 #include "platform/regular_file.h"
 
-bool CopyOver(const wxString& source, const PinnedDirectory& directory, const wxString& name)
+std::optional<FailedCall> CopyOver(const wxString& source, const PinnedDirectory& directory,
+                                   const wxString& name)
 {
     RegularFile from;
     RegularFile to;
-    std::string before;
-    std::string after;
-    if (from.OpenForReading(source) != RegularFile::Status::Open || !from.Read(after))
-        return false;
+    if (from.OpenForReading(source) != RegularFile::Status::Open)
+        return from.GetFailure();
     RegularFile::Status status = to.OpenForUpdate(directory, name);
     if (status == RegularFile::Status::Refused)
         status = to.Replace(directory, name);
-    if (status != RegularFile::Status::Open)
-        return false;
-    if (!to.Read(before))
-    {
-        // Too long for an icon, so not worth restoring.
-        before.clear();
-        to.SetLength(0);
-    }
-    if (!to.Rewrite(before, after, RegularFile::Wait::ForNothing))
-        return false;
+    if (status != RegularFile::Status::Open || !to.TakeContent(from))
+        return to.GetFailure();
     to.TakeAttributes(from);
-    return true;
+    return {};
 }
 
 bool MayCopyOver(const wxString& source, const PinnedDirectory& directory, const wxString& name)
@@ -42,9 +33,7 @@ bool IsCopy(const wxString& source, const PinnedDirectory& directory, const wxSt
 {
     RegularFile from;
     RegularFile to;
-    std::string wanted;
-    std::string there;
     return from.OpenForReading(source) == RegularFile::Status::Open &&
            to.OpenForReading(directory, name) == RegularFile::Status::Open &&
-           to.HasAttributesOf(from) && from.Read(wanted) && to.Read(there) && wanted == there;
+           to.HasAttributesOf(from) && to.HasContentOf(from);
 }

@@ -26,12 +26,13 @@ struct FailedCall
     /// Of this kind, with the system's last error.
     static FailedCall Now(Kind kind);
 
-    /// The words in which wxLogSysError reports it.
+    /// The words in which wxLogSysError reports it, and the end of them.
     wxString Describe(const wxString& shownPath) const;
+    wxString Reason() const;
 };
 
 /// Bytes. A longer file is not read into memory: a planted file of terabytes must not crash a run.
-constexpr std::int64_t LongestFile = std::int64_t{256} * 1024 * 1024;
+constexpr std::int64_t LongestFile = std::int64_t{64} * 1024 * 1024;
 
 /// A file that is opened without waiting (a pipe in its place would block). In a pinned directory
 /// it is not opened through a link. No call reports an error by itself; after one that failed,
@@ -97,6 +98,10 @@ class RegularFile
     /// or the new one followed by line feeds, provided that the system does not interrupt a write.
     bool Rewrite(const std::string& before, const std::string& after, Wait wait = Wait::ForDisk);
 
+    /// Copies the content of the other file in pieces, after reserving space for it.
+    bool TakeContent(const RegularFile& source);
+    bool HasContentOf(const RegularFile& other) const;
+
     /// Copies what wxCopyFile copies in addition to the content. Windows: the attributes and the
     /// time of the last change. Elsewhere: the mode.
     void TakeAttributes(const RegularFile& source);
@@ -113,10 +118,13 @@ class RegularFile
     bool Append(const std::string& bytes);
 
   private:
-    Status Open(const wxString& path, Links links, bool forUpdate);
+    // In no directory, links are followed.
+    Status Open(const PinnedDirectory* directory, const wxString& path, bool forUpdate);
     bool Reserve(std::int64_t from, std::int64_t length);
-    bool Write(std::int64_t offset, const std::string& bytes);
     void WaitForDisk();
+    // Until the count is reached or the file ends; less if a call fails.
+    size_t ReadAt(std::int64_t offset, char* bytes, size_t count) const;
+    bool Write(std::int64_t offset, const char* bytes, size_t count);
     // The number of bytes that were read or written, at least one; 0 if there are none or the call
     // fails.
     size_t ReadSome(std::int64_t offset, char* bytes, size_t count) const;
@@ -127,6 +135,6 @@ class RegularFile
     void* m_handle = nullptr;
 #else
     int m_descriptor = -1;
-    Links m_links = Links::Refuse;
+    bool m_followsLinks = false;
 #endif
 };

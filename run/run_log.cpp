@@ -1,10 +1,11 @@
 #include "run/run_log.h"
 
+#include "platform/library_log.h"
 #include "platform/regular_file.h"
 #include "platform/unicode_text.h"
 #include "run/run_log_place.h"
 
-#include <wx/log.h>
+#include <exception>
 
 bool RunLogEnabled = true;
 
@@ -30,7 +31,7 @@ class LogFile
         if ((status == RegularFile::Status::Open && file.Append(line)) ||
             status == RegularFile::Status::NotThere || m_isReported)
             return;
-        wxLogError("%s", file.GetFailure().Describe(m_directory + RunLogFileName));
+        ReportError(file.GetFailure().Describe(m_directory + RunLogFileName));
         m_isReported = true;
     }
 
@@ -58,6 +59,14 @@ void RunLog(const wxString& message, int count)
 {
     if (!RunLogEnabled)
         return;
-    static LogFile log;
-    log.Append(FormatLine(message, count));
+    try
+    {
+        static LogFile log;
+        log.Append(FormatLine(message, count));
+    }
+    catch (const std::exception&)
+    {
+        // Without memory for it, the line is left out.
+        return;
+    }
 }

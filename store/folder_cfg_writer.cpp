@@ -6,23 +6,30 @@
 
 #include <wx/stream.h>
 
+#include <new>
 #include <utility>
 
 namespace
 {
 
 constexpr int IndentationStep = 2;
-// The library's memory stream copies all its bytes for every kilobyte that is added.
+// The library's memory stream copies all its bytes for every kilobyte that is added. This one
+// refuses more than can be read again.
 class StringOutputStream : public wxOutputStream
 {
   public:
     std::string bytes;
+    bool isFull = false;
 
   protected:
     size_t OnSysWrite(const void* data, size_t size) override
     {
-        bytes.append(static_cast<const char*>(data), size);
-        return size;
+        isFull = bytes.size() + size > FolderCfgLimits.bytes;
+        if (isFull)
+            m_lasterror = wxSTREAM_WRITE_ERROR;
+        else
+            bytes.append(static_cast<const char*>(data), size);
+        return isFull ? 0 : size;
     }
 };
 
@@ -162,8 +169,12 @@ std::string FolderCfgBytes(const HotFolderSettings& settings, const JobSettingTa
     WriteFilterSetting(*root, filterSetting);
     WritePreflightSettings(root, preflightSettings);
     StringOutputStream stream;
-    document.Save(stream, IndentationStep);
-    return std::move(stream.bytes);
+    if (!document.Save(stream, IndentationStep) && !stream.isFull)
+        throw std::bad_alloc(); // the only other reason
+    const bool isReadable =
+        !stream.isFull &&
+        (IsHarmlessXml(stream.bytes) || LookAtXml(stream.bytes, FolderCfgLimits).isWithinLimits);
+    return isReadable ? std::move(stream.bytes) : std::string();
 }
 
 XmlFile::Saved SaveHotFolderSettings(HotFolder& folder, const std::string& content)

@@ -10,8 +10,8 @@
 #include <vector>
 
 /// The content of a Folder.cfg with the six values, and nothing else. A filter setting whose name
-/// is not "FilterSetting" is left out. It must not be deeper than MaxFilterLevels. It is moved
-/// from, and empty afterwards.
+/// is not "FilterSetting" is left out. It is moved from, and empty afterwards. Empty if the content
+/// would exceed FolderCfgLimits, and so could not be read again.
 std::string FolderCfgBytes(const HotFolderSettings& settings, const JobSettingTable& jobSettings,
                            const HotFolderPaths& paths, wxXmlNode& filterSetting,
                            const ImposeSettingTable& imposeSettings,
@@ -20,10 +20,6 @@ std::string FolderCfgBytes(const HotFolderSettings& settings, const JobSettingTa
 /// Makes that content the hot folder's Folder.cfg, if it still has the loaded content. Holds
 /// FolderCfgLock throughout.
 XmlFile::Saved SaveHotFolderSettings(HotFolder& folder, const std::string& content);
-
-/// How many levels below a filter setting can be saved: wxXmlDocument::Save recurses, and the time
-/// and size of the indentation grow with the square of the depth.
-constexpr int MaxFilterLevels = 1024;
 
 /// The section writers append one element to the root of a document under construction, or do
 /// nothing if there is no root.

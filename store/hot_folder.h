@@ -30,5 +30,5 @@ struct HotFolder
     const wxString path; // as it is listed; for messages and the shell
     const PinnedDirectory directory;
     const PinnedDirectory privateDir;
-    XmlFile cfg;
+    XmlFile cfg{FolderCfgLimits};
 };

@@ -1,11 +1,11 @@
 #include "store/hot_folder_list.h"
 
+#include "platform/library_log.h"
 #include "platform/standard_folders.h"
 #include "store/xml_lookup.h"
 
 #include <wx/filename.h>
 #include <wx/hashmap.h>
-#include <wx/log.h>
 
 #include <unordered_set>
 
@@ -69,7 +69,7 @@ wxString GetHotFolderDataDir()
 HotFolderList LoadHotFolderList()
 {
     HotFolderList list;
-    XmlFile file;
+    XmlFile file(ListLimits);
     const wxString path = GetHotFolderListPath();
     list.state = file.Load(file.file.OpenForReading(path));
     if (list.state == XmlFile::State::NotReadable)
@@ -97,7 +97,7 @@ void ReadHotFolderList(wxArrayString& folders)
 {
     const HotFolderList list = LoadHotFolderList();
     if (!list.whyNotReadable.empty())
-        wxLogError("%s", list.whyNotReadable);
+        ReportError(list.whyNotReadable);
     PathSet known(folders.begin(), folders.end());
     for (const wxString& folder : list.folders)
     {

@@ -22,5 +22,6 @@ struct XmlLoad
 };
 
 /// Loads the document with wxXmlDocument::Load (encoding "UTF-8"), text nodes that are only white
-/// space included. The library reports nothing.
-XmlLoad LoadXml(const std::string& bytes, wxXmlDocument& document);
+/// space included. The library reports nothing. Throws std::bad_alloc if there is not enough memory
+/// to work with the document.
+XmlLoad LoadXml(const std::string& bytes, const XmlLimits& limits, wxXmlDocument& document);

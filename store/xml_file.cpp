@@ -2,6 +2,10 @@
 
 #include "store/xml_encoding.h"
 
+XmlFile::XmlFile(const XmlLimits& itsLimits) : limits(itsLimits)
+{
+}
+
 // Most of the time of a run is the parser's, and the steps of a hot folder read the same file one
 // after another. The same bytes make the same document.
 XmlFile::State XmlFile::Load(RegularFile::Status opened)
@@ -11,7 +15,7 @@ XmlFile::State XmlFile::Load(RegularFile::Status opened)
     state = State::Loaded;
     if (opened != RegularFile::Status::Open)
         state = opened == RegularFile::Status::Refused ? State::NotReadable : State::Missing;
-    else if (file.Length() > LongestXml)
+    else if (file.Length() > Longest())
         state = State::TooLarge;
     else if (!file.Read(bytes))
         state = State::NotReadable;
@@ -22,7 +26,7 @@ XmlFile::State XmlFile::Load(RegularFile::Status opened)
     if (state != State::Loaded)
         return state;
     auto parsed = std::make_unique<wxXmlDocument>();
-    const XmlLoad load = LoadXml(bytes, *parsed);
+    const XmlLoad load = LoadXml(bytes, limits, *parsed);
     error = load.error;
     if (load.state != XmlLoad::State::Loaded)
         return state =
@@ -38,11 +42,16 @@ XmlFile::Saved XmlFile::Save(const std::string& newBytes)
     if (reopened == RegularFile::Status::Refused)
         return Saved::Refused;
     std::string now;
-    if (reopened != RegularFile::Status::Open || !file.Read(now, LongestXml))
+    if (reopened != RegularFile::Status::Open || !file.Read(now, Longest()))
         return Saved::NotReadAgain;
     if (now != bytes)
         return Saved::Changed;
     return file.Rewrite(bytes, newBytes) ? Saved::Done : Saved::Refused;
+}
+
+std::int64_t XmlFile::Longest() const
+{
+    return static_cast<std::int64_t>(limits.bytes);
 }
 
 wxString XmlFile::WhyNotReadable(const wxString& shownPath) const

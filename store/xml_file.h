@@ -27,6 +27,8 @@ struct XmlFile
         Changed       // its bytes are no longer those that were loaded
     };
 
+    explicit XmlFile(const XmlLimits& itsLimits);
+
     /// Reads a file that was just opened. Parses it unless its bytes are those of the document that
     /// is already here.
     State Load(RegularFile::Status opened);
@@ -42,10 +44,14 @@ struct XmlFile
     /// space.
     const wxXmlNode* Root() const;
 
+    const XmlLimits& limits;
     RegularFile file;
     State state = State::Missing;
     std::string bytes; // as they were loaded
     std::unique_ptr<const wxXmlDocument> document;
     bool isFaithful = false; // whether the document is what its author meant: IsReadFaithfully
     XmlSyntaxError error;
+
+  private:
+    std::int64_t Longest() const;
 };

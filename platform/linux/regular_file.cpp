@@ -16,10 +16,9 @@ bool IsRegular(int descriptor, struct stat& status)
 }
 
 // Opened so that a pipe in place of the file does not block the tool.
-int OpenDescriptor(const wxString& path, Links links, int flags)
+int OpenDescriptor(const wxString& path, bool followsLinks, int flags)
 {
-    return open(path.utf8_str(),
-                flags | O_NONBLOCK | O_CLOEXEC | (links == Links::Refuse ? O_NOFOLLOW : 0));
+    return open(path.utf8_str(), flags | O_NONBLOCK | O_CLOEXEC | (followsLinks ? 0 : O_NOFOLLOW));
 }
 
 // Whether both are the same regular file.
@@ -31,17 +30,18 @@ bool IsSameFile(const struct stat& left, const struct stat& right)
 
 } // namespace
 
-RegularFile::Status RegularFile::Open(const wxString& path, Links links, bool forUpdate)
+RegularFile::Status RegularFile::Open(const PinnedDirectory* directory, const wxString& path,
+                                      bool forUpdate)
 {
     Close();
     m_path = path;
-    m_links = links;
-    m_descriptor = OpenDescriptor(path, links, forUpdate ? O_RDWR : O_RDONLY);
+    m_followsLinks = !directory;
+    m_descriptor = OpenDescriptor(path, m_followsLinks, forUpdate ? O_RDWR : O_RDONLY);
     m_failure = FailedCall::Now(FailedCall::Kind::Open);
     struct stat status = {};
     if (m_descriptor < 0)
     {
-        const int flags = links == Links::Refuse ? AT_SYMLINK_NOFOLLOW : 0;
+        const int flags = m_followsLinks ? 0 : AT_SYMLINK_NOFOLLOW;
         return fstatat(AT_FDCWD, path.utf8_str(), &status, flags) == 0 && S_ISREG(status.st_mode)
                    ? Status::Refused
                    : Status::NotThere;
@@ -57,7 +57,7 @@ RegularFile::Status RegularFile::ReopenForUpdate()
     struct stat ours = {};
     struct stat now = {};
     const bool isKnown = fstat(m_descriptor, &ours) == 0;
-    const int descriptor = OpenDescriptor(m_path, m_links, O_RDWR);
+    const int descriptor = OpenDescriptor(m_path, m_followsLinks, O_RDWR);
     m_failure = FailedCall::Now(FailedCall::Kind::Open);
     const bool isFound =
         descriptor < 0 ? lstat(m_path.utf8_str(), &now) == 0 : fstat(descriptor, &now) == 0;

@@ -19,11 +19,26 @@ HANDLE OpenHandle(const wxString& path, DWORD access, DWORD flags)
     return handle == INVALID_HANDLE_VALUE ? nullptr : handle;
 }
 
-bool IsReparsePoint(HANDLE handle)
+BY_HANDLE_FILE_INFORMATION InformationOf(HANDLE handle)
 {
     BY_HANDLE_FILE_INFORMATION information = {};
-    return GetFileInformationByHandle(handle, &information) != 0 &&
-           (information.dwFileAttributes & FILE_ATTRIBUTE_REPARSE_POINT) != 0;
+    GetFileInformationByHandle(handle, &information);
+    return information;
+}
+
+// Opens by its name a file that is already open. Null if the name leads to another one by now.
+HANDLE OpenAgain(const wxString& path, DWORD access, HANDLE file)
+{
+    const HANDLE again = OpenHandle(path, access, 0);
+    const BY_HANDLE_FILE_INFORMATION ours = InformationOf(file);
+    const BY_HANDLE_FILE_INFORMATION now = InformationOf(again);
+    if (!again ||
+        (ours.dwVolumeSerialNumber == now.dwVolumeSerialNumber &&
+         ours.nFileIndexHigh == now.nFileIndexHigh && ours.nFileIndexLow == now.nFileIndexLow))
+        return again;
+    CloseHandle(again);
+    SetLastError(ERROR_FILE_INVALID);
+    return nullptr;
 }
 
 bool IsDiskFull(DWORD error)
@@ -48,15 +63,15 @@ DWORD LengthOfCall(size_t rest)
 
 } // namespace
 
-// A link is opened as such, so that it can be distinguished from a file. While the link or the file
-// is open, the name leads to nothing else; so a file whose content is elsewhere (in the cloud) can
-// be opened again by its name.
-RegularFile::Status RegularFile::Open(const wxString& path, Links links, bool forUpdate)
+// A link is opened as such, so that it can be distinguished from a file. A file whose content is
+// elsewhere (in the cloud) is then opened again.
+RegularFile::Status RegularFile::Open(const PinnedDirectory* directory, const wxString& path,
+                                      bool forUpdate)
 {
     Close();
     m_path = path;
     const DWORD access = forUpdate ? GENERIC_READ | GENERIC_WRITE : GENERIC_READ;
-    const DWORD flags = links == Links::Refuse ? FILE_FLAG_OPEN_REPARSE_POINT : 0;
+    const DWORD flags = directory ? FILE_FLAG_OPEN_REPARSE_POINT : 0;
     m_handle = OpenHandle(path, access, flags);
     m_failure = FailedCall::Now(FailedCall::Kind::Open);
     if (!m_handle)
@@ -67,14 +82,15 @@ RegularFile::Status RegularFile::Open(const wxString& path, Links links, bool fo
                    : Status::Refused;
     }
     if (GetFileType(m_handle) != FILE_TYPE_DISK ||
-        (links == Links::Refuse && (IsLinkHandle(m_handle) || IsLink(path))))
+        (directory && (IsLinkHandle(m_handle) || IsLink(path) || !directory->Holds(m_handle))))
     {
         Close();
         return Status::NotThere;
     }
-    if (flags == 0 || !IsReparsePoint(m_handle))
+    if (!directory ||
+        (InformationOf(m_handle).dwFileAttributes & FILE_ATTRIBUTE_REPARSE_POINT) == 0)
         return Status::Open;
-    const HANDLE content = OpenHandle(path, access, 0);
+    const HANDLE content = OpenAgain(path, access, m_handle);
     m_failure = FailedCall::Now(FailedCall::Kind::Open);
     CloseHandle(m_handle);
     m_handle = content;
@@ -84,10 +100,8 @@ RegularFile::Status RegularFile::Open(const wxString& path, Links links, bool fo
 RegularFile::Status RegularFile::ReopenForUpdate()
 {
     HANDLE handle = ReOpenFile(m_handle, GENERIC_READ | GENERIC_WRITE, Sharing, 0);
-    // Not every file system supports that. The open handle ensures that the name leads to the same
-    // file.
-    if (handle == INVALID_HANDLE_VALUE)
-        handle = OpenHandle(m_path, GENERIC_READ | GENERIC_WRITE, 0);
+    if (handle == INVALID_HANDLE_VALUE) // not every file system supports that
+        handle = OpenAgain(m_path, GENERIC_READ | GENERIC_WRITE, m_handle);
     m_failure = FailedCall::Now(FailedCall::Kind::Open);
     if (!handle)
         return Status::Refused;
