@@ -38,9 +38,9 @@ void ReportLosses(const wxArrayString& losses, Report& report)
 {
     constexpr size_t Most = 20;
     for (size_t i = 0; i < losses.size() && i < Most; ++i)
-        report.Problem("Folder.cfg: " + losses[i]);
+        report.Loss("Folder.cfg: " + losses[i]);
     if (losses.size() > Most)
-        report.Problem(wxString::Format("Folder.cfg: and %zu more", losses.size() - Most));
+        report.Loss(wxString::Format("Folder.cfg: and %zu more", losses.size() - Most));
 }
 
 // False if the file is not rewritten.

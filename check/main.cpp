@@ -8,10 +8,6 @@
 namespace
 {
 
-// The exit statuses. The highest one that applies is returned.
-constexpr int NothingToDo = 0;
-constexpr int HasChanges = 1;
-constexpr int HasProblems = 2;
 constexpr int WrongCall = 3;
 
 int Check(bool isUpgrade, const wxString& fileName)
@@ -19,14 +15,9 @@ int Check(bool isUpgrade, const wxString& fileName)
     Report report(fileName);
     CheckRun(isUpgrade, report);
     if (!report.End())
-    {
         WriteStandardError("FolderUpgradeCheck: the report cannot be written to " +
                            (fileName.empty() ? wxString("the standard output") : fileName) + "\n");
-        return HasProblems;
-    }
-    if (report.GetProblems() > 0)
-        return HasProblems;
-    return report.GetChanges() > 0 ? HasChanges : NothingToDo;
+    return report.GetStatus();
 }
 
 } // namespace

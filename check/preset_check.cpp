@@ -48,7 +48,7 @@ void CheckContent(const wxString& name, const RewrittenPreset& rewritten, Report
     if (!encoding.empty() && encoding.CmpNoCase("UTF-8") != 0)
         report.Problem(name + ": declares the encoding " + encoding + ", but comes out as UTF-8");
     else if (IsTakenAsLatin1(before))
-        report.Problem(name + ": is not UTF-8, so the whole file is read as Latin-1");
+        report.Loss(name + ": is not UTF-8, so the whole file is read as Latin-1");
     if (rewritten.bytes == before)
         return;
     if (rewritten.movedPaths == 0)

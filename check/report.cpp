@@ -30,10 +30,12 @@ Report::Report(const wxString& fileName) : m_toFile(!fileName.empty())
     path.MakeAbsolute();
     const PinnedDirectory directory(path.GetPath(wxPATH_GET_VOLUME | wxPATH_GET_SEPARATOR),
                                     Links::Follow);
-    const wxString name = path.GetFullName();
-    m_isWritten = (m_file.OpenForUpdate(directory, name) == RegularFile::Status::Open &&
-                   m_file.SetLength(0)) ||
-                  m_file.CreateNew(directory, name) == RegularFile::Status::Open;
+    m_isWritten = m_file.OpenEmpty(directory, path.GetFullName());
+}
+
+Report::Report(const PinnedDirectory& directory, const wxString& name)
+    : m_toFile(true), m_isWritten(m_file.OpenEmpty(directory, name))
+{
 }
 
 void Report::Head(const wxString& text)
@@ -52,6 +54,22 @@ void Report::Problem(const wxString& text)
     Add(Problems, "  problem  " + text);
 }
 
+void Report::Loss(const wxString& text)
+{
+    m_losses.insert(m_title + ": " + text);
+    Problem(text);
+}
+
+void Report::RepeatLosses(const Report& before)
+{
+    Begin("Lost or reset by the run");
+    for (const wxString& loss : before.m_losses)
+    {
+        if (m_losses.count(loss) == 0)
+            Problem(loss);
+    }
+}
+
 void Report::Change(const wxString& text)
 {
     Add(Changes, "  change   " + text);
@@ -68,23 +86,22 @@ void Report::ProblemOnce(const wxString& text)
         Problem(text);
 }
 
-bool Report::End()
+bool Report::End(const wxString& lastLine)
 {
     EndBlock();
     Write("");
     Write(Count(m_counts[Changes], "change") + ", " + Count(m_counts[Problems], "problem") + ", " +
           Count(m_counts[Notes], "note"));
+    if (!lastLine.empty())
+        Write(lastLine);
     return m_isWritten;
 }
 
-size_t Report::GetProblems() const
+int Report::GetStatus() const
 {
-    return m_counts[Problems];
-}
-
-size_t Report::GetChanges() const
-{
-    return m_counts[Changes];
+    if (m_counts[Problems] > 0 || !m_isWritten)
+        return ReportStatus::HasProblems;
+    return m_counts[Changes] > 0 ? ReportStatus::HasChanges : ReportStatus::NothingToDo;
 }
 
 void Report::Add(Kind kind, const wxString& text)

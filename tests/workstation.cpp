@@ -119,7 +119,7 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser)
     const fs::path programs = IsWindowsProgram() ? WindowsProgram().parent_path() : built;
     fs::create_directories(m_hostDirs["tool"]);
     fs::create_directories(m_root / "Vorige 版");
-    for (const char* program : {"FolderUpgrade", "FolderUpgradeCheck"})
+    for (const char* program : {"FolderUpgrade", "FolderUpgradeCheck", "FolderUpgradeRun"})
         fs::copy(programs / ProgramFile(program), m_hostDirs["tool"]);
     fs::copy(built / "BundleIcons", m_hostDirs["tool"] / "BundleIcons");
     for (const auto& icon : fs::directory_iterator(built / "BundleIcons"))
