@@ -89,7 +89,8 @@ ProcessResult Wine::Start(const std::vector<std::string>& commandLine, const fs:
     return RunToTheEnd(process,
                        [&](double seconds)
                        {
-                           if (seconds <= 1)
+                           // FolderUpgradeRun has to do without.
+                           if (seconds <= 1 || commandLine[0].find("FolderUpgradeRun") != std::string::npos)
                                return;
                            const std::string text = TextIfThere(watched);
                            // One box may need more than one press.
