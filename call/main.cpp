@@ -27,7 +27,7 @@ using Clock = std::chrono::steady_clock;
 constexpr int WrongCall = 3;
 constexpr int NoRun = 4;
 
-constexpr unsigned long LongestLimit = 7 * 24 * 60 * 60; // seconds; longer than any installation
+constexpr unsigned long LongestLimit = 7UL * 24 * 60 * 60; // seconds; longer than any installation
 constexpr const char* LastLine = "Exit status of FolderUpgradeRun: %d";
 
 class Call
@@ -71,11 +71,6 @@ class Call
     }
 
   private:
-    wxString Name(const wxString& end) const
-    {
-        return wxString("FolderUpgrade-") + (m_isUpgrade ? "upgrade" : "downgrade") + end;
-    }
-
     // A check that hangs in a call of the system cannot be ended without the process.
     void Check(Report& report, int statusAtDeadline)
     {
@@ -102,7 +97,7 @@ class Call
     void GiveUp(int status) const
     {
         RegularFile report;
-        if (report.OpenForUpdate(m_folder, Name("-after.txt")) == RegularFile::Status::Open)
+        if (report.OpenForUpdate(m_folder, m_name + "-after.txt") == RegularFile::Status::Open)
             report.Append(wxTextBuffer::Translate("The time is over. A check was not finished.\n" +
                                                   wxString::Format(LastLine, status) + "\n")
                               .utf8_string());
@@ -110,13 +105,14 @@ class Call
     }
 
     const bool m_isUpgrade;
+    const wxString m_name = m_isUpgrade ? "FolderUpgrade-upgrade" : "FolderUpgrade-downgrade";
     const Clock::time_point m_deadline;
     const PinnedDirectory m_folder;
     // All files are empty at first, so that none is an earlier call's.
-    Report m_before{m_folder, Name("-before.txt")};
-    Report m_after{m_folder, Name("-after.txt")};
+    Report m_before{m_folder, m_name + "-before.txt"};
+    Report m_after{m_folder, m_name + "-after.txt"};
     RegularFile m_log;
-    bool m_isWritten = m_log.OpenEmpty(m_folder, Name(".log")); // the log, and the first report
+    bool m_isWritten = m_log.OpenEmpty(m_folder, m_name + ".log"); // the log, and the first report
 };
 
 } // namespace
@@ -136,7 +132,7 @@ class FolderUpgradeRunApp : public wxAppConsole
         wxDisableAsserts();
         const bool isUpgrade = argc > 1 && argv[1].CmpNoCase("I") == 0;
         const bool isDowngrade = argc > 1 && argv[1].CmpNoCase("U") == 0;
-        unsigned long limit = 60 * 60; // seconds
+        unsigned long limit = 60UL * 60; // seconds
         const bool hasLimit = argc > 3 && argv[2] == "--limit" && argv[3].ToULong(&limit);
         const int next = hasLimit ? 4 : 2; // the position of FOLDER
         if ((!isUpgrade && !isDowngrade) || limit < 1 || limit > LongestLimit || argc > next + 1 ||

@@ -13,15 +13,16 @@ namespace
 {
 
 // Returns the system's error, or 0.
-int Start(std::string path, std::string argument, pid_t& child)
+int Start(const wxString& path, const wxString& argument, pid_t& child)
 {
-    const std::array<char*, 3> argv = {path.data(), argument.data(), nullptr};
+    std::array<std::string, 2> words = {path.utf8_string(), argument.utf8_string()};
+    const std::array<char*, 3> argv = {words[0].data(), words[1].data(), nullptr};
     posix_spawn_file_actions_t actions;
     posix_spawn_file_actions_init(&actions);
     for (const int stream : {STDIN_FILENO, STDOUT_FILENO, STDERR_FILENO})
         posix_spawn_file_actions_addopen(&actions, stream, "/dev/null", O_RDWR, 0);
     posix_spawn_file_actions_addclosefrom_np(&actions, STDERR_FILENO + 1);
-    const int error = posix_spawn(&child, path.c_str(), &actions, nullptr, argv.data(), environ);
+    const int error = posix_spawn(&child, argv[0], &actions, nullptr, argv.data(), environ);
     posix_spawn_file_actions_destroy(&actions);
     return error;
 }
@@ -32,7 +33,7 @@ ProgramRun RunProgram(const wxString& path, const wxString& argument,
                       std::chrono::steady_clock::time_point deadline)
 {
     pid_t child = 0;
-    errno = Start(path.utf8_string(), argument.utf8_string(), child);
+    errno = Start(path, argument, child);
     if (errno != 0)
         return {FailedCall::Now(FailedCall::Kind::Open)};
     int status = 0;
