@@ -9,6 +9,13 @@
 
 #include <array>
 #include <set>
+#include <vector>
+
+/// The exit statuses of a check. The highest one that applies is returned.
+constexpr int NothingToDo = 0;
+constexpr int HasChanges = 1;
+constexpr int HasProblems = 2;
+constexpr int WrongArguments = 3;
 
 /// As much of a text as is readable in one line.
 wxString Shown(const wxString& text);
@@ -28,27 +35,32 @@ class Report
     void Begin(const wxString& title);
 
     void Problem(const wxString& text);
+    /// The first lines, each after the prefix, and how many more there are.
+    void Problems(const wxString& prefix, const std::vector<wxString>& texts);
+    void Notes(const wxString& prefix, const std::vector<wxString>& texts);
     void Change(const wxString& text);
+    void Changes(const wxString& prefix, const std::vector<wxString>& texts);
     void Note(const wxString& text);
-    /// A problem that concerns many blocks: written only with the first of them.
+    /// What concerns many blocks: written only with the first of them.
     void ProblemOnce(const wxString& text);
+    void NoteOnce(const wxString& text);
 
     /// Writes the totals. Returns false if anything could not be written.
     bool End();
 
-    size_t GetProblems() const;
-    size_t GetChanges() const;
+    int ExitStatus() const;
 
   private:
     enum Kind
     {
-        Problems,
-        Changes,
-        Notes,
+        ProblemKind,
+        ChangeKind,
+        NoteKind,
         KindCount
     };
 
     void Add(Kind kind, const wxString& text);
+    void AddSome(Kind kind, const wxString& prefix, const std::vector<wxString>& texts);
     void EndBlock();
     void Write(const wxString& text);
 
