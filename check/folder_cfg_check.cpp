@@ -47,7 +47,7 @@ bool CheckMove(HotFolder& folder, const TemplateMove& move, Report& report)
     }
     if (move.storedPath == move.newPath && move.newContent == cfg.bytes)
         return true;
-    report.Problems("Folder.cfg: ", FindFolderCfgLosses(*cfg.document, move.newContent));
+    report.Add("Folder.cfg: ", {FindFolderCfgLosses(*cfg.document, move.newContent), {}, {}});
     report.Change("Folder.cfg: " + Shown(move.storedPath) + " -> " + Shown(move.newPath));
     if (!IsUtf8(cfg.bytes))
         report.Note("Folder.cfg: comes out as UTF-8");
@@ -72,8 +72,7 @@ bool CheckTemplate(HotFolder& folder, TemplateFolders& folders, TemplateCheck& t
                     move.outcome == Outcome::Elsewhere ? "in a sub-folder"
                                                        : "in a file that stays as it is",
                     findings);
-    report.Problems({}, findings.problems);
-    report.Notes({}, findings.notes);
+    report.Add({}, findings);
     return isRewritten;
 }
 

@@ -114,7 +114,6 @@ void CheckPaths(const wxString& name, const std::string& before, bool isRewritte
         else
             ++paths[{path.stored, isRewritten ? path.moved : path.stored}];
     }
-    std::vector<wxString> changes;
     for (const auto& [path, count] : paths)
     {
         const auto& [stored, left] = path;
@@ -125,15 +124,14 @@ void CheckPaths(const wxString& name, const std::string& before, bool isRewritte
                         findings);
         if (stored == left)
             continue;
-        changes.push_back(Shown(stored) + " -> " + Shown(left) +
-                          (count == 1 ? wxString() : wxString::Format(" (%zu times)", count)));
+        findings.changes.push_back(
+            Shown(stored) + " -> " + Shown(left) +
+            (count == 1 ? wxString() : wxString::Format(" (%zu times)", count)));
         if (MovedPresetPath(left, from, to) != left)
             report.ProblemOnce("one template folder is below the other: another run would move "
                                "paths of presets once more");
     }
-    report.Problems(name, findings.problems);
-    report.Changes(name, changes);
-    report.Notes(name, findings.notes);
+    report.Add(name, findings);
 }
 
 void CheckPreset(JobPresetFile& preset, const wxString& name, TemplateFolders& folders,

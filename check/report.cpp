@@ -52,19 +52,9 @@ void Report::Problem(const wxString& text)
     Add(ProblemKind, text);
 }
 
-void Report::Problems(const wxString& prefix, const std::vector<wxString>& texts)
-{
-    AddSome(ProblemKind, prefix, texts);
-}
-
 void Report::Change(const wxString& text)
 {
     Add(ChangeKind, text);
-}
-
-void Report::Changes(const wxString& prefix, const std::vector<wxString>& texts)
-{
-    AddSome(ChangeKind, prefix, texts);
 }
 
 void Report::Note(const wxString& text)
@@ -72,9 +62,11 @@ void Report::Note(const wxString& text)
     Add(NoteKind, text);
 }
 
-void Report::Notes(const wxString& prefix, const std::vector<wxString>& texts)
+void Report::Add(const wxString& prefix, const Findings& findings)
 {
-    AddSome(NoteKind, prefix, texts);
+    AddSome(ProblemKind, prefix, findings.problems);
+    AddSome(ChangeKind, prefix, findings.changes);
+    AddSome(NoteKind, prefix, findings.notes);
 }
 
 void Report::ProblemOnce(const wxString& text)

@@ -20,6 +20,14 @@ constexpr int WrongArguments = 3;
 /// As much of a text as is readable in one line.
 wxString Shown(const wxString& text);
 
+/// Findings of the same kind, of which a report shows only some.
+struct Findings
+{
+    std::vector<wxString> problems;
+    std::vector<wxString> changes;
+    std::vector<wxString> notes;
+};
+
 class Report
 {
   public:
@@ -35,12 +43,10 @@ class Report
     void Begin(const wxString& title);
 
     void Problem(const wxString& text);
-    /// The first lines, each after the prefix, and how many more there are.
-    void Problems(const wxString& prefix, const std::vector<wxString>& texts);
-    void Notes(const wxString& prefix, const std::vector<wxString>& texts);
     void Change(const wxString& text);
-    void Changes(const wxString& prefix, const std::vector<wxString>& texts);
     void Note(const wxString& text);
+    /// The first 20 of each kind, each after the prefix, and how many more there are.
+    void Add(const wxString& prefix, const Findings& findings);
     /// What concerns many blocks: written only with the first of them.
     void ProblemOnce(const wxString& text);
     void NoteOnce(const wxString& text);

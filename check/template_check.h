@@ -6,13 +6,6 @@
 
 #include <wx/string.h>
 
-/// Findings about one file.
-struct Findings
-{
-    std::vector<wxString> problems;
-    std::vector<wxString> notes;
-};
-
 class TemplateCheck
 {
   public:

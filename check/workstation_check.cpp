@@ -24,19 +24,21 @@ void CheckEntries(const HotFolderList& list, Report& report)
         report.Problem("none of the listed hot folders exists (another account? mapped drives?)");
     else if (list.folders.empty())
         report.Note("HotFolderList.cfg lists no hot folder");
+    Findings missing;
     for (const wxString& folder : list.missing)
     {
         const wxString obstacle = WhyOutOfReach(folder);
         if (!obstacle.empty())
-            report.Problem("listed hot folder " + Shown(folder) + " " + obstacle);
+            missing.problems.push_back(Shown(folder) + " " + obstacle);
         else if (!IsDriveThere(folder))
-            report.Problem("listed hot folder is on a drive or share that is not there: " +
-                           Shown(folder));
+            missing.problems.push_back("is on a drive or share that is not there: " +
+                                       Shown(folder));
         else
-            report.Note("listed hot folder does not exist: " + Shown(folder));
+            missing.notes.push_back("does not exist: " + Shown(folder));
     }
     for (const wxString& folder : list.repeated)
-        report.Note("hot folder is listed twice: " + Shown(folder));
+        missing.notes.push_back("is listed twice: " + Shown(folder));
+    report.Add("listed hot folder ", missing);
 }
 
 } // namespace
