@@ -23,8 +23,7 @@ namespace
 
 using Clock = std::chrono::steady_clock;
 
-// The exit statuses in addition to those of a report. The highest one that applies is returned.
-constexpr int WrongCall = 3;
+// The exit status in addition to those of a check. The highest one that applies is returned.
 constexpr int NoRun = 4;
 
 constexpr unsigned long LongestLimit = 7UL * 24 * 60 * 60; // seconds; longer than any installation
@@ -61,13 +60,13 @@ class Call
             m_after.Problem("the time is over, so the check after the run is left out");
         else
         {
-            Check(m_after, isFinished ? ReportStatus::HasProblems : NoRun);
+            Check(m_after, isFinished ? HasProblems : NoRun);
             m_after.RepeatLosses(m_before);
         }
-        const int status = std::max({m_after.GetStatus(), isFinished ? 0 : NoRun,
-                                     m_isWritten ? 0 : ReportStatus::HasProblems});
-        m_after.End(wxString::Format(LastLine, status));
-        return std::max(status, m_after.GetStatus());
+        const int status =
+            std::max({m_after.ExitStatus(), isFinished ? 0 : NoRun, m_isWritten ? 0 : HasProblems});
+        const bool isSaid = m_after.End(wxString::Format(LastLine, status));
+        return std::max(status, isSaid ? 0 : HasProblems);
     }
 
   private:
@@ -83,7 +82,8 @@ class Call
             });
         try
         {
-            CheckRun(m_isUpgrade, report);
+            TemplateFolders folders(m_isUpgrade);
+            CheckRun(folders, report);
         }
         catch (const std::exception& exception)
         {
@@ -142,7 +142,7 @@ class FolderUpgradeRunApp : public wxAppConsole
                                "Runs FolderUpgrade with the same switch, between two checks.\n"
                                "Exit status: 0 everything is as it should be, 1 changes are left, "
                                "2 problems, 3 wrong arguments, 4 FolderUpgrade did not run.\n");
-            return WrongCall;
+            return WrongArguments;
         }
         const wxString logFolder = RunLogDirPath();
         wxMkdir(WithoutFinalSeparators(logFolder)); // leaves a link as it is

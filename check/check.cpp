@@ -2,7 +2,6 @@
 
 #include "check/hot_folder_check.h"
 #include "check/preset_check.h"
-#include "check/template_folders_check.h"
 #include "check/workstation_check.h"
 #include "platform/process_rights.h"
 
@@ -27,8 +26,9 @@ void WriteHead(TemplateFolders& folders, Report& report)
 }
 
 // A directory that is listed under two names is checked once.
-void CheckHotFolders(const HotFolderList& list, TemplateFolders& folders, Report& report)
+void CheckHotFolders(const HotFolderList& list, TemplateCheck& check)
 {
+    Report& report = check.report;
     std::map<std::pair<std::uint64_t, std::uint64_t>, size_t> known; // identity -> position
     for (size_t i = 0; i < list.folders.size(); ++i)
     {
@@ -38,7 +38,7 @@ void CheckHotFolders(const HotFolderList& list, TemplateFolders& folders, Report
         const auto identity = folder.directory.Identity();
         const auto [first, isNew] = known.emplace(identity, i);
         if (isNew || identity == std::pair<std::uint64_t, std::uint64_t>())
-            CheckHotFolder(folder, folders, report);
+            CheckHotFolder(folder, check);
         else
             report.Note("the same directory as " + Shown(list.folders[first->second]));
     }
@@ -46,16 +46,19 @@ void CheckHotFolders(const HotFolderList& list, TemplateFolders& folders, Report
 
 } // namespace
 
-void CheckRun(bool isUpgrade, Report& report)
+void CheckRun(TemplateFolders& folders, Report& report)
 {
-    TemplateFolders folders(isUpgrade);
     WriteHead(folders, report);
+    TemplateCheck check(folders, report);
     report.Begin("Workstation");
-    CheckPreviousFolder(folders, report);
+    CheckAccount(report);
+    check.CheckPreviousFolder();
     const HotFolderList list = LoadHotFolderList();
     CheckHotFolderList(list, report);
     CheckRunLog(report);
-    CheckHotFolders(list, folders, report);
+    CheckHotFolders(list, check);
     report.Begin("Job presets");
-    CheckPresets(folders, report);
+    CheckPresets(check);
+    report.Begin("Templates");
+    check.ReportAwaited();
 }

@@ -1,7 +1,7 @@
 #include "check/folder_cfg_check.h"
 
 #include "check/folder_cfg_loss.h"
-#include "check/template_folders_check.h"
+#include "check/workstation_check.h"
 #include "migrate/template_move.h"
 #include "store/xml_encoding.h"
 
@@ -34,16 +34,7 @@ void CheckShownState(const wxXmlNode& root, Report& report)
                        "\", so the enabled folder shows as disabled");
 }
 
-void ReportLosses(const wxArrayString& losses, Report& report)
-{
-    constexpr size_t Most = 20;
-    for (size_t i = 0; i < losses.size() && i < Most; ++i)
-        report.Loss("Folder.cfg: " + losses[i]);
-    if (losses.size() > Most)
-        report.Loss(wxString::Format("Folder.cfg: and %zu more", losses.size() - Most));
-}
-
-// False if the file is not rewritten.
+// Returns whether the file is rewritten.
 bool CheckMove(HotFolder& folder, const TemplateMove& move, Report& report)
 {
     XmlFile& cfg = folder.cfg;
@@ -55,48 +46,40 @@ bool CheckMove(HotFolder& folder, const TemplateMove& move, Report& report)
     }
     if (move.storedPath == move.newPath && move.newContent == cfg.bytes)
         return true;
-    ReportLosses(FindFolderCfgLosses(*cfg.document, move.newContent), report);
+    report.AddLosses("Folder.cfg: ", FindFolderCfgLosses(*cfg.document, move.newContent));
     report.Change("Folder.cfg: " + Shown(move.storedPath) + " -> " + Shown(move.newPath));
     if (!IsUtf8(cfg.bytes))
         report.Note("Folder.cfg: comes out as UTF-8");
-    if (!wxFileName::Exists(move.newPath))
-        report.Note("no such file: " + Shown(move.newPath));
     return true;
 }
 
-// False if the file is not rewritten.
-bool CheckTemplate(HotFolder& folder, TemplateFolders& folders, Report& report)
+// Returns whether the file is rewritten.
+bool CheckTemplate(HotFolder& folder, TemplateCheck& check)
 {
+    Report& report = check.report;
     using Outcome = TemplateMove::Outcome;
-    const TemplateMove move = DecideTemplateMove(folder.cfg, folders);
-    switch (move.outcome)
-    {
-    case Outcome::NoSection:
-    case Outcome::NoTemplate:
-        break;
-    case Outcome::FromUnknown:
-        CheckIsKnown(folders.From(), report);
-        break;
-    case Outcome::ToUnknown:
-        CheckIsKnown(folders.To(), report);
-        break;
-    case Outcome::Elsewhere:
-        if (!move.storedPath.empty() && !IsDirectlyIn(move.storedPath, folders.To().path))
-            report.Note("template elsewhere: " + Shown(move.storedPath));
-        break;
-    case Outcome::Stays:
+    const TemplateMove move = DecideTemplateMove(folder.cfg, check.folders);
+    const bool isRewritten = move.outcome == Outcome::Moves && CheckMove(folder, move, report);
+    if (move.outcome == Outcome::Stays)
         ReportLeft(move.reasonToStay, report);
-        break;
-    case Outcome::Moves:
-        return CheckMove(folder, move, report);
-    }
-    return false;
+    if (move.outcome == Outcome::FromUnknown && !move.storedPath.empty())
+        check.CheckIsKnown(check.folders.From());
+    if (move.outcome == Outcome::ToUnknown)
+        check.CheckIsKnown(check.folders.To());
+    Findings findings;
+    check.Judge(isRewritten ? move.newPath : move.storedPath,
+                move.outcome == Outcome::Elsewhere ? "in a sub-folder"
+                                                   : "in a file that stays as it is",
+                findings);
+    report.Add({}, findings);
+    return isRewritten;
 }
 
 } // namespace
 
-void CheckFolderCfg(HotFolder& folder, TemplateFolders& folders, Report& report)
+void CheckFolderCfg(HotFolder& folder, TemplateCheck& check)
 {
+    Report& report = check.report;
     switch (folder.LoadCfg())
     {
     case XmlFile::State::Missing:
@@ -106,10 +89,14 @@ void CheckFolderCfg(HotFolder& folder, TemplateFolders& folders, Report& report)
         ReportLeft(CfgStays::TooLarge, report);
         break;
     case XmlFile::State::NotReadable:
-        report.Problem("Folder.cfg: " + folder.cfg.WhyNotReadable(FolderCfgPath(folder.path)));
+        report.Problem("Folder.cfg: " +
+                       (folder.cfg.error.message.empty()
+                            ? folder.cfg.WhyNotReadable(FolderCfgPath(folder.path))
+                            : Damage(folder.cfg.error) +
+                                  "; it stays as it is, and the folder shows as disabled"));
         break;
     case XmlFile::State::Loaded:
-        if (!CheckTemplate(folder, folders, report))
+        if (!CheckTemplate(folder, check))
             CheckShownState(*folder.cfg.Root(), report);
         break;
     }

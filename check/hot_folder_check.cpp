@@ -25,14 +25,14 @@ wxString FindObstacle(const HotFolder& folder)
 
 } // namespace
 
-void CheckHotFolder(HotFolder& folder, TemplateFolders& folders, Report& report)
+void CheckHotFolder(HotFolder& folder, TemplateCheck& check)
 {
     const wxString obstacle = FindObstacle(folder);
     if (!obstacle.empty())
     {
-        report.Problem(obstacle);
+        check.report.Problem(obstacle);
         return;
     }
-    CheckFolderCfg(folder, folders, report);
-    CheckFolderIcon(folder, folders.IsUpgrade(), report);
+    CheckFolderCfg(folder, check);
+    CheckFolderIcon(folder, check);
 }

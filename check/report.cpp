@@ -9,6 +9,8 @@
 namespace
 {
 
+constexpr size_t MostOfAKind = 20;
+
 wxString Count(size_t number, const wxString& what)
 {
     return wxString::Format("%zu %s%s", number, what, number == 1 ? "" : "s");
@@ -51,13 +53,31 @@ void Report::Begin(const wxString& title)
 
 void Report::Problem(const wxString& text)
 {
-    Add(Problems, "  problem  " + text);
+    Add(ProblemKind, text);
 }
 
-void Report::Loss(const wxString& text)
+void Report::Change(const wxString& text)
 {
-    m_losses.insert(m_title + ": " + text);
-    Problem(text);
+    Add(ChangeKind, text);
+}
+
+void Report::Note(const wxString& text)
+{
+    Add(NoteKind, text);
+}
+
+void Report::Add(const wxString& prefix, const Findings& findings)
+{
+    AddSome(ProblemKind, prefix, findings.problems);
+    AddSome(ChangeKind, prefix, findings.changes);
+    AddSome(NoteKind, prefix, findings.notes);
+}
+
+void Report::AddLosses(const wxString& prefix, const std::vector<wxString>& losses)
+{
+    AddSome(ProblemKind, prefix, losses);
+    for (size_t i = 0; i < losses.size() && i < MostOfAKind; ++i)
+        m_losses.insert(m_title + ": " + prefix + losses[i]);
 }
 
 void Report::RepeatLosses(const Report& before)
@@ -70,44 +90,50 @@ void Report::RepeatLosses(const Report& before)
     }
 }
 
-void Report::Change(const wxString& text)
-{
-    Add(Changes, "  change   " + text);
-}
-
-void Report::Note(const wxString& text)
-{
-    Add(Notes, "  note     " + text);
-}
-
 void Report::ProblemOnce(const wxString& text)
 {
     if (m_once.insert(text).second)
         Problem(text);
 }
 
+void Report::NoteOnce(const wxString& text)
+{
+    if (m_once.insert(text).second)
+        Note(text);
+}
+
 bool Report::End(const wxString& lastLine)
 {
     EndBlock();
     Write("");
-    Write(Count(m_counts[Changes], "change") + ", " + Count(m_counts[Problems], "problem") + ", " +
-          Count(m_counts[Notes], "note"));
+    Write(Count(m_counts[ChangeKind], "change") + ", " + Count(m_counts[ProblemKind], "problem") +
+          ", " + Count(m_counts[NoteKind], "note"));
     if (!lastLine.empty())
         Write(lastLine);
     return m_isWritten;
 }
 
-int Report::GetStatus() const
+int Report::ExitStatus() const
 {
-    if (m_counts[Problems] > 0 || !m_isWritten)
-        return ReportStatus::HasProblems;
-    return m_counts[Changes] > 0 ? ReportStatus::HasChanges : ReportStatus::NothingToDo;
+    if (m_counts[ProblemKind] > 0)
+        return HasProblems;
+    return m_counts[ChangeKind] > 0 ? HasChanges : NothingToDo;
 }
 
 void Report::Add(Kind kind, const wxString& text)
 {
-    m_block[kind].Add(text);
+    static const std::array<const char*, KindCount> beginnings = {"  problem  ", "  change   ",
+                                                                  "  note     "};
+    m_block[kind].Add(beginnings[kind] + text);
     ++m_counts[kind];
+}
+
+void Report::AddSome(Kind kind, const wxString& prefix, const std::vector<wxString>& texts)
+{
+    for (size_t i = 0; i < texts.size() && i < MostOfAKind; ++i)
+        Add(kind, prefix + texts[i]);
+    if (texts.size() > MostOfAKind)
+        Add(kind, prefix + wxString::Format("and %zu more", texts.size() - MostOfAKind));
 }
 
 void Report::EndBlock()

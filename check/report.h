@@ -9,17 +9,24 @@
 
 #include <array>
 #include <set>
+#include <vector>
 
-/// What a report says in all. The highest that applies is the exit status of the check.
-namespace ReportStatus
-{
+/// The exit statuses of a check. The highest one that applies is returned.
 constexpr int NothingToDo = 0;
 constexpr int HasChanges = 1;
-constexpr int HasProblems = 2; // or could not be written
-} // namespace ReportStatus
+constexpr int HasProblems = 2;
+constexpr int WrongArguments = 3;
 
 /// As much of a text as is readable in one line.
 wxString Shown(const wxString& text);
+
+/// Findings of the same kind, of which a report shows only some.
+struct Findings
+{
+    std::vector<wxString> problems;
+    std::vector<wxString> changes;
+    std::vector<wxString> notes;
+};
 
 class Report
 {
@@ -37,32 +44,35 @@ class Report
     void Begin(const wxString& title);
 
     void Problem(const wxString& text);
-    /// A problem that a run hides: it loses or resets what a later check can no longer see.
-    void Loss(const wxString& text);
     void Change(const wxString& text);
     void Note(const wxString& text);
-    /// A block with the losses in the report of a check before the run that this one no longer
-    /// sees.
+    /// The first 20 of each kind, each after the prefix, and how many more there are.
+    void Add(const wxString& prefix, const Findings& findings);
+    /// Problems that a run hides: it loses or resets what a later check can no longer see.
+    void AddLosses(const wxString& prefix, const std::vector<wxString>& losses);
+    /// A block with the losses of a check before the run that this one does not have.
     void RepeatLosses(const Report& before);
-    /// A problem that concerns many blocks: written only with the first of them.
+    /// What concerns many blocks: written only with the first of them.
     void ProblemOnce(const wxString& text);
+    void NoteOnce(const wxString& text);
 
     /// Writes the totals, then the last line unless it is empty. Returns false if anything could
     /// not be written.
     bool End(const wxString& lastLine = wxString());
 
-    int GetStatus() const;
+    int ExitStatus() const;
 
   private:
     enum Kind
     {
-        Problems,
-        Changes,
-        Notes,
+        ProblemKind,
+        ChangeKind,
+        NoteKind,
         KindCount
     };
 
     void Add(Kind kind, const wxString& text);
+    void AddSome(Kind kind, const wxString& prefix, const std::vector<wxString>& texts);
     void EndBlock();
     void Write(const wxString& text);
 
