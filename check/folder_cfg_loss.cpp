@@ -165,7 +165,8 @@ wxArrayString FindFolderCfgLosses(const wxXmlDocument& document, const std::stri
         losses.Add("its root <" + root.GetName() + "> comes out as <" + FolderCfg::Root + ">");
     FindLostAttributes(root, losses);
     wxXmlDocument after;
-    if (LoadXml(rewritten, FolderCfgLimits, after).state == XmlLoad::State::Loaded)
+    LoadXml(rewritten, FolderCfgLimits, after);
+    if (after.IsOk())
         FindLostContent(root, *after.GetRoot(), losses);
     return losses;
 }
