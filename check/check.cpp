@@ -27,7 +27,8 @@ void WriteHead(TemplateFolders& folders, Report& report)
 }
 
 // A directory that is listed under two names is checked once.
-void CheckHotFolders(const HotFolderList& list, TemplateFolders& folders, Report& report)
+void CheckHotFolders(const HotFolderList& list, TemplateFolders& folders, TemplateCheck& templates,
+                     Report& report)
 {
     std::map<std::pair<std::uint64_t, std::uint64_t>, size_t> known; // identity -> position
     for (size_t i = 0; i < list.folders.size(); ++i)
@@ -38,7 +39,7 @@ void CheckHotFolders(const HotFolderList& list, TemplateFolders& folders, Report
         const auto identity = folder.directory.Identity();
         const auto [first, isNew] = known.emplace(identity, i);
         if (isNew || identity == std::pair<std::uint64_t, std::uint64_t>())
-            CheckHotFolder(folder, folders, report);
+            CheckHotFolder(folder, folders, templates, report);
         else
             report.Note("the same directory as " + Shown(list.folders[first->second]));
     }
@@ -46,16 +47,22 @@ void CheckHotFolders(const HotFolderList& list, TemplateFolders& folders, Report
 
 } // namespace
 
-void CheckRun(bool isUpgrade, Report& report)
+void CheckRun(TemplateFolders& folders, Report& report)
 {
-    TemplateFolders folders(isUpgrade);
     WriteHead(folders, report);
     report.Begin("Workstation");
+    CheckAccount(report);
     CheckPreviousFolder(folders, report);
     const HotFolderList list = LoadHotFolderList();
     CheckHotFolderList(list, report);
     CheckRunLog(report);
-    CheckHotFolders(list, folders, report);
+    TemplateCheck templates(folders);
+    CheckHotFolders(list, folders, templates, report);
     report.Begin("Job presets");
-    CheckPresets(folders, report);
+    CheckPresets(folders, templates, report);
+    report.Begin("Templates");
+    if (templates.GetAwaited() > 0)
+        report.Note(wxString::Format(
+            "there is no folder %s yet; templates that will be looked for in it: %zu",
+            folders.To().path, templates.GetAwaited()));
 }

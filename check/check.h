@@ -2,6 +2,7 @@
 #pragma once
 
 #include "check/report.h"
+#include "migrate/template_folders.h"
 
 /// Writes the whole report but its totals.
-void CheckRun(bool isUpgrade, Report& report);
+void CheckRun(TemplateFolders& folders, Report& report);

@@ -2,6 +2,7 @@
 
 #include "check/folder_cfg_loss.h"
 #include "check/template_folders_check.h"
+#include "check/workstation_check.h"
 #include "migrate/template_move.h"
 #include "store/xml_encoding.h"
 
@@ -34,16 +35,7 @@ void CheckShownState(const wxXmlNode& root, Report& report)
                        "\", so the enabled folder shows as disabled");
 }
 
-void ReportLosses(const wxArrayString& losses, Report& report)
-{
-    constexpr size_t Most = 20;
-    for (size_t i = 0; i < losses.size() && i < Most; ++i)
-        report.Problem("Folder.cfg: " + losses[i]);
-    if (losses.size() > Most)
-        report.Problem(wxString::Format("Folder.cfg: and %zu more", losses.size() - Most));
-}
-
-// False if the file is not rewritten.
+// Returns whether the file is rewritten.
 bool CheckMove(HotFolder& folder, const TemplateMove& move, Report& report)
 {
     XmlFile& cfg = folder.cfg;
@@ -55,47 +47,39 @@ bool CheckMove(HotFolder& folder, const TemplateMove& move, Report& report)
     }
     if (move.storedPath == move.newPath && move.newContent == cfg.bytes)
         return true;
-    ReportLosses(FindFolderCfgLosses(*cfg.document, move.newContent), report);
+    report.Add("Folder.cfg: ", {FindFolderCfgLosses(*cfg.document, move.newContent), {}, {}});
     report.Change("Folder.cfg: " + Shown(move.storedPath) + " -> " + Shown(move.newPath));
     if (!IsUtf8(cfg.bytes))
         report.Note("Folder.cfg: comes out as UTF-8");
-    if (!wxFileName::Exists(move.newPath))
-        report.Note("no such file: " + Shown(move.newPath));
     return true;
 }
 
-// False if the file is not rewritten.
-bool CheckTemplate(HotFolder& folder, TemplateFolders& folders, Report& report)
+// Returns whether the file is rewritten.
+bool CheckTemplate(HotFolder& folder, TemplateFolders& folders, TemplateCheck& templates,
+                   Report& report)
 {
     using Outcome = TemplateMove::Outcome;
     const TemplateMove move = DecideTemplateMove(folder.cfg, folders);
-    switch (move.outcome)
-    {
-    case Outcome::NoSection:
-    case Outcome::NoTemplate:
-        break;
-    case Outcome::FromUnknown:
-        CheckIsKnown(folders.From(), report);
-        break;
-    case Outcome::ToUnknown:
-        CheckIsKnown(folders.To(), report);
-        break;
-    case Outcome::Elsewhere:
-        if (!move.storedPath.empty() && !IsDirectlyIn(move.storedPath, folders.To().path))
-            report.Note("template elsewhere: " + Shown(move.storedPath));
-        break;
-    case Outcome::Stays:
+    const bool isRewritten = move.outcome == Outcome::Moves && CheckMove(folder, move, report);
+    if (move.outcome == Outcome::Stays)
         ReportLeft(move.reasonToStay, report);
-        break;
-    case Outcome::Moves:
-        return CheckMove(folder, move, report);
-    }
-    return false;
+    if (move.outcome == Outcome::FromUnknown && !move.storedPath.empty())
+        CheckIsKnown(folders.From(), report);
+    if (move.outcome == Outcome::ToUnknown)
+        CheckIsKnown(folders.To(), report);
+    Findings findings;
+    templates.Judge(isRewritten ? move.newPath : move.storedPath,
+                    move.outcome == Outcome::Elsewhere ? "in a sub-folder"
+                                                       : "in a file that stays as it is",
+                    findings);
+    report.Add({}, findings);
+    return isRewritten;
 }
 
 } // namespace
 
-void CheckFolderCfg(HotFolder& folder, TemplateFolders& folders, Report& report)
+void CheckFolderCfg(HotFolder& folder, TemplateFolders& folders, TemplateCheck& templates,
+                    Report& report)
 {
     switch (folder.LoadCfg())
     {
@@ -106,10 +90,14 @@ void CheckFolderCfg(HotFolder& folder, TemplateFolders& folders, Report& report)
         ReportLeft(CfgStays::TooLarge, report);
         break;
     case XmlFile::State::NotReadable:
-        report.Problem("Folder.cfg: " + folder.cfg.WhyNotReadable(FolderCfgPath(folder.path)));
+        report.Problem("Folder.cfg: " +
+                       (folder.cfg.error.message.empty()
+                            ? folder.cfg.WhyNotReadable(FolderCfgPath(folder.path))
+                            : Damage(folder.cfg.error) +
+                                  "; it stays as it is, and the folder shows as disabled"));
         break;
     case XmlFile::State::Loaded:
-        if (!CheckTemplate(folder, folders, report))
+        if (!CheckTemplate(folder, folders, templates, report))
             CheckShownState(*folder.cfg.Root(), report);
         break;
     }

@@ -1,8 +1,8 @@
 // What a run would do to one hot folder's Folder.cfg.
 #pragma once
 
-#include "check/report.h"
-#include "migrate/template_folders.h"
+#include "check/template_check.h"
 #include "store/hot_folder.h"
 
-void CheckFolderCfg(HotFolder& folder, TemplateFolders& folders, Report& report);
+void CheckFolderCfg(HotFolder& folder, TemplateFolders& folders, TemplateCheck& templates,
+                    Report& report);

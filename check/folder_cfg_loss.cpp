@@ -106,7 +106,7 @@ std::vector<wxString> DescribeContent(const wxXmlNode& root)
     return content;
 }
 
-void FindLostContent(const wxXmlNode& before, const wxXmlNode& after, wxArrayString& losses)
+void FindLostContent(const wxXmlNode& before, const wxXmlNode& after, std::vector<wxString>& losses)
 {
     const std::vector<wxString> kept = DescribeContent(after);
     std::unordered_multiset<wxString, wxStringHash> pool(kept.begin(), kept.end());
@@ -116,16 +116,16 @@ void FindLostContent(const wxXmlNode& before, const wxXmlNode& after, wxArrayStr
         if (found != pool.end())
             pool.erase(found);
         else
-            losses.Add("loses " + Shown(each));
+            losses.push_back("loses " + Shown(each));
     }
 }
 
-void FindLostAttributes(const wxXmlNode& root, wxArrayString& losses)
+void FindLostAttributes(const wxXmlNode& root, std::vector<wxString>& losses)
 {
     const AttributeGap gap = FindAttributeGap(root);
     if (!gap.reset.empty())
-        losses.Add("lacks \"" + gap.missing + "\", so the rewrite resets: " + gap.reset +
-                   (gap.isDisabled ? " (the folder ends up disabled)" : ""));
+        losses.push_back("lacks \"" + gap.missing + "\", so the rewrite resets: " + gap.reset +
+                         (gap.isDisabled ? " (the folder ends up disabled)" : ""));
     AttributeMap attributes;
     CollectAttributes(root, attributes);
     HotFolderSettings settings;
@@ -139,30 +139,32 @@ void FindLostAttributes(const wxXmlNode& root, wxArrayString& losses)
         const wxString now = each.Format(settings);
         if (i < read && each.form != AttributeForm::Text &&
             wxString(found->second).Trim().Trim(false) != now)
-            losses.Add(wxString(each.name) + "=\"" + Shown(found->second) + "\" comes out as \"" +
-                       now + "\"");
+            losses.push_back(wxString(each.name) + "=\"" + Shown(found->second) +
+                             "\" comes out as \"" + now + "\"");
         attributes.erase(found);
     }
     for (const auto& [name, value] : attributes)
-        losses.Add("loses the attribute " + name + "=\"" + Shown(value) + "\"");
+        losses.push_back("loses the attribute " + name + "=\"" + Shown(value) + "\"");
 }
 
 } // namespace
 
-wxArrayString FindFolderCfgLosses(const wxXmlDocument& document, const std::string& rewritten)
+std::vector<wxString> FindFolderCfgLosses(const wxXmlDocument& document,
+                                          const std::string& rewritten)
 {
-    wxArrayString losses;
+    std::vector<wxString> losses;
     if (!document.GetDoctype().GetRootName().empty())
-        losses.Add("loses its document type, and with it the entities in its texts");
+        losses.push_back("loses its document type, and with it the entities in its texts");
     for (const wxXmlNode* node = document.GetDocumentNode()->GetChildren(); node;
          node = node->GetNext())
     {
         if (node->GetType() == wxXML_PI_NODE)
-            losses.Add("loses the instruction <?" + node->GetName() + "?>");
+            losses.push_back("loses the instruction <?" + node->GetName() + "?>");
     }
     const wxXmlNode& root = *document.GetRoot();
     if (root.GetName() != FolderCfg::Root)
-        losses.Add("its root <" + root.GetName() + "> comes out as <" + FolderCfg::Root + ">");
+        losses.push_back("its root <" + root.GetName() + "> comes out as <" + FolderCfg::Root +
+                         ">");
     FindLostAttributes(root, losses);
     wxXmlDocument after;
     LoadXml(rewritten, FolderCfgLimits, after);

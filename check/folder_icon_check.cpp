@@ -96,9 +96,9 @@ void CheckDesktopIni(const HotFolder& folder, const wxString& iconName, Report& 
 
 } // namespace
 
-void CheckFolderIcon(HotFolder& folder, bool isUpgrade, Report& report)
+void CheckFolderIcon(HotFolder& folder, const TemplateFolders& folders, Report& report)
 {
-    const IconCopy copy = DecideIconCopy(folder, isUpgrade, BundleIconsDirName);
+    const IconCopy copy = DecideIconCopy(folder, folders.IsUpgrade(), BundleIconsDirName);
     switch (copy.outcome)
     {
     case IconCopy::Outcome::Linked:
@@ -108,11 +108,16 @@ void CheckFolderIcon(HotFolder& folder, bool isUpgrade, Report& report)
         report.Note("no copy of the icon to replace: " + copy.name);
         break;
     case IconCopy::Outcome::NoSource:
-        report.ProblemOnce("source icon missing: " + copy.source);
+        if (folders.IsRehearsal())
+            report.NoteOnce(
+                "the icons being installed are not there, so icons are left out of this check");
+        else
+            report.ProblemOnce("source icon missing: " + copy.source);
         break;
     case IconCopy::Outcome::Replaces:
         if (!MayCopyOver(copy.source, folder.privateDir, copy.name))
-            report.Problem(copy.name + ": the copy would be refused");
+            report.Problem(copy.name +
+                           ": cannot be replaced (read-only, in use, or access denied)");
         else if (!IsCopy(copy.source, folder.privateDir, copy.name))
             report.Change(copy.name);
         CheckDesktopIni(folder, copy.name, report);

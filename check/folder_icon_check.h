@@ -2,6 +2,8 @@
 #pragma once
 
 #include "check/report.h"
+#include "migrate/template_folders.h"
 #include "store/hot_folder.h"
 
-void CheckFolderIcon(HotFolder& folder, bool isUpgrade, Report& report);
+/// In a rehearsal without the icons of the version being installed, the icon is left out.
+void CheckFolderIcon(HotFolder& folder, const TemplateFolders& folders, Report& report);

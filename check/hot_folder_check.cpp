@@ -25,7 +25,8 @@ wxString FindObstacle(const HotFolder& folder)
 
 } // namespace
 
-void CheckHotFolder(HotFolder& folder, TemplateFolders& folders, Report& report)
+void CheckHotFolder(HotFolder& folder, TemplateFolders& folders, TemplateCheck& templates,
+                    Report& report)
 {
     const wxString obstacle = FindObstacle(folder);
     if (!obstacle.empty())
@@ -33,6 +34,6 @@ void CheckHotFolder(HotFolder& folder, TemplateFolders& folders, Report& report)
         report.Problem(obstacle);
         return;
     }
-    CheckFolderCfg(folder, folders, report);
-    CheckFolderIcon(folder, folders.IsUpgrade(), report);
+    CheckFolderCfg(folder, folders, templates, report);
+    CheckFolderIcon(folder, folders, report);
 }

@@ -49,17 +49,24 @@ void Report::Begin(const wxString& title)
 
 void Report::Problem(const wxString& text)
 {
-    Add(Problems, "  problem  " + text);
+    Add(ProblemKind, text);
 }
 
 void Report::Change(const wxString& text)
 {
-    Add(Changes, "  change   " + text);
+    Add(ChangeKind, text);
 }
 
 void Report::Note(const wxString& text)
 {
-    Add(Notes, "  note     " + text);
+    Add(NoteKind, text);
+}
+
+void Report::Add(const wxString& prefix, const Findings& findings)
+{
+    AddSome(ProblemKind, prefix, findings.problems);
+    AddSome(ChangeKind, prefix, findings.changes);
+    AddSome(NoteKind, prefix, findings.notes);
 }
 
 void Report::ProblemOnce(const wxString& text)
@@ -68,29 +75,43 @@ void Report::ProblemOnce(const wxString& text)
         Problem(text);
 }
 
+void Report::NoteOnce(const wxString& text)
+{
+    if (m_once.insert(text).second)
+        Note(text);
+}
+
 bool Report::End()
 {
     EndBlock();
     Write("");
-    Write(Count(m_counts[Changes], "change") + ", " + Count(m_counts[Problems], "problem") + ", " +
-          Count(m_counts[Notes], "note"));
+    Write(Count(m_counts[ChangeKind], "change") + ", " + Count(m_counts[ProblemKind], "problem") +
+          ", " + Count(m_counts[NoteKind], "note"));
     return m_isWritten;
 }
 
-size_t Report::GetProblems() const
+int Report::ExitStatus() const
 {
-    return m_counts[Problems];
-}
-
-size_t Report::GetChanges() const
-{
-    return m_counts[Changes];
+    if (m_counts[ProblemKind] > 0)
+        return HasProblems;
+    return m_counts[ChangeKind] > 0 ? HasChanges : NothingToDo;
 }
 
 void Report::Add(Kind kind, const wxString& text)
 {
-    m_block[kind].Add(text);
+    static const std::array<const char*, KindCount> beginnings = {"  problem  ", "  change   ",
+                                                                  "  note     "};
+    m_block[kind].Add(beginnings[kind] + text);
     ++m_counts[kind];
+}
+
+void Report::AddSome(Kind kind, const wxString& prefix, const std::vector<wxString>& texts)
+{
+    constexpr size_t Most = 20;
+    for (size_t i = 0; i < texts.size() && i < Most; ++i)
+        Add(kind, prefix + texts[i]);
+    if (texts.size() > Most)
+        Add(kind, prefix + wxString::Format("and %zu more", texts.size() - Most));
 }
 
 void Report::EndBlock()

@@ -1,19 +1,7 @@
 #include "check/template_folders_check.h"
 
-#include "platform/path_normal_form.h"
+#include "platform/process_rights.h"
 #include "store/xml_text.h"
-
-namespace
-{
-
-bool IsBelow(const wxString& folder, const wxString& outer)
-{
-    const wxString begin = WithoutFinalSeparators(outer);
-    return !begin.empty() && folder.length() > begin.length() && folder.StartsWith(begin) &&
-           wxFileName::IsPathSeparator(folder[begin.length()]);
-}
-
-} // namespace
 
 void CheckPreviousFolder(TemplateFolders& folders, Report& report)
 {
@@ -34,25 +22,19 @@ void CheckPreviousFolder(TemplateFolders& folders, Report& report)
 void CheckIsKnown(const TemplateFolder& folder, Report& report)
 {
     if (!folder.isKnown)
-        report.ProblemOnce(folder.source.name + ": " + folder.source.whyNot + "; nothing moves");
+        report.ProblemOnce(folder.source.name + ": " + folder.source.whyNot + ", for the account " +
+                           AccountName() +
+                           "; nothing moves. Run as the client's user, after its installation");
 }
 
 void CheckFoldersForPresets(TemplateFolders& folders, Report& report)
 {
-    const wxString& from = folders.From().path;
-    const wxString& to = folders.To().path;
     CheckIsKnown(folders.From(), report);
     CheckIsKnown(folders.To(), report);
-    for (const TemplateFolder& folder : {folders.Default(), folders.Previous()})
-    {
-        if (folder.path.find_first_of("&<") != wxString::npos)
-            report.ProblemOnce(folder.source.name +
-                               ": holds & or <, which presets store in another form");
-    }
-    if (!IsXmlText(to))
+    if (folders.To().path.find_first_of("&<") != wxString::npos)
+        report.ProblemOnce(folders.To().source.name +
+                           ": holds & or <, which is inserted into presets as it is");
+    if (!IsXmlText(folders.To().path))
         report.ProblemOnce("the folder being installed holds a character that XML cannot store; no "
                            "path of a preset moves");
-    if (folders.From().isKnown && folders.To().isKnown && IsBelow(to, from))
-        report.ProblemOnce("the folder being installed is below the one being left; every further "
-                           "run moves the paths of presets again");
 }

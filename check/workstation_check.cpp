@@ -2,6 +2,7 @@
 
 #include "check/reach.h"
 #include "platform/access_rights.h"
+#include "platform/process_rights.h"
 #include "platform/regular_file.h"
 #include "run/run_log_place.h"
 
@@ -10,25 +11,50 @@
 namespace
 {
 
+bool IsDriveThere(const wxString& folder)
+{
+    const wxString root = wxFileName(folder, wxPATH_NATIVE).GetVolume();
+    return root.empty() ||
+           wxDirExists(root + wxFileName::GetVolumeSeparator() + wxFileName::GetPathSeparator());
+}
+
 void CheckEntries(const HotFolderList& list, Report& report)
 {
     if (list.folders.empty() && !list.missing.empty())
         report.Problem("none of the listed hot folders exists (another account? mapped drives?)");
     else if (list.folders.empty())
         report.Note("HotFolderList.cfg lists no hot folder");
+    Findings missing;
     for (const wxString& folder : list.missing)
     {
         const wxString obstacle = WhyOutOfReach(folder);
         if (!obstacle.empty())
-            report.Problem("listed hot folder " + Shown(folder) + " " + obstacle);
+            missing.problems.push_back(Shown(folder) + " " + obstacle);
+        else if (!IsDriveThere(folder))
+            missing.problems.push_back("is on a drive or share that is not there: " +
+                                       Shown(folder));
         else
-            report.Note("listed hot folder does not exist: " + Shown(folder));
+            missing.notes.push_back("does not exist: " + Shown(folder));
     }
     for (const wxString& folder : list.repeated)
-        report.Note("hot folder is listed twice: " + Shown(folder));
+        missing.notes.push_back("is listed twice: " + Shown(folder));
+    report.Add("listed hot folder ", missing);
 }
 
 } // namespace
+
+wxString Damage(const XmlSyntaxError& error)
+{
+    return wxString::Format("damaged (line %lu: %s)", error.line, error.message);
+}
+
+void CheckAccount(Report& report)
+{
+    if (IsSystemAccount())
+        report.Problem(
+            "the account is SYSTEM, which has no hot folder client: it has other presets, "
+            "another log and no previous version; run it as the client's user");
+}
 
 void CheckHotFolderList(const HotFolderList& list, Report& report)
 {
@@ -42,10 +68,13 @@ void CheckHotFolderList(const HotFolderList& list, Report& report)
                                     wxFILE_EXISTS_ANY | wxFILE_EXISTS_NO_FOLLOW))
             report.Problem("HotFolderList.cfg: is not a file");
         else
-            report.Note("there is no HotFolderList.cfg");
+            report.Note("there is no " + GetHotFolderListPath());
         break;
     case XmlFile::State::NotReadable:
-        report.Problem("HotFolderList.cfg: " + list.whyNotReadable);
+        report.Problem((list.error.message.empty()
+                            ? list.whyNotReadable
+                            : GetHotFolderListPath() + ": " + Damage(list.error)) +
+                       "; no hot folder is migrated");
         break;
     case XmlFile::State::TooLarge:
         report.Problem("HotFolderList.cfg: too large to read safely");

@@ -38,7 +38,7 @@ class wxDirTraverserSimple : public wxDirTraverser
     wxArrayString& m_directories;
 };
 
-wxString PresetPath(const wxString& directory)
+wxString PathIn(const wxString& directory)
 {
     wxFileName folder(directory + wxFileName::GetPathSeparator());
     folder.AppendDir(PresetDirName);
@@ -73,7 +73,7 @@ JobPresetDirs ListJobPresetDirs(const wxString& root)
 }
 
 JobPresetFile::JobPresetFile(const wxString& directory)
-    : m_path(PresetPath(directory)), m_directory(directory, Links::Follow),
+    : m_path(PathIn(directory)), m_directory(directory, Links::Follow),
       m_presets(m_directory.Reach(PresetDirName), Links::Refuse),
       m_isLinked(IsLink(m_directory.Reach(PresetDirName)))
 {

@@ -18,6 +18,22 @@ TemplateFolders::TemplateFolders(bool isUpgrade) : m_isUpgrade(isUpgrade)
 {
 }
 
+TemplateFolders::TemplateFolders(bool isUpgrade, const wxString& from, const wxString& to)
+    : m_isUpgrade(isUpgrade), m_isRehearsal(!from.empty() || !to.empty())
+{
+    std::optional<TemplateFolder>& folderFrom = isUpgrade ? m_previous : m_default;
+    std::optional<TemplateFolder>& folderTo = isUpgrade ? m_default : m_previous;
+    if (!from.empty())
+        folderFrom = TemplateFolder{true, wxFileName(from).GetFullPath(), {"the given folder", {}}};
+    if (!to.empty())
+        folderTo = TemplateFolder{true, wxFileName(to).GetFullPath(), {"the given folder", {}}};
+}
+
+bool TemplateFolders::IsRehearsal() const
+{
+    return m_isRehearsal;
+}
+
 bool TemplateFolders::IsUpgrade() const
 {
     return m_isUpgrade;

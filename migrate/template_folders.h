@@ -19,8 +19,12 @@ class TemplateFolders
 {
   public:
     explicit TemplateFolders(bool isUpgrade);
+    /// With these folders in place of what the registry leads to, unless they are empty.
+    TemplateFolders(bool isUpgrade, const wxString& from, const wxString& to);
 
     bool IsUpgrade() const;
+    /// Whether either folder was given.
+    bool IsRehearsal() const;
     /// The folders of the version being left and of the version being installed.
     const TemplateFolder& From();
     const TemplateFolder& To();
@@ -30,6 +34,7 @@ class TemplateFolders
 
   private:
     const bool m_isUpgrade;
+    bool m_isRehearsal = false;
     std::optional<TemplateFolder> m_previous;
     std::optional<TemplateFolder> m_default;
 };

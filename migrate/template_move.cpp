@@ -43,18 +43,6 @@ wxString Share(const wxString& path)
     return share;
 }
 
-// Windows has no longer path than 32,767 characters. The library copies the rest of the path for
-// every variable in it.
-bool IsTooLong(const wxString& path)
-{
-    constexpr size_t LongestPath = 32767;
-    constexpr std::ptrdiff_t MostVariables = 100;
-    return path.length() > LongestPath ||
-           std::count_if(path.begin(), path.end(),
-                         [](wxUniChar character)
-                         { return character == '$' || character == '%'; }) > MostVariables;
-}
-
 // A variable may also expand to a server or a drive.
 bool IsElsewhereByName(const wxString& stored, const wxString& folder)
 {
@@ -120,9 +108,21 @@ void MakeContent(const wxXmlNode& root, const ImposeSettingTable& imposeSettings
 
 } // namespace
 
+// Windows has no longer path than 32,767 characters. The library copies the rest of the path for
+// every variable in it.
+bool IsTooLongPath(const wxString& path)
+{
+    constexpr size_t LongestPath = 32767;
+    constexpr std::ptrdiff_t MostVariables = 100;
+    return path.length() > LongestPath ||
+           std::count_if(path.begin(), path.end(),
+                         [](wxUniChar character)
+                         { return character == '$' || character == '%'; }) > MostVariables;
+}
+
 bool IsDirectlyIn(const wxString& stored, const wxString& folder)
 {
-    if (IsTooLong(stored))
+    if (IsTooLongPath(stored))
         return false;
     wxFileName left(wxFileName(stored, wxPATH_NATIVE).GetPath(wxPATH_GET_VOLUME, wxPATH_NATIVE),
                     wxPATH_NATIVE);

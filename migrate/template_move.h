@@ -51,3 +51,7 @@ TemplateMove DecideTemplateMove(const XmlFile& cfg, TemplateFolders& folders);
 /// that leads over a shortcut (.lnk), and one that is too long. A folder with a final separator is
 /// not the same as one without.
 bool IsDirectlyIn(const wxString& stored, const wxString& folder);
+
+/// Whether a path is longer than any that Windows has, or holds more variables than the library
+/// can expand in a reasonable time.
+bool IsTooLongPath(const wxString& path);

@@ -72,6 +72,7 @@ HotFolderList LoadHotFolderList()
     XmlFile file(ListLimits);
     const wxString path = GetHotFolderListPath();
     list.state = file.Load(file.file.OpenForReading(path));
+    list.error = file.error;
     if (list.state == XmlFile::State::NotReadable)
         list.whyNotReadable = file.WhyNotReadable(path);
     if (list.state != XmlFile::State::Loaded)

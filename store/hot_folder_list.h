@@ -17,7 +17,8 @@ wxString GetHotFolderDataDir();
 struct HotFolderList
 {
     XmlFile::State state = XmlFile::State::Missing;
-    wxString whyNotReadable;
+    wxString whyNotReadable; // in the library's words
+    XmlSyntaxError error;
     /// The folders that exist, in the order and spelling of the file, without trailing white space;
     /// of paths that are equal ignoring case, only the first.
     wxArrayString folders;

@@ -19,8 +19,9 @@ struct XmlLimits
 /// elements of a filter setting take about 16 million bytes of memory.
 constexpr XmlLimits FolderCfgLimits = {2 * 1024 * 1024, 24'000'000, 6, 100'000'000};
 
-/// The list of hot folders is parsed once. 250,000 folders take about 180 million bytes of memory.
-constexpr XmlLimits ListLimits = {64 * 1024 * 1024, 208'000'000, 2, 1'000'000'000};
+/// The list of hot folders is parsed once. 250,000 folders of 60 characters take about 250 million
+/// bytes of memory.
+constexpr XmlLimits ListLimits = {64 * 1024 * 1024, 320'000'000, 2, 1'000'000'000};
 
 /// Where and why a document is not well-formed, in the parser's words.
 struct XmlSyntaxError
