@@ -103,9 +103,7 @@ void ReadFilterSetting(const wxXmlNode* root, wxXmlNode& node)
     if (!section)
         return;
     node = wxXmlNode();
-    CopyTree(*section, node);
-    RemoveIgnoredWhiteSpace(node);
-    RemoveSavedIndentation(node, FolderCfg::FilterSettingLevel);
+    CopyTree(*section, node, FolderCfg::FilterSettingLevel);
 }
 
 int ReadPaths(const wxXmlNode* root, HotFolderPaths& paths)
