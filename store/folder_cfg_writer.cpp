@@ -51,7 +51,7 @@ void AddAttributes(wxXmlNode& element, const Fields& fields,
 // Appends a section with an element for each entry, after the last one: finding that each time
 // would take time proportional to the square of their number.
 template <typename Fields, typename Entries>
-void WriteSection(wxXmlNode* root, const wchar_t* name, const wchar_t* element,
+void WriteSection(wxXmlNode* root, const wchar_t* name, const wxString& element,
                   const Fields& fields, const Entries& entries)
 {
     if (!root)
