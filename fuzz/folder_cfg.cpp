@@ -1,6 +1,7 @@
 // Arbitrary bytes as a Folder.cfg: what loads is unchanged after saving and loading, and what does not load leaves
 // every value as it was.
 #include "fuzz/fuzzing.h"
+#include "store/folder_cfg_format.h"
 #include "store/folder_cfg_reader.h"
 #include "store/folder_cfg_writer.h"
 #include "store/root_attributes.h"
@@ -37,7 +38,7 @@ wxString Sections(const Values& values)
     WriteImposeSettings(root, values.imposeSettings);
     WritePreflightSettings(root, values.preflightSettings);
     auto* filterSetting = new wxXmlNode(root, wxXML_ELEMENT_NODE, "");
-    CopyTree(values.filterSetting, *filterSetting);
+    CopyTree(values.filterSetting, *filterSetting, FolderCfg::FilterSettingLevel);
     wxStringOutputStream text;
     document.Save(text, wxXML_NO_INDENTATION);
     return text.GetString();
