@@ -22,15 +22,30 @@ class Appearance : public testing::Test
         ShellVersionResult = 0;
     }
 
-    ~Appearance() override { wxFileName::Rmdir(m_folder, wxPATH_RMDIR_RECURSIVE); }
+    ~Appearance() override
+    {
+        wxFileName::Rmdir(m_folder, wxPATH_RMDIR_RECURSIVE);
+    }
 
-    wxString Ini() const { return m_folder + "/Desktop.ini"; }
+    wxString Ini() const
+    {
+        return m_folder + "/Desktop.ini";
+    }
 
-    void WriteIni(const wxString& text) const { wxFFile(Ini(), "wb").Write(text); }
+    void WriteIni(const wxString& text) const
+    {
+        wxFFile(Ini(), "wb").Write(text);
+    }
 
-    wxString Text() const { return wxString::FromUTF8(ReadFile(Ini().utf8_string())); }
+    wxString Text() const
+    {
+        return wxString::FromUTF8(ReadFile(Ini().utf8_string()));
+    }
 
-    static std::vector<std::string> Version() { return {"load shell32.dll", "find DllGetVersion", "free"}; }
+    static std::vector<std::string> Version()
+    {
+        return {"load shell32.dll", "find DllGetVersion", "free"};
+    }
 
     std::vector<std::string> Calls(bool isForced, const std::string& iconFile) const
     {
@@ -39,8 +54,9 @@ class Appearance : public testing::Test
         std::vector<std::string> calls = Version();
         if (isForced)
             calls.push_back("force " + folder + " 10 " + iconFile + " 0 0 2");
-        for (const std::string& call : {"notify 800 1005 " + ini, "info " + ini + " 0 1 4000", std::string("notify 8000 1003 -7"),
-                                        "notify 8 1005 " + ini, std::string("notify 8000000 1000 0")})
+        for (const std::string& call : {"notify 800 1005 " + ini, "info " + ini + " 0 1 4000",
+                                        std::string("notify 8000 1003 -7"), "notify 8 1005 " + ini,
+                                        std::string("notify 8000000 1000 0")})
             calls.push_back(call);
         return calls;
     }
@@ -73,7 +89,9 @@ TEST_F(Appearance, WithAnOldOrUnknownShellOnlyAttributesChange)
         ShellCalls.clear();
         EXPECT_TRUE(ApplyFolderIcon(m_folder, "i.ico"));
         EXPECT_EQ(ShellCalls == Version(), Text().empty()) << major << "." << minor;
-        EXPECT_EQ(FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_SYSTEM, GetFileAttributesW(Ini().wc_str())) << major << "." << minor;
+        EXPECT_EQ(FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_SYSTEM,
+                  GetFileAttributesW(Ini().wc_str()))
+            << major << "." << minor;
         wxRemoveFile(Ini());
         return ShellCalls != Version();
     };
@@ -106,10 +124,13 @@ TEST_F(Appearance, AProfileWriteChangesOneLine)
         wxString after;
     };
     for (const Change& change :
-         {Change{"[s]\nK = a\nk=b", "[s]\nK =v\r\nk=b"}, Change{"k=a\n[ S ]\n[s] ; c\nk", "k=a\n[ S ]\n[s] ; c\nk=v\r\n"},
-          Change{"[s]\n;k=a\n\n\n[t]\nk=a", "[s]\n;k=a\nk=v\r\n\n\n[t]\nk=a"}, Change{"[s]\nx", "[s]\nx\r\nk=v\r\n"},
-          Change{"[s\nk=a", "[s\nk=a\r\n[s]\r\nk=v\r\n"}, Change{"[s]\r\nk=v\r\n", "[s]\r\nk=v\r\n"},
-          Change{wxString::FromUTF8("ü\xEF\xBB\xBF[s]\nk=ä"), wxString::FromUTF8("ü\xEF\xBB\xBF[s]\nk=ä\r\n[s]\r\nk=v\r\n")}})
+         {Change{"[s]\nK = a\nk=b", "[s]\nK =v\r\nk=b"},
+          Change{"k=a\n[ S ]\n[s] ; c\nk", "k=a\n[ S ]\n[s] ; c\nk=v\r\n"},
+          Change{"[s]\n;k=a\n\n\n[t]\nk=a", "[s]\n;k=a\nk=v\r\n\n\n[t]\nk=a"},
+          Change{"[s]\nx", "[s]\nx\r\nk=v\r\n"}, Change{"[s\nk=a", "[s\nk=a\r\n[s]\r\nk=v\r\n"},
+          Change{"[s]\r\nk=v\r\n", "[s]\r\nk=v\r\n"},
+          Change{wxString::FromUTF8("ü\xEF\xBB\xBF[s]\nk=ä"),
+                 wxString::FromUTF8("ü\xEF\xBB\xBF[s]\nk=ä\r\n[s]\r\nk=v\r\n")}})
     {
         WriteIni(change.before);
         EXPECT_NE(0, WritePrivateProfileStringW(L"s", L"k", L"v", Ini().wc_str()));

@@ -19,7 +19,8 @@ namespace
     if (!std::freopen(process.output.c_str(), "w", stdout) ||
         (!process.errors.empty() && !std::freopen(process.errors.c_str(), "w", stderr)))
         _exit(125);
-    if (process.asOtherUser && geteuid() == 0 && (setgroups(0, nullptr) != 0 || setgid(OtherUser) != 0 || setuid(OtherUser) != 0))
+    if (process.asOtherUser && geteuid() == 0 &&
+        (setgroups(0, nullptr) != 0 || setgid(OtherUser) != 0 || setuid(OtherUser) != 0))
         _exit(126);
     alarm(120);
     std::vector<char*> argv;
@@ -35,7 +36,10 @@ namespace
 ProcessResult RunToTheEnd(const Process& process, const std::function<void(double)>& meanwhile)
 {
     const auto start = std::chrono::steady_clock::now();
-    const auto elapsed = [&]() { return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count(); };
+    const auto elapsed = [&]()
+    {
+        return std::chrono::duration<double>(std::chrono::steady_clock::now() - start).count();
+    };
     std::fflush(nullptr); // or the child writes the buffer a second time
     const pid_t child = fork();
     if (child == 0)
@@ -47,5 +51,6 @@ ProcessResult RunToTheEnd(const Process& process, const std::function<void(doubl
         std::this_thread::sleep_for(std::chrono::milliseconds(elapsed() < 1 ? 10 : 100));
         meanwhile(elapsed());
     }
-    return {WIFEXITED(status) ? WEXITSTATUS(status) : -WTERMSIG(status), elapsed(), usage.ru_maxrss / 1024};
+    return {WIFEXITED(status) ? WEXITSTATUS(status) : -WTERMSIG(status), elapsed(),
+            usage.ru_maxrss / 1024};
 }

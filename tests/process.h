@@ -26,5 +26,7 @@ struct ProcessResult
     long megabytes; // the peak, which is never below the test program's own memory at the start
 };
 
-/// Runs the process until it ends, for at most 120 seconds, and calls meanwhile(seconds since the start) while it runs.
-ProcessResult RunToTheEnd(const Process& process, const std::function<void(double)>& meanwhile = nullptr);
+/// Runs the process until it ends, for at most 120 seconds, and calls meanwhile(seconds since the
+/// start) while it runs.
+ProcessResult RunToTheEnd(const Process& process,
+                          const std::function<void(double)>& meanwhile = nullptr);

@@ -20,15 +20,22 @@ TEST(Registry, AnExportIsReadAsTheRegistryGivesIt)
     };
     for (const auto& [bytes, expected] :
          {Export{key + "\"v\"=\"a\\\\b \\\"c\\\"\"", "1:61005c00620020002200630022000000"},
-          Export{key + "\"v\"=\"\U0001F600\"", "1:3dd800de0000"}, Export{"\xEF\xBB\xBF" + key + "\"V\"=\"x\"", "1:78000000"},
-          Export{ToUtf16(key + "\"v\"=\"x\""), "1:78000000"}, Export{key + "@=\"x\"\r\n\"vv\"=\"x\"\r\n\"v\"=\"y\"", "1:79000000"},
+          Export{key + "\"v\"=\"\U0001F600\"", "1:3dd800de0000"},
+          Export{"\xEF\xBB\xBF" + key + "\"V\"=\"x\"", "1:78000000"},
+          Export{ToUtf16(key + "\"v\"=\"x\""), "1:78000000"},
+          Export{key + "@=\"x\"\r\n\"vv\"=\"x\"\r\n\"v\"=\"y\"", "1:79000000"},
           Export{key + "\"v\"=hex(2):78,00,\\\r\n  79,00,00,00\r\n\"w\"=\"x\"", "2:780079000000"},
-          Export{key + "\"v\"=hex(2):78,00", "2:78000000"}, Export{key + "\"v\"=hex(1):78,00,79", "1:780079"},
-          Export{key + "\"v\"=hex(1):", "1:0000"}, Export{key + "\"v\"=hex(7):78,00", "7:7800"}, Export{key + "\"v\"=hex:78,00", "3:7800"},
-          Export{key + "\"v\"=hex:\r\n\"w\"=\"x\"", "3:"}, Export{key + "\"v\"=dword:01020378", "4:78030201"},
-          Export{key + "\"v\"=-", none}, Export{key + "\r\n[HKEY_CURRENT_USER\\A\\K\\L]\r\n\"v\"=\"x\"", none},
+          Export{key + "\"v\"=hex(2):78,00", "2:78000000"},
+          Export{key + "\"v\"=hex(1):78,00,79", "1:780079"},
+          Export{key + "\"v\"=hex(1):", "1:0000"}, Export{key + "\"v\"=hex(7):78,00", "7:7800"},
+          Export{key + "\"v\"=hex:78,00", "3:7800"},
+          Export{key + "\"v\"=hex:\r\n\"w\"=\"x\"", "3:"},
+          Export{key + "\"v\"=dword:01020378", "4:78030201"}, Export{key + "\"v\"=-", none},
+          Export{key + "\r\n[HKEY_CURRENT_USER\\A\\K\\L]\r\n\"v\"=\"x\"", none},
           Export{heading + "[HKEY_CURRENT_USER\\A\\K\\L]\r\n\"v\"=\"x\"", none},
-          Export{heading + "[HKEY_CURRENT_USER\\A\\KL]\r\n\r\n[hkey_current_user\\a\\k]\r\n\"v\"=\"x\"", "1:78000000"}})
+          Export{heading +
+                     "[HKEY_CURRENT_USER\\A\\KL]\r\n\r\n[hkey_current_user\\a\\k]\r\n\"v\"=\"x\"",
+                 "1:78000000"}})
     {
         const std::string hive = DecodeRegistryExport(bytes);
         const char* const lines = FindRegistryKey(hive, "HKEY_CURRENT_USER\\a\\K");
@@ -38,8 +45,12 @@ TEST(Registry, AnExportIsReadAsTheRegistryGivesIt)
         std::ostringstream found;
         for (const int byte : value ? value->data : std::vector<BYTE>())
             found << std::hex << std::setfill('0') << std::setw(2) << byte;
-        EXPECT_EQ(expected ? expected : ":", (value ? std::to_string(value->type) : "") + ":" + found.str()) << bytes;
+        EXPECT_EQ(expected ? expected : ":",
+                  (value ? std::to_string(value->type) : "") + ":" + found.str())
+            << bytes;
     }
-    for (const Bytes& bytes : {heading + "[HKEY_CURRENT_USER\\A\\KL]\r\n", "REGEDIT4\r\n" + key.substr(heading.size()), Bytes()})
-        EXPECT_EQ(nullptr, FindRegistryKey(DecodeRegistryExport(bytes), "HKEY_CURRENT_USER\\A\\K")) << bytes;
+    for (const Bytes& bytes : {heading + "[HKEY_CURRENT_USER\\A\\KL]\r\n",
+                               "REGEDIT4\r\n" + key.substr(heading.size()), Bytes()})
+        EXPECT_EQ(nullptr, FindRegistryKey(DecodeRegistryExport(bytes), "HKEY_CURRENT_USER\\A\\K"))
+            << bytes;
 }

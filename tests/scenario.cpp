@@ -14,7 +14,8 @@ Scenario& Scenario::Add(Files& to, const Files& files)
 
 Scenario& Scenario::Log(const Text& folders, const Text& presets)
 {
-    return WholeLog("{start}" + Text(folders.empty() ? "No Hotfolder listed\n" : "") + "Start: HF updation\n" + folders +
+    return WholeLog("{start}" + Text(folders.empty() ? "No Hotfolder listed\n" : "") +
+                    "Start: HF updation\n" + folders +
                     "End: HF updation\nStart: Updating Impose path for JP Presets\n" + presets +
                     "End: Updating Impose path for JP Presets\n");
 }
@@ -24,9 +25,15 @@ Scenario& Scenario::LogOfA(const Text& impose, const Text& presets, const Text& 
     return Log(FolderLines("A", 1, NoIcon(icon), impose), presets);
 }
 
-Scenario& Scenario::LogOfDisabledA(const Text& impose, const Text& presets) { return LogOfA(impose, presets, "hf_folder_disabled"); }
+Scenario& Scenario::LogOfDisabledA(const Text& impose, const Text& presets)
+{
+    return LogOfA(impose, presets, "hf_folder_disabled");
+}
 
-Scenario& Scenario::LogOfPreset(const Text& line) { return Log("", PresetLine(line)); }
+Scenario& Scenario::LogOfPreset(const Text& line)
+{
+    return Log("", PresetLine(line));
+}
 
 Files WorkstationBefore(const Scenario& scenario)
 {
@@ -36,7 +43,8 @@ Files WorkstationBefore(const Scenario& scenario)
     for (const auto& [place, text] : scenario.before)
     {
         const size_t end = place.find('/', 4);
-        if (StartsWith(place, "hot/") && end != Text::npos && names.insert(place.substr(4, end - 4)).second)
+        if (StartsWith(place, "hot/") && end != Text::npos &&
+            names.insert(place.substr(4, end - 4)).second)
             list += "<HotFolder path=\"{hot}{/}" + place.substr(4, end - 4) + "\"/>";
     }
     files.insert({{ListPlace, list + "</HotFolders>"},
@@ -51,15 +59,18 @@ Files WorkstationBefore(const Scenario& scenario)
 
 Text LogAfter(const Scenario& scenario)
 {
-    const bool isUpgrade = !scenario.arguments.empty() && (scenario.arguments[0] == "I" || scenario.arguments[0] == "i");
+    const bool isUpgrade = !scenario.arguments.empty() &&
+                           (scenario.arguments[0] == "I" || scenario.arguments[0] == "i");
     Text log = scenario.log;
     ReplaceAll(log, "{start}",
-               isUpgrade ? "Installation : Upgrade call with switch: I\n" : "Un-installation : Downgrade call with switch: U\n");
+               isUpgrade ? "Installation : Upgrade call with switch: I\n"
+                         : "Un-installation : Downgrade call with switch: U\n");
     ReplaceAll(log, "{icons}", isUpgrade ? "" : "BundleIcons{/}");
     return log;
 }
 
-void TestOn(const Scenario& scenario, const std::string& program, const std::function<void(Workstation&)>& test)
+void TestOn(const Scenario& scenario, const std::string& program,
+            const std::function<void(Workstation&)>& test)
 {
     if (IsWindowsProgram() && !scenario.notUnderWine.empty())
         GTEST_SKIP() << scenario.notUnderWine;

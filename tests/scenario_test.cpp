@@ -32,10 +32,14 @@ std::string Difference(const std::string& expected, const std::string& actual)
     testing::GTEST_FLAG(print_utf8) = false; // escapes alone, on one line
     const std::vector<std::string> left = Lines(expected);
     const std::vector<std::string> right = Lines(actual);
-    const auto [leftBegin, rightBegin] = std::mismatch(left.begin(), left.end(), right.begin(), right.end());
+    const auto [leftBegin, rightBegin] =
+        std::mismatch(left.begin(), left.end(), right.begin(), right.end());
     const auto [leftEnd, rightEnd] =
-        std::mismatch(left.rbegin(), std::make_reverse_iterator(leftBegin), right.rbegin(), std::make_reverse_iterator(rightBegin));
-    const auto number = 1 + std::count_if(left.begin(), leftBegin, [](const std::string& line) { return line.back() == '\n'; });
+        std::mismatch(left.rbegin(), std::make_reverse_iterator(leftBegin), right.rbegin(),
+                      std::make_reverse_iterator(rightBegin));
+    const auto number =
+        1 + std::count_if(left.begin(), leftBegin,
+                          [](const std::string& line) { return line.back() == '\n'; });
     std::string text = "--- expected\n+++ actual\n@@ line " + std::to_string(number) + " @@\n";
     const auto add = [&](char sign, auto from, auto to)
     {
@@ -79,7 +83,9 @@ void Compare(const Files& expected, const Files& actual, const std::string& when
             ADD_FAILURE() << place << " is missing " << when;
             continue;
         }
-        const bool isMeaning = IsWindowsProgram() && place.find("Desktop.ini") != std::string::npos && place.back() != '#';
+        const bool isMeaning = IsWindowsProgram() &&
+                               place.find("Desktop.ini") != std::string::npos &&
+                               place.back() != '#';
         const std::string& wanted = isMeaning ? ProfileMeaning(text) : text;
         const std::string& got = isMeaning ? ProfileMeaning(found->second) : found->second;
         if (wanted != got)
@@ -95,7 +101,8 @@ void Compare(const Files& expected, const Files& actual, const std::string& when
 Files FolderCfgsOf(Files files)
 {
     for (auto file = files.begin(); file != files.end();)
-        file = file->first.find("Folder.cfg") == std::string::npos ? files.erase(file) : std::next(file);
+        file = file->first.find("Folder.cfg") == std::string::npos ? files.erase(file)
+                                                                   : std::next(file);
     return files;
 }
 
@@ -109,7 +116,8 @@ constexpr bool HasSanitizer = false;
 CheckReport Check(Workstation& workstation, const Scenario& scenario)
 {
     const Files before = workstation.Snapshot();
-    CheckReport report(workstation, workstation.Start({scenario.arguments[0]}, "FolderUpgradeCheck"));
+    CheckReport report(workstation,
+                       workstation.Start({scenario.arguments[0]}, "FolderUpgradeCheck"));
     Compare(before, workstation.Snapshot(), "after a check");
     return report;
 }
@@ -120,16 +128,19 @@ bool IsRun(const Scenario& scenario)
     return !scenario.arguments.empty() && switches.count(scenario.arguments[0]) != 0;
 }
 
-// The check has to name before the run what the run then changes, and nothing after it. If it names problems, the run
-// may change less.
-void CompareChecks(const CheckReport& first, const CheckReport& second, const std::set<std::string>& changed)
+// The check has to name before the run what the run then changes, and nothing after it. If it names
+// problems, the run may change less.
+void CompareChecks(const CheckReport& first, const CheckReport& second,
+                   const std::set<std::string>& changed)
 {
     if (first.problems == 0)
     {
         EXPECT_EQ(changed, first.changes) << first.text;
     }
     for (const std::string& place : changed)
-        EXPECT_TRUE(first.problems == 0 || first.changes.count(place) != 0) << place << " is not in\n" << first.text;
+        EXPECT_TRUE(first.problems == 0 || first.changes.count(place) != 0)
+            << place << " is not in\n"
+            << first.text;
     EXPECT_TRUE(second.changes.empty() || first.problems + second.problems > 0) << second.text;
 }
 
@@ -146,7 +157,8 @@ void RunAndCompare(Workstation& workstation, const Scenario& scenario)
     if (scenario.seconds > 0 && !HasSanitizer)
     {
         EXPECT_LE(run.process.seconds, scenario.seconds);
-        EXPECT_TRUE(IsWindowsProgram() || run.process.megabytes <= scenario.megabytes) << run.process.megabytes << " megabytes";
+        EXPECT_TRUE(IsWindowsProgram() || run.process.megabytes <= scenario.megabytes)
+            << run.process.megabytes << " megabytes";
     }
     const Files after = workstation.Snapshot();
     if (IsWindowsProgram() && scenario.libraryReports)
@@ -168,11 +180,18 @@ void RunAndCompare(Workstation& workstation, const Scenario& scenario)
 
 } // namespace
 
-std::string NameOf(const testing::TestParamInfo<Scenario>& scenario) { return scenario.param.name.what; }
+std::string NameOf(const testing::TestParamInfo<Scenario>& scenario)
+{
+    return scenario.param.name.what;
+}
 
-void PrintTo(const Scenario& scenario, std::ostream* stream) { *stream << scenario.name.what; }
+void PrintTo(const Scenario& scenario, std::ostream* stream)
+{
+    *stream << scenario.name.what;
+}
 
 TEST_P(Workstations, IsAsExpectedAfterTheRun)
 {
-    TestOn(GetParam(), "FolderUpgrade", [](Workstation& workstation) { RunAndCompare(workstation, GetParam()); });
+    TestOn(GetParam(), "FolderUpgrade",
+           [](Workstation& workstation) { RunAndCompare(workstation, GetParam()); });
 }

@@ -1,4 +1,5 @@
-// What no run can show: the results and defaults of readers, lookups, rarer forms of the output, files, and what counts as text.
+// What no run can show: the results and defaults of readers, lookups, rarer forms of the output,
+// files, and what counts as text.
 #include "platform/regular_file.h"
 #include "platform/system.h"
 #include "platform/unicode_text.h"
@@ -23,9 +24,14 @@ namespace
 class Store : public testing::Test
 {
   protected:
-    Store() : m_path(wxFileName::CreateTempFileName("store")) {}
+    Store() : m_path(wxFileName::CreateTempFileName("store"))
+    {
+    }
 
-    ~Store() override { wxRemoveFile(m_path); }
+    ~Store() override
+    {
+        wxRemoveFile(m_path);
+    }
 
     const wxString& File(const wxString& text)
     {
@@ -33,7 +39,10 @@ class Store : public testing::Test
         return m_path;
     }
 
-    wxString Text() const { return wxString::FromUTF8(ReadFile(m_path.utf8_string())); }
+    wxString Text() const
+    {
+        return wxString::FromUTF8(ReadFile(m_path.utf8_string()));
+    }
 
     int Load(const wxString& text, HotFolderSettings& settings)
     {
@@ -54,30 +63,41 @@ class Store : public testing::Test
 TEST_F(Store, TheChainOfAttributesEndsAtTheFirstGap)
 {
     // The chain in the order in which it is read, without server_version, which does not end it.
-    const wxArrayString chain =
-        wxSplit("name description server_ip server_name Enable BaseVirtualPrinter BaseVirtualPrinterName BaseVirtualPrinterDisplayName "
-                "HFPresetName Centralized Isjobpresetattached IsCustomInterval TimeInterval PPDVersion ServerTypeAndJPDefaultKeyInfo "
-                "server_textversion server_type Quickset Quickset_Supported Quickset_Enabled IsWidthBased",
-                ' ');
+    const wxArrayString chain = wxSplit(
+        "name description server_ip server_name Enable BaseVirtualPrinter BaseVirtualPrinterName "
+        "BaseVirtualPrinterDisplayName "
+        "HFPresetName Centralized Isjobpresetattached IsCustomInterval TimeInterval PPDVersion "
+        "ServerTypeAndJPDefaultKeyInfo "
+        "server_textversion server_type Quickset Quickset_Supported Quickset_Enabled IsWidthBased",
+        ' ');
     std::set<int> places;
     for (const RootAttribute& attribute : RootAttributes())
-        EXPECT_TRUE(places.insert(attribute.chainPlace).second) << attribute.name << " shares its place";
+        EXPECT_TRUE(places.insert(attribute.chainPlace).second)
+            << attribute.name << " shares its place";
     for (size_t gap = 0; gap <= chain.size(); ++gap)
     {
         wxString attributes;
         for (size_t i = 0; i < chain.size(); ++i)
             attributes += i == gap ? wxString() : " " + chain[i] + "='1'";
         HotFolderSettings read;
-        const auto isReached = [&](const char* name) { return static_cast<int>(gap) > chain.Index(name); };
-        EXPECT_EQ(isReached("server_name") ? 1 : -1, Load("<r" + attributes + " server_version='12'/>", read)) << gap;
+        const auto isReached = [&](const char* name)
+        {
+            return static_cast<int>(gap) > chain.Index(name);
+        };
+        EXPECT_EQ(isReached("server_name") ? 1 : -1,
+                  Load("<r" + attributes + " server_version='12'/>", read))
+            << gap;
         size_t count = 0; // the number of fields that were set
         for (const wxString& text :
-             {read.name, read.description, read.server_ip, read.server_name, read.BaseVirtualPrinter, read.BaseVirtualPrinterName,
-              read.BaseVirtualPrinterDisplayName, read.HFPresetName, read.TimeInterval, read.PPDVersion, read.ServerTypeAndJPDefaultKeyInfo,
-              read.server_textversion, read.server_type, read.Quickset})
+             {read.name, read.description, read.server_ip, read.server_name,
+              read.BaseVirtualPrinter, read.BaseVirtualPrinterName,
+              read.BaseVirtualPrinterDisplayName, read.HFPresetName, read.TimeInterval,
+              read.PPDVersion, read.ServerTypeAndJPDefaultKeyInfo, read.server_textversion,
+              read.server_type, read.Quickset})
             count += text == "1" ? 1 : 0;
-        for (const bool flag : {read.Enable, read.Centralized, read.Isjobpresetattached, read.IsCustomInterval, read.Quickset_Supported,
-                                read.Quickset_Enabled, read.IsWidthBased})
+        for (const bool flag :
+             {read.Enable, read.Centralized, read.Isjobpresetattached, read.IsCustomInterval,
+              read.Quickset_Supported, read.Quickset_Enabled, read.IsWidthBased})
             count += flag ? 1 : 0;
         EXPECT_EQ(gap, count) << "without " << (gap < chain.size() ? chain[gap] : wxString("none"));
         EXPECT_EQ(isReached("ServerTypeAndJPDefaultKeyInfo") ? 12 : -1, read.server_version) << gap;
@@ -86,22 +106,25 @@ TEST_F(Store, TheChainOfAttributesEndsAtTheFirstGap)
 
 TEST_F(Store, FlagsAndNumbersAreRead)
 {
-    const std::set<std::string> numericFlags = {"2147483647", "-2147483648", "1", "1 \t", " 1", "01", "-1", "12x"};
+    const std::set<std::string> numericFlags = {"2147483647", "-2147483648", "1",  "1 \t",
+                                                " 1",         "01",          "-1", "12x"};
     const std::set<std::string> textFlags = {"1", "1 \t"};
     using Number = std::pair<std::string, int>;
     for (const auto& [value, number] :
-         {Number{"1", 1}, Number{"1 \t", 1}, Number{" 1", 1}, Number{"01", 1}, Number{"-1", -1}, Number{"0", 0}, Number{"", 0},
-          Number{"true", 0}, Number{"12x", 12}, Number{"x1", 0}, Number{"2147483647", 2147483647}, Number{"-2147483648", -2147483647 - 1},
+         {Number{"1", 1}, Number{"1 \t", 1}, Number{" 1", 1}, Number{"01", 1}, Number{"-1", -1},
+          Number{"0", 0}, Number{"", 0}, Number{"true", 0}, Number{"12x", 12}, Number{"x1", 0},
+          Number{"2147483647", 2147483647}, Number{"-2147483648", -2147483647 - 1},
           Number{"2147483648", 0}, Number{"99999999999999999999", 0}})
     {
         HotFolderSettings read;
-        Load(wxString::Format("<r name='' description='' server_ip='' server_name='' Enable='%s' "
-                              "BaseVirtualPrinter='' BaseVirtualPrinterName='' BaseVirtualPrinterDisplayName='' "
-                              "HFPresetName='' Centralized='' Isjobpresetattached='' IsCustomInterval='' "
-                              "TimeInterval='' PPDVersion='' ServerTypeAndJPDefaultKeyInfo='' "
-                              "server_version='%s' "
-                              "server_textversion='' server_type='' Quickset='' Quickset_Supported='%s'/>",
-                              value, value, value),
+        Load(wxString::Format(
+                 "<r name='' description='' server_ip='' server_name='' Enable='%s' "
+                 "BaseVirtualPrinter='' BaseVirtualPrinterName='' BaseVirtualPrinterDisplayName='' "
+                 "HFPresetName='' Centralized='' Isjobpresetattached='' IsCustomInterval='' "
+                 "TimeInterval='' PPDVersion='' ServerTypeAndJPDefaultKeyInfo='' "
+                 "server_version='%s' "
+                 "server_textversion='' server_type='' Quickset='' Quickset_Supported='%s'/>",
+                 value, value, value),
              read);
         EXPECT_EQ(textFlags.count(value) == 1, read.Enable) << value;
         EXPECT_EQ(numericFlags.count(value) == 1, read.Quickset_Supported) << value;
@@ -168,14 +191,17 @@ TEST_F(Store, WithoutARootNothingIsReadOrWritten)
 TEST_F(Store, AnEntryWithoutAShortNameHasNoNames)
 {
     std::vector<InputFormat> formats;
-    ReadInputFormats(Root("<r><InputFormatsSummary><x/>text<x DisplayName='d'/></InputFormatsSummary></r>"), formats);
+    ReadInputFormats(
+        Root("<r><InputFormatsSummary><x/>text<x DisplayName='d'/></InputFormatsSummary></r>"),
+        formats);
     ASSERT_EQ(1U, formats.size());
     EXPECT_EQ("", formats[0].DisplayName);
 }
 
 TEST_F(Store, DirectChildrenComeBeforeSubtrees)
 {
-    const wxXmlNode* root = Root("<r><a><b><x n='3'/></b><x n='2'/></a><!--c--><c><x n='4'/></c><d/></r>");
+    const wxXmlNode* root =
+        Root("<r><a><b><x n='3'/></b><x n='2'/></a><!--c--><c><x n='4'/></c><d/></r>");
     wxString value;
     EXPECT_TRUE(FindElement(root, "x", true)->GetAttribute("n", &value));
     EXPECT_EQ("2", value);
@@ -187,12 +213,14 @@ TEST_F(Store, DirectChildrenComeBeforeSubtrees)
 
 TEST_F(Store, DefaultsAreWrittenAndAFilterOfAnotherNameIsNot)
 {
-    SaveHotFolderSettings(m_path, {}, {}, {}, wxXmlNode(wxXML_ELEMENT_NODE, "filtersetting"), {}, {});
-    EXPECT_TRUE(Text().EndsWith("Enable=\"0\" Centralized=\"0\" Isjobpresetattached=\"0\" "
-                                "IsCustomInterval=\"0\" TimeInterval=\"\">\n  <InputFormatsSummary/>\n"
-                                "  <Paths>\n    <Failfolder path=\"\"/>\n    <Workfolder path=\"\"/>\n"
-                                "    <Movefolder path=\"\"/>\n    <Hotfolder path=\"\"/>\n  </Paths>\n"
-                                "  <JobSetting/>\n  <ImposeSetting/>\n  <PreflightSettings/>\n</HotFolder>\n"));
+    SaveHotFolderSettings(m_path, {}, {}, {}, wxXmlNode(wxXML_ELEMENT_NODE, "filtersetting"), {},
+                          {});
+    EXPECT_TRUE(Text().EndsWith(
+        "Enable=\"0\" Centralized=\"0\" Isjobpresetattached=\"0\" "
+        "IsCustomInterval=\"0\" TimeInterval=\"\">\n  <InputFormatsSummary/>\n"
+        "  <Paths>\n    <Failfolder path=\"\"/>\n    <Workfolder path=\"\"/>\n"
+        "    <Movefolder path=\"\"/>\n    <Hotfolder path=\"\"/>\n  </Paths>\n"
+        "  <JobSetting/>\n  <ImposeSetting/>\n  <PreflightSettings/>\n</HotFolder>\n"));
     EXPECT_TRUE(Text().Contains("server_version=\"-1\""));
 }
 
@@ -229,21 +257,32 @@ TEST(UnicodeText, ALoneSurrogateIsNotText)
     {
         std::vector<unsigned char> bytes;
         for (const unsigned unit : units)
-            bytes.insert(bytes.end(), {static_cast<unsigned char>(unit), static_cast<unsigned char>(unit >> 8)});
+            bytes.insert(bytes.end(),
+                         {static_cast<unsigned char>(unit), static_cast<unsigned char>(unit >> 8)});
         bytes.push_back('x'); // half a unit
         return FromUtf16Bytes(bytes.data(), bytes.size());
     };
     EXPECT_EQ(wxString::FromUTF8("a\U0001D11Eb\U0010FFFF\U00010000"),
               text({'a', 0xD834, 0xDD1E, 'b', 0xDBFF, 0xDFFF, 0xD800, 0xDC00, 0, 'c'}));
-    for (const Units& units :
-         {Units{0xD834, 0xDD1E}, {0xDBFF, 0xDFFF}, {0xD800, 0xDC00}, {0xD7FF, 0xE000, 0xFFFD}, {0x20, '\t', '\r', '\n'}})
+    for (const Units& units : {Units{0xD834, 0xDD1E},
+                               {0xDBFF, 0xDFFF},
+                               {0xD800, 0xDC00},
+                               {0xD7FF, 0xE000, 0xFFFD},
+                               {0x20, '\t', '\r', '\n'}})
         EXPECT_TRUE(IsXmlText(text(units))) << std::hex << units[0];
-    for (const Units& units : {Units{0xD834}, {0xD834, 'a'}, {0xDD1E}, {0xDC00, 0xD800}, {0xD800, 0xD800}, {0xDFFF, 'a'}, {0xD834, 0xE000}})
+    for (const Units& units : {Units{0xD834},
+                               {0xD834, 'a'},
+                               {0xDD1E},
+                               {0xDC00, 0xD800},
+                               {0xD800, 0xD800},
+                               {0xDFFF, 'a'},
+                               {0xD834, 0xE000}})
         EXPECT_FALSE(IsUnicodeText(text(units)) || IsXmlText(text(units))) << std::hex << units[0];
     for (const unsigned unit : {0x1FU, 1U, 8U, 0xBU, 0xFFFEU, 0xFFFFU})
         EXPECT_TRUE(IsUnicodeText(text({unit})) && !IsXmlText(text({unit}))) << std::hex << unit;
     EXPECT_EQ(wxString::FromUTF8("\t \uFFFD~\uFFFD\uFFFD\u00A0\u2027\uFFFD\uFFFD\u202A\uFFFD"),
-              ToOneLine(text({'\t', ' ', 0x1F, '~', 0x7F, 0x9F, 0xA0, 0x2027, 0x2028, 0x2029, 0x202A, 0xD834})));
+              ToOneLine(text({'\t', ' ', 0x1F, '~', 0x7F, 0x9F, 0xA0, 0x2027, 0x2028, 0x2029,
+                              0x202A, 0xD834})));
 }
 
 } // namespace

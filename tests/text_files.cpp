@@ -27,12 +27,16 @@ void ReplaceAll(std::string& text, const std::string& from, const std::string& t
         text.replace(at, from.size(), to);
 }
 
-bool StartsWith(const std::string& text, const std::string& start) { return text.compare(0, start.size(), start) == 0; }
+bool StartsWith(const std::string& text, const std::string& start)
+{
+    return text.compare(0, start.size(), start) == 0;
+}
 
 std::string ToUtf16(const std::string& text)
 {
     std::string result = "\xFF\xFE";
-    for (const char16_t unit : std::filesystem::path(text).u16string()) // as the names of files are in UTF-8
+    for (const char16_t unit :
+         std::filesystem::path(text).u16string()) // as the names of files are in UTF-8
         result += {static_cast<char>(unit & 0xFF), static_cast<char>(unit >> 8)};
     return result;
 }

@@ -23,8 +23,9 @@ std::string FromEnvironment(const char* name)
 // Presses the button of a message box if there is one; returns whether there was one.
 bool PressButton()
 {
-    return std::system("xdotool search --onlyvisible --name '^FolderUpgrade' windowfocus key Return "
-                       ">/dev/null 2>&1") == 0;
+    return std::system(
+               "xdotool search --onlyvisible --name '^FolderUpgrade' windowfocus key Return "
+               ">/dev/null 2>&1") == 0;
 }
 
 // Empty while the run is replacing the file.
@@ -36,33 +37,53 @@ std::string TextIfThere(const fs::path& path)
 
 } // namespace
 
-fs::path WindowsProgram() { return FromEnvironment("FOLDER_UPGRADE_WINDOWS_PROGRAM"); }
+fs::path WindowsProgram()
+{
+    return FromEnvironment("FOLDER_UPGRADE_WINDOWS_PROGRAM");
+}
 
 Wine::Wine(bool asOtherUser, const fs::path& driveH)
     : m_asOtherUser(asOtherUser),
-      m_prefix(FromEnvironment(asOtherUser ? "FOLDER_UPGRADE_WINE_PREFIX_OTHER" : "FOLDER_UPGRADE_WINE_PREFIX")), m_driveH(driveH)
+      m_prefix(FromEnvironment(asOtherUser ? "FOLDER_UPGRADE_WINE_PREFIX_OTHER"
+                                           : "FOLDER_UPGRADE_WINE_PREFIX")),
+      m_driveH(driveH)
 {
     const fs::path link = m_prefix / "dosdevices" / "h:";
     fs::remove(link);
     fs::create_symlink(driveH, link);
-    for (const fs::path& left : {UserDataDir() / "ORX", UserDataDir() / "ORX_Installers", UserDataDir() / "registry",
-                                 MachineDataDir() / "hotfolder", MachineDataDir() / "registry"})
+    for (const fs::path& left :
+         {UserDataDir() / "ORX", UserDataDir() / "ORX_Installers", UserDataDir() / "registry",
+          MachineDataDir() / "hotfolder", MachineDataDir() / "registry"})
         fs::remove_all(left);
 }
 
-std::string Wine::UserName() const { return m_asOtherUser ? "nobody" : "root"; }
+std::string Wine::UserName() const
+{
+    return m_asOtherUser ? "nobody" : "root";
+}
 
-fs::path Wine::UserDataDir() const { return m_prefix / "drive_c/users" / UserName() / "AppData/Roaming"; }
+fs::path Wine::UserDataDir() const
+{
+    return m_prefix / "drive_c/users" / UserName() / "AppData/Roaming";
+}
 
-fs::path Wine::MachineDataDir() const { return m_prefix / "drive_c/ProgramData"; }
+fs::path Wine::MachineDataDir() const
+{
+    return m_prefix / "drive_c/ProgramData";
+}
 
-std::string Wine::UserDataPath() const { return std::string("C:\\users\\") + UserName() + "\\AppData\\Roaming"; }
+std::string Wine::UserDataPath() const
+{
+    return std::string("C:\\users\\") + UserName() + "\\AppData\\Roaming";
+}
 
 void Wine::ImportHives(const std::string& machineHive, const std::string& userHive) const
 {
     std::string text = "Windows Registry Editor Version 5.00\r\n\r\n";
-    for (const char* key : {"HKEY_LOCAL_MACHINE\\SOFTWARE\\Vantorix", "HKEY_LOCAL_MACHINE\\SOFTWARE\\Wow6432Node\\Vantorix",
-                            "HKEY_CURRENT_USER\\SOFTWARE\\HF", "HKEY_CURRENT_USER\\SOFTWARE\\Wow6432Node\\HF"})
+    for (const char* key :
+         {"HKEY_LOCAL_MACHINE\\SOFTWARE\\Vantorix",
+          "HKEY_LOCAL_MACHINE\\SOFTWARE\\Wow6432Node\\Vantorix", "HKEY_CURRENT_USER\\SOFTWARE\\HF",
+          "HKEY_CURRENT_USER\\SOFTWARE\\Wow6432Node\\HF"})
         text += std::string("[-") + key + "]\r\n\r\n";
     for (const std::string& hive : {machineHive, userHive})
     {
@@ -74,17 +95,22 @@ void Wine::ImportHives(const std::string& machineHive, const std::string& userHi
         return;
     WriteFile(m_driveH / "hives.reg", ToUtf16(text));
     std::vector<std::string> boxes;
-    if (Start({"regedit", "/S", "H:\\hives.reg"}, "/dev/null", m_driveH / "hives.reg", boxes).exitStatus != 0)
+    if (Start({"regedit", "/S", "H:\\hives.reg"}, "/dev/null", m_driveH / "hives.reg", boxes)
+            .exitStatus != 0)
         throw std::runtime_error("the hives were not imported");
     imported[m_asOtherUser] = text;
     fs::remove(m_driveH / "hives.reg");
 }
 
-ProcessResult Wine::Start(const std::vector<std::string>& commandLine, const fs::path& output, const fs::path& watched,
-                          std::vector<std::string>& boxes) const
+ProcessResult Wine::Start(const std::vector<std::string>& commandLine, const fs::path& output,
+                          const fs::path& watched, std::vector<std::string>& boxes) const
 {
     Process process = {
-        {Loader}, {{"WINEPREFIX", m_prefix}, {"HOME", m_prefix}, {"LC_ALL", "C.UTF-8"}, {"USER", UserName()}}, m_asOtherUser, output, {}};
+        {Loader},
+        {{"WINEPREFIX", m_prefix}, {"HOME", m_prefix}, {"LC_ALL", "C.UTF-8"}, {"USER", UserName()}},
+        m_asOtherUser,
+        output,
+        {}};
     process.commandLine.insert(process.commandLine.end(), commandLine.begin(), commandLine.end());
     return RunToTheEnd(process,
                        [&](double seconds)

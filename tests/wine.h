@@ -1,5 +1,5 @@
-// The Windows program under Wine, with Wine's registry, profile, attribute and shell functions. There are two prefixes,
-// root's and another user's, because root is refused nothing.
+// The Windows program under Wine, with Wine's registry, profile, attribute and shell functions.
+// There are two prefixes, root's and another user's, because root is refused nothing.
 #pragma once
 
 #include "tests/process.h"
@@ -24,10 +24,11 @@ class Wine
     /// Replaces all keys with those of the two hives, which are in the registry editor's text form.
     void ImportHives(const std::string& machineHive, const std::string& userHive) const;
 
-    /// Starts a program and presses the button of every message box. While a box is open, appends the text of the
-    /// watched file to boxes whenever it has changed.
-    ProcessResult Start(const std::vector<std::string>& commandLine, const std::filesystem::path& output,
-                        const std::filesystem::path& watched, std::vector<std::string>& boxes) const;
+    /// Starts a program and presses the button of every message box. While a box is open, appends
+    /// the text of the watched file to boxes whenever it has changed.
+    ProcessResult Start(const std::vector<std::string>& commandLine,
+                        const std::filesystem::path& output, const std::filesystem::path& watched,
+                        std::vector<std::string>& boxes) const;
 
   private:
     std::string UserName() const;

@@ -30,22 +30,28 @@ std::string Attributes(const fs::path& path, bool withMode)
     std::array<char, 16> text{};
     getxattr(path.c_str(), AttributeName, text.data(), text.size() - 1);
     const unsigned long stored = std::strtoul(text.data(), nullptr, 16);
-    const bool isReadOnly = S_ISDIR(status.st_mode) ? (stored & 1) != 0 : (status.st_mode & 0222) == 0;
+    const bool isReadOnly =
+        S_ISDIR(status.st_mode) ? (stored & 1) != 0 : (status.st_mode & 0222) == 0;
     std::ostringstream attributes;
-    attributes << (isReadOnly ? "R" : "") << ((stored & 2) != 0 ? "H" : "") << ((stored & 4) != 0 ? "S" : "");
+    attributes << (isReadOnly ? "R" : "") << ((stored & 2) != 0 ? "H" : "")
+               << ((stored & 4) != 0 ? "S" : "");
     if (withMode)
         attributes << " mode " << std::oct << (status.st_mode & 07777U);
     return attributes.str();
 }
 
-// Whether a path in an application data folder, which other programs also use, belongs to a scenario.
+// Whether a path in an application data folder, which other programs also use, belongs to a
+// scenario.
 bool IsOurs(const std::string& path)
 {
     const std::string top = path.substr(0, path.find('/'));
     return top == "ORX" || top == "ORX_Installers" || top == "hotfolder" || top == "registry";
 }
 
-std::string ProgramFile(const std::string& program) { return IsWindowsProgram() ? program + ".exe" : program; }
+std::string ProgramFile(const std::string& program)
+{
+    return IsWindowsProgram() ? program + ".exe" : program;
+}
 
 void GiveAway(const fs::path& path)
 {
@@ -78,7 +84,10 @@ std::string Repeat(const std::string& text)
 
 } // namespace
 
-bool IsWindowsProgram() { return !WindowsProgram().empty(); }
+bool IsWindowsProgram()
+{
+    return !WindowsProgram().empty();
+}
 
 Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser)
 {
@@ -100,12 +109,13 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser)
     }
     const std::string separator = IsWindowsProgram() ? "\\" : "/";
     const std::string root = (IsWindowsProgram() ? "H:" : m_root.string()) + separator;
-    m_tokens = {{"{hot}", root + "Hot Folders"},
-                {"{tool}", root + "Tool Größe"},
-                {"{app}", root + "Apps ä"},
-                {"{previous}", root + "Vorige 版"},
-                {"{user}", IsWindowsProgram() ? m_wine->UserDataPath() : m_hostDirs["user"].string()},
-                {"{/}", separator}};
+    m_tokens = {
+        {"{hot}", root + "Hot Folders"},
+        {"{tool}", root + "Tool Größe"},
+        {"{app}", root + "Apps ä"},
+        {"{previous}", root + "Vorige 版"},
+        {"{user}", IsWindowsProgram() ? m_wine->UserDataPath() : m_hostDirs["user"].string()},
+        {"{/}", separator}};
     m_tokens["{default}"] = m_tokens["{app}"] + separator + "template";
     // In capitals, in the form of the registry editor's text.
     for (const auto& [token, value] : Files(m_tokens))
@@ -174,8 +184,12 @@ void Workstation::SetAttributes(const std::string& place, const std::string& let
 {
     const fs::path path = HostPath(place);
     const bool isDirectory = fs::is_directory(path);
-    const auto has = [&](char letter) { return letters.find(letter) != std::string::npos; };
-    const unsigned stored = (has('H') ? 2U : 0U) | (has('S') ? 4U : 0U) | (has('R') && isDirectory ? 1U : 0U);
+    const auto has = [&](char letter)
+    {
+        return letters.find(letter) != std::string::npos;
+    };
+    const unsigned stored =
+        (has('H') ? 2U : 0U) | (has('S') ? 4U : 0U) | (has('R') && isDirectory ? 1U : 0U);
     const std::string text = "0x" + std::to_string(stored);
     if (stored != 0 && setxattr(path.c_str(), AttributeName, text.data(), text.size(), 0) != 0)
         throw std::runtime_error("no extended attributes in " + m_root.string());
@@ -232,7 +246,8 @@ void Workstation::LayOut(const Files& files)
     {
         for (const auto& [name, directory] : m_hostDirs)
             GiveAway(directory);
-        ForEachEntry([](const std::string&, const fs::directory_entry& entry) { GiveAway(entry.path()); });
+        ForEachEntry([](const std::string&, const fs::directory_entry& entry)
+                     { GiveAway(entry.path()); });
     }
     Files hives = files;
     if (m_wine)
@@ -248,8 +263,9 @@ RunResult Workstation::Start(const std::vector<std::string>& arguments, const st
 {
     RunResult run;
     const fs::path output = m_root / "output";
-    std::vector<std::string> commandLine = {(m_wine ? m_tokens["{tool}"] + "\\" : m_hostDirs["tool"].string() + "/") +
-                                            ProgramFile(program)};
+    std::vector<std::string> commandLine = {
+        (m_wine ? m_tokens["{tool}"] + "\\" : m_hostDirs["tool"].string() + "/") +
+        ProgramFile(program)};
     commandLine.insert(commandLine.end(), arguments.begin(), arguments.end());
     if (m_wine)
     {
@@ -261,13 +277,14 @@ RunResult Workstation::Start(const std::vector<std::string>& arguments, const st
     else
     {
         const fs::path errors = m_root / "errors";
-        run.process = RunToTheEnd({commandLine,
-                                   {{"XDG_CONFIG_HOME", m_hostDirs["user"].string()},
-                                    {"XDG_CONFIG_DIRS", m_hostDirs["machine"].string() + ":/nowhere"},
-                                    {"LC_ALL", "C"}},
-                                   m_asOtherUser,
-                                   output,
-                                   errors});
+        run.process =
+            RunToTheEnd({commandLine,
+                         {{"XDG_CONFIG_HOME", m_hostDirs["user"].string()},
+                          {"XDG_CONFIG_DIRS", m_hostDirs["machine"].string() + ":/nowhere"},
+                          {"LC_ALL", "C"}},
+                         m_asOtherUser,
+                         output,
+                         errors});
         run.libraryLog = ReadFile(errors);
     }
     run.output = ReadFile(output);

@@ -5,17 +5,21 @@
 //   user/...        the per-user application data folder; machine/... the machine-wide one
 //   tool/...        the folder of the executable
 //   elsewhere/...   files that the tool has no reason to touch, for example targets of links
-// A place that ends in a slash is a directory. One that ends in '#' has the attributes of the file or directory before
-// it, as letters: R read-only, H hidden, S system, X another user's, 0 no permission at all, L a directory that cannot be listed
+// A place that ends in a slash is a directory. One that ends in '#' has the attributes of the file
+// or directory before it, as letters: R read-only, H hidden, S system, X another user's, 0 no
+// permission at all, L a directory that cannot be listed
 // ("hot/A/Desktop.ini#" -> "RS"). A snapshot of elsewhere/ also has the modes there ("R mode 444").
 //
-// In texts, {hot}, {user}, {tool}, {app}, {previous} and {default} are replaced with paths (as the tool sees them) and
-// {/} with the path separator; in capitals ({HOT}, {/2}) in the form of the registry editor's text. {repeat:COUNT:TEXT}
-// is the text COUNT times, with the repetition's six-digit number in place of '#'. A whole text can also be
+// In texts, {hot}, {user}, {tool}, {app}, {previous} and {default} are replaced with paths (as the
+// tool sees them) and
+// {/} with the path separator; in capitals ({HOT}, {/2}) in the form of the registry editor's text.
+// {repeat:COUNT:TEXT} is the text COUNT times, with the repetition's six-digit number in place of
+// '#'. A whole text can also be
 //   {utf16}TEXT     the text in UTF-16 with a byte-order mark
 //   {icon:NAME}     the bytes of a shipped icon
 //   {link:TARGET}   a symbolic link to another place or to an absolute path; to a directory if its
-//                   own place ends in a slash. Links to files and dangling ones work only on this machine.
+//                   own place ends in a slash. Links to files and dangling ones work only on this
+//                   machine.
 //   {fifo}          a FIFO; only on this machine
 #pragma once
 
@@ -53,8 +57,10 @@ class Workstation
 
     void LayOut(const Files& files);
     /// Runs a program in the tool's folder until it ends.
-    RunResult Start(const std::vector<std::string>& arguments, const std::string& program = "FolderUpgrade");
-    /// Every file with its text, every link, every directory and every attribute that is set. Links are not followed.
+    RunResult Start(const std::vector<std::string>& arguments,
+                    const std::string& program = "FolderUpgrade");
+    /// Every file with its text, every link, every directory and every attribute that is set. Links
+    /// are not followed.
     Files Snapshot() const;
     /// The text with everything in braces replaced, except for a link or a FIFO.
     std::string Expand(std::string text) const;

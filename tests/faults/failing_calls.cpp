@@ -1,8 +1,9 @@
-// Preloaded before the C library (LD_PRELOAD): makes something happen at one of the program's calls.
+// Preloaded before the C library (LD_PRELOAD): makes something happen at one of the program's
+// calls.
 //
-// It counts the calls that concern a path below $FAULT_ROOT, by name or by descriptor, or only those of them that
-// $FAULT_CALLS lists. The letters of $FAULT_EVENTS say what happens at call number $FAULT_NUMBER and at those that
-// follow it:
+// It counts the calls that concern a path below $FAULT_ROOT, by name or by descriptor, or only
+// those of them that $FAULT_CALLS lists. The letters of $FAULT_EVENTS say what happens at call
+// number $FAULT_NUMBER and at those that follow it:
 //   f  the call does nothing and fails with the error number $FAULT_ERROR
 //   s  it writes half of what it is given
 //   e  the process ends before the call
@@ -87,8 +88,8 @@ char Event(const char* call, const char* path)
     static long count = 0;
     char resolved[8192] = {};
     Resolve(path, resolved, sizeof resolved);
-    if (!IsListed(call) || std::strncmp(resolved, root, std::strlen(root)) != 0 || ++count < number ||
-        count - number >= static_cast<long>(std::strlen(events)))
+    if (!IsListed(call) || std::strncmp(resolved, root, std::strlen(root)) != 0 ||
+        ++count < number || count - number >= static_cast<long>(std::strlen(events)))
         return '\0';
     const char event = events[count - number];
     if (count == number)
@@ -112,21 +113,28 @@ bool Fails(const char* call, const char* path)
 
 struct PathOf
 {
-    explicit PathOf(int descriptor) { std::snprintf(path, sizeof path, "/proc/self/fd/%d", descriptor); }
+    explicit PathOf(int descriptor)
+    {
+        std::snprintf(path, sizeof path, "/proc/self/fd/%d", descriptor);
+    }
 
     char path[32] = {};
 };
 
-bool Fails(const char* call, int descriptor) { return Fails(call, PathOf(descriptor).path); }
+bool Fails(const char* call, int descriptor)
+{
+    return Fails(call, PathOf(descriptor).path);
+}
 
 } // namespace
 
-// Defines a call: its result, name and parameters, its arguments, what identifies its file, and how it fails.
-#define FAILING(result, name, parameters, arguments, subject, failure)                                                                     \
-    extern "C" result name parameters                                                                                                      \
-    {                                                                                                                                      \
-        static const auto real = Real(&name, #name);                                                                                       \
-        return Fails(#name, subject) ? (failure) : real arguments;                                                                         \
+// Defines a call: its result, name and parameters, its arguments, what identifies its file, and how
+// it fails.
+#define FAILING(result, name, parameters, arguments, subject, failure)                             \
+    extern "C" result name parameters                                                              \
+    {                                                                                              \
+        static const auto real = Real(&name, #name);                                               \
+        return Fails(#name, subject) ? (failure) : real arguments;                                 \
     }
 extern "C" int open64(const char* path, int flags, ...)
 {
@@ -147,21 +155,26 @@ extern "C" ssize_t pwrite64(int file, const void* data, size_t size, off64_t off
 
 FAILING(DIR*, opendir, (const char* path), (path), path, nullptr)
 FAILING(dirent64*, readdir64, (DIR * dir), (dir), dirfd(dir), nullptr)
-FAILING(ssize_t, pread64, (int file, void* data, size_t size, off64_t offset), (file, data, size, offset), file, -1)
+FAILING(ssize_t, pread64, (int file, void* data, size_t size, off64_t offset),
+        (file, data, size, offset), file, -1)
 FAILING(int, ftruncate64, (int file, off64_t length) noexcept, (file, length), file, -1)
-FAILING(int, fallocate64, (int file, int mode, off64_t from, off64_t length), (file, mode, from, length), file, -1)
+FAILING(int, fallocate64, (int file, int mode, off64_t from, off64_t length),
+        (file, mode, from, length), file, -1)
 FAILING(int, fsync, (int file), (file), file, -1)
 FAILING(int, close, (int file), (file), file, FailAfter(real(file))) // it closes the file anyway
 FAILING(int, access, (const char* path, int mode) noexcept, (path, mode), path, -1)
 FAILING(int, stat64, (const char* path, struct stat64* status) noexcept, (path, status), path, -1)
 FAILING(int, lstat64, (const char* path, struct stat64* status) noexcept, (path, status), path, -1)
-FAILING(int, fstatat64, (int directory, const char* path, struct stat64* status, int flags) noexcept, (directory, path, status, flags),
-        path, -1)
+FAILING(int, fstatat64,
+        (int directory, const char* path, struct stat64* status, int flags) noexcept,
+        (directory, path, status, flags), path, -1)
 FAILING(int, fstat64, (int file, struct stat64* status) noexcept, (file, status), file, -1)
 FAILING(int, chmod, (const char* path, mode_t mode) noexcept, (path, mode), path, -1)
 FAILING(int, fchmod, (int file, mode_t mode) noexcept, (file, mode), file, -1)
 FAILING(int, unlink, (const char* path) noexcept, (path), path, -1)
-FAILING(ssize_t, getxattr, (const char* path, const char* name, void* data, size_t size) noexcept, (path, name, data, size), path, -1)
-FAILING(int, setxattr, (const char* path, const char* name, const void* data, size_t size, int flags) noexcept,
+FAILING(ssize_t, getxattr, (const char* path, const char* name, void* data, size_t size) noexcept,
+        (path, name, data, size), path, -1)
+FAILING(int, setxattr,
+        (const char* path, const char* name, const void* data, size_t size, int flags) noexcept,
         (path, name, data, size, flags), path, -1)
 FAILING(int, removexattr, (const char* path, const char* name) noexcept, (path, name), path, -1)

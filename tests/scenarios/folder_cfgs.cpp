@@ -4,7 +4,10 @@
 namespace
 {
 
-Text Filter(const Text& content) { return "  <FilterSetting>" + content + "</FilterSetting>\n"; }
+Text Filter(const Text& content)
+{
+    return "  <FilterSetting>" + content + "</FilterSetting>\n";
+}
 
 // A chain of nested elements, as the library writes it; levels are counted from 1.
 Text Nested(int levels)
@@ -33,32 +36,50 @@ std::vector<Scenario> FolderCfgs()
 {
     const Text found = Found(MovedFrom);
     const Text written = MinimalWritten(MovedTo);
-    const Text mixed = Filter("t\n    <x>u\n      <y/>v</x>\n    <![CDATA[<w>]]>z\n    <!--c-->\n  ");
-    const auto elsewhere = [](const Name& name, const Text& path) { return Scenario(name).FolderCfg(Written(path)).LogOfA(Found(path)); };
-    const Text onServer = "{/}{/}host{/}share{/}old{/}x";
-    const auto onShare = [&](const Name& name, const Text& share) {
-        return Scenario(name).Before({{UserHive, UserValue("\"Path\"=\"{/2}{/2}host{/2}" + share + "{/2}old\"")}}).LogOfA(Found(onServer));
+    const Text mixed =
+        Filter("t\n    <x>u\n      <y/>v</x>\n    <![CDATA[<w>]]>z\n    <!--c-->\n  ");
+    const auto elsewhere = [](const Name& name, const Text& path)
+    {
+        return Scenario(name).FolderCfg(Written(path)).LogOfA(Found(path));
     };
-    const auto nested = [&](const Name& name, int levels) {
+    const Text onServer = "{/}{/}host{/}share{/}old{/}x";
+    const auto onShare = [&](const Name& name, const Text& share)
+    {
+        return Scenario(name)
+            .Before({{UserHive, UserValue("\"Path\"=\"{/2}{/2}host{/2}" + share + "{/2}old\"")}})
+            .LogOfA(Found(onServer));
+    };
+    const auto nested = [&](const Name& name, int levels)
+    {
         return Scenario(name)
             .FolderCfg(Written(MovedFrom, Filter(Chain(levels))))
             .LogOfA(found + Untouched("filter setting nested too deep"));
     };
     return {
-        Scenario("AForeignFolderCfgIsRewrittenInTheToolsForm").FolderCfg(Foreign(MovedFrom), Written(MovedTo)).LogOfA(found),
-        Scenario("AnIncompleteChainIsRewrittenWithDefaults").FolderCfg(Minimal(MovedFrom), written).LogOfDisabledA(found),
+        Scenario("AForeignFolderCfgIsRewrittenInTheToolsForm")
+            .FolderCfg(Foreign(MovedFrom), Written(MovedTo))
+            .LogOfA(found),
+        Scenario("AnIncompleteChainIsRewrittenWithDefaults")
+            .FolderCfg(Minimal(MovedFrom), written)
+            .LogOfDisabledA(found),
         Scenario("ADocumentTypeIsNotCarriedOver")
-            .FolderCfg(Minimal(MovedFrom, "<!DOCTYPE h [<!ENTITY e 'x'>]>", "&e;"), MinimalWritten(MovedTo, "x"))
+            .FolderCfg(Minimal(MovedFrom, "<!DOCTYPE h [<!ENTITY e 'x'>]>", "&e;"),
+                       MinimalWritten(MovedTo, "x"))
             .LogOfDisabledA(found),
         Scenario("FolderCfgLosesItsByteOrderMark")
-            .FolderCfg("\xEF\xBB\xBF" + Minimal(MovedFrom, "<?xml version='1.0' encoding='utf-8'?>"), written)
+            .FolderCfg("\xEF\xBB\xBF" +
+                           Minimal(MovedFrom, "<?xml version='1.0' encoding='utf-8'?>"),
+                       written)
             .LogOfDisabledA(found),
-        Scenario("AUtf16FolderCfgComesOutInUtf8").FolderCfg("{utf16}" + Minimal(MovedFrom), written).LogOfDisabledA(found),
+        Scenario("AUtf16FolderCfgComesOutInUtf8")
+            .FolderCfg("{utf16}" + Minimal(MovedFrom), written)
+            .LogOfDisabledA(found),
         elsewhere("ATemplateInASubfolderStays", "{previous}{/}Sub{/}x"),
         elsewhere("ATemplateElsewhereStays", "{previous}2{/}x"),
         elsewhere("ATemplateOnAServerStays", "\\\\host\\share\\x\\B"),
         elsewhere("ATemplateOnAServerStaysWithSlashes", "//host/share/B"),
-        onShare("ATemplateOnTheShareBeingLeftMoves", "share").FolderCfg(Written(onServer), Written("{default}{/}x")),
+        onShare("ATemplateOnTheShareBeingLeftMoves", "share")
+            .FolderCfg(Written(onServer), Written("{default}{/}x")),
         onShare("ATemplateOnAnotherShareStays", "other").FolderCfg(Written(onServer)),
         Scenario("ATemplateInARelativeFolderMoves")
             .Before({{UserHive, UserValue("\"Path\"=\"x{/2}y\"")}})
@@ -70,17 +91,27 @@ std::vector<Scenario> FolderCfgs()
             .Preset(Stored(MovedFrom), Stored(MovedTo))
             .LogOfA(found, PresetLine(Updated)),
         Scenario("AnEmptyFolderCfgStays").FolderCfg("").LogOfDisabledA("").LibraryReports(),
-        Scenario("ATruncatedFolderCfgStays").FolderCfg(Foreign(MovedFrom).substr(0, 700)).LogOfDisabledA("").LibraryReports(),
-        Scenario("WithoutImposeSettingNothingIsLogged").FolderCfg("<HotFolder/>").LogOfDisabledA(""),
+        Scenario("ATruncatedFolderCfgStays")
+            .FolderCfg(Foreign(MovedFrom).substr(0, 700))
+            .LogOfDisabledA("")
+            .LibraryReports(),
+        Scenario("WithoutImposeSettingNothingIsLogged")
+            .FolderCfg("<HotFolder/>")
+            .LogOfDisabledA(""),
         Scenario("WithoutTheTemplateKeyNothingMoves")
-            .FolderCfg("<H><ImposeSetting><K k='orximposetemplate' v='" + MovedFrom + "'/></ImposeSetting></H>")
+            .FolderCfg("<H><ImposeSetting><K k='orximposetemplate' v='" + MovedFrom +
+                       "'/></ImposeSetting></H>")
             .LogOfDisabledA(Found("")),
         Scenario("MixedContentIsIndented")
-            .FolderCfg(Written(MovedFrom, Filter("\n \nt<x>u<y/>v</x><![CDATA[<w>]]>z<!--c-->")), Written(MovedTo, mixed))
+            .FolderCfg(Written(MovedFrom, Filter("\n \nt<x>u<y/>v</x><![CDATA[<w>]]>z<!--c-->")),
+                       Written(MovedTo, mixed))
             .LogOfA(found),
-        Scenario("MixedContentIsIndentedOnceOnly").FolderCfg(Written(MovedFrom, mixed), Written(MovedTo, mixed)).LogOfA(found),
+        Scenario("MixedContentIsIndentedOnceOnly")
+            .FolderCfg(Written(MovedFrom, mixed), Written(MovedTo, mixed))
+            .LogOfA(found),
         Scenario("AFilterOf1024LevelsIsSaved")
-            .FolderCfg(Written(MovedFrom, Filter(Nested(1024))), Written(MovedTo, Filter(Nested(1024))))
+            .FolderCfg(Written(MovedFrom, Filter(Nested(1024))),
+                       Written(MovedTo, Filter(Nested(1024))))
             .LogOfA(found),
         nested("AFilterOf1025LevelsStays", 1025),
         nested("AFilterOf60000LevelsStays", 60000),
@@ -98,8 +129,10 @@ std::vector<Scenario> Encodings()
     const auto declared = [](const Name& name, const Text& encoding, const Text& folder)
     {
         return Scenario(name)
-            .Before({{MachineHive, MachineValue("\"InstallPath\"=\"{HOT}\"")}, {UserHive, UserValue("\"Path\"=\"{HOT}\"")}})
-            .FolderCfg(Minimal("{hot}{/}x", "<?xml version='1.0' encoding" + encoding + "?>", folder))
+            .Before({{MachineHive, MachineValue("\"InstallPath\"=\"{HOT}\"")},
+                     {UserHive, UserValue("\"Path\"=\"{HOT}\"")}})
+            .FolderCfg(
+                Minimal("{hot}{/}x", "<?xml version='1.0' encoding" + encoding + "?>", folder))
             .LogOfDisabledA(Found("{hot}{/}x") + Untouched("unknown encoding"));
     };
     const auto ascii = [&](const Name& name, const Text& encoding)
@@ -123,7 +156,8 @@ std::vector<Scenario> Encodings()
         declared("ShiftJisStaysWithSpacesInItsDeclaration", " = 'Shift_JIS'", "\x93\xFA"),
         declared("AFolderCfgInAnUnknownEncodingStays", "='x-own'", "x"),
         declared("AnUnknownEncodingIsSeenAfterAByteOrderMark", "", "")
-            .FolderCfg("\xEF\xBB\xBF" + Minimal("{hot}{/}x", "<?xml version='1.0' encoding='x-own'?>")),
+            .FolderCfg("\xEF\xBB\xBF" +
+                       Minimal("{hot}{/}x", "<?xml version='1.0' encoding='x-own'?>")),
     };
 }
 
