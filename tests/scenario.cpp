@@ -1,14 +1,54 @@
 #include "tests/scenario.h"
 
 #include "tests/scenarios/texts.h"
-#include "tests/text_files.h"
 
 #include <set>
 
-Scenario& Scenario::Add(Files& to, const Files& files)
+Scenario& Scenario::Before(const Files& files)
 {
     for (const auto& [place, text] : files)
-        to[place] = text;
+        before[place] = text;
+    return *this;
+}
+
+Scenario& Scenario::After(const Files& files)
+{
+    for (const auto& [place, text] : files)
+        after[place] = text;
+    return *this;
+}
+
+Scenario& Scenario::FolderCfg(const Text& text, const Text& becomes)
+{
+    return Before({{CfgPlace, text}}).After({{CfgPlace, becomes.empty() ? text : becomes}});
+}
+
+Scenario& Scenario::Preset(const Text& text, const Text& becomes)
+{
+    return Before({{PresetPlace, text}}).After({{PresetPlace, becomes.empty() ? text : becomes}});
+}
+
+Scenario& Scenario::Run(const std::vector<Text>& given)
+{
+    arguments = given;
+    return *this;
+}
+
+Scenario& Scenario::AsOtherUser()
+{
+    asOtherUser = true;
+    return *this;
+}
+
+Scenario& Scenario::NotUnderWine(const Text& reason)
+{
+    notUnderWine = reason;
+    return *this;
+}
+
+Scenario& Scenario::WholeLog(const Text& text)
+{
+    log = text;
     return *this;
 }
 
@@ -35,6 +75,36 @@ Scenario& Scenario::LogOfPreset(const Text& line)
     return Log("", PresetLine(line));
 }
 
+Scenario& Scenario::LibraryReports()
+{
+    libraryReports = true;
+    return *this;
+}
+
+Scenario& Scenario::Shell(const Text& version, const Text& calls)
+{
+    shellVersion = version;
+    shellCalls = calls;
+    return NotUnderWine("Wine's own shell is called there");
+}
+
+Scenario& Scenario::IsReported(const Text& lines)
+{
+    isOnlyChecked = true;
+    report = lines;
+    for (const auto& [token, text] : Files{
+             {"{moves}",
+              "  change   Folder.cfg: {previous}{/}Booklet.tpl -> {default}{/}Booklet.tpl"
+              "\n  note     no such file: {default}{/}Booklet.tpl"},
+             {"{log}", "{user}{/}ORX_Installers{/}UpgradeDowngrade.log"},
+             {"{Path}", "registry value Path in HKEY_CURRENT_USER\\SOFTWARE[\\Wow6432Node]\\HF"},
+             {"{InstallPath}", "registry value InstallPath in "
+                               "HKEY_LOCAL_MACHINE\\SOFTWARE[\\Wow6432Node]\\Vantorix\\QZA"},
+             {"{unknown}", "missing, longer than 257 characters, or not readable; nothing moves"}})
+        report = Replaced(report, token, text);
+    return *this;
+}
+
 Files WorkstationBefore(const Scenario& scenario)
 {
     Files files = scenario.before;
@@ -55,37 +125,4 @@ Files WorkstationBefore(const Scenario& scenario)
     for (auto file = files.begin(); file != files.end();)
         file = file->second == Removed ? files.erase(file) : std::next(file);
     return files;
-}
-
-Text LogAfter(const Scenario& scenario)
-{
-    const bool isUpgrade = !scenario.arguments.empty() &&
-                           (scenario.arguments[0] == "I" || scenario.arguments[0] == "i");
-    Text log = scenario.log;
-    ReplaceAll(log, "{start}",
-               isUpgrade ? "Installation : Upgrade call with switch: I\n"
-                         : "Un-installation : Downgrade call with switch: U\n");
-    ReplaceAll(log, "{icons}", isUpgrade ? "" : "BundleIcons{/}");
-    return log;
-}
-
-void TestOn(const Scenario& scenario, const std::string& program,
-            const std::function<void(Workstation&)>& test)
-{
-    if (IsWindowsProgram() && !scenario.notUnderWine.empty())
-        GTEST_SKIP() << scenario.notUnderWine;
-    Text description = scenario.name.what + ": " + program;
-    for (const Text& argument : scenario.arguments)
-        description += " " + argument;
-    const testing::ScopedTrace trace(scenario.name.file, scenario.name.line, description);
-    try
-    {
-        Workstation workstation(scenario.asOtherUser);
-        workstation.LayOut(WorkstationBefore(scenario));
-        test(workstation);
-    }
-    catch (const std::exception& exception)
-    {
-        FAIL() << exception.what();
-    }
 }

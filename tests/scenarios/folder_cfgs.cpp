@@ -6,7 +6,7 @@ namespace
 
 Text Filter(const Text& content)
 {
-    return "  <FilterSetting>" + content + "</FilterSetting>\n";
+    return "<FilterSetting>" + content + "</FilterSetting>";
 }
 
 // A chain of nested elements, as the library writes it; levels are counted from 1.
@@ -32,30 +32,90 @@ Text Chain(int levels)
     return text;
 }
 
+// Hot folders that each lack one attribute of the root, and one that has all.
+Scenario Gaps()
+{
+    const std::vector<Text> chain = {"description",
+                                     "server_ip",
+                                     "server_name",
+                                     "Enable",
+                                     "BaseVirtualPrinter",
+                                     "BaseVirtualPrinterName",
+                                     "BaseVirtualPrinterDisplayName",
+                                     "HFPresetName",
+                                     "Centralized",
+                                     "Isjobpresetattached",
+                                     "IsCustomInterval",
+                                     "TimeInterval",
+                                     "PPDVersion",
+                                     "ServerTypeAndJPDefaultKeyInfo",
+                                     "server_textversion",
+                                     "server_type",
+                                     "Quickset",
+                                     "Quickset_Supported",
+                                     "Quickset_Enabled",
+                                     "IsWidthBased"};
+    // server_version is read after 14 of them, and is no gap itself.
+    const std::vector<std::pair<Text, Text>> numbers = {{"2147483647", "2147483647"},
+                                                        {"-2147483648", "-2147483648"},
+                                                        {"2147483648", "0"},
+                                                        {"x1", "0"},
+                                                        {" 01", "1"},
+                                                        {"", "0"},
+                                                        {"9x", "9"}};
+    Scenario scenario("AttributesAfterAGapComeOutAsDefaults");
+    Text log;
+    for (size_t gap = 0; gap <= chain.size(); ++gap)
+    {
+        const auto& [number, read] = numbers[gap < 14 ? 0 : gap - 14];
+        Text attributes = "<HotFolder server_version='" + number + "'";
+        Text written = MinimalWritten(MovedTo);
+        for (size_t i = 0; i < chain.size(); ++i)
+        {
+            const Text value = " " + chain[i] + "=\"1\"";
+            attributes += i == gap ? "" : value;
+            for (const char* unset : {"\"\"", "\"0\""})
+                written = Replaced(written, " " + chain[i] + "=" + unset,
+                                   i < gap ? value : " " + chain[i] + "=" + unset);
+        }
+        const Text name = "gap " + std::to_string(10 + gap);
+        scenario
+            .Before({{"hot/" + name + "/[P]/Folder.cfg",
+                      Replaced(Minimal(MovedFrom), "<HotFolder", attributes)}})
+            .After({{"hot/" + name + "/[P]/Folder.cfg",
+                     Replaced(written, "\"-1\"", "\"" + (gap < 14 ? "-1" : read) + "\"")}});
+        log += FolderLines(name, static_cast<int>(gap) + 1,
+                           NoIcon(gap > 3 ? "hf_folder" : "hf_folder_disabled"),
+                           Found(MovedFrom, name));
+    }
+    return scenario.Log(log);
+}
+
 std::vector<Scenario> FolderCfgs()
 {
     const Text found = Found(MovedFrom);
     const Text written = MinimalWritten(MovedTo);
     const Text mixed =
         Filter("t\n    <x>u\n      <y/>v</x>\n    <![CDATA[<w>]]>z\n    <!--c-->\n  ");
-    const auto elsewhere = [](const Name& name, const Text& path)
+    const auto elsewhere = [](const Text& name, const Text& path)
     {
         return Scenario(name).FolderCfg(Written(path)).LogOfA(Found(path));
     };
     const Text onServer = "{/}{/}host{/}share{/}old{/}x";
-    const auto onShare = [&](const Name& name, const Text& share)
+    const auto onShare = [&](const Text& name, const Text& share)
     {
         return Scenario(name)
             .Before({{UserHive, UserValue("\"Path\"=\"{/2}{/2}host{/2}" + share + "{/2}old\"")}})
             .LogOfA(Found(onServer));
     };
-    const auto nested = [&](const Name& name, int levels)
+    const auto nested = [&](const Text& name, int levels)
     {
         return Scenario(name)
             .FolderCfg(Written(MovedFrom, Filter(Chain(levels))))
             .LogOfA(found + Untouched("filter setting nested too deep"));
     };
     return {
+        Gaps(),
         Scenario("AForeignFolderCfgIsRewrittenInTheToolsForm")
             .FolderCfg(Foreign(MovedFrom), Written(MovedTo))
             .LogOfA(found),
@@ -126,7 +186,7 @@ std::vector<Scenario> FolderCfgs()
 // The paths are ASCII, because nothing else can be compared in these encodings.
 std::vector<Scenario> Encodings()
 {
-    const auto declared = [](const Name& name, const Text& encoding, const Text& folder)
+    const auto declared = [](const Text& name, const Text& encoding, const Text& folder)
     {
         return Scenario(name)
             .Before({{MachineHive, MachineValue("\"InstallPath\"=\"{HOT}\"")},
@@ -135,7 +195,7 @@ std::vector<Scenario> Encodings()
                 Minimal("{hot}{/}x", "<?xml version='1.0' encoding" + encoding + "?>", folder))
             .LogOfDisabledA(Found("{hot}{/}x") + Untouched("unknown encoding"));
     };
-    const auto ascii = [&](const Name& name, const Text& encoding)
+    const auto ascii = [&](const Text& name, const Text& encoding)
     {
         return declared(name, "='" + encoding + "'", "x")
             .After({{CfgPlace, MinimalWritten("{hot}{/}template{/}x", "x")}})

@@ -28,7 +28,7 @@ Text Cfg(const Text& enabled)
 std::vector<Scenario> Icons()
 {
     // The new icon is in the tool's folder, the previous version's in BundleIcons.
-    const auto shows = [](const Name& name, const Text& icon, const Text& copied)
+    const auto shows = [](const Text& name, const Text& icon, const Text& copied)
     {
         return Scenario(name)
             .Before({{Icon(icon), "old"},
@@ -41,13 +41,13 @@ std::vector<Scenario> Icons()
                     {Ini, Header + IconFile(icon) + "IconIndex=00\r\n" + InfoTip}})
             .Log(FolderLines("A", 1, Copied(icon), ""));
     };
-    const auto upgradeShows = [&](const Name& name, const Text& icon)
+    const auto upgradeShows = [&](const Text& name, const Text& icon)
     {
         return shows(name, icon, "{icon:" + icon + ".ico}")
             .Before({{"tool/" + icon + ".ico#", "R"}})
             .After({{Icon(icon) + "#", "R"}});
     };
-    const auto downgradeShows = [&](const Name& name, const Text& icon)
+    const auto downgradeShows = [&](const Text& name, const Text& icon)
     {
         return shows(name, icon, "bundled").Run({"U"});
     };
@@ -95,7 +95,7 @@ std::vector<Scenario> DesktopInis()
         "; mine\n[ViewState]\nMode=\n[.shellclassinfo]\n\n;IconFile=no\nICONFILE=" +
         disabled.substr(9) + "IconIndex=3\nIconResource=y,1\n" + InfoTip +
         "\n[.ShellClassInfo]\nInfoTip=second\n";
-    const auto refresh = [](const Name& name, const Text& before, const Text& after)
+    const auto refresh = [](const Text& name, const Text& before, const Text& after)
     {
         return Scenario(name)
             .Before({{Icon("hf_folder_disabled"), "old"}, {Ini, before}})
@@ -139,12 +139,12 @@ std::vector<Scenario> DesktopInis()
             .NotUnderWine(WineLosesSystem),
         refresh("ADesktopIniOfAnotherUserStays", "[x]\r\n", "[x]\r\n")
             .Before(has("X"))
-            .After(has(""))
+            .After(has(Removed))
             .AsOtherUser()
             .NotUnderWine(WineLosesSystem),
         refresh("AReadOnlyIconIsReplaced", Header + InfoTip + disabled, Header + InfoTip + disabled)
             .Before({{Icon("hf_folder_disabled") + "#", "R"}})
-            .After({{Icon("hf_folder_disabled") + "#", ""}})
+            .After({{Icon("hf_folder_disabled") + "#", Removed}})
             .AsOtherUser()
             .NotUnderWine("Wine, like Windows, lets no user but root replace it"),
         Scenario("AFolderOfAnotherUserStays")
@@ -158,6 +158,46 @@ std::vector<Scenario> DesktopInis()
     };
 }
 
+// What the shell is asked for and told.
+std::vector<Scenario> ShellCalls()
+{
+    const Text version = "load shell32.dll\nfind DllGetVersion\nfree\n";
+    const auto notices = [](const Text& folder) -> Text
+    {
+        const Text ini = "{hot}{/}" + folder + "{/}Desktop.ini";
+        return "notify 800 1005 " + ini + " 0\ninfo " + ini +
+               " 0 1 4000\nnotify 8000 1003  -7\nnotify 8 1005 " + ini +
+               " 0\nnotify 8000000 1000  0\n";
+    };
+    const auto told = [&](const Text& name, const Text& shell, const Text& calls)
+    {
+        return Scenario(name)
+            .Before({{Icon("hf_folder_disabled"), "{icon:hf_folder_disabled.ico}"}})
+            .After({{Ini + "#", "RS"}})
+            .Log(FolderLines("A", 1, Copied("hf_folder_disabled"), NoCfg()))
+            .Shell(shell, calls);
+    };
+    const Text force = "force {hot}{/}A 10 .\\[_ORX_HotFolder_]\\hf_folder_disabled.ico 0 0 2\n";
+    const Text ini = Header + InfoTip + IconFile("hf_folder_disabled");
+    const Files system = {{"hot/A#", "S"}};
+    return {
+        told("ANewDesktopIniIsAnnounced", "6.0", version + notices("A"))
+            .After(system)
+            .After({{Ini, Header + IconFile("hf_folder_disabled") + "IconIndex=00\r\n" + InfoTip}}),
+        told("AnExistingDesktopIniIsForced", "4.72", version + force + notices("A"))
+            .Before({{Ini, ""}})
+            .After(system)
+            .After({{Ini, ini}}),
+        told("OnlyTheLowerHalfOfAVersionCounts", "65540.72", version + force + notices("A"))
+            .Before({{Ini, ""}})
+            .After(system)
+            .After({{Ini, ini}}),
+        told("AnOldShellIsNotTold", "4.71", version).Before({{Ini, ""}}),
+        told("AnUnknownShellIsNotTold", "unknown", version).Before({{Ini, ""}}),
+    };
+}
+
+TEST_SCENARIOS(ShellCalls);
 TEST_SCENARIOS(Icons);
 TEST_SCENARIOS(DesktopInis);
 

@@ -11,7 +11,7 @@ Text Lines(const Text& name, int position)
 
 std::vector<Scenario> Lists()
 {
-    const auto listed = [](const Name& name, const Text& list)
+    const auto listed = [](const Text& name, const Text& list)
     {
         return Scenario(name).Before({{"hot/A/", ""},
                                       {"hot/b ü 漢/", ""},

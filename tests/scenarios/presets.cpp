@@ -11,11 +11,11 @@ std::vector<Scenario> Presets()
                       "ORXImposeTemplate\">\"{previous}";
     const Text from = Stored(MovedFrom);
     const Text to = Stored(MovedTo);
-    const auto updated = [](const Name& name, const Text& before, const Text& after)
+    const auto updated = [](const Text& name, const Text& before, const Text& after)
     {
-        return Scenario(name).Preset(before, after).LogOfPreset(Updated);
+        return Scenario(name).Preset(before).After({{PresetPlace, after}}).LogOfPreset(Updated);
     };
-    const auto left = [](const Name& name, const Text& preset, const Text& reason)
+    const auto left = [](const Text& name, const Text& preset, const Text& reason)
     {
         return Scenario(name).Preset(preset).LogOfPreset("preset.xml left as it is (" + reason +
                                                          "): ");

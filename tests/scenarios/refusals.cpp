@@ -8,7 +8,7 @@ std::vector<Scenario> Refusals()
 {
     const Text found = Found(MovedFrom);
     const Text cfg = Written(MovedFrom);
-    const auto refused = [](const Name& name, const Text& place, const Text& attributes)
+    const auto refused = [](const Text& name, const Text& place, const Text& attributes)
     {
         return Scenario(name).Before({{place + "#", attributes}}).AsOtherUser().LibraryReports();
     };
@@ -21,6 +21,7 @@ std::vector<Scenario> Refusals()
         refused("AReadOnlyPresetStays", PresetPlace, "R")
             .Preset(Stored(MovedFrom))
             .LogOfPreset("Unable to open preset.xml for write : "),
+        refused("AReadOnlyLogStays", LogPlace, "R").FolderCfg(cfg, Written(MovedTo)),
         refused("AnUnreadableListIsEmpty", ListPlace, "0").Before({{"hot/A/", ""}}).Log(""),
     };
 }

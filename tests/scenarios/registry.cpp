@@ -5,18 +5,18 @@ namespace
 {
 
 // A hot folder and a preset whose paths would move, and these hives.
-Scenario Both(const Name& name, const Text& letter, const Files& hives)
+Scenario Both(const Text& name, const Text& letter, const Files& hives)
 {
     const Text path = letter == "I" ? MovedFrom : MovedTo;
     return Scenario(name).Before(hives).FolderCfg(Written(path)).Preset(Stored(path)).Run({letter});
 }
 
-Scenario WithPrevious(const Name& name, const Text& value)
+Scenario WithPrevious(const Text& name, const Text& value)
 {
     return Both(name, "I", {{UserHive, UserValue(value)}});
 }
 
-Scenario WithInstalled(const Name& name, const Text& value)
+Scenario WithInstalled(const Text& name, const Text& value)
 {
     return Both(name, "I", {{MachineHive, MachineValue(value)}});
 }

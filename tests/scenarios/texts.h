@@ -4,8 +4,6 @@
 #include "tests/scenario.h"
 #include "tests/text_files.h"
 
-using Text = std::string;
-
 inline const Text MovedFrom = "{previous}{/}Booklet.tpl";
 inline const Text MovedTo = "{default}{/}Booklet.tpl";
 
@@ -28,19 +26,18 @@ inline Text UserValue(const Text& value)
 /// A file of tests/data, with the parts in double braces replaced.
 inline Text Data(const Text& file, const Files& values)
 {
-    Text text = ReadFile(Text(DATA_DIR) + "/" + file);
+    Text text = ReadFile(DATA_DIR "/" + file);
     for (const auto& [name, value] : values)
-        ReplaceAll(text, "{{" + name + "}}", value);
+        text = Replaced(text, "{{" + name + "}}", value);
     return text;
 }
 
 /// A Folder.cfg as the tool writes it.
-inline Text Written(
-    const Text& path,
-    const Text& filter =
-        "  <FilterSetting mode=\"2\" name=\"&lt;\">\n    <a/>\n  </FilterSetting>\n")
+inline Text Written(const Text& path,
+                    const Text& filter = "<FilterSetting mode=\"2\" name=\"&lt;\">\n"
+                                         "    <a/>\n  </FilterSetting>")
 {
-    return Data("written.cfg", {{"path", path}, {"filter", filter}});
+    return Data("written.cfg", {{"path", path}, {"filter", "  " + filter + "\n"}});
 }
 
 /// The same settings as another program may write them.
@@ -99,9 +96,9 @@ inline Text Untouched(const Text& reason)
 {
     return "HF cfg file left as it is (" + reason + "): " + CfgOf("A");
 }
-inline Text Found(const Text& path)
+inline Text Found(const Text& path, const Text& name = "A")
 {
-    return "Imposepath:{hot}{/}Ais: " + path + "\n";
+    return "Imposepath:{hot}{/}" + name + "is: " + path + "\n";
 }
 inline Text PresetLine(const Text& line)
 {
