@@ -75,6 +75,10 @@ struct Scenario
 /// Everything on the workstation before the run, the usual files included.
 Files WorkstationBefore(const Scenario& scenario);
 
+/// The places that differ in two snapshots, with both texts, or Removed.
+using Difference = std::pair<Text, Text>;
+std::map<Text, Difference> Differences(const Files& left, const Files& right);
+
 class Workstations : public testing::TestWithParam<Scenario>
 {
 };

@@ -38,8 +38,8 @@ Text Meaning(const Text& place, const Text& text)
     return !isAttributes && place.find("Desktop.ini") != Text::npos ? ProfileMeaning(text) : text;
 }
 
-// The texts of a place in two snapshots if they differ.
-using Difference = std::pair<Text, Text>;
+} // namespace
+
 std::map<Text, Difference> Differences(const Files& left, const Files& right)
 {
     std::map<Text, Difference> texts;
@@ -51,6 +51,9 @@ std::map<Text, Difference> Differences(const Files& left, const Files& right)
         each = each->second.first == each->second.second ? texts.erase(each) : std::next(each);
     return texts;
 }
+
+namespace
+{
 
 void ExpectEqual(const Files& expected, const Files& actual, const Text& when)
 {
