@@ -6,11 +6,13 @@
 #include "appearance/icon_source.h"
 #include "migrate/hot_folder_impose_path.h"
 #include "migrate/job_preset_impose_path.h"
-#include "run/run_log.h"
+#include "run/attempt.h"
 #include "store/hot_folder_list.h"
 
 #include <wx/arrstr.h>
 #include <wx/debug.h>
+
+#include <optional>
 
 namespace
 {
@@ -29,12 +31,33 @@ Switch ReadSwitch(const wxString& text)
     return text.CmpNoCase("U") == 0 ? Switch::Downgrade : Switch::Invalid;
 }
 
-void UpdateHotFolder(const FolderUpgradeApp& app, const wxString& folder, int position)
+void UpdateHotFolder(const FolderUpgradeApp& app, const wxString& path, int position)
 {
-    UpdateFolderIcon(app, folder);
-    RunLog(L"Updated icon for hf" + folder, position);
-    UpdateHotFolderImposePath(app, folder);
-    RunLog(L"updated Impose path for hf" + folder, position);
+    std::optional<HotFolder> folder;
+    Attempt(L"Icon", path,
+            [&]()
+            {
+                folder.emplace(path);
+                UpdateFolderIcon(app, *folder);
+            });
+    RunLog(L"Updated icon for hf" + path, position);
+    if (folder)
+        Attempt(L"HF cfg file", FolderCfgPath(path),
+                [&]() { UpdateHotFolderImposePath(app, *folder); });
+    RunLog(L"updated Impose path for hf" + path, position);
+}
+
+wxArrayString ListHotFolders()
+{
+    wxArrayString folders;
+    Attempt(L"HotFolderList.cfg", GetHotFolderListPath(),
+            [&]()
+            {
+                wxArrayString read;
+                ReadHotFolderList(read);
+                folders = read;
+            });
+    return folders;
 }
 
 } // namespace
@@ -67,8 +90,7 @@ bool FolderUpgradeApp::OnInit()
         return false;
     }
 
-    wxArrayString folders;
-    ReadHotFolderList(folders);
+    const wxArrayString folders = ListHotFolders();
     if (folders.empty())
         RunLog(L"No Hotfolder listed");
 

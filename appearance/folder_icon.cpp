@@ -1,18 +1,13 @@
 #include "appearance/folder_icon.h"
 
-#include "appearance/attribute_change.h"
-#include "appearance/desktop_ini.h"
-#include "appearance/folder_icon_state.h"
-#include "appearance/icon_source.h"
-#include "appearance/shell_version.h"
+#include "appearance/icon_copy.h"
 #include "platform/file_copy.h"
+#include "platform/library_log.h"
 #include "platform/system.h"
 #include "run/run_log.h"
-#include "store/hot_folder.h"
 
 #include <wx/filename.h>
 #include <wx/intl.h>
-#include <wx/log.h>
 
 #include <cstdint>
 
@@ -40,63 +35,51 @@ void TellShell(const wxString& iniPath)
     SHChangeNotify(SHCNE_ASSOCCHANGED, SHCNF_IDLIST | SHCNF_FLUSH, nullptr, nullptr);
 }
 
-void WriteDesktopIni(const PinnedDirectory& directory, const wxString& hotFolder,
-                     const wxString& iconName)
-{
-    if (wxFileExists(directory.Reach(DesktopIniName)))
-        RefreshDesktopIni(directory, hotFolder, iconName);
-    else
-        CreateDesktopIni(directory, iconName);
-}
-
-bool Apply(const PinnedDirectory& directory, const wxString& hotFolder, const wxString& iconName)
-{
-    const wxString iniPath = IniPath(hotFolder);
-    const bool isLinked = IsLink(directory.Reach(DesktopIniName));
-    if (isLinked)
-        RunLog(L"Desktop.ini left as it is (reached over a link): " + iniPath);
-    if (GetPackedShellVersion() >= CustomFolderVersion)
-    {
-        if (!isLinked)
-            WriteDesktopIni(directory, hotFolder, iconName);
-        ChangeAttributes(directory.Reach(L""), ReadOnlyAndSystem, 0);
-        TellShell(iniPath);
-        ChangeAttributes(directory.Reach(L""), 0, FILE_ATTRIBUTE_READONLY);
-    }
-    return !isLinked && ChangeAttributes(directory.Reach(DesktopIniName), ReadOnlyAndSystem, 0);
-}
-
-bool IsFileItself(const wxString& path)
-{
-    return wxFileExists(path) && !IsLink(path);
-}
-
 } // namespace
 
-bool ApplyFolderIcon(const wxString& hotFolder, const wxString& iconName)
+bool ApplyFolderIcon(const HotFolder& folder, const wxString& iconName)
 {
-    return Apply(PinnedDirectory(hotFolder, Links::Follow), hotFolder, iconName);
+    using Kind = DesktopIniChange::Kind;
+    const wxString iniPath = IniPath(folder.path);
+    const wxString reachedIni = folder.directory.Reach(DesktopIniName);
+    const wxString reachedFolder = folder.directory.Reach(L"");
+    const DesktopIniChange change = DecideDesktopIni(folder, iconName);
+    if (change.kind == Kind::Stays)
+        RunLog(
+            wxString::Format(L"Desktop.ini left as it is (%s): %s", change.reasonToStay, iniPath));
+    else if (change.kind == Kind::Create)
+        CreateDesktopIni(folder, change.keys);
+    else if (change.kind == Kind::Refresh)
+        RefreshDesktopIni(folder, change.keys);
+    if (change.isCustomised)
+    {
+        ChangeAttributes(reachedFolder, ReadOnlyAndSystem, 0);
+        TellShell(iniPath);
+        ChangeAttributes(reachedFolder, 0, FILE_ATTRIBUTE_READONLY);
+    }
+    return change.kind != Kind::Stays && ChangeAttributes(reachedIni, ReadOnlyAndSystem, 0);
 }
 
-void UpdateFolderIcon(const FolderUpgradeApp& app, const wxString& hotFolder)
+void UpdateFolderIcon(const FolderUpgradeApp& app, HotFolder& folder)
 {
-    const PinnedHotFolder folder(hotFolder);
-    wxString iconName;
-    if (!GetFolderIconName(folder, hotFolder, iconName))
+    const IconCopy copy = DecideIconCopy(folder, app.m_isUpgrade, app.m_bundleIconsDir);
+    if (folder.cfg.state == XmlFile::State::NotReadable)
+        ReportError(folder.cfg.WhyNotReadable(FolderCfgPath(folder.path)));
+    if (copy.name.empty())
     {
-        RunLog(L"Unable to get Icon filename " + iconName);
+        RunLog(L"Unable to get Icon filename " + copy.name);
         return;
     }
-    const wxString source = SourceIconPath(iconName, app.m_isUpgrade, app.m_bundleIconsDir);
-    const wxString destination = folder.privateDir.Reach(iconName);
-    if (!wxFileExists(source) || !IsFileItself(destination))
+    if (copy.outcome != IconCopy::Outcome::Replaces)
     {
-        RunLog(L"Icon path  not exist: " + source);
+        RunLog(L"Icon path  not exist: " + copy.source);
         return;
     }
-    const wxString shownDestination = PrivateDirPath(hotFolder) + iconName;
-    if (!CopyOver(source, destination))
-        wxLogSysError(_("Failed to copy the file '%s' to '%s'"), source, shownDestination);
-    Apply(folder.directory, hotFolder, iconName);
-    RunLog(L"Icon  copied from : " + source + L" To " + shownDestination + L" ");
+    const wxString destination = PrivateDirPath(folder.path) + copy.name;
+    if (const auto failure = CopyOver(copy.source, folder.privateDir, copy.name))
+        ReportError(
+            wxString::Format(_("Failed to copy the file '%s' to '%s'"), copy.source, destination) +
+            failure->Reason());
+    ApplyFolderIcon(folder, copy.name);
+    RunLog(L"Icon  copied from : " + copy.source + L" To " + destination + L" ");
 }

@@ -1,6 +1,7 @@
 // A hot folder's icon in Explorer.
 #pragma once
 
+#include "appearance/desktop_ini.h"
 #include "run/folder_upgrade_app.h"
 
 #include <wx/string.h>
@@ -8,11 +9,12 @@
 /// Copies the icon for the folder's state over the icon of the same name in its private directory,
 /// and refreshes Desktop.ini, attributes and Explorer. An upgrade takes the icon from the
 /// executable's directory, a downgrade from the bundle icons directory in it. If either icon is
-/// missing, nothing changes. Reports to the run log; the library reports a failed copy.
-void UpdateFolderIcon(const FolderUpgradeApp& app, const wxString& hotFolder);
+/// missing, nothing changes. Reports to the run log; the library reports a Folder.cfg that cannot
+/// be read and a failed copy.
+void UpdateFolderIcon(const FolderUpgradeApp& app, HotFolder& folder);
 
 /// Writes or refreshes the folder's Desktop.ini, makes the folder a system folder that is not
 /// read-only, notifies the shell, and makes Desktop.ini read-only and system. Before shell version
 /// 4.72 it does only the last of these. Returns the success flag of the last attribute write;
 /// nothing else is reported.
-bool ApplyFolderIcon(const wxString& hotFolder, const wxString& iconName);
+bool ApplyFolderIcon(const HotFolder& folder, const wxString& iconName);

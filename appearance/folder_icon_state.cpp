@@ -1,9 +1,7 @@
 #include "appearance/folder_icon_state.h"
 
 #include "store/folder_cfg_reader.h"
-#include "store/xml_file.h"
 
-#include <wx/dir.h>
 #include <wx/filename.h>
 
 namespace
@@ -12,26 +10,22 @@ namespace
 const wchar_t* const ErrorFileName = L"Error.er";
 const wchar_t* const IconExtension = L".ico";
 
-bool IsEnabled(const PinnedHotFolder& folder, const wxString& hotFolder)
+bool IsEnabled(HotFolder& folder)
 {
     HotFolderSettings settings;
-    XmlFile cfg;
     const wxCriticalSectionLocker lock(FolderCfgLock);
-    cfg.Load(folder.privateDir.Reach(FolderCfgName), Links::Refuse, FolderCfgPath(hotFolder));
-    ReadHotFolderSettings(cfg.GetRoot(), settings);
+    LoadHotFolderSettings(folder, settings);
     return settings.Enable;
 }
 
-// The library reports an error for a directory that it cannot open, so that is checked before
-// listing. The check for the file comes first because it is quicker.
-bool HasError(const PinnedHotFolder& folder)
+// A link counts by its name: its target may be on a drive that does not answer.
+bool HasError(const HotFolder& folder)
 {
-    const wxString path = folder.privateDir.Reach(L"");
-    if (!wxFileName::Exists(folder.privateDir.Reach(ErrorFileName), wxFILE_EXISTS_ANY) ||
-        !wxFileName::IsDirReadable(path))
-        return false;
-    const wxDir directory(path);
-    return directory.IsOpened() && directory.HasFiles(ErrorFileName);
+    const wxString path = folder.privateDir.Reach(ErrorFileName);
+    return wxFileName::IsDirReadable(folder.privateDir.Reach(L"")) &&
+           (IsLink(path) ||
+            (wxFileName::Exists(path, wxFILE_EXISTS_ANY | wxFILE_EXISTS_NO_FOLLOW) &&
+             !wxDirExists(path)));
 }
 
 const wchar_t* IconBaseName(FolderIconState state)
@@ -52,14 +46,9 @@ const wchar_t* IconBaseName(FolderIconState state)
 
 } // namespace
 
-bool GetFolderIconName(const wxString& hotFolder, wxString& iconName)
+bool GetFolderIconName(HotFolder& folder, wxString& iconName)
 {
-    return GetFolderIconName(PinnedHotFolder(hotFolder), hotFolder, iconName);
-}
-
-bool GetFolderIconName(const PinnedHotFolder& folder, const wxString& hotFolder, wxString& iconName)
-{
-    const bool isEnabled = IsEnabled(folder, hotFolder);
+    const bool isEnabled = IsEnabled(folder);
     FolderIconState state = isEnabled ? FolderIconState::Active : FolderIconState::Inactive;
     if (HasError(folder))
         state = isEnabled ? FolderIconState::ErrorActive : FolderIconState::ErrorInactive;

@@ -17,8 +17,4 @@ enum class FolderIconState
 /// depends on whether its Folder.cfg enables it and whether its private directory holds a file
 /// "Error.er". A folder whose Folder.cfg cannot be read is not enabled; one whose private directory
 /// is missing or cannot be listed is not in error. Changes nothing; returns true.
-bool GetFolderIconName(const wxString& hotFolder, wxString& iconName);
-
-/// The same for a pinned hot folder; its path is for messages.
-bool GetFolderIconName(const PinnedHotFolder& folder, const wxString& hotFolder,
-                       wxString& iconName);
+bool GetFolderIconName(HotFolder& folder, wxString& iconName);

@@ -6,12 +6,10 @@
 
 wxString SourceIconPath(const wxString& iconName, bool isUpgrade, const wxString& bundleIconsDir)
 {
-    static const wxString executable = wxStandardPaths::Get().GetExecutablePath();
-    const wxString separator = wxFileName::GetPathSeparator();
-    wxString path = executable + L"/../";
+    wxFileName source(wxStandardPaths::Get().GetExecutablePath());
     if (!isUpgrade)
-        path += separator + bundleIconsDir + separator;
-    wxFileName source(path + iconName);
+        source.AppendDir(bundleIconsDir);
+    source.SetFullName(iconName);
     source.Normalize(NormalizeAll, wxString(), wxPATH_NATIVE);
     return source.GetFullPath();
 }

@@ -1,224 +1,196 @@
 #include "check/folder_cfg_loss.h"
 
+#include "check/report.h"
 #include "store/folder_cfg_format.h"
 #include "store/xml_document.h"
 
 #include <wx/hashmap.h>
 
 #include <algorithm>
-#include <functional>
-#include <unordered_map>
+#include <initializer_list>
+#include <unordered_set>
 #include <vector>
 
 namespace
 {
 
-size_t Mix(size_t left, size_t right)
+bool IsOneOf(std::initializer_list<const wchar_t*> texts, const wxString& text)
 {
-    constexpr size_t Odd = 0x9E3779B9; // spreads the bits
-    return (left ^ (right + Odd + (left << 6) + (left >> 2))) * Odd;
+    return std::any_of(texts.begin(), texts.end(),
+                       [&](const wchar_t* each) { return text == each; });
 }
 
-size_t Hash(const wxString& text)
+// The writer adds these attributes where they are missing.
+bool IsAdded(const wxString& name)
 {
-    return wxStringHash()(text);
+    return IsOneOf({FolderCfg::Path, FolderCfg::ShortName, FolderCfg::DisplayName, FolderCfg::Key,
+                    FolderCfg::Value, FolderCfg::KeyDisplayValue, FolderCfg::LocDisplayValue},
+                   name);
 }
 
 bool IsSection(const wxString& name)
 {
-    const auto sections = {FolderCfg::InputFormatsSection,  FolderCfg::PathsSection,
-                           FolderCfg::JobSettingSection,    FolderCfg::ImposeSettingSection,
-                           FolderCfg::FilterSettingSection, FolderCfg::PreflightSection};
-    return std::any_of(sections.begin(), sections.end(),
-                       [&](const wchar_t* section) { return name == section; });
+    return IsOneOf({FolderCfg::InputFormatsSection, FolderCfg::PathsSection,
+                    FolderCfg::JobSettingSection, FolderCfg::ImposeSettingSection,
+                    FolderCfg::FilterSettingSection, FolderCfg::PreflightSection},
+                   name);
 }
 
-wxString WithoutWhiteSpace(const wxString& text)
+// The path in the template's entry is meant to change.
+bool IsTemplatePath(const wxXmlNode& element, const wxXmlAttribute& attribute)
 {
-    wxString result;
-    for (const wxUniChar character : text)
-    {
-        if (!wxIsspace(character))
-            result += character;
-    }
-    return result;
+    const wxXmlAttribute* first = element.GetAttributes();
+    return first->GetNext() == &attribute && first->GetValue() == FolderCfg::ImposeTemplateKey &&
+           element.GetParent()->GetName() == FolderCfg::ImposeSettingSection;
 }
 
-// A node below the root, with a hash of everything that identifies it: its name and attributes or
-// its text, and the names of the nodes above it up to its section. A section counts as directly
-// below the root wherever it is, as it does for the readers.
-struct Thing
+// The same whatever the order of the attributes.
+wxString DescribeElement(const wxXmlNode& element, bool isInFilter)
 {
-    const wxXmlNode* node;
-    size_t fingerprint;
-};
-
-bool IsElement(const wxXmlNode& node)
-{
-    return node.GetType() == wxXML_ELEMENT_NODE;
-}
-
-// The same in any order. Outside the filter setting the writer adds empty attributes.
-size_t AttributesFingerprint(const wxXmlNode& element, bool withEmpty)
-{
-    size_t sum = 0;
+    std::vector<wxString> attributes;
     for (const wxXmlAttribute* each = element.GetAttributes(); each; each = each->GetNext())
     {
-        if (withEmpty || !each->GetValue().empty())
-            sum += Mix(Hash(each->GetName()), Hash(each->GetValue()));
+        const bool isKept =
+            !isInFilter && ((each->GetValue().empty() && IsAdded(each->GetName())) ||
+                            IsTemplatePath(element, *each));
+        if (!isKept)
+            attributes.push_back(" " + each->GetName() + "=\"" + each->GetValue() + "\"");
     }
-    return sum;
+    std::sort(attributes.begin(), attributes.end());
+    wxString description = "<" + element.GetName();
+    for (const wxString& attribute : attributes)
+        description += attribute;
+    return description + ">";
 }
 
-// Comments and white space are left out.
-std::vector<Thing> Collect(const wxXmlNode& root)
+// What is below the root, but for comments and white space. The readers find a section wherever it
+// is, and the root may come out under another name.
+std::vector<wxString> DescribeContent(const wxXmlNode& root)
 {
     struct Open
     {
         const wxXmlNode* next;
-        size_t place;
         bool isInFilter;
     };
-    std::vector<Thing> things;
-    std::vector<Open> open = {{root.GetChildren(), 0, false}};
+    std::vector<wxString> content;
+    std::vector<Open> open = {{root.GetChildren(), false}};
     while (!open.empty())
     {
-        const wxXmlNode* node = open.back().next;
+        const auto [node, isInFilter] = open.back();
         if (!node)
         {
             open.pop_back();
             continue;
         }
         open.back().next = node->GetNext();
-        const auto [next, place, isInFilter] = open.back();
-        if (IsElement(*node))
+        wxString what;
+        if (node->GetType() == wxXML_ELEMENT_NODE)
         {
-            const bool isSection = !isInFilter && IsSection(node->GetName());
-            const size_t own = Mix(isSection ? 0 : place, Hash(node->GetName()));
-            things.push_back({node, Mix(own, AttributesFingerprint(*node, isInFilter))});
-            open.push_back(
-                {node->GetChildren(), own,
-                 isInFilter || (isSection && node->GetName() == FolderCfg::FilterSettingSection)});
-            continue;
+            what = DescribeElement(*node, isInFilter);
+            open.push_back({node->GetChildren(),
+                            isInFilter || node->GetName() == FolderCfg::FilterSettingSection});
         }
-        const wxString text = WithoutWhiteSpace(node->GetContent());
-        if (node->GetType() == wxXML_PI_NODE ||
-            (node->GetType() != wxXML_COMMENT_NODE && !text.empty()))
-            things.push_back(
-                {node, Mix(Mix(place, static_cast<size_t>(node->GetType())), Hash(text))});
+        else if (node->GetType() == wxXML_PI_NODE)
+            what = "the instruction <?" + node->GetName() + "?>";
+        else if (node->GetType() != wxXML_COMMENT_NODE)
+            what = wxString(node->GetContent()).Trim().Trim(false);
+        if (what.empty())
+            continue;
+        if (node->GetType() == wxXML_TEXT_NODE || node->GetType() == wxXML_CDATA_SECTION_NODE)
+            what = "the text \"" + what + "\"";
+        const wxXmlNode* parent = node->GetParent();
+        content.push_back(parent == &root || IsSection(node->GetName())
+                              ? what
+                              : what + " in <" + parent->GetName() + ">");
     }
-    return things;
+    return content;
 }
 
-bool HasAll(const wxXmlNode& element, const wxXmlNode& wanted)
+void FindLostContent(const wxXmlNode& before, const wxXmlNode& after, std::vector<wxString>& losses)
 {
-    for (const wxXmlAttribute* each = wanted.GetAttributes(); each; each = each->GetNext())
+    const std::vector<wxString> kept = DescribeContent(after);
+    std::unordered_multiset<wxString, wxStringHash> pool(kept.begin(), kept.end());
+    for (const wxString& each : DescribeContent(before))
     {
-        if (!element.HasAttribute(each->GetName()))
-            return false;
-    }
-    return true;
-}
-
-// As much of a text as is readable in one line.
-wxString Shown(const wxString& text)
-{
-    constexpr size_t Longest = 200;
-    return text.length() <= Longest ? text : text.Left(Longest) + "...";
-}
-
-wxString Describe(const wxXmlNode& node)
-{
-    if (node.GetType() == wxXML_PI_NODE)
-        return "the instruction <?" + node.GetName() + "?>";
-    const wxString place = " in <" + node.GetParent()->GetName() + ">";
-    if (!IsElement(node))
-        return "the text \"" + Shown(wxString(node.GetContent()).Trim().Trim(false)) + "\"" + place;
-    wxString tag = "<" + node.GetName();
-    for (const wxXmlAttribute* each = node.GetAttributes(); each; each = each->GetNext())
-        tag += " " + each->GetName() + "=\"" + each->GetValue() + "\"";
-    return Shown(tag) + ">" + place;
-}
-
-void FindLostThings(const wxXmlNode& before, const wxXmlNode& after, wxArrayString& losses)
-{
-    // Each node of the new document can match one of the old.
-    std::unordered_multimap<size_t, const wxXmlNode*> pool;
-    for (const Thing& thing : Collect(after))
-        pool.emplace(thing.fingerprint, thing.node);
-    for (const Thing& thing : Collect(before))
-    {
-        const auto found = pool.find(thing.fingerprint);
-        if (found != pool.end() && HasAll(*found->second, *thing.node))
+        const auto found = pool.find(each);
+        if (found != pool.end())
             pool.erase(found);
         else
-            losses.Add("loses " + Describe(*thing.node));
+            losses.push_back("loses " + Shown(each));
     }
 }
 
-void FindLostAttributes(const wxXmlNode& root, wxArrayString& losses)
+void FindLostAttributes(const wxXmlNode& root, std::vector<wxString>& losses)
 {
+    const AttributeGap gap = FindAttributeGap(root);
+    if (!gap.reset.empty())
+        losses.push_back("lacks \"" + gap.missing + "\", so the rewrite resets: " + gap.reset +
+                         (gap.isDisabled ? " (the folder ends up disabled)" : ""));
     AttributeMap attributes;
     CollectAttributes(root, attributes);
     HotFolderSettings settings;
-    const RootAttribute* gap = ReadRootAttributes(attributes, settings);
-    if (gap)
-        losses.Add(wxString("lacks the attribute \"") + gap->name +
-                   "\"; the rewrite sets it and all that follow it to their defaults" +
-                   (FindGapBeforeEnable(root) ? " (the folder comes out disabled)" : ""));
-    for (const RootAttribute& each : RootAttributes())
+    const size_t read = ReadRootAttributes(attributes, settings);
+    for (size_t i = 0; i < RootAttributes().size(); ++i)
     {
+        const RootAttribute& each = RootAttributes()[i];
         const auto found = attributes.find(each.name);
         if (found == attributes.end())
             continue;
-        const bool isRead = !gap || each.chainPlace < gap->chainPlace;
         const wxString now = each.Format(settings);
-        if (isRead && each.form != AttributeForm::Text &&
+        if (i < read && each.form != AttributeForm::Text &&
             wxString(found->second).Trim().Trim(false) != now)
-            losses.Add(wxString(each.name) + "=\"" + Shown(found->second) + "\" comes out as \"" +
-                       now + "\"");
+            losses.push_back(wxString(each.name) + "=\"" + Shown(found->second) +
+                             "\" comes out as \"" + now + "\"");
         attributes.erase(found);
     }
     for (const auto& [name, value] : attributes)
-        losses.Add("loses the attribute " + name + "=\"" + Shown(value) + "\"");
+        losses.push_back("loses the attribute " + name + "=\"" + Shown(value) + "\"");
 }
 
 } // namespace
 
-wxArrayString FindFolderCfgLosses(const wxXmlDocument& document, const std::string& rewritten)
+std::vector<wxString> FindFolderCfgLosses(const wxXmlDocument& document,
+                                          const std::string& rewritten)
 {
-    wxArrayString losses;
+    std::vector<wxString> losses;
     if (!document.GetDoctype().GetRootName().empty())
-        losses.Add("loses its document type, and with it the entities in its texts");
+        losses.push_back("loses its document type, and with it the entities in its texts");
     for (const wxXmlNode* node = document.GetDocumentNode()->GetChildren(); node;
          node = node->GetNext())
     {
         if (node->GetType() == wxXML_PI_NODE)
-            losses.Add("loses " + Describe(*node));
+            losses.push_back("loses the instruction <?" + node->GetName() + "?>");
     }
     const wxXmlNode& root = *document.GetRoot();
     if (root.GetName() != FolderCfg::Root)
-        losses.Add("its root <" + root.GetName() + "> comes out as <" + FolderCfg::Root + ">");
+        losses.push_back("its root <" + root.GetName() + "> comes out as <" + FolderCfg::Root +
+                         ">");
     FindLostAttributes(root, losses);
     wxXmlDocument after;
-    if (LoadXml(rewritten, after, wxXMLDOC_KEEP_WHITESPACE_NODES) == XmlLoad::Loaded)
-        FindLostThings(root, *after.GetRoot(), losses);
+    if (LoadXml(rewritten, FolderCfgLimits, after).state == XmlLoad::State::Loaded)
+        FindLostContent(root, *after.GetRoot(), losses);
     return losses;
 }
 
-const RootAttribute* FindGapBeforeEnable(const wxXmlNode& root)
+AttributeGap FindAttributeGap(const wxXmlNode& root)
 {
     AttributeMap attributes;
     CollectAttributes(root, attributes);
     HotFolderSettings settings;
-    const RootAttribute* gap = ReadRootAttributes(attributes, settings);
-    if (!gap || gap->chainPlace > EnablePlace)
-        return nullptr;
-    for (const RootAttribute& each : RootAttributes())
+    const size_t read = ReadRootAttributes(attributes, settings);
+    AttributeGap gap;
+    for (size_t i = read; i < RootAttributes().size(); ++i)
     {
+        const RootAttribute& each = RootAttributes()[i];
         const auto found = attributes.find(each.name);
-        if (each.chainPlace == EnablePlace && found != attributes.end())
-            each.Read(found->second, settings);
+        HotFolderSettings stored;
+        if (found != attributes.end())
+            each.Read(found->second, stored);
+        if (each.Format(stored) == each.Format(settings))
+            continue;
+        gap.missing = RootAttributes()[read].name;
+        gap.reset += (gap.reset.empty() ? wxString() : wxString(", ")) + each.name;
+        gap.isDisabled = gap.isDisabled || stored.Enable;
     }
-    return settings.Enable ? gap : nullptr;
+    return gap;
 }

@@ -3,16 +3,23 @@
 
 #include "store/root_attributes.h"
 
-#include <wx/arrstr.h>
 #include <wx/xml/xml.h>
 
 #include <string>
+#include <vector>
 
 /// One phrase for each part of the document that the rewritten bytes lose or change. Both have the
 /// same template path. Comments, white space and order are ignored. The document has to be loaded
 /// with wxXMLDOC_KEEP_WHITESPACE_NODES.
-wxArrayString FindFolderCfgLosses(const wxXmlDocument& document, const std::string& rewritten);
+std::vector<wxString> FindFolderCfgLosses(const wxXmlDocument& document,
+                                          const std::string& rewritten);
 
-/// The missing attribute that ends the chain of root attributes before Enable, although Enable is
-/// set; null if there is none.
-const RootAttribute* FindGapBeforeEnable(const wxXmlNode& root);
+/// The missing attribute that ends the chain of root attributes, if values are lost by it.
+struct AttributeGap
+{
+    wxString missing;
+    wxString reset;          // the names of those values
+    bool isDisabled = false; // whether the folder was enabled, and comes out disabled
+};
+
+AttributeGap FindAttributeGap(const wxXmlNode& root);

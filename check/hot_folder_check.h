@@ -1,10 +1,9 @@
 // What a run would do to one hot folder.
 #pragma once
 
-#include "check/report.h"
-#include "check/template_folders.h"
-
-#include <wx/string.h>
+#include "check/template_check.h"
+#include "store/hot_folder.h"
 
 /// Changes nothing.
-void CheckHotFolder(const wxString& hotFolder, const TemplateFolders& folders, Report& report);
+void CheckHotFolder(HotFolder& folder, TemplateFolders& folders, TemplateCheck& templates,
+                    Report& report);

@@ -1,83 +1,59 @@
-// FolderUpgradeCheck: what a run of FolderUpgrade would change, and what would prevent a change.
-// Only reads.
-#include "check/hot_folder_check.h"
-#include "check/library_errors.h"
-#include "check/preset_check.h"
-#include "check/report.h"
-#include "check/template_folders.h"
-#include "check/workstation_check.h"
-#include "platform/process_rights.h"
+// FolderUpgradeCheck: writes the report of a check.
+#include "check/check.h"
 #include "platform/standard_output.h"
 
 #include <wx/app.h>
-#include <wx/datetime.h>
 #include <wx/debug.h>
-
-#include <map>
 
 namespace
 {
 
-// The exit statuses. The highest one that applies is returned.
-constexpr int NothingToDo = 0;
-constexpr int HasChanges = 1;
-constexpr int HasProblems = 2;
-constexpr int WrongCall = 3;
+const char* const Usage =
+    "Usage: FolderUpgradeCheck I|U [--from FOLDER] [--to FOLDER] [FILE]\n"
+    "Reports what FolderUpgrade would change with the same switch, and what would prevent a change "
+    "or leave a job without its template, to the standard output or to FILE.\n"
+    "--from and --to name template folders in place of those that the registry names, to rehearse "
+    "an installation.\n"
+    "Exit status: 0 nothing to do, and every template is there; 1 changes; 2 problems; 3 wrong "
+    "arguments.\n";
 
-void WriteHead(const TemplateFolders& folders, Report& report)
+struct Options
 {
-    report.Head(wxString("FolderUpgradeCheck ") + PROGRAM_VERSION + ", " +
-                (folders.IsUpgrade() ? "upgrade" : "downgrade") + ", " +
-                wxDateTime::Now().Format("%Y-%m-%d %H:%M") + ", " + AccountName() + ", " +
-                (IsElevated() ? "elevated" : "not elevated"));
-    const auto orUnknown = [](const wxString& folder)
+    bool isUpgrade = false;
+    wxString from;
+    wxString to;
+    wxString file;
+};
+
+// Returns false for wrong arguments.
+bool ReadOptions(const wxArrayString& arguments, Options& options)
+{
+    options.isUpgrade = !arguments.empty() && arguments[0].CmpNoCase("I") == 0;
+    if (!options.isUpgrade && (arguments.empty() || arguments[0].CmpNoCase("U") != 0))
+        return false;
+    for (size_t i = 1; i < arguments.size(); ++i)
     {
-        return folder.empty() ? wxString("(unknown)") : folder;
-    };
-    report.Head("From " + orUnknown(folders.From()) + " to " + orUnknown(folders.To()));
+        const bool isFrom = arguments[i] == "--from";
+        const bool isFolder = isFrom || arguments[i] == "--to";
+        wxString& value = isFrom ? options.from : isFolder ? options.to : options.file;
+        if (!value.empty() || (isFolder && ++i == arguments.size()) || arguments[i].empty())
+            return false;
+        value = arguments[i];
+    }
+    return true;
 }
 
-// A directory that is listed under two names is checked once.
-void CheckHotFolders(const HotFolderList& list, const TemplateFolders& folders, Report& report)
+int Check(const Options& options)
 {
-    std::map<std::pair<std::uint64_t, std::uint64_t>, size_t> known; // identity -> position
-    for (size_t i = 0; i < list.folders.size(); ++i)
-    {
-        const wxString& hotFolder = list.folders[i];
-        report.Begin(hotFolder);
-        const auto identity = PinnedDirectory(hotFolder, Links::Follow).Identity();
-        const auto [first, isNew] = known.emplace(identity, i);
-        if (isNew || identity == std::pair<std::uint64_t, std::uint64_t>())
-            CheckHotFolder(hotFolder, folders, report);
-        else
-            report.Note("the same directory as " + list.folders[first->second]);
-    }
-}
-
-int Check(bool isUpgrade, const wxString& fileName)
-{
-    KeepLibraryErrors();
-    const TemplateFolders folders(isUpgrade);
-    Report report(fileName);
-    TakeLibraryErrors(); // if a file cannot be written, that is reported at the end
-    WriteHead(folders, report);
-    report.Begin("Workstation");
-    folders.ReportPath(report);
-    const HotFolderList list = LoadHotFolderList();
-    CheckHotFolderList(list, report);
-    CheckRunLog(report);
-    CheckHotFolders(list, folders, report);
-    report.Begin("Job presets");
-    CheckPresets(folders, report);
-    if (!report.End())
-    {
-        WriteStandardError("FolderUpgradeCheck: the report cannot be written to " +
-                           (fileName.empty() ? wxString("the standard output") : fileName) + "\n");
-        return HasProblems;
-    }
-    if (report.GetProblems() > 0)
-        return HasProblems;
-    return report.GetChanges() > 0 ? HasChanges : NothingToDo;
+    Report report(options.file);
+    TemplateFolders folders(options.isUpgrade, options.from, options.to);
+    CheckRun(folders, report);
+    if (report.End())
+        return report.ExitStatus();
+    WriteStandardError("FolderUpgradeCheck: the report cannot be written to " +
+                       (options.file.empty() ? wxString("the standard output") : options.file) +
+                       "\n");
+    return HasProblems;
 }
 
 } // namespace
@@ -94,16 +70,19 @@ class FolderUpgradeCheckApp : public wxAppConsole
     int OnRun() override
     {
         wxDisableAsserts();
-        const bool isUpgrade = argc > 1 && argv[1].CmpNoCase("I") == 0;
-        const bool isDowngrade = argc > 1 && argv[1].CmpNoCase("U") == 0;
-        if ((isUpgrade || isDowngrade) && argc <= 3)
-            return Check(isUpgrade, argc == 3 ? argv[2] : wxString());
-        WriteStandardError(
-            "Usage: FolderUpgradeCheck I|U [FILE]\n"
-            "Reports what FolderUpgrade would change with the same switch, and what "
-            "would prevent a change, to the standard output or to FILE.\n"
-            "Exit status: 0 nothing to do, 1 changes, 2 problems, 3 wrong arguments.\n");
-        return WrongCall;
+        wxArrayString arguments = argv.GetArguments();
+        arguments.RemoveAt(0);
+        const wxString first = arguments.empty() ? wxString() : arguments[0];
+        Options options;
+        if (first == "--help" || first == "-h" || first == "/?")
+            return WriteStandardOutput(Usage) ? NothingToDo : HasProblems;
+        if (first == "--version")
+            return WriteStandardOutput("FolderUpgradeCheck " PROGRAM_VERSION "\n") ? NothingToDo
+                                                                                   : HasProblems;
+        if (ReadOptions(arguments, options))
+            return Check(options);
+        WriteStandardError(Usage);
+        return WrongArguments;
     }
 };
 

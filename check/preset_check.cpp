@@ -1,16 +1,15 @@
 #include "check/preset_check.h"
 
-#include "check/library_errors.h"
 #include "check/reach.h"
+#include "check/template_folders_check.h"
 #include "migrate/job_preset_files.h"
-#include "migrate/preset_text.h"
-#include "platform/unicode_text.h"
 #include "store/xml_encoding.h"
 
 #include <wx/convauto.h>
 #include <wx/filename.h>
 
 #include <algorithm>
+#include <map>
 
 namespace
 {
@@ -43,49 +42,128 @@ bool IsTakenAsLatin1(const std::string& bytes)
            wxString::FromUTF8(bytes.data(), bytes.size()).empty();
 }
 
-void CheckContent(const wxString& name, const std::string& before, const RewrittenPreset& rewritten,
-                  Report& report)
+void CheckContent(const wxString& name, const RewrittenPreset& rewritten, Report& report)
 {
     const wxString encoding = DeclaredEncoding(rewritten.bytes);
     if (!encoding.empty() && encoding.CmpNoCase("UTF-8") != 0)
-        report.Problem(name + ": declares the encoding " + encoding + ", but comes out as UTF-8");
-    else if (IsTakenAsLatin1(before))
-        report.Problem(name + ": is not UTF-8, so the whole file is read as Latin-1");
-    if (rewritten.bytes == before)
-        return;
-    if (rewritten.movedPaths == 0)
-        report.Change(name + ": " + OtherChange(before, rewritten.bytes));
-    else
-        report.Change(wxString::Format("%s: %zu path%s", name, rewritten.movedPaths,
-                                       rewritten.movedPaths == 1 ? "" : "s"));
+        report.Problem(name + "declares the encoding " + encoding + ", but comes out as UTF-8");
+    else if (IsTakenAsLatin1(rewritten.before))
+        report.Problem(name + "is not UTF-8, so the whole file is read as Latin-1; accented "
+                              "characters come out wrong");
+    if (rewritten.bytes != rewritten.before && rewritten.movedPaths == 0)
+        report.Change(name + OtherChange(rewritten.before, rewritten.bytes));
 }
 
-void CheckPreset(JobPresetFile& preset, const wxString& name, const TemplateFolders& folders,
-                 Report& report)
+// The character that an entity or a numeric reference stands for; 0 for any other text.
+unsigned long CharacterOf(const wxString& name)
 {
-    const RegularFile::Status status = preset.OpenForReading();
-    if (status == RegularFile::Status::Refused)
-        report.Problem(name + ": cannot be opened for reading (" + TakeLibraryErrors() + ")");
-    else if (status != RegularFile::Status::Open)
-        report.Problem(name + ": reached over a link, or not a file");
-    if (status != RegularFile::Status::Open)
-        return;
-    std::string before;
-    if (!preset.GetFile().Read(before))
+    const std::pair<const char*, char> entities[] = {
+        {"lt", '<'}, {"gt", '>'}, {"quot", '"'}, {"apos", '\''}, {"amp", '&'}};
+    for (const auto& [entity, character] : entities)
     {
-        report.Problem(name + ": left as it is (cannot be read)");
+        if (name == entity)
+            return static_cast<unsigned long>(character);
+    }
+    unsigned long code = 0;
+    const bool isHex = name.StartsWith("#x");
+    const bool isNumber =
+        name.StartsWith("#") && name.Mid(isHex ? 2 : 1).ToULong(&code, isHex ? 16 : 10);
+    return isNumber && code <= 0x10FFFF ? code : 0;
+}
+
+// The path as an XML parser reads it, for a look at the template.
+wxString Decoded(const wxString& path)
+{
+    constexpr size_t LongestName = 10;
+    wxString decoded;
+    for (size_t i = 0; i < path.length(); ++i)
+    {
+        const size_t end = path[i] == '&' ? path.find(';', i) : wxString::npos;
+        const unsigned long code = end != wxString::npos && end - i <= LongestName
+                                       ? CharacterOf(path.Mid(i + 1, end - i - 1))
+                                       : 0;
+        decoded += code != 0 ? wxUniChar(static_cast<int>(code)) : wxUniChar(path[i]);
+        i = code != 0 ? end : i;
+    }
+    return decoded;
+}
+
+// Why a path of a preset that is rewritten stays although it leads into the folder being left.
+wxString WhyItStays(const wxString& path, const wxString& decoded, const wxString& from)
+{
+    if (path != decoded)
+        return "stored as XML";
+    const wxString begin = decoded.Left(from.length());
+    return begin.CmpNoCase(from) == 0 ? "other letter case" : "other separators";
+}
+
+void CheckPaths(const wxString& name, const std::string& before, bool isRewritten,
+                TemplateFolders& folders, TemplateCheck& templates, Report& report)
+{
+    const wxString& from = folders.From().path;
+    const wxString& to = folders.To().path;
+    wxString text;
+    if (DecodePreset(before, text))
+        return;
+    std::map<std::pair<wxString, wxString>, size_t> paths; // stored and moved -> how often
+    Findings findings;
+    for (const PresetPath& path : FindPresetPaths(text, from, to))
+    {
+        if (path.isCutOff)
+            findings.notes.push_back("a template path has no end");
+        else
+            ++paths[{path.stored, isRewritten ? path.moved : path.stored}];
+    }
+    for (const auto& [path, count] : paths)
+    {
+        const auto& [stored, left] = path;
+        const wxString decoded = Decoded(left);
+        templates.Judge(decoded,
+                        isRewritten ? WhyItStays(left, decoded, from)
+                                    : "in a file that stays as it is",
+                        findings);
+        if (stored == left)
+            continue;
+        findings.changes.push_back(
+            Shown(stored) + " -> " + Shown(left) +
+            (count == 1 ? wxString() : wxString::Format(" (%zu times)", count)));
+        if (MovedPresetPath(left, from, to) != left)
+            report.ProblemOnce("one template folder is below the other: another run would move "
+                               "paths of presets once more");
+    }
+    report.Add(name, findings);
+}
+
+void CheckPreset(JobPresetFile& preset, const wxString& name, TemplateFolders& folders,
+                 TemplateCheck& templates, Report& report)
+{
+    const RegularFile& file = preset.GetFile();
+    const RegularFile::Status opened = preset.OpenForReading();
+    if (opened != RegularFile::Status::Open)
+    {
+        report.Problem(name + (opened == RegularFile::Status::Refused
+                                   ? "cannot be opened for reading (" +
+                                         file.GetFailure().Describe(preset.GetPath()) + ")"
+                                   : wxString("reached over a link, or not a file")));
         return;
     }
-    const RewrittenPreset rewritten = RewritePreset(before, folders.From(), folders.To());
+    const RegularFile::Status reopened = preset.GetFile().ReopenForUpdate();
+    const FailedCall reopening = file.GetFailure();
+    const RewrittenPreset rewritten = preset.Decide(folders.From().path, folders.To().path);
+    wxString text;
+    if (DecodePreset(rewritten.before, text) == nullptr && !FindPresetPaths(text, {}, {}).empty())
+        CheckFoldersForPresets(folders, report);
+    if (!folders.From().isKnown || !folders.To().isKnown)
+        return;
+    const bool isRewritten = !rewritten.reasonToStay && reopened == RegularFile::Status::Open;
     if (rewritten.reasonToStay)
-        report.Problem(name + ": left as it is (" + rewritten.reasonToStay + ")");
-    else if (preset.GetFile().ReopenForUpdate() != RegularFile::Status::Open)
-    {
-        preset.GetFile().ReportNotReopened(preset.GetPath()); // for the system's reason
-        report.Problem(name + ": cannot be opened for writing (" + TakeLibraryErrors() + ")");
-    }
+        report.Problem(name + "left as it is (" + rewritten.reasonToStay + ")");
+    else if (!isRewritten)
+        report.Problem(name + "cannot be opened for writing (" +
+                       reopening.Describe(preset.GetPath()) + ")");
     else
-        CheckContent(name, before, rewritten, report);
+        CheckContent(name, rewritten, report);
+    CheckPaths(name, rewritten.before, isRewritten, folders, templates, report);
 }
 
 // Why a presets.xml that may exist cannot be seen; empty if it does not exist.
@@ -101,45 +179,38 @@ wxString WhyMissing(const JobPresetFile& preset, const wxString& directory)
 }
 
 // False if there is no preset.
-bool CheckDirectory(const wxString& directory, const wxString& root, const TemplateFolders& folders,
-                    Report& report)
+bool CheckDirectory(const wxString& directory, const wxString& root, TemplateFolders& folders,
+                    TemplateCheck& templates, Report& report)
 {
     JobPresetFile preset(directory);
-    const wxString name = preset.GetPath().Mid(root.length());
+    const wxString name = preset.GetPath().Mid(root.length()) + ": ";
     if (preset.IsThere())
     {
-        folders.ReportForPresets(report);
-        if (folders.AreKnown())
-            CheckPreset(preset, name, folders, report);
-        TakeLibraryErrors();
+        CheckPreset(preset, name, folders, templates, report);
         return true;
     }
     const wxString obstacle = WhyMissing(preset, directory);
     if (!obstacle.empty())
-        report.Problem(name + ": " + obstacle);
+        report.Problem(name + obstacle);
     return !obstacle.empty();
 }
 
 } // namespace
 
-void CheckPresets(const TemplateFolders& folders, Report& report)
+void CheckPresets(TemplateFolders& folders, TemplateCheck& templates, Report& report)
 {
     const wxString root = JobPresetRoot();
-    wxArrayString directories;
-    const bool isThere = ListJobPresetDirs(root, directories);
-    const wxString errors = TakeLibraryErrors();
+    const JobPresetDirs directories = ListJobPresetDirs(root);
     const wxString obstacle = WhyOutOfReach(root);
     if (!obstacle.empty())
         report.Problem(root + " " + obstacle);
-    else if (!errors.empty())
-        report.Problem(root + ": " + errors);
-    else if (isThere && !wxFileName::IsDirReadable(root))
+    else if (directories.failure)
         report.Problem(root + " cannot be listed");
-    bool hasPresets = false;
-    for (const wxString& directory : directories)
-        hasPresets = CheckDirectory(directory, root, folders, report) || hasPresets;
-    if (!hasPresets && errors.empty() && obstacle.empty() &&
-        (!isThere || wxFileName::IsDirReadable(root)))
-        report.Note(isThere ? "there are no presets in " + root
-                            : "there are no presets, because there is no folder " + root);
+    bool hasPresets = !obstacle.empty() || directories.failure;
+    for (const wxString& directory : directories.paths)
+        hasPresets = CheckDirectory(directory, root, folders, templates, report) || hasPresets;
+    if (!hasPresets)
+        report.Note(directories.isThere
+                        ? "there are no presets in " + root
+                        : "there are no presets, because there is no folder " + root);
 }

@@ -1,7 +1,6 @@
 // What a run would do to the job presets.
 #pragma once
 
-#include "check/report.h"
-#include "check/template_folders.h"
+#include "check/template_check.h"
 
-void CheckPresets(const TemplateFolders& folders, Report& report);
+void CheckPresets(TemplateFolders& folders, TemplateCheck& templates, Report& report);

@@ -3,6 +3,7 @@
 #include "platform/standard_output.h"
 #include "platform/unicode_text.h"
 
+#include <wx/filename.h>
 #include <wx/textbuf.h>
 
 namespace
@@ -15,10 +16,24 @@ wxString Count(size_t number, const wxString& what)
 
 } // namespace
 
+wxString Shown(const wxString& text)
+{
+    constexpr size_t Longest = 300;
+    return text.length() <= Longest ? text : text.Left(Longest) + "...";
+}
+
 Report::Report(const wxString& fileName) : m_toFile(!fileName.empty())
 {
-    if (m_toFile)
-        m_isWritten = m_file.Open(fileName, "wb");
+    if (!m_toFile)
+        return;
+    wxFileName path(fileName);
+    path.MakeAbsolute();
+    const PinnedDirectory directory(path.GetPath(wxPATH_GET_VOLUME | wxPATH_GET_SEPARATOR),
+                                    Links::Follow);
+    const wxString name = path.GetFullName();
+    m_isWritten = (m_file.OpenForUpdate(directory, name) == RegularFile::Status::Open &&
+                   m_file.SetLength(0)) ||
+                  m_file.CreateNew(directory, name) == RegularFile::Status::Open;
 }
 
 void Report::Head(const wxString& text)
@@ -29,22 +44,29 @@ void Report::Head(const wxString& text)
 void Report::Begin(const wxString& title)
 {
     EndBlock();
-    m_title = title;
+    m_title = Shown(title);
 }
 
 void Report::Problem(const wxString& text)
 {
-    Add(Problems, "  problem  " + text);
+    Add(ProblemKind, text);
 }
 
 void Report::Change(const wxString& text)
 {
-    Add(Changes, "  change   " + text);
+    Add(ChangeKind, text);
 }
 
 void Report::Note(const wxString& text)
 {
-    Add(Notes, "  note     " + text);
+    Add(NoteKind, text);
+}
+
+void Report::Add(const wxString& prefix, const Findings& findings)
+{
+    AddSome(ProblemKind, prefix, findings.problems);
+    AddSome(ChangeKind, prefix, findings.changes);
+    AddSome(NoteKind, prefix, findings.notes);
 }
 
 void Report::ProblemOnce(const wxString& text)
@@ -53,34 +75,43 @@ void Report::ProblemOnce(const wxString& text)
         Problem(text);
 }
 
+void Report::NoteOnce(const wxString& text)
+{
+    if (m_once.insert(text).second)
+        Note(text);
+}
+
 bool Report::End()
 {
     EndBlock();
     Write("");
-    Write(Count(m_counts[Changes], "change") + ", " + Count(m_counts[Problems], "problem") + ", " +
-          Count(m_counts[Notes], "note"));
-    if (m_file.IsOpened() && !m_file.Close())
-    {
-        m_file.Detach(); // or the library closes it again
-        m_isWritten = false;
-    }
+    Write(Count(m_counts[ChangeKind], "change") + ", " + Count(m_counts[ProblemKind], "problem") +
+          ", " + Count(m_counts[NoteKind], "note"));
     return m_isWritten;
 }
 
-size_t Report::GetProblems() const
+int Report::ExitStatus() const
 {
-    return m_counts[Problems];
-}
-
-size_t Report::GetChanges() const
-{
-    return m_counts[Changes];
+    if (m_counts[ProblemKind] > 0)
+        return HasProblems;
+    return m_counts[ChangeKind] > 0 ? HasChanges : NothingToDo;
 }
 
 void Report::Add(Kind kind, const wxString& text)
 {
-    m_block[kind].Add(text);
+    static const std::array<const char*, KindCount> beginnings = {"  problem  ", "  change   ",
+                                                                  "  note     "};
+    m_block[kind].Add(beginnings[kind] + text);
     ++m_counts[kind];
+}
+
+void Report::AddSome(Kind kind, const wxString& prefix, const std::vector<wxString>& texts)
+{
+    constexpr size_t Most = 20;
+    for (size_t i = 0; i < texts.size() && i < Most; ++i)
+        Add(kind, prefix + texts[i]);
+    if (texts.size() > Most)
+        Add(kind, prefix + wxString::Format("and %zu more", texts.size() - Most));
 }
 
 void Report::EndBlock()
@@ -106,5 +137,5 @@ void Report::Write(const wxString& text)
     if (!m_toFile)
         m_isWritten = WriteStandardOutput(line) && m_isWritten;
     else if (m_isWritten)
-        m_isWritten = m_file.Write(line, wxConvUTF8);
+        m_isWritten = m_file.Append(line.utf8_string());
 }

@@ -2,17 +2,37 @@
 // knowing.
 #pragma once
 
+#include "platform/regular_file.h"
+
 #include <wx/arrstr.h>
-#include <wx/ffile.h>
 #include <wx/string.h>
 
 #include <array>
 #include <set>
+#include <vector>
+
+/// The exit statuses of a check. The highest one that applies is returned.
+constexpr int NothingToDo = 0;
+constexpr int HasChanges = 1;
+constexpr int HasProblems = 2;
+constexpr int WrongArguments = 3;
+
+/// As much of a text as is readable in one line.
+wxString Shown(const wxString& text);
+
+/// Findings of the same kind, of which a report shows only some.
+struct Findings
+{
+    std::vector<wxString> problems;
+    std::vector<wxString> changes;
+    std::vector<wxString> notes;
+};
 
 class Report
 {
   public:
-    /// Writes to the file, or to the standard output if the name is empty.
+    /// Writes to the file, or to the standard output if the name is empty. A link or a pipe in
+    /// place of the file is not written to.
     explicit Report(const wxString& fileName);
 
     /// Writes a line of the head, which comes before all blocks.
@@ -25,29 +45,32 @@ class Report
     void Problem(const wxString& text);
     void Change(const wxString& text);
     void Note(const wxString& text);
-    /// A problem that concerns many blocks: written only with the first of them.
+    /// The first 20 of each kind, each after the prefix, and how many more there are.
+    void Add(const wxString& prefix, const Findings& findings);
+    /// What concerns many blocks: written only with the first of them.
     void ProblemOnce(const wxString& text);
+    void NoteOnce(const wxString& text);
 
     /// Writes the totals. Returns false if anything could not be written.
     bool End();
 
-    size_t GetProblems() const;
-    size_t GetChanges() const;
+    int ExitStatus() const;
 
   private:
     enum Kind
     {
-        Problems,
-        Changes,
-        Notes,
+        ProblemKind,
+        ChangeKind,
+        NoteKind,
         KindCount
     };
 
     void Add(Kind kind, const wxString& text);
+    void AddSome(Kind kind, const wxString& prefix, const std::vector<wxString>& texts);
     void EndBlock();
     void Write(const wxString& text);
 
-    wxFFile m_file;
+    RegularFile m_file;
     const bool m_toFile;
     bool m_isWritten = true;
     wxString m_title;

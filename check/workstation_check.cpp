@@ -1,8 +1,8 @@
 #include "check/workstation_check.h"
 
-#include "check/library_errors.h"
 #include "check/reach.h"
 #include "platform/access_rights.h"
+#include "platform/process_rights.h"
 #include "platform/regular_file.h"
 #include "run/run_log_place.h"
 
@@ -11,29 +11,53 @@
 namespace
 {
 
+bool IsDriveThere(const wxString& folder)
+{
+    const wxString root = wxFileName(folder, wxPATH_NATIVE).GetVolume();
+    return root.empty() ||
+           wxDirExists(root + wxFileName::GetVolumeSeparator() + wxFileName::GetPathSeparator());
+}
+
 void CheckEntries(const HotFolderList& list, Report& report)
 {
     if (list.folders.empty() && !list.missing.empty())
         report.Problem("none of the listed hot folders exists (another account? mapped drives?)");
     else if (list.folders.empty())
         report.Note("HotFolderList.cfg lists no hot folder");
+    Findings missing;
     for (const wxString& folder : list.missing)
     {
         const wxString obstacle = WhyOutOfReach(folder);
         if (!obstacle.empty())
-            report.Problem("listed hot folder " + folder + " " + obstacle);
+            missing.problems.push_back(Shown(folder) + " " + obstacle);
+        else if (!IsDriveThere(folder))
+            missing.problems.push_back("is on a drive or share that is not there: " +
+                                       Shown(folder));
         else
-            report.Note("listed hot folder does not exist: " + folder);
+            missing.notes.push_back("does not exist: " + Shown(folder));
     }
     for (const wxString& folder : list.repeated)
-        report.Note("hot folder is listed twice: " + folder);
+        missing.notes.push_back("is listed twice: " + Shown(folder));
+    report.Add("listed hot folder ", missing);
 }
 
 } // namespace
 
+wxString Damage(const XmlSyntaxError& error)
+{
+    return wxString::Format("damaged (line %lu: %s)", error.line, error.message);
+}
+
+void CheckAccount(Report& report)
+{
+    if (IsSystemAccount())
+        report.Problem(
+            "the account is SYSTEM, which has no hot folder client: it has other presets, "
+            "another log and no previous version; run it as the client's user");
+}
+
 void CheckHotFolderList(const HotFolderList& list, Report& report)
 {
-    const wxString errors = TakeLibraryErrors();
     const wxString obstacle = WhyOutOfReach(GetHotFolderDataDir());
     switch (list.state)
     {
@@ -44,10 +68,13 @@ void CheckHotFolderList(const HotFolderList& list, Report& report)
                                     wxFILE_EXISTS_ANY | wxFILE_EXISTS_NO_FOLLOW))
             report.Problem("HotFolderList.cfg: is not a file");
         else
-            report.Note("there is no HotFolderList.cfg");
+            report.Note("there is no " + GetHotFolderListPath());
         break;
     case XmlFile::State::NotReadable:
-        report.Problem("HotFolderList.cfg: " + errors);
+        report.Problem((list.error.message.empty()
+                            ? list.whyNotReadable
+                            : GetHotFolderListPath() + ": " + Damage(list.error)) +
+                       "; no hot folder is migrated");
         break;
     case XmlFile::State::TooLarge:
         report.Problem("HotFolderList.cfg: too large to read safely");
@@ -79,12 +106,10 @@ void CheckRunLog(Report& report)
         return;
     }
     RegularFile log;
-    const RegularFile::Status status = log.OpenForUpdate(path, Links::Refuse);
+    const RegularFile::Status status =
+        log.OpenForUpdate(PinnedDirectory(folder, Links::Refuse), RunLogFileName);
     if (status == RegularFile::Status::Refused)
-    {
-        ReportNotOpened(path); // to get the system's reason
-        report.Problem("there will be no run log: " + TakeLibraryErrors());
-    }
+        report.Problem("there will be no run log: " + log.GetFailure().Describe(path));
     else if (status == RegularFile::Status::NotThere && wxFileName::Exists(path))
         report.Note("there will be no run log: something else has its name: " + path);
     else if (status == RegularFile::Status::NotThere && !MayCreateIn(folder))

@@ -18,16 +18,14 @@ function(add_windows_resources target description)
     endif()
 endfunction()
 
-# The stack is for the XML library, which destroys a document by recursion: 64 MiB is enough for all that xml_limits.cpp
-# admits; with 2 MiB, 60,000 levels crash the run. Only the used part takes memory. The module platform does what has to
-# be done before main().
+# The module platform does what has to be done before main().
 function(harden_windows_program target)
     if(MSVC)
         target_link_options(${target} PRIVATE
-            /STACK:67108864 /DYNAMICBASE /NXCOMPAT /HIGHENTROPYVA /DEPENDENTLOADFLAG:0x800)
+            /DYNAMICBASE /NXCOMPAT /HIGHENTROPYVA /DEPENDENTLOADFLAG:0x800)
     else()
         target_link_options(${target} PRIVATE
-            LINKER:--stack,67108864 LINKER:--dynamicbase LINKER:--nxcompat LINKER:--high-entropy-va)
+            LINKER:--dynamicbase LINKER:--nxcompat LINKER:--high-entropy-va)
     endif()
 endfunction()
 

@@ -3,6 +3,8 @@
 #include "platform/system.h"
 #include "platform/unicode_text.h"
 
+#include <wx/log.h>
+
 #include <algorithm>
 #include <array>
 #include <vector>
@@ -18,6 +20,7 @@ constexpr DWORD ValueCapacity = 517;
 struct Location
 {
     HKEY hive;
+    const char* hiveName;
     std::vector<const wchar_t*> keys;
     const wchar_t* value;
 };
@@ -26,6 +29,7 @@ const Location& DefaultFolder()
 {
     static const Location location = {
         HKEY_LOCAL_MACHINE,
+        "HKEY_LOCAL_MACHINE",
         {L"SOFTWARE\\Wow6432Node\\Vantorix\\QZA", L"SOFTWARE\\Vantorix\\QZA"},
         L"InstallPath"};
     return location;
@@ -33,54 +37,75 @@ const Location& DefaultFolder()
 
 const Location& PreviousFolder()
 {
-    static const Location location = {
-        HKEY_CURRENT_USER, {L"SOFTWARE\\Wow6432Node\\HF", L"SOFTWARE\\HF"}, L"Path"};
+    static const Location location = {HKEY_CURRENT_USER,
+                                      "HKEY_CURRENT_USER",
+                                      {L"SOFTWARE\\Wow6432Node\\HF", L"SOFTWARE\\HF"},
+                                      L"Path"};
     return location;
 }
 
 const char* const TemplateDirName = "template";
 
-} // namespace
-
-const char* const DefaultFolderSource =
-    "InstallPath in HKEY_LOCAL_MACHINE\\SOFTWARE[\\Wow6432Node]\\Vantorix\\QZA";
-const char* const PreviousFolderSource = "Path in HKEY_CURRENT_USER\\SOFTWARE[\\Wow6432Node]\\HF";
-
-namespace
-{
-
-bool QueryText(HKEY key, const wchar_t* name, wxString& text)
+LSTATUS QueryText(HKEY key, const wchar_t* name, wxString& text)
 {
     std::array<BYTE, ValueCapacity> data{};
     DWORD type = 0;
     DWORD size = ValueCapacity;
-    if (RegQueryValueExW(key, name, nullptr, &type, data.data(), &size) != ERROR_SUCCESS)
-        return false;
-    text = FromUtf16Bytes(data.data(), std::min(size, ValueCapacity));
-    return true;
+    const LSTATUS status = RegQueryValueExW(key, name, nullptr, &type, data.data(), &size);
+    if (status == ERROR_SUCCESS)
+        text = FromUtf16Bytes(data.data(), std::min(size, ValueCapacity));
+    return status;
+}
+
+// The name of the value with the key that was opened, or with all keys if none was.
+wxString NameOf(const Location& location, const wxString& opened)
+{
+    wxString name = wxString("registry value ") + location.value + " in " + location.hiveName;
+    if (!opened.empty())
+        return name + "\\" + opened;
+    for (const wchar_t* key : location.keys)
+        name += (key == location.keys.front() ? "\\" : " or \\") + wxString(key);
+    return name;
+}
+
+wxString WhyNotRead(const Location& location, const wxString& opened, LSTATUS status)
+{
+    if (status == ERROR_SUCCESS)
+        return {};
+    if (opened.empty())
+        return "there is no such key";
+    if (status == ERROR_MORE_DATA)
+        return "longer than 257 characters";
+    if (status != ERROR_FILE_NOT_FOUND)
+        return wxSysErrorMsgStr(static_cast<unsigned long>(status));
+    return opened == location.keys.back() ? "missing" : "missing, and no other key is looked at";
 }
 
 // The next key is tried only if a key cannot be opened, not if its value is missing.
-bool ReadText(const Location& location, wxString& text)
+bool ReadText(const Location& location, wxString& text, ValueSource& source)
 {
+    wxString opened;
+    LSTATUS status = ERROR_FILE_NOT_FOUND;
     for (const wchar_t* path : location.keys)
     {
         HKEY key = nullptr;
         if (RegOpenKeyExW(location.hive, path, 0, KEY_READ, &key) != ERROR_SUCCESS)
             continue;
-        const bool found = QueryText(key, location.value, text);
+        opened = path;
+        status = QueryText(key, location.value, text);
         RegCloseKey(key);
-        return found;
+        break;
     }
-    return false;
+    source = {NameOf(location, opened), WhyNotRead(location, opened, status)};
+    return status == ERROR_SUCCESS;
 }
 
 } // namespace
 
-bool GetDefaultImposeTemplatePath(wxFileName& folder)
+bool GetDefaultImposeTemplatePath(wxFileName& folder, ValueSource& source)
 {
     wxString path;
-    if (!ReadText(DefaultFolder(), path))
+    if (!ReadText(DefaultFolder(), path, source))
         return false;
     path += wxFileName::GetPathSeparator();
     path += TemplateDirName;
@@ -88,10 +113,10 @@ bool GetDefaultImposeTemplatePath(wxFileName& folder)
     return true;
 }
 
-bool GetPreviousImposeTemplatePath(wxFileName& folder)
+bool GetPreviousImposeTemplatePath(wxFileName& folder, ValueSource& source)
 {
     wxString path;
-    const bool found = ReadText(PreviousFolder(), path);
+    const bool found = ReadText(PreviousFolder(), path, source);
     folder.Assign(path, wxPATH_NATIVE);
     return found;
 }

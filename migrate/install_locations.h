@@ -4,9 +4,12 @@
 #include <wx/filename.h>
 #include <wx/string.h>
 
-/// Where the two folders come from, for messages.
-extern const char* const DefaultFolderSource;
-extern const char* const PreviousFolderSource;
+/// The registry value that was looked for, for messages.
+struct ValueSource
+{
+    wxString name;   // with its key
+    wxString whyNot; // why it could not be read; empty if it was
+};
 
 /// The default template folder of the installed software: "template" below the InstallPath of the
 /// machine's key. Returns false and leaves the folder as it was if that cannot be read.
@@ -15,8 +18,8 @@ extern const char* const PreviousFolderSource;
 /// tried only if the first cannot be opened; at most 517 bytes are read, as UTF-16 up to the first
 /// NUL whatever the value's type; every call reads the registry, and none checks that the folder
 /// exists. The folder's last component becomes the file name.
-bool GetDefaultImposeTemplatePath(wxFileName& folder);
+bool GetDefaultImposeTemplatePath(wxFileName& folder, ValueSource& source);
 
 /// The default template folder of the previous version: the Path of the current user's key. Returns
 /// false and an empty file name if that cannot be read.
-bool GetPreviousImposeTemplatePath(wxFileName& folder);
+bool GetPreviousImposeTemplatePath(wxFileName& folder, ValueSource& source);

@@ -1,5 +1,7 @@
 #include "migrate/job_preset_files.h"
 
+#include "platform/access_rights.h"
+#include "platform/memory.h"
 #include "platform/standard_folders.h"
 
 #include <wx/dir.h>
@@ -36,7 +38,7 @@ class wxDirTraverserSimple : public wxDirTraverser
     wxArrayString& m_directories;
 };
 
-wxString PresetPath(const wxString& directory)
+wxString PathIn(const wxString& directory)
 {
     wxFileName folder(directory + wxFileName::GetPathSeparator());
     folder.AppendDir(PresetDirName);
@@ -53,19 +55,25 @@ wxString JobPresetRoot()
     return root.GetFullPath();
 }
 
-bool ListJobPresetDirs(const wxString& root, wxArrayString& directories)
+JobPresetDirs ListJobPresetDirs(const wxString& root)
 {
-    if (!wxFileName::DirExists(root))
-        return false;
+    JobPresetDirs directories;
+    directories.isThere = wxFileName::DirExists(root);
+    if (!directories.isThere)
+        return directories;
+    // The library would report it by itself.
+    directories.failure = WhyNotListed(root);
+    if (directories.failure)
+        return directories;
     const wxDir directory(root);
-    wxDirTraverserSimple collector(directories);
+    wxDirTraverserSimple collector(directories.paths);
     if (directory.IsOpened())
         directory.Traverse(collector, wxString(), wxDIR_FILES | wxDIR_DIRS | wxDIR_HIDDEN);
-    return true;
+    return directories;
 }
 
 JobPresetFile::JobPresetFile(const wxString& directory)
-    : m_path(PresetPath(directory)), m_directory(directory, Links::Follow),
+    : m_path(PathIn(directory)), m_directory(directory, Links::Follow),
       m_presets(m_directory.Reach(PresetDirName), Links::Refuse),
       m_isLinked(IsLink(m_directory.Reach(PresetDirName)))
 {
@@ -84,11 +92,24 @@ bool JobPresetFile::IsThere() const
 
 RegularFile::Status JobPresetFile::OpenForReading()
 {
-    const RegularFile::Status status =
-        m_file.OpenForReading(m_presets.Reach(PresetFileName), Links::Refuse);
-    if (status == RegularFile::Status::Refused)
-        ReportNotOpened(m_path);
-    return status;
+    return m_file.OpenForReading(m_presets, PresetFileName);
+}
+
+RewrittenPreset JobPresetFile::Decide(const wxString& from, const wxString& to)
+{
+    // As it is, as wide characters twice, and one byte to spare.
+    constexpr std::uint64_t MemoryForEachByte = 10;
+    std::string before;
+    RewrittenPreset preset;
+    const std::int64_t length = m_file.Length();
+    if (length > 0 && length <= LongestFile)
+        RequireMemory(static_cast<std::uint64_t>(length) * MemoryForEachByte);
+    if (m_file.Read(before))
+        preset = RewritePreset(before, from, to);
+    else
+        preset.reasonToStay = PresetStays::NotRead;
+    preset.before.swap(before);
+    return preset;
 }
 
 RegularFile& JobPresetFile::GetFile()

@@ -1,19 +1,28 @@
 // The files of the current user's job presets.
 #pragma once
 
+#include "migrate/preset_text.h"
 #include "platform/regular_file.h"
 
 #include <wx/arrstr.h>
 #include <wx/string.h>
 
+#include <optional>
+
 /// The directory of the job preset directories: ORX/JPData in the per-user application data folder,
 /// with a final separator.
 wxString JobPresetRoot();
 
-/// Appends the full paths of the root's direct sub-directories, hidden ones too, in the order of
-/// the listing. Returns false if the root is not a directory. The library reports an error if it
-/// cannot be listed.
-bool ListJobPresetDirs(const wxString& root, wxArrayString& directories);
+struct JobPresetDirs
+{
+    bool isThere = false;
+    std::optional<FailedCall> failure; // if it is there, but cannot be listed
+    wxArrayString paths;
+};
+
+/// The full paths of the root's direct sub-directories, hidden ones too, in the order of the
+/// listing.
+JobPresetDirs ListJobPresetDirs(const wxString& root);
 
 /// One job preset's file. The job preset directory and those above it may be links (redirected
 /// profiles); the directory Presets in it and the file itself may not.
@@ -29,11 +38,13 @@ class JobPresetFile
     /// Presets is a link: its target is not accessed.
     bool IsThere() const;
 
-    /// NotThere for anything but a regular file. The library reports an error if a regular file
-    /// does not open.
+    /// NotThere for anything but a regular file.
     RegularFile::Status OpenForReading();
 
-    /// The file, once it is open.
+    /// What becomes of the file, once it is open. It has to be opened for update as well if it is
+    /// to be written.
+    RewrittenPreset Decide(const wxString& from, const wxString& to);
+
     RegularFile& GetFile();
 
   private:

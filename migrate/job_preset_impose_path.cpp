@@ -1,54 +1,56 @@
 #include "migrate/job_preset_impose_path.h"
 
-#include "migrate/install_locations.h"
 #include "migrate/job_preset_files.h"
-#include "migrate/preset_text.h"
-#include "run/run_log.h"
-
-#include <wx/filename.h>
+#include "migrate/template_folders.h"
+#include "platform/library_log.h"
+#include "run/attempt.h"
 
 namespace
 {
+
+void LogFailure(const RegularFile& file, const wxString& path)
+{
+    ReportError(file.GetFailure().Describe(path));
+}
 
 // Opened for update before it is read, so that one handle serves both. If both fail, only the fault
 // in the content is logged.
 void UpdatePreset(JobPresetFile& preset, const wxString& from, const wxString& to)
 {
     const wxString& path = preset.GetPath();
-    if (preset.OpenForReading() != RegularFile::Status::Open)
+    RegularFile& file = preset.GetFile();
+    const RegularFile::Status opened = preset.OpenForReading();
+    if (opened != RegularFile::Status::Open)
     {
+        if (opened == RegularFile::Status::Refused)
+            LogFailure(file, path);
         RunLog("Unable to open preset.xml for read : " + path);
         return;
     }
-    RegularFile& file = preset.GetFile();
-    const RegularFile::Status status = file.ReopenForUpdate();
-    std::string before;
-    RewrittenPreset after;
-    if (file.Read(before))
-        after = RewritePreset(before, from, to);
-    else
-        after.reasonToStay = "cannot be read";
-    if (after.reasonToStay)
-        RunLog(wxString::Format("preset.xml left as it is (%s): %s", after.reasonToStay, path));
-    else if (status != RegularFile::Status::Open)
+    const RegularFile::Status reopened = file.ReopenForUpdate();
+    const FailedCall reopening = file.GetFailure();
+    const RewrittenPreset rewritten = preset.Decide(from, to);
+    if (rewritten.reasonToStay)
+        RunLog(wxString::Format("preset.xml left as it is (%s): %s", rewritten.reasonToStay, path));
+    else if (reopened != RegularFile::Status::Open)
     {
-        if (status == RegularFile::Status::Refused)
-            file.ReportNotReopened(path);
+        if (reopened == RegularFile::Status::Refused)
+            ReportError(reopening.Describe(path));
         RunLog("Unable to open preset.xml for write : " + path);
     }
     else
     {
-        if (!file.Rewrite(before, after.bytes))
-            file.ReportNotWritten(path);
+        if (!file.Rewrite(rewritten.before, rewritten.bytes))
+            LogFailure(file, path);
         RunLog("Updated preset.xml  : " + path);
     }
 }
 
 // Always makes both lookups, in this order; returns false if either fails.
-bool LookUpFolders(wxFileName& previousFolder, wxFileName& defaultFolder)
+bool LookUp(TemplateFolders& folders)
 {
-    const bool previousFound = GetPreviousImposeTemplatePath(previousFolder);
-    const bool defaultFound = GetDefaultImposeTemplatePath(defaultFolder);
+    const bool previousFound = folders.Previous().isKnown;
+    const bool defaultFound = folders.Default().isKnown;
     if (!defaultFound)
         RunLog("Unable to read: Default Impose Template Path");
     if (!previousFound)
@@ -61,25 +63,27 @@ bool LookUpFolders(wxFileName& previousFolder, wxFileName& defaultFolder)
 void FindJobPresetDirs(wxArrayString& directories)
 {
     const wxString root = JobPresetRoot();
-    if (!ListJobPresetDirs(root, directories))
+    const JobPresetDirs found = ListJobPresetDirs(root);
+    if (!found.isThere)
         RunLog("Preset dirctory  not exist: " + root);
+    if (found.failure)
+        ReportError(found.failure->Describe(root));
+    for (const wxString& path : found.paths)
+        directories.Add(path);
 }
 
 void UpdateJobPresetImposePath(const FolderUpgradeApp& app)
 {
     wxArrayString directories;
     FindJobPresetDirs(directories);
-    wxFileName previousFolder;
-    wxFileName defaultFolder;
-    if (!LookUpFolders(previousFolder, defaultFolder))
+    TemplateFolders folders(app.m_isUpgrade);
+    if (!LookUp(folders))
         return;
-
-    const wxString from = (app.m_isUpgrade ? previousFolder : defaultFolder).GetFullPath();
-    const wxString to = (app.m_isUpgrade ? defaultFolder : previousFolder).GetFullPath();
     for (const wxString& directory : directories)
     {
         JobPresetFile preset(directory);
         if (preset.IsThere())
-            UpdatePreset(preset, from, to);
+            Attempt(L"preset.xml", preset.GetPath(),
+                    [&]() { UpdatePreset(preset, folders.From().path, folders.To().path); });
     }
 }

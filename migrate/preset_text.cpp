@@ -1,11 +1,11 @@
 #include "migrate/preset_text.h"
 
+#include "platform/path_normal_form.h"
 #include "platform/unicode_text.h"
 #include "store/folder_cfg_format.h"
 #include "store/xml_text.h"
 
 #include <wx/convauto.h>
-#include <wx/filename.h>
 #include <wx/textbuf.h>
 
 #include <vector>
@@ -13,12 +13,9 @@
 namespace
 {
 
-const char* const PathIntroduction = "\">\"";
-
-void TrimSeparators(wxString& folder)
+wxString Introduction()
 {
-    while (!folder.empty() && wxFileName::IsPathSeparator(folder.Last()))
-        folder.RemoveLast();
+    return wxString(FolderCfg::ImposeTemplateKey) + "\">\"";
 }
 
 bool EndsFolder(const wxString& text, size_t position)
@@ -30,7 +27,7 @@ bool EndsFolder(const wxString& text, size_t position)
 // The positions of the folder in the template paths of the text, in ascending order.
 std::vector<size_t> FindFolders(const wxString& text, const wxString& folder)
 {
-    const wxString introduction = wxString(FolderCfg::ImposeTemplateKey) + PathIntroduction;
+    const wxString introduction = Introduction();
     const wxString searched = introduction + folder;
     std::vector<size_t> folders;
     for (size_t found = text.find(searched); found != wxString::npos;)
@@ -58,27 +55,12 @@ bool IsEmptyText(const std::string& bytes)
     return bytes.length() == markLength || (mark == wxBOM_Unknown && bytes == "\xFF\xFE");
 }
 
-// Decodes the bytes unchanged, then converts line ends as the system's text mode would, if it has
-// one. Text mode itself would end the file at the first Ctrl-Z, and find line ends inside UTF-16
-// characters.
-const char* Decode(const std::string& bytes, wxString& text)
-{
-    if (IsEmptyText(bytes))
-        return nullptr;
-    wxString(bytes.data(), wxConvAuto(), bytes.length()).swap(text); // assigning would copy it
-    if (text.empty())
-        return "cannot be decoded";
-    if (wxTextBuffer::typeDefault == wxTextFileType_Dos)
-        text.Replace("\r\n", "\n");
-    return IsUnicodeText(text) ? nullptr : "cannot be encoded again";
-}
-
 } // namespace
 
-size_t MovePresetPaths(wxString& text, wxString from, wxString to)
+size_t MovePresetPaths(wxString& text, const wxString& oldFolder, const wxString& newFolder)
 {
-    TrimSeparators(from);
-    TrimSeparators(to);
+    const wxString from = WithoutFinalSeparators(oldFolder);
+    const wxString to = WithoutFinalSeparators(newFolder);
     if (from.empty() || to.empty() || !IsXmlText(to))
         return 0;
     const std::vector<size_t> folders = FindFolders(text, from);
@@ -99,11 +81,49 @@ size_t MovePresetPaths(wxString& text, wxString from, wxString to)
     return folders.size();
 }
 
+// Decodes the bytes unchanged, then converts line ends as the system's text mode would, if it has
+// one. Text mode itself would end the file at the first Ctrl-Z, and find line ends inside UTF-16
+// characters.
+const char* DecodePreset(const std::string& bytes, wxString& text)
+{
+    if (IsEmptyText(bytes))
+        return nullptr;
+    wxString(bytes.data(), wxConvAuto(), bytes.length()).swap(text); // assigning would copy it
+    if (text.empty())
+        return PresetStays::NotDecoded;
+    if (wxTextBuffer::typeDefault == wxTextFileType_Dos)
+        text.Replace("\r\n", "\n");
+    return IsUnicodeText(text) ? nullptr : PresetStays::NotEncodedAgain;
+}
+
+wxString MovedPresetPath(const wxString& path, const wxString& from, const wxString& to)
+{
+    wxString text = Introduction() + path + "\"";
+    MovePresetPaths(text, from, to);
+    return text.Mid(Introduction().length()).BeforeLast('"');
+}
+
+std::vector<PresetPath> FindPresetPaths(const wxString& text, const wxString& from,
+                                        const wxString& to)
+{
+    const wxString introduction = Introduction();
+    std::vector<PresetPath> paths;
+    for (size_t found = text.find(introduction); found != wxString::npos;)
+    {
+        const size_t begin = found + introduction.length();
+        const size_t end = text.find('"', begin);
+        const wxString stored = text.Mid(begin, end - begin);
+        paths.push_back({stored, MovedPresetPath(stored, from, to), end == wxString::npos});
+        found = text.find(introduction, begin);
+    }
+    return paths;
+}
+
 RewrittenPreset RewritePreset(const std::string& before, const wxString& from, const wxString& to)
 {
     RewrittenPreset preset;
     wxString text;
-    preset.reasonToStay = Decode(before, text);
+    preset.reasonToStay = DecodePreset(before, text);
     if (preset.reasonToStay)
         return preset;
     preset.movedPaths = MovePresetPaths(text, from, to);

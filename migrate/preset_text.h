@@ -4,19 +4,48 @@
 #include <wx/string.h>
 
 #include <string>
+#include <vector>
 
 /// Replaces the first folder with the second in every template path of the text that lies in it:
 /// where the search text ORXImposeTemplate">" is directly followed by the folder's text, and that
 /// by a path separator or the closing double quote. Separators at the end of either folder are
 /// ignored. Replaces nothing if either folder is empty, or if XML cannot hold the text of the new
 /// one. Returns the number of replacements. Takes time proportional to the length of the text.
-size_t MovePresetPaths(wxString& text, wxString from, wxString to);
+size_t MovePresetPaths(wxString& text, const wxString& from, const wxString& to);
+
+/// The template paths of the text, each with what MovePresetPaths makes of it; what follows the
+/// search text up to the next double quote. isCutOff: the last one has no double quote.
+struct PresetPath
+{
+    wxString stored;
+    wxString moved;
+    bool isCutOff = false;
+};
+std::vector<PresetPath> FindPresetPaths(const wxString& text, const wxString& from,
+                                        const wxString& to);
+
+/// What MovePresetPaths makes of this path.
+wxString MovedPresetPath(const wxString& path, const wxString& from, const wxString& to);
+
+/// Decodes a preset file's bytes. Returns why it stays as it is, or null.
+const char* DecodePreset(const std::string& bytes, wxString& text);
+
+/// Why a preset file stays as it is.
+namespace PresetStays
+{
+
+constexpr const char* NotRead = "cannot be read";
+constexpr const char* NotDecoded = "cannot be decoded";
+constexpr const char* NotEncodedAgain = "cannot be encoded again";
+
+} // namespace PresetStays
 
 /// A preset file's new content, or why the file has to stay as it is.
 struct RewrittenPreset
 {
     const char* reasonToStay = nullptr;
     size_t movedPaths = 0;
+    std::string before;
     std::string bytes;
 };
 

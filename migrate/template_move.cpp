@@ -1,20 +1,20 @@
 #include "migrate/template_move.h"
 
-#include "migrate/install_locations.h"
+#include "platform/path_normal_form.h"
+#include "store/folder_cfg_format.h"
 #include "store/folder_cfg_reader.h"
 #include "store/folder_cfg_writer.h"
-#include "store/xml_encoding.h"
+#include "store/xml_lookup.h"
 #include "store/xml_text.h"
-#include "store/xml_tree.h"
 
 #include <wx/confbase.h>
 #include <wx/filename.h>
 #include <wx/tokenzr.h>
 
+#include <algorithm>
+
 namespace
 {
-
-using Lookup = bool (*)(wxFileName&);
 
 bool IsAnySeparator(wxUniChar character)
 {
@@ -59,53 +59,36 @@ bool IsElsewhereByName(const wxString& stored, const wxString& folder)
     return folded.GetExt().CmpNoCase("lnk") == 0;
 }
 
-// The folder that holds the template, without a final separator.
-wxString FolderOf(const wxFileName& templateFile)
+void Stay(TemplateMove& move, const wchar_t* reason)
 {
-    return templateFile.GetPath(wxPATH_GET_VOLUME, wxPATH_NATIVE);
+    move.outcome = TemplateMove::Outcome::Stays;
+    move.reasonToStay = reason;
 }
 
-} // namespace
-
-bool IsSameFolder(const wxString& stored, const wxString& folder)
+void DecideFolder(const XmlFile& cfg, TemplateFolders& folders, TemplateMove& move)
 {
-    const wxFileName left(stored, wxPATH_NATIVE);
-    const wxFileName right(folder, wxPATH_NATIVE);
-    return left.GetFullName().empty() == right.GetFullName().empty() &&
-           !IsElsewhereByName(stored, folder) && right.SameAs(left, wxPATH_NATIVE);
-}
-
-TemplateMove DecideTemplateMove(const wxString& storedPath, const std::string& folderCfg,
-                                bool isUpgrade)
-{
-    using Outcome = TemplateMove::Outcome;
-    const Lookup lookUpFrom =
-        isUpgrade ? GetPreviousImposeTemplatePath : GetDefaultImposeTemplatePath;
-    const Lookup lookUpTo =
-        isUpgrade ? GetDefaultImposeTemplatePath : GetPreviousImposeTemplatePath;
-    wxFileName from;
-    if (!lookUpFrom(from))
-        return {Outcome::NoFromFolder, {}};
-    const wxString fromPath = from.GetFullPath(wxPATH_NATIVE);
-    const wxFileName templateFile(storedPath, wxPATH_NATIVE);
-    const bool isInFolder = IsSameFolder(FolderOf(templateFile), fromPath);
+    move.outcome = TemplateMove::Outcome::FromUnknown;
+    if (!folders.From().isKnown)
+        return;
+    const bool isInFolder = IsDirectlyIn(move.storedPath, folders.From().path);
+    move.outcome = TemplateMove::Outcome::Elsewhere;
     // In an unknown encoding, only ASCII is read correctly.
-    if (!isInFolder && storedPath.IsAscii())
-        return {Outcome::Elsewhere, {}};
-    if (!IsReadFaithfully(folderCfg))
-        return {Outcome::UnknownEncoding, {}};
-    if (!isInFolder)
-        return {Outcome::Elsewhere, {}};
-    wxFileName to;
-    if (!lookUpTo(to))
-        return {Outcome::NoToFolder, {}};
-    const wxString newPath = to.GetFullPath(wxPATH_NATIVE) +
-                             wxFileName::GetPathSeparator(wxPATH_NATIVE) +
-                             templateFile.GetFullName();
-    return {IsXmlText(newPath) ? Outcome::Moves : Outcome::NotStorable, newPath};
+    if (!cfg.isFaithful && (isInFolder || !move.storedPath.IsAscii()))
+        Stay(move, CfgStays::UnknownEncoding);
+    else if (isInFolder)
+        move.outcome =
+            folders.To().isKnown ? TemplateMove::Outcome::Moves : TemplateMove::Outcome::ToUnknown;
+    if (move.outcome != TemplateMove::Outcome::Moves)
+        return;
+    move.newPath = folders.To().path + wxFileName::GetPathSeparator(wxPATH_NATIVE) +
+                   wxFileName(move.storedPath, wxPATH_NATIVE).GetFullName();
+    if (!IsXmlText(move.newPath))
+        Stay(move, CfgStays::NotStorable);
 }
 
-RewrittenFolderCfg RewriteFolderCfg(const wxXmlNode& root, const ImposeSettingTable& imposeSettings)
+// The content of Folder.cfg with the root's settings and this imposition table.
+void MakeContent(const wxXmlNode& root, const ImposeSettingTable& imposeSettings,
+                 TemplateMove& move)
 {
     JobSettingTable jobSettings;
     HotFolderPaths paths;
@@ -117,8 +100,60 @@ RewrittenFolderCfg RewriteFolderCfg(const wxXmlNode& root, const ImposeSettingTa
     ReadFilterSetting(&root, filterSetting);
     ReadPreflightSettings(&root, preflightSettings);
     ReadHotFolderSettings(&root, settings);
-    if (CountLevels(filterSetting) > MaxFilterLevels)
-        return {L"filter setting nested too deep", {}};
-    return {nullptr, FolderCfgBytes(settings, jobSettings, paths, filterSetting, imposeSettings,
-                                    preflightSettings)};
+    move.newContent = FolderCfgBytes(settings, jobSettings, paths, filterSetting, imposeSettings,
+                                     preflightSettings);
+    if (move.newContent.empty())
+        Stay(move, CfgStays::NewTooLarge);
+}
+
+} // namespace
+
+// Windows has no longer path than 32,767 characters. The library copies the rest of the path for
+// every variable in it.
+bool IsTooLongPath(const wxString& path)
+{
+    constexpr size_t LongestPath = 32767;
+    constexpr std::ptrdiff_t MostVariables = 100;
+    return path.length() > LongestPath ||
+           std::count_if(path.begin(), path.end(),
+                         [](wxUniChar character)
+                         { return character == '$' || character == '%'; }) > MostVariables;
+}
+
+bool IsDirectlyIn(const wxString& stored, const wxString& folder)
+{
+    if (IsTooLongPath(stored))
+        return false;
+    wxFileName left(wxFileName(stored, wxPATH_NATIVE).GetPath(wxPATH_GET_VOLUME, wxPATH_NATIVE),
+                    wxPATH_NATIVE);
+    wxFileName right(folder, wxPATH_NATIVE);
+    if (left.GetFullName().empty() != right.GetFullName().empty() ||
+        IsElsewhereByName(left.GetFullPath(), folder))
+        return false;
+    for (wxFileName* each : {&left, &right})
+        each->Normalize(NormalizeAll | wxPATH_NORM_CASE, wxString(), wxPATH_NATIVE);
+    return left.GetFullPath() == right.GetFullPath();
+}
+
+TemplateMove DecideTemplateMove(const XmlFile& cfg, TemplateFolders& folders)
+{
+    using Outcome = TemplateMove::Outcome;
+    TemplateMove move;
+    if (!FindElement(cfg.Root(), FolderCfg::ImposeSettingSection, true))
+        return move;
+    ImposeSettingTable table;
+    ReadImposeSettings(cfg.Root(), table);
+    const auto entry = table.find(FolderCfg::ImposeTemplateKey);
+    move.outcome = Outcome::NoTemplate;
+    if (entry == table.end())
+        return move;
+    move.storedPath = entry->second.Value;
+    DecideFolder(cfg, folders, move);
+    if (move.outcome == Outcome::Moves)
+    {
+        SetImposeSetting(table, FolderCfg::ImposeTemplateKey, move.newPath,
+                         entry->second.KeyDisplayValue);
+        MakeContent(*cfg.Root(), table, move);
+    }
+    return move;
 }

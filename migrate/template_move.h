@@ -1,48 +1,57 @@
-// The decision about the template path that one Folder.cfg stores. Nothing is changed or logged
-// here.
+// What becomes of one Folder.cfg. Nothing is changed or logged here.
 #pragma once
 
-#include "store/hot_folder_settings.h"
+#include "migrate/template_folders.h"
+#include "store/xml_file.h"
 
 #include <wx/string.h>
-#include <wx/xml/xml.h>
 
 #include <string>
 
-/// What happens to a stored template path.
+/// Why a Folder.cfg stays as it is although its template could move, or is not looked at.
+namespace CfgStays
+{
+
+constexpr const wchar_t* TooLarge = L"too large to read safely";
+constexpr const wchar_t* UnknownEncoding = L"unknown encoding";
+constexpr const wchar_t* NotStorable = L"new path holds a character that XML cannot store";
+constexpr const wchar_t* NewTooLarge = L"the new content would be too large";
+constexpr const wchar_t* NotLoadedAgain = L"cannot be loaded again";
+constexpr const wchar_t* Changed = L"changed meanwhile";
+
+} // namespace CfgStays
+
 struct TemplateMove
 {
     enum class Outcome
     {
-        NoFromFolder,    // no registry value for the template folder of the version being left
-        Elsewhere,       // the template is not directly in that folder
-        UnknownEncoding, // the document cannot be read faithfully, so it cannot be rewritten
-        NoToFolder,      // no registry value for the template folder of the version being installed
-        NotStorable,     // the new path holds a character that XML cannot store
+        NoSection,   // no imposition settings
+        NoTemplate,  // none of them is the template's path
+        FromUnknown, // no registry value for the template folder of the version being left
+        Elsewhere,   // the template is not directly in that folder
+        ToUnknown,   // no registry value for the template folder of the version being installed
+        Stays,       // for reasonToStay
         Moves
     };
 
-    Outcome outcome;
-    wxString newPath; // when it moves
-};
-
-/// Decides about the path that this Folder.cfg (given as bytes) stores. Makes each registry lookup
-/// only if the decision still depends on it.
-TemplateMove DecideTemplateMove(const wxString& storedPath, const std::string& folderCfg,
-                                bool isUpgrade);
-
-/// Whether both names lead to the same folder. Like wxFileName::SameAs, but a stored name never
-/// causes access to a server: a name on a server counts as another folder unless both are on the
-/// same share, and so do a name on another drive and a name that leads over a shortcut (.lnk). A
-/// name with a final separator is not the same as one without.
-bool IsSameFolder(const wxString& stored, const wxString& folder);
-
-/// The content of Folder.cfg with the root's settings and this imposition table, or why the file
-/// has to stay as it is. The document has to be loaded with wxXMLDOC_KEEP_WHITESPACE_NODES.
-struct RewrittenFolderCfg
-{
+    Outcome outcome = Outcome::NoSection;
+    wxString storedPath;
+    wxString newPath; // when it moves or stays
     const wchar_t* reasonToStay = nullptr;
-    std::string bytes;
+    std::string newContent; // of Folder.cfg, when the template moves
 };
-RewrittenFolderCfg RewriteFolderCfg(const wxXmlNode& root,
-                                    const ImposeSettingTable& imposeSettings);
+
+/// Decides about the path that a loaded Folder.cfg stores. Asks for each folder only if the
+/// decision still depends on it.
+TemplateMove DecideTemplateMove(const XmlFile& cfg, TemplateFolders& folders);
+
+/// Whether the stored path names something directly in the folder. Only names are compared, as
+/// wxFileName::SameAs does on Windows, and a stored path never causes access to a server: a path on
+/// a server is elsewhere unless both are on the same share, and so are a path on another drive, one
+/// that leads over a shortcut (.lnk), and one that is too long. A folder with a final separator is
+/// not the same as one without.
+bool IsDirectlyIn(const wxString& stored, const wxString& folder);
+
+/// Whether a path is longer than any that Windows has, or holds more variables than the library
+/// can expand in a reasonable time.
+bool IsTooLongPath(const wxString& path);

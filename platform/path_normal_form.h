@@ -1,4 +1,4 @@
-// The normal form of paths.
+// The forms of paths.
 #pragma once
 
 #include <wx/filename.h>
@@ -8,3 +8,6 @@
 /// made long, shortcuts followed. Letter case stays.
 constexpr int NormalizeAll = wxPATH_NORM_ENV_VARS | wxPATH_NORM_DOTS | wxPATH_NORM_TILDE |
                              wxPATH_NORM_ABSOLUTE | wxPATH_NORM_LONG | wxPATH_NORM_SHORTCUT;
+
+/// The path without the separators at its end; empty for a path of separators alone.
+wxString WithoutFinalSeparators(wxString path);

@@ -43,9 +43,15 @@ class PinnedDirectory
     /// inode. Two zeros if it is not open.
     std::pair<std::uint64_t, std::uint64_t> Identity() const;
 
+#ifdef _WIN32
+    /// Whether an open file is directly in the directory, and was not reached over a link.
+    bool Holds(void* file) const;
+#endif
+
   private:
 #ifdef _WIN32
     void* m_handle = nullptr;
+    wxString m_finalPath;
     wxString m_path;
 #else
     int m_descriptor = -1;

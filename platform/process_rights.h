@@ -16,3 +16,7 @@ wxString AccountName();
 /// Whether the process refuses to follow links made by processes without administrator's rights: an
 /// elevated process does on Windows 11 and Windows 10 22H2.
 bool RefusesLinksOfOthers();
+
+/// Whether that account is SYSTEM, which has a profile and a registry of its own. Elsewhere than on
+/// Windows never.
+bool IsSystemAccount();

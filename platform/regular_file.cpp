@@ -3,73 +3,169 @@
 #include <wx/intl.h>
 #include <wx/log.h>
 
+#include <algorithm>
+#include <array>
+
+namespace
+{
+
+constexpr size_t PieceBytes = size_t{64} * 1024; // of a file that is too long for the memory
+
+wxString Words(FailedCall::Kind kind)
+{
+    switch (kind)
+    {
+    case FailedCall::Kind::Open:
+        return _("can't open file '%s'");
+    case FailedCall::Kind::List:
+        return _("Cannot enumerate files in directory '%s'");
+    case FailedCall::Kind::Read:
+        return _("can't read from file '%s'");
+    case FailedCall::Kind::Write:
+        break;
+    }
+    return _("can't write to file '%s'");
+}
+
+} // namespace
+
+FailedCall FailedCall::Now(Kind kind)
+{
+    return {kind, wxSysErrorCode()};
+}
+
+wxString FailedCall::Describe(const wxString& shownPath) const
+{
+    return wxString::Format(Words(kind), shownPath) + Reason();
+}
+
+wxString FailedCall::Reason() const
+{
+    return wxString::Format(_(" (error %ld: %s)"), static_cast<long>(error),
+                            wxSysErrorMsgStr(error));
+}
+
 RegularFile::~RegularFile()
 {
     Close();
 }
 
-RegularFile::Status RegularFile::OpenForReading(const wxString& path, Links links)
+RegularFile::Status RegularFile::OpenForReading(const wxString& path)
 {
-    return Open(path, links, false);
+    return Open(nullptr, path, false);
 }
 
-RegularFile::Status RegularFile::OpenForUpdate(const wxString& path, Links links)
+RegularFile::Status RegularFile::OpenForReading(const PinnedDirectory& directory,
+                                                const wxString& name)
 {
-    return Open(path, links, true);
+    return Open(&directory, directory.Reach(name), false);
+}
+
+RegularFile::Status RegularFile::OpenForUpdate(const PinnedDirectory& directory,
+                                               const wxString& name)
+{
+    return Open(&directory, directory.Reach(name), true);
+}
+
+size_t RegularFile::ReadAt(std::int64_t offset, char* bytes, size_t count) const
+{
+    size_t done = 0;
+    for (size_t some = 1; some > 0 && done < count; done += some)
+        some = ReadSome(offset + static_cast<std::int64_t>(done), bytes + done, count - done);
+    return done;
+}
+
+bool RegularFile::Write(std::int64_t offset, const char* bytes, size_t count)
+{
+    size_t done = 0;
+    for (size_t some = 1; some > 0 && done < count; done += some)
+        some = WriteSome(offset + static_cast<std::int64_t>(done), bytes + done, count - done);
+    return done == count;
+}
+
+bool RegularFile::Read(std::string& bytes, std::int64_t most) const
+{
+    const std::int64_t length = Length();
+    const bool isShort = length >= 0 && length <= most;
+    bytes.resize(isShort ? static_cast<size_t>(length) : 0);
+    if (isShort && ReadAt(0, bytes.data(), bytes.size()) == bytes.size())
+        return true;
+    m_failure = FailedCall::Now(FailedCall::Kind::Read);
+    return false;
+}
+
+bool RegularFile::TakeContent(const RegularFile& source)
+{
+    const std::int64_t oldLength = Length();
+    const std::int64_t newLength = source.Length();
+    bool isDone =
+        newLength >= 0 && (newLength <= oldLength || Reserve(oldLength, newLength - oldLength));
+    std::array<char, PieceBytes> piece{};
+    for (std::int64_t done = 0; isDone && done < newLength;)
+    {
+        const size_t count = source.ReadAt(done, piece.data(), piece.size());
+        isDone = count > 0 && Write(done, piece.data(), count);
+        done += static_cast<std::int64_t>(count);
+    }
+    isDone = isDone && SetLength(newLength);
+    if (!isDone)
+        m_failure = FailedCall::Now(FailedCall::Kind::Write);
+    return isDone;
+}
+
+bool RegularFile::HasContentOf(const RegularFile& other) const
+{
+    const std::int64_t length = Length();
+    std::array<char, PieceBytes> ours{};
+    std::array<char, PieceBytes> theirs{};
+    for (std::int64_t done = 0; done < length; done += PieceBytes)
+    {
+        const size_t count = ReadAt(done, ours.data(), ours.size());
+        if (count == 0 || other.ReadAt(done, theirs.data(), theirs.size()) != count ||
+            !std::equal(ours.begin(), ours.begin() + count, theirs.begin()))
+            return false;
+    }
+    return length == other.Length();
 }
 
 bool RegularFile::Rewrite(const std::string& before, const std::string& after, Wait wait)
 {
     const auto oldLength = static_cast<std::int64_t>(before.size());
     const auto newLength = static_cast<std::int64_t>(after.size());
+    const bool isShorter = newLength < oldLength;
+    const std::string filled =
+        isShorter ? after + std::string(before.size() - after.size(), '\n') : std::string();
+    const std::string& written = isShorter ? filled : after;
     if (newLength > oldLength && !Reserve(oldLength, newLength - oldLength))
     {
-        m_error = wxSysErrorCode();
+        m_failure = FailedCall::Now(FailedCall::Kind::Write);
         return false;
     }
-    const bool isShorter = newLength < oldLength;
-    const bool isWritten =
-        Write(0, isShorter ? after + std::string(before.size() - after.size(), '\n') : after);
     // Another program may have made it longer a moment ago.
-    if (isWritten && (Length() == newLength || SetLength(newLength)))
+    if (Write(0, written.data(), written.size()) && (Length() == newLength || SetLength(newLength)))
     {
         if (wait == Wait::ForDisk)
             WaitForDisk();
         return true;
     }
-    m_error = wxSysErrorCode();
-    Write(0, before);
+    m_failure = FailedCall::Now(FailedCall::Kind::Write);
+    Write(0, before.data(), before.size());
     SetLength(oldLength);
     return false;
-}
-
-void RegularFile::ReportNotReopened(const wxString& shownPath) const
-{
-    wxLogSysError(static_cast<long>(m_error), _("can't open file '%s'"), shownPath);
-}
-
-void RegularFile::ReportNotWritten(const wxString& shownPath) const
-{
-    wxLogSysError(static_cast<long>(m_error), _("can't write to file '%s'"), shownPath);
 }
 
 bool RegularFile::Append(const std::string& bytes)
 {
     const std::int64_t length = Length();
-    if (length >= 0 && Write(length, bytes))
+    if (length >= 0 && Write(length, bytes.data(), bytes.size()))
         return true;
-    m_error = wxSysErrorCode();
+    m_failure = FailedCall::Now(FailedCall::Kind::Write);
     if (length >= 0)
         SetLength(length);
     return false;
 }
 
-void ReportNotOpened(const wxString& path)
+const FailedCall& RegularFile::GetFailure() const
 {
-    wxLogSysError(_("can't open file '%s'"), path);
-}
-
-void ReportNotRead(const wxString& path)
-{
-    wxLogSysError(_("can't read from file '%s'"), path);
+    return m_failure;
 }

@@ -9,11 +9,34 @@
 #include <cstdint>
 #include <string>
 
-/// Bytes. A longer file is not read into memory: a planted file of terabytes must not crash a run.
-constexpr std::int64_t LongestFile = std::int64_t{256} * 1024 * 1024;
+/// The last call of the system that failed.
+struct FailedCall
+{
+    enum class Kind
+    {
+        Open,
+        List, // the names in a directory
+        Read,
+        Write
+    };
 
-/// A file that is opened without waiting (a pipe in its place would block) and, if links are
-/// refused, not through a link. No call reports an error by itself.
+    Kind kind = Kind::Open;
+    unsigned long error = 0; // as the system numbers it
+
+    /// Of this kind, with the system's last error.
+    static FailedCall Now(Kind kind);
+
+    /// The words in which wxLogSysError reports it, and the end of them.
+    wxString Describe(const wxString& shownPath) const;
+    wxString Reason() const;
+};
+
+/// Bytes. A longer file is not read into memory: a planted file of terabytes must not crash a run.
+constexpr std::int64_t LongestFile = std::int64_t{64} * 1024 * 1024;
+
+/// A file that is opened without waiting (a pipe in its place would block). In a pinned directory
+/// it is not opened through a link. No call reports an error by itself; after one that failed,
+/// GetFailure says why.
 ///
 /// As long as it is open, it is the same file, whatever happens to its name; on Windows no program
 /// can rename or remove it meanwhile (it is opened without FILE_SHARE_DELETE).
@@ -22,7 +45,6 @@ class RegularFile
   public:
     enum class Status
     {
-        NotOpen,
         NotThere, // no such file, not a regular file, or a refused link
         Refused,  // it exists, but access is denied or another program blocks it
         Gone,     // the name no longer leads to the same file
@@ -40,19 +62,21 @@ class RegularFile
     RegularFile(const RegularFile&) = delete;
     RegularFile& operator=(const RegularFile&) = delete;
 
-    Status OpenForReading(const wxString& path, Links links);
+    /// Follows links.
+    Status OpenForReading(const wxString& path);
+    Status OpenForReading(const PinnedDirectory& directory, const wxString& name);
     /// Opens for reading and writing. The content stays as it is.
-    Status OpenForUpdate(const wxString& path, Links links);
+    Status OpenForUpdate(const PinnedDirectory& directory, const wxString& name);
     /// Also opens the same file for update (ReOpenFile; elsewhere the name has to lead to the same
     /// device and inode). If the result is not Open, the file stays open for reading.
     Status ReopenForUpdate();
     /// Creates an empty file and opens it for update; fails and changes nothing if anything of that
     /// name exists (CREATE_NEW, O_EXCL).
-    Status CreateNew(const wxString& path);
+    Status CreateNew(const PinnedDirectory& directory, const wxString& name);
     /// Puts a new, empty file in place of one that cannot be written. Not on Windows, where a
     /// file's own permissions prevent that.
-    Status Replace(const wxString& path);
-    static bool MayReplace(const wxString& path);
+    Status Replace(const PinnedDirectory& directory, const wxString& name);
+    static bool MayReplace(const PinnedDirectory& directory);
     /// Returns false if the system reports an error, which does not matter: all bytes have already
     /// been written.
     bool Close();
@@ -74,19 +98,17 @@ class RegularFile
     /// or the new one followed by line feeds, provided that the system does not interrupt a write.
     bool Rewrite(const std::string& before, const std::string& after, Wait wait = Wait::ForDisk);
 
+    /// Copies the content of the other file in pieces, after reserving space for it.
+    bool TakeContent(const RegularFile& source);
+    bool HasContentOf(const RegularFile& other) const;
+
     /// Copies what wxCopyFile copies in addition to the content. Windows: the attributes and the
     /// time of the last change. Elsewhere: the mode.
     void TakeAttributes(const RegularFile& source);
     /// Whether both have the same read-only, hidden and system attributes, or mode.
     bool HasAttributesOf(const RegularFile& source) const;
 
-    /// Has the library report, under that path, why the file could not be opened for update as
-    /// well.
-    void ReportNotReopened(const wxString& shownPath) const;
-
-    /// Has the library report that the file could not be written, under that path and with the
-    /// error of the call that failed.
-    void ReportNotWritten(const wxString& shownPath) const;
+    const FailedCall& GetFailure() const;
 
     /// Cuts the file, or extends it with zeros.
     bool SetLength(std::int64_t length);
@@ -96,23 +118,23 @@ class RegularFile
     bool Append(const std::string& bytes);
 
   private:
+    // In no directory, links are followed.
+    Status Open(const PinnedDirectory* directory, const wxString& path, bool forUpdate);
     bool Reserve(std::int64_t from, std::int64_t length);
-    bool Write(std::int64_t offset, const std::string& bytes);
     void WaitForDisk();
-    Status Open(const wxString& path, Links links, bool forUpdate);
-
-    Status m_status = Status::NotOpen;
+    // Until the count is reached or the file ends; less if a call fails.
+    size_t ReadAt(std::int64_t offset, char* bytes, size_t count) const;
+    bool Write(std::int64_t offset, const char* bytes, size_t count);
+    // The number of bytes that were read or written, at least one; 0 if there are none or the call
+    // fails.
+    size_t ReadSome(std::int64_t offset, char* bytes, size_t count) const;
+    size_t WriteSome(std::int64_t offset, const char* bytes, size_t count);
     wxString m_path;
-    unsigned long m_error = 0; // of the last failed reopening or write, as the system numbers it
+    mutable FailedCall m_failure;
 #ifdef _WIN32
     void* m_handle = nullptr;
 #else
     int m_descriptor = -1;
-    Links m_links = Links::Refuse;
+    bool m_followsLinks = false;
 #endif
 };
-
-/// Has the library report that the file could not be opened or read, with the system's last error:
-/// on Windows in a message box after the run.
-void ReportNotOpened(const wxString& path);
-void ReportNotRead(const wxString& path);

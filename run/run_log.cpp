@@ -1,8 +1,11 @@
 #include "run/run_log.h"
 
+#include "platform/library_log.h"
 #include "platform/regular_file.h"
 #include "platform/unicode_text.h"
 #include "run/run_log_place.h"
+
+#include <exception>
 
 bool RunLogEnabled = true;
 
@@ -16,20 +19,39 @@ std::string FormatLine(const wxString& message, int count)
     return ToOneLine(line).utf8_string() + "\r\n";
 }
 
-// The first line creates the file or empties it, including a byte-order mark.
-RegularFile::Status OpenLog(RegularFile& file, const PinnedDirectory& directory, bool isFirstLine)
+class LogFile
 {
-    const wxString path = directory.Reach(RunLogFileName);
-    const RegularFile::Status status = file.OpenForUpdate(path, Links::Refuse);
-    if (!isFirstLine)
+  public:
+    void Append(const std::string& line)
+    {
+        const PinnedDirectory directory(m_directory, Links::Refuse);
+        RegularFile file;
+        const RegularFile::Status status = Open(file, directory);
+        m_isFirstLine = false;
+        if ((status == RegularFile::Status::Open && file.Append(line)) ||
+            status == RegularFile::Status::NotThere || m_isReported)
+            return;
+        ReportError(file.GetFailure().Describe(m_directory + RunLogFileName));
+        m_isReported = true;
+    }
+
+  private:
+    // The first line creates the file or empties it, including a byte-order mark.
+    RegularFile::Status Open(RegularFile& file, const PinnedDirectory& directory) const
+    {
+        const RegularFile::Status status = file.OpenForUpdate(directory, RunLogFileName);
+        if (m_isFirstLine && status == RegularFile::Status::Open)
+            file.SetLength(0);
+        if (m_isFirstLine && status == RegularFile::Status::NotThere &&
+            file.CreateNew(directory, RunLogFileName) == RegularFile::Status::Open)
+            return RegularFile::Status::Open;
         return status;
-    if (status == RegularFile::Status::NotThere)
-        return file.CreateNew(path) == RegularFile::Status::Open ? RegularFile::Status::Open
-                                                                 : status;
-    if (status == RegularFile::Status::Open)
-        file.SetLength(0);
-    return status;
-}
+    }
+
+    const wxString m_directory = RunLogDirPath();
+    bool m_isFirstLine = true;
+    bool m_isReported = false; // once for a run
+};
 
 } // namespace
 
@@ -37,18 +59,14 @@ void RunLog(const wxString& message, int count)
 {
     if (!RunLogEnabled)
         return;
-    static const wxString directoryPath = RunLogDirPath();
-    static bool isFirstLine = true;
-    static bool isReported = false;
-    const PinnedDirectory directory(directoryPath, Links::Refuse);
-    RegularFile file;
-    const RegularFile::Status status = OpenLog(file, directory, isFirstLine);
-    isFirstLine = false;
-    if (status == RegularFile::Status::Open && file.Append(FormatLine(message, count)))
+    try
+    {
+        static LogFile log;
+        log.Append(FormatLine(message, count));
+    }
+    catch (const std::exception&)
+    {
+        // Without memory for it, the line is left out.
         return;
-    if (status == RegularFile::Status::Open && !isReported)
-        file.ReportNotWritten(directoryPath + RunLogFileName);
-    else if (status == RegularFile::Status::Refused && !isReported)
-        ReportNotOpened(directoryPath + RunLogFileName);
-    isReported = isReported || status != RegularFile::Status::NotThere;
+    }
 }

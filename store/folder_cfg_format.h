@@ -31,6 +31,11 @@ constexpr const wchar_t* Hotfolder = L"Hotfolder";
 
 constexpr const wchar_t* ShortName = L"ShortName";
 constexpr const wchar_t* DisplayName = L"DisplayName";
+constexpr const wchar_t* Path = L"path";
+constexpr const wchar_t* Key = L"Key";
+constexpr const wchar_t* Value = L"Value";
+constexpr const wchar_t* KeyDisplayValue = L"KeyDisplayValue";
+constexpr const wchar_t* LocDisplayValue = L"LocDisplayValue";
 
 /// The level of the filter setting in the document; the root has level 0.
 constexpr int FilterSettingLevel = 1;

@@ -2,7 +2,6 @@
 
 #include "store/folder_cfg_format.h"
 #include "store/root_attributes.h"
-#include "store/xml_file.h"
 #include "store/xml_lookup.h"
 #include "store/xml_tree.h"
 
@@ -77,20 +76,12 @@ void ReadPath(const wxXmlNode& section, const wchar_t* name, wxString& path)
 
 } // namespace
 
-int LoadHotFolderSettings(const wxString& path, HotFolderSettings& settings)
+int LoadHotFolderSettings(HotFolder& folder, HotFolderSettings& settings)
 {
-    XmlFile file;
-    if (file.Load(path, Links::Refuse, path) == XmlFile::State::Missing)
-        return 0;
-    return ReadHotFolderSettings(file.GetRoot(), settings);
-}
-
-int ReadFilterSetting(const wxString& path, wxXmlNode& node)
-{
-    XmlFile file;
-    file.Load(path, Links::Refuse, path);
-    ReadFilterSetting(file.GetRoot(), node);
-    return 0;
+    const XmlFile::State state = folder.LoadCfg();
+    folder.cfg.file.Close();
+    return state == XmlFile::State::Missing ? 0
+                                            : ReadHotFolderSettings(folder.cfg.Root(), settings);
 }
 
 int ReadHotFolderSettings(const wxXmlNode* root, HotFolderSettings& settings)
@@ -99,11 +90,11 @@ int ReadHotFolderSettings(const wxXmlNode* root, HotFolderSettings& settings)
         return -1;
     AttributeMap attributes;
     CollectAttributes(*root, attributes);
-    const RootAttribute* gap = ReadRootAttributes(attributes, settings);
+    const size_t read = ReadRootAttributes(attributes, settings);
     std::vector<InputFormat> formats;
     ReadInputFormats(root, formats);
     settings.InputFormatsSummary.swap(formats);
-    return gap && gap->chainPlace <= LastRequiredPlace ? -1 : 1;
+    return read < RequiredAttributes ? -1 : 1;
 }
 
 void ReadFilterSetting(const wxXmlNode* root, wxXmlNode& node)

@@ -1,32 +1,28 @@
 // Reading Folder.cfg, part by part. Nothing is thrown for bad content.
 #pragma once
 
+#include "store/hot_folder.h"
 #include "store/hot_folder_settings.h"
 
-#include <wx/string.h>
 #include <wx/xml/xml.h>
 
 #include <vector>
 
-/// Reads the root attributes and the input formats.
+/// Loads the hot folder's Folder.cfg, and reads the root attributes and the input formats.
 ///
 /// The attributes are read as a chain: from the first missing one on, all fields stay as they were
 /// (a missing server_version becomes -1 and does not end the chain). Returns 0 if there is no such
 /// file; -1 if it cannot be loaded, which leaves the record as it was, or if the chain ends before
 /// server_name; 1 otherwise.
-int LoadHotFolderSettings(const wxString& path, HotFolderSettings& settings);
-
-/// Copies the whole "FilterSetting" element. Without one, or if the file cannot be loaded, the node
-/// stays as it was. Always returns 0.
-int ReadFilterSetting(const wxString& path, wxXmlNode& node);
+int LoadHotFolderSettings(HotFolder& folder, HotFolderSettings& settings);
 
 /// The following functions take the root of a loaded document, or null. If a section is missing,
 /// the value stays as it was; entries with too few attributes are skipped.
 
 /// Like LoadHotFolderSettings; returns -1 without a root.
 int ReadHotFolderSettings(const wxXmlNode* root, HotFolderSettings& settings);
-/// Copies the whole "FilterSetting" element, as above. The document has to be loaded with
-/// wxXMLDOC_KEEP_WHITESPACE_NODES.
+/// Copies the whole "FilterSetting" element, without the indentation that saving adds. The document
+/// has to be loaded with wxXMLDOC_KEEP_WHITESPACE_NODES.
 void ReadFilterSetting(const wxXmlNode* root, wxXmlNode& node);
 /// Returns 1 if there is no root or no "Paths" element, 0 otherwise.
 int ReadPaths(const wxXmlNode* root, HotFolderPaths& paths);

@@ -1,29 +1,35 @@
 #include "store/folder_cfg_writer.h"
 
-#include "platform/regular_file.h"
 #include "store/folder_cfg_format.h"
 #include "store/root_attributes.h"
 #include "store/xml_tree.h"
 
 #include <wx/stream.h>
 
+#include <new>
 #include <utility>
 
 namespace
 {
 
 constexpr int IndentationStep = 2;
-// The library's memory stream copies all its bytes for every kilobyte that is added.
+// The library's memory stream copies all its bytes for every kilobyte that is added. This one
+// refuses more than can be read again.
 class StringOutputStream : public wxOutputStream
 {
   public:
     std::string bytes;
+    bool isFull = false;
 
   protected:
     size_t OnSysWrite(const void* data, size_t size) override
     {
-        bytes.append(static_cast<const char*>(data), size);
-        return size;
+        isFull = bytes.size() + size > FolderCfgLimits.bytes;
+        if (isFull)
+            m_lasterror = wxSTREAM_WRITE_ERROR;
+        else
+            bytes.append(static_cast<const char*>(data), size);
+        return isFull ? 0 : size;
     }
 };
 
@@ -61,10 +67,10 @@ class Section
 struct KeyValueNames
 {
     wxString element = L"KEYVALUE";
-    wxString key = L"Key";
-    wxString value = L"Value";
-    wxString keyDisplayValue = L"KeyDisplayValue";
-    wxString locDisplayValue = L"LocDisplayValue";
+    wxString key = FolderCfg::Key;
+    wxString value = FolderCfg::Value;
+    wxString keyDisplayValue = FolderCfg::KeyDisplayValue;
+    wxString locDisplayValue = FolderCfg::LocDisplayValue;
 };
 
 void WriteFilterSetting(wxXmlNode& root, wxXmlNode& filterSetting)
@@ -96,10 +102,10 @@ void WritePaths(wxXmlNode* root, const HotFolderPaths& paths)
     if (!root)
         return;
     Section section(*root, FolderCfg::PathsSection);
-    section.Add(FolderCfg::Failfolder).AddAttribute(L"path", paths.Failfolder);
-    section.Add(FolderCfg::Workfolder).AddAttribute(L"path", paths.Workfolder);
-    section.Add(FolderCfg::Movefolder).AddAttribute(L"path", paths.Movefolder);
-    section.Add(FolderCfg::Hotfolder).AddAttribute(L"path", paths.Hotfolder);
+    section.Add(FolderCfg::Failfolder).AddAttribute(FolderCfg::Path, paths.Failfolder);
+    section.Add(FolderCfg::Workfolder).AddAttribute(FolderCfg::Path, paths.Workfolder);
+    section.Add(FolderCfg::Movefolder).AddAttribute(FolderCfg::Path, paths.Movefolder);
+    section.Add(FolderCfg::Hotfolder).AddAttribute(FolderCfg::Path, paths.Hotfolder);
 }
 
 void WriteJobSettings(wxXmlNode* root, const JobSettingTable& table)
@@ -141,8 +147,8 @@ void WritePreflightSettings(wxXmlNode* root, const PreflightSettingList& list)
     for (const PreflightSetting& setting : list)
     {
         wxXmlNode& child = section.Add(L"Preflight");
-        child.AddAttribute(L"Key", setting.Key);
-        child.AddAttribute(L"Value", setting.Value);
+        child.AddAttribute(FolderCfg::Key, setting.Key);
+        child.AddAttribute(FolderCfg::Value, setting.Value);
     }
 }
 
@@ -154,8 +160,8 @@ std::string FolderCfgBytes(const HotFolderSettings& settings, const JobSettingTa
     wxXmlDocument document;
     auto* root = new wxXmlNode(wxXML_ELEMENT_NODE, FolderCfg::Root);
     document.SetRoot(root); // from here on owned by the document
-    for (const RootAttribute& attribute : RootAttributes())
-        root->AddAttribute(attribute.name, attribute.Format(settings));
+    for (const RootAttribute* attribute : WrittenRootAttributes())
+        root->AddAttribute(attribute->name, attribute->Format(settings));
     WriteInputFormats(root, settings.InputFormatsSummary);
     WritePaths(root, paths);
     WriteJobSettings(root, jobSettings);
@@ -163,28 +169,16 @@ std::string FolderCfgBytes(const HotFolderSettings& settings, const JobSettingTa
     WriteFilterSetting(*root, filterSetting);
     WritePreflightSettings(root, preflightSettings);
     StringOutputStream stream;
-    document.Save(stream, IndentationStep);
-    return std::move(stream.bytes);
+    if (!document.Save(stream, IndentationStep) && !stream.isFull)
+        throw std::bad_alloc(); // the only other reason
+    const bool isReadable =
+        !stream.isFull &&
+        (IsHarmlessXml(stream.bytes) || LookAtXml(stream.bytes, FolderCfgLimits).isWithinLimits);
+    return isReadable ? std::move(stream.bytes) : std::string();
 }
 
-int SaveHotFolderSettings(const wxString& path, const HotFolderSettings& settings,
-                          const JobSettingTable& jobSettings, const HotFolderPaths& paths,
-                          const wxXmlNode& filterSetting, const ImposeSettingTable& imposeSettings,
-                          const PreflightSettingList& preflightSettings)
+XmlFile::Saved SaveHotFolderSettings(HotFolder& folder, const std::string& content)
 {
     const wxCriticalSectionLocker lock(FolderCfgLock);
-    wxXmlNode filterCopy;
-    CopyTree(filterSetting, filterCopy);
-    const std::string bytes =
-        FolderCfgBytes(settings, jobSettings, paths, filterCopy, imposeSettings, preflightSettings);
-    RegularFile file;
-    RegularFile::Status status = file.OpenForUpdate(path, Links::Refuse);
-    if (status == RegularFile::Status::NotThere)
-        status = file.CreateNew(path);
-    std::string before;
-    if (status != RegularFile::Status::Open || !file.Read(before))
-        ReportNotOpened(path);
-    else if (!file.Rewrite(before, bytes))
-        file.ReportNotWritten(path);
-    return 0;
+    return folder.cfg.Save(content);
 }

@@ -1,33 +1,25 @@
 // Writing Folder.cfg.
 #pragma once
 
+#include "store/hot_folder.h"
 #include "store/hot_folder_settings.h"
 
-#include <wx/string.h>
 #include <wx/xml/xml.h>
 
 #include <string>
 #include <vector>
 
 /// The content of a Folder.cfg with the six values, and nothing else. A filter setting whose name
-/// is not "FilterSetting" is left out. It must not be deeper than MaxFilterLevels. It is moved
-/// from, and empty afterwards.
+/// is not "FilterSetting" is left out. It is moved from, and empty afterwards. Empty if the content
+/// would exceed FolderCfgLimits, and so could not be read again.
 std::string FolderCfgBytes(const HotFolderSettings& settings, const JobSettingTable& jobSettings,
                            const HotFolderPaths& paths, wxXmlNode& filterSetting,
                            const ImposeSettingTable& imposeSettings,
                            const PreflightSettingList& preflightSettings);
 
-/// Writes that content to the file, as RegularFile::Rewrite does; creates the file if it does not
-/// exist. If it cannot be opened or written, it stays as it was. Holds FolderCfgLock throughout.
-/// Always returns 0; the library reports an error if the file cannot be opened or written.
-int SaveHotFolderSettings(const wxString& path, const HotFolderSettings& settings,
-                          const JobSettingTable& jobSettings, const HotFolderPaths& paths,
-                          const wxXmlNode& filterSetting, const ImposeSettingTable& imposeSettings,
-                          const PreflightSettingList& preflightSettings);
-
-/// How many levels below a filter setting can be saved: wxXmlDocument::Save recurses, and the time
-/// and size of the indentation grow with the square of the depth.
-constexpr int MaxFilterLevels = 1024;
+/// Makes that content the hot folder's Folder.cfg, if it still has the loaded content. Holds
+/// FolderCfgLock throughout.
+XmlFile::Saved SaveHotFolderSettings(HotFolder& folder, const std::string& content);
 
 /// The section writers append one element to the root of a document under construction, or do
 /// nothing if there is no root.

@@ -15,7 +15,13 @@ wxString FolderCfgPath(const wxString& hotFolder)
     return PrivateDirPath(hotFolder) + FolderCfgName;
 }
 
-PinnedHotFolder::PinnedHotFolder(const wxString& path)
-    : directory(path, Links::Follow), privateDir(directory.Reach(PrivateDirName), Links::Refuse)
+HotFolder::HotFolder(const wxString& listedPath)
+    : path(listedPath), directory(path, Links::Follow),
+      privateDir(directory.Reach(PrivateDirName), Links::Refuse)
 {
+}
+
+XmlFile::State HotFolder::LoadCfg()
+{
+    return cfg.Load(cfg.file.OpenForReading(privateDir, FolderCfgName));
 }

@@ -2,6 +2,7 @@
 #pragma once
 
 #include "platform/pinned_directory.h"
+#include "store/xml_file.h"
 
 #include <wx/string.h>
 
@@ -16,12 +17,18 @@ wxString PrivateDirPath(const wxString& hotFolder);
 /// The path of the hot folder's Folder.cfg, in its private directory.
 wxString FolderCfgPath(const wxString& hotFolder);
 
-/// A hot folder and its private directory, which cannot be replaced while a step works in them. The
-/// hot folder may be reached over links; a private directory that is a link counts as missing.
-struct PinnedHotFolder
+/// A hot folder, which cannot be replaced while the steps of a run work in it. It may be reached
+/// over links; a private directory that is a link counts as missing.
+struct HotFolder
 {
-    explicit PinnedHotFolder(const wxString& path);
+    explicit HotFolder(const wxString& listedPath);
 
+    /// Opens Folder.cfg by its name and loads it: the client may have replaced it since the last
+    /// time.
+    XmlFile::State LoadCfg();
+
+    const wxString path; // as it is listed; for messages and the shell
     const PinnedDirectory directory;
     const PinnedDirectory privateDir;
+    XmlFile cfg{FolderCfgLimits};
 };

@@ -1,5 +1,6 @@
 #include "store/hot_folder_list.h"
 
+#include "platform/library_log.h"
 #include "platform/standard_folders.h"
 #include "store/xml_lookup.h"
 
@@ -68,13 +69,16 @@ wxString GetHotFolderDataDir()
 HotFolderList LoadHotFolderList()
 {
     HotFolderList list;
-    XmlFile file;
+    XmlFile file(ListLimits);
     const wxString path = GetHotFolderListPath();
-    list.state = file.Load(path, Links::Follow, path);
+    list.state = file.Load(file.file.OpenForReading(path));
+    list.error = file.error;
+    if (list.state == XmlFile::State::NotReadable)
+        list.whyNotReadable = file.WhyNotReadable(path);
     if (list.state != XmlFile::State::Loaded)
         return list;
     PathSet known;
-    const wxXmlNode* element = FirstNamed(file.GetRoot()->GetChildren(), FolderElement);
+    const wxXmlNode* element = FirstNamed(file.Root()->GetChildren(), FolderElement);
     for (; element; element = FirstNamed(element->GetNext(), FolderElement))
     {
         const wxString folder = ReadPath(*element);
@@ -92,8 +96,11 @@ HotFolderList LoadHotFolderList()
 
 void ReadHotFolderList(wxArrayString& folders)
 {
+    const HotFolderList list = LoadHotFolderList();
+    if (!list.whyNotReadable.empty())
+        ReportError(list.whyNotReadable);
     PathSet known(folders.begin(), folders.end());
-    for (const wxString& folder : LoadHotFolderList().folders)
+    for (const wxString& folder : list.folders)
     {
         if (known.insert(folder).second)
             folders.Add(folder);

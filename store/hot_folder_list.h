@@ -17,6 +17,8 @@ wxString GetHotFolderDataDir();
 struct HotFolderList
 {
     XmlFile::State state = XmlFile::State::Missing;
+    wxString whyNotReadable; // in the library's words
+    XmlSyntaxError error;
     /// The folders that exist, in the order and spelling of the file, without trailing white space;
     /// of paths that are equal ignoring case, only the first.
     wxArrayString folders;
@@ -24,9 +26,8 @@ struct HotFolderList
     wxArrayString repeated; // equal to an earlier one, ignoring case
 };
 
-/// The library reports an error if the list cannot be opened or parsed.
 HotFolderList LoadHotFolderList();
 
 /// Appends the folders of the list, except those that are already in the array, ignoring case. A
-/// list that is missing or cannot be read adds nothing.
+/// list that is missing or cannot be read adds nothing; the library reports why it cannot be read.
 void ReadHotFolderList(wxArrayString& folders);

@@ -1,6 +1,5 @@
 #include "store/root_attributes.h"
 
-#include <algorithm>
 #include <limits>
 
 namespace
@@ -21,48 +20,49 @@ bool ReadFlag(const wxString& text, AttributeForm form)
     return form == AttributeForm::TextFlag ? wxString(text).Trim() == L"1" : ReadNumber(text) != 0;
 }
 
-std::vector<const RootAttribute*> InChainOrder()
-{
-    std::vector<const RootAttribute*> chain;
-    for (const RootAttribute& attribute : RootAttributes())
-        chain.push_back(&attribute);
-    std::sort(chain.begin(), chain.end(),
-              [](const RootAttribute* left, const RootAttribute* right)
-              { return left->chainPlace < right->chainPlace; });
-    return chain;
-}
-
 } // namespace
 
 const std::vector<RootAttribute>& RootAttributes()
 {
     using S = HotFolderSettings;
     using F = AttributeForm;
+    constexpr bool Required = false;
+    constexpr bool Optional = true;
     static const std::vector<RootAttribute> attributes = {
-        {L"name", F::Text, &S::name, 1},
-        {L"description", F::Text, &S::description, 2},
-        {L"server_ip", F::Text, &S::server_ip, 3},
-        {L"server_name", F::Text, &S::server_name, LastRequiredPlace},
-        {L"server_version", F::Number, &S::server_version, 16},
-        {L"server_textversion", F::Text, &S::server_textversion, 17},
-        {L"server_type", F::Text, &S::server_type, 18},
-        {L"BaseVirtualPrinter", F::Text, &S::BaseVirtualPrinter, 6},
-        {L"BaseVirtualPrinterName", F::Text, &S::BaseVirtualPrinterName, 7},
-        {L"BaseVirtualPrinterDisplayName", F::Text, &S::BaseVirtualPrinterDisplayName, 8},
-        {L"HFPresetName", F::Text, &S::HFPresetName, 9},
-        {L"PPDVersion", F::Text, &S::PPDVersion, 14},
-        {L"ServerTypeAndJPDefaultKeyInfo", F::Text, &S::ServerTypeAndJPDefaultKeyInfo, 15},
-        {L"Quickset_Supported", F::NumericFlag, &S::Quickset_Supported, 20},
-        {L"Quickset_Enabled", F::NumericFlag, &S::Quickset_Enabled, 21},
-        {L"Quickset", F::Text, &S::Quickset, 19},
-        {L"IsWidthBased", F::NumericFlag, &S::IsWidthBased, 22},
-        {L"Enable", F::TextFlag, &S::Enable, EnablePlace},
-        {L"Centralized", F::TextFlag, &S::Centralized, 10},
-        {L"Isjobpresetattached", F::TextFlag, &S::Isjobpresetattached, 11},
-        {L"IsCustomInterval", F::TextFlag, &S::IsCustomInterval, 12},
-        {L"TimeInterval", F::Text, &S::TimeInterval, 13},
+        {L"name", F::Text, &S::name, Required, 1},
+        {L"description", F::Text, &S::description, Required, 2},
+        {L"server_ip", F::Text, &S::server_ip, Required, 3},
+        {L"server_name", F::Text, &S::server_name, Required, 4},
+        {L"Enable", F::TextFlag, &S::Enable, Required, 18},
+        {L"BaseVirtualPrinter", F::Text, &S::BaseVirtualPrinter, Required, 8},
+        {L"BaseVirtualPrinterName", F::Text, &S::BaseVirtualPrinterName, Required, 9},
+        {L"BaseVirtualPrinterDisplayName", F::Text, &S::BaseVirtualPrinterDisplayName, Required,
+         10},
+        {L"HFPresetName", F::Text, &S::HFPresetName, Required, 11},
+        {L"Centralized", F::TextFlag, &S::Centralized, Required, 19},
+        {L"Isjobpresetattached", F::TextFlag, &S::Isjobpresetattached, Required, 20},
+        {L"IsCustomInterval", F::TextFlag, &S::IsCustomInterval, Required, 21},
+        {L"TimeInterval", F::Text, &S::TimeInterval, Required, 22},
+        {L"PPDVersion", F::Text, &S::PPDVersion, Required, 12},
+        {L"ServerTypeAndJPDefaultKeyInfo", F::Text, &S::ServerTypeAndJPDefaultKeyInfo, Required,
+         13},
+        {L"server_version", F::Number, &S::server_version, Optional, 5},
+        {L"server_textversion", F::Text, &S::server_textversion, Required, 6},
+        {L"server_type", F::Text, &S::server_type, Required, 7},
+        {L"Quickset", F::Text, &S::Quickset, Required, 16},
+        {L"Quickset_Supported", F::NumericFlag, &S::Quickset_Supported, Required, 14},
+        {L"Quickset_Enabled", F::NumericFlag, &S::Quickset_Enabled, Required, 15},
+        {L"IsWidthBased", F::NumericFlag, &S::IsWidthBased, Required, 17},
     };
     return attributes;
+}
+
+std::vector<const RootAttribute*> WrittenRootAttributes()
+{
+    std::vector<const RootAttribute*> written(RootAttributes().size());
+    for (const RootAttribute& attribute : RootAttributes())
+        written[static_cast<size_t>(attribute.writtenPlace) - 1] = &attribute;
+    return written;
 }
 
 void RootAttribute::Read(const wxString& text, HotFolderSettings& settings) const
@@ -84,18 +84,16 @@ wxString RootAttribute::Format(const HotFolderSettings& settings) const
     return settings.*std::get<bool HotFolderSettings::*>(field) ? L"1" : L"0";
 }
 
-const RootAttribute* ReadRootAttributes(const AttributeMap& attributes, HotFolderSettings& settings)
+size_t ReadRootAttributes(const AttributeMap& attributes, HotFolderSettings& settings)
 {
-    static const std::vector<const RootAttribute*> chain = InChainOrder();
-    for (const RootAttribute* attribute : chain)
+    size_t read = 0;
+    for (const RootAttribute& attribute : RootAttributes())
     {
-        const auto found = attributes.find(attribute->name);
-        if (found != attributes.end())
-            attribute->Read(found->second, settings);
-        else if (attribute->form == AttributeForm::Number)
-            attribute->Read(L"-1", settings);
-        else
-            return attribute;
+        const auto found = attributes.find(attribute.name);
+        if (found == attributes.end() && !attribute.isOptional)
+            break;
+        attribute.Read(found == attributes.end() ? wxString(L"-1") : found->second, settings);
+        ++read;
     }
-    return nullptr;
+    return read;
 }

@@ -26,24 +26,22 @@ struct RootAttribute
     const wchar_t* name;
     AttributeForm form;
     Field field;
-    int chainPlace; // its place in the chain in which the attributes are read, from 1
+    bool isOptional; // missing, it becomes -1 and does not end the chain of those that are read
+    int writtenPlace;
 
     void Read(const wxString& text, HotFolderSettings& settings) const;
     wxString Format(const HotFolderSettings& settings) const;
 };
 
-/// All of them, in the order in which they are written.
+/// All of them, in the order in which they are read.
 const std::vector<RootAttribute>& RootAttributes();
 
-/// Reads the attributes as a chain, in the order of their places, up to the first that is missing:
-/// from there on all fields stay as they were. A missing server_version becomes -1 and does not end
-/// the chain. Returns the attribute at which the chain ended, or null.
-const RootAttribute* ReadRootAttributes(const AttributeMap& attributes,
-                                        HotFolderSettings& settings);
+/// The same, in the order in which they are written.
+std::vector<const RootAttribute*> WrittenRootAttributes();
 
-/// The place of "server_name", the last required attribute: without it, a Folder.cfg counts as not
-/// read.
-constexpr int LastRequiredPlace = 4;
+/// Reads the attributes as a chain, up to the first that is missing and not optional: from there on
+/// all fields stay as they were. Returns how many attributes of the table come before it.
+size_t ReadRootAttributes(const AttributeMap& attributes, HotFolderSettings& settings);
 
-/// The place of "Enable".
-constexpr int EnablePlace = 5;
+/// Up to "server_name": without them, a Folder.cfg counts as not read.
+constexpr size_t RequiredAttributes = 4;

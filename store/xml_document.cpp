@@ -1,14 +1,22 @@
 #include "store/xml_document.h"
 
-#include "store/xml_limits.h"
+#include "platform/memory.h"
 
+#include <wx/log.h>
 #include <wx/mstream.h>
 
-XmlLoad LoadXml(const std::string& bytes, wxXmlDocument& document, int flags)
+XmlLoad LoadXml(const std::string& bytes, const XmlLimits& limits, wxXmlDocument& document)
 {
-    if (!IsWithinXmlLimits(bytes))
-        return XmlLoad::TooLarge;
+    const bool isHarmless = IsHarmlessXml(bytes);
+    XmlLook look{true, HarmlessMemory, {}};
+    if (!isHarmless)
+        look = LookAtXml(bytes, limits);
+    if (!look.isWithinLimits)
+        return {XmlLoad::State::TooLarge, {}};
+    RequireMemory(look.memory * limits.copies);
+    const wxLogNull noSyntaxErrors;
     wxMemoryInputStream stream(bytes.data(), bytes.size());
-    return document.Load(stream, L"UTF-8", flags) && document.GetRoot() ? XmlLoad::Loaded
-                                                                        : XmlLoad::Malformed;
+    if (document.Load(stream, L"UTF-8", wxXMLDOC_KEEP_WHITESPACE_NODES) && document.GetRoot())
+        return {};
+    return {XmlLoad::State::Malformed, isHarmless ? LookAtXml(bytes, limits).error : look.error};
 }

@@ -1,88 +1,65 @@
 #include "store/xml_file.h"
 
-#include "store/xml_document.h"
-#include "store/xml_limits.h"
+#include "store/xml_encoding.h"
 
-#include <cstdint>
-
-XmlFile::State XmlFile::Load(const wxString& path, Links links, const wxString& shownPath)
+XmlFile::XmlFile(const XmlLimits& itsLimits) : limits(itsLimits)
 {
-    m_shownPath = shownPath;
-    const RegularFile::Status status = m_file.OpenForReading(path, links);
-    if (status == RegularFile::Status::Refused)
-        ReportNotOpened(shownPath);
-    if (status != RegularFile::Status::Open)
-        return status == RegularFile::Status::Refused ? State::NotReadable : State::Missing;
-    if (m_file.Length() > static_cast<std::int64_t>(MaxXmlBytes))
-        return State::TooLarge;
-    if (m_file.Read(m_bytes))
-        return Parse();
-    ReportNotRead(shownPath);
-    return State::NotReadable;
 }
 
-// Both steps of a hot folder read the same Folder.cfg one after another, and most of their time
-// is the parser's. So the last document is kept, together with its bytes: the same bytes make the
-// same document. A large one is not kept, since it would take memory while another is loaded.
-XmlFile::State XmlFile::Parse()
+// Most of the time of a run is the parser's, and the steps of a hot folder read the same file one
+// after another. The same bytes make the same document.
+XmlFile::State XmlFile::Load(RegularFile::Status opened)
 {
-    constexpr size_t LongestKept = size_t{64} * 1024;
-    static std::string lastBytes;
-    static std::shared_ptr<const wxXmlDocument> lastDocument;
-    if (lastDocument && m_bytes == lastBytes)
-    {
-        m_document = lastDocument;
-        return State::Loaded;
-    }
-    m_document = nullptr;
-    lastDocument = nullptr;
-    auto document = std::make_shared<wxXmlDocument>();
-    const XmlLoad result = LoadXml(m_bytes, *document, wxXMLDOC_KEEP_WHITESPACE_NODES);
-    if (result != XmlLoad::Loaded)
-        return result == XmlLoad::TooLarge ? State::TooLarge : State::NotReadable;
-    m_document = document;
-    if (m_bytes.size() <= LongestKept)
-    {
-        lastBytes = m_bytes;
-        lastDocument = m_document;
-    }
-    return State::Loaded;
+    const std::string bytesBefore = std::move(bytes);
+    bytes.clear();
+    state = State::Loaded;
+    if (opened != RegularFile::Status::Open)
+        state = opened == RegularFile::Status::Refused ? State::NotReadable : State::Missing;
+    else if (file.Length() > Longest())
+        state = State::TooLarge;
+    else if (!file.Read(bytes))
+        state = State::NotReadable;
+    if (state == State::Loaded && document && bytes == bytesBefore)
+        return state;
+    document = nullptr;
+    error = {};
+    if (state != State::Loaded)
+        return state;
+    auto parsed = std::make_unique<wxXmlDocument>();
+    const XmlLoad load = LoadXml(bytes, limits, *parsed);
+    error = load.error;
+    if (load.state != XmlLoad::State::Loaded)
+        return state =
+                   load.state == XmlLoad::State::TooLarge ? State::TooLarge : State::NotReadable;
+    isFaithful = IsReadFaithfully(bytes);
+    document = std::move(parsed);
+    return state;
 }
 
-RegularFile::Status XmlFile::ReopenForUpdate()
+XmlFile::Saved XmlFile::Save(const std::string& newBytes)
 {
-    const RegularFile::Status status = m_file.ReopenForUpdate();
-    if (status == RegularFile::Status::Refused)
-        m_file.ReportNotReopened(m_shownPath);
-    return status;
-}
-
-bool XmlFile::LoadAgain()
-{
+    const RegularFile::Status reopened = file.ReopenForUpdate();
+    if (reopened == RegularFile::Status::Refused)
+        return Saved::Refused;
     std::string now;
-    if (m_file.Length() > static_cast<std::int64_t>(MaxXmlBytes) || !m_file.Read(now))
-        return false;
-    m_bytes.swap(now);
-    return Parse() == State::Loaded;
+    if (reopened != RegularFile::Status::Open || !file.Read(now, Longest()))
+        return Saved::NotReadAgain;
+    if (now != bytes)
+        return Saved::Changed;
+    return file.Rewrite(bytes, newBytes) ? Saved::Done : Saved::Refused;
 }
 
-void XmlFile::Rewrite(const std::string& bytes)
+std::int64_t XmlFile::Longest() const
 {
-    if (!m_file.Rewrite(m_bytes, bytes))
-        m_file.ReportNotWritten(m_shownPath);
+    return static_cast<std::int64_t>(limits.bytes);
 }
 
-const wxXmlNode* XmlFile::GetRoot() const
+wxString XmlFile::WhyNotReadable(const wxString& shownPath) const
 {
-    return m_document ? m_document->GetRoot() : nullptr;
+    return error.message.empty() ? file.GetFailure().Describe(shownPath) : error.Describe();
 }
 
-const wxXmlDocument& XmlFile::GetDocument() const
+const wxXmlNode* XmlFile::Root() const
 {
-    return *m_document;
-}
-
-const std::string& XmlFile::GetBytes() const
-{
-    return m_bytes;
+    return document ? document->GetRoot() : nullptr;
 }

@@ -1,51 +1,57 @@
-// An XML file that is opened and parsed once, and perhaps reopened and rewritten.
+// An XML file that is read and parsed, and perhaps rewritten.
 #pragma once
 
 #include "platform/regular_file.h"
+#include "store/xml_document.h"
 
 #include <wx/string.h>
-#include <wx/xml/xml.h>
 
 #include <memory>
 #include <string>
 
-class XmlFile
+struct XmlFile
 {
-  public:
     enum class State
     {
         Missing,     // no regular file of that name, or a refused link
-        NotReadable, // refused or malformed; the library has reported the reason
+        NotReadable, // refused by the system, or malformed; see WhyNotReadable
         TooLarge,    // see store/xml_limits.h
         Loaded
     };
 
-    /// Opens the file for reading and parses it. The second path is for messages.
-    State Load(const wxString& path, Links links, const wxString& shownPath);
+    enum class Saved
+    {
+        Done,
+        Refused,      // the file cannot be opened for writing, or not be written; it knows why
+        NotReadAgain, // it is gone, or cannot be read
+        Changed       // its bytes are no longer those that were loaded
+    };
 
-    /// Also opens the same file for writing. If that is refused, has the library report it.
-    RegularFile::Status ReopenForUpdate();
+    explicit XmlFile(const XmlLimits& itsLimits);
 
-    /// Reads the file again, and parses it again unless an unchanged document was kept; returns
-    /// false if that fails.
-    bool LoadAgain();
+    /// Reads a file that was just opened. Parses it unless its bytes are those of the document that
+    /// is already here.
+    State Load(RegularFile::Status opened);
 
-    /// Makes these bytes the whole content, as RegularFile::Rewrite does; the library reports a
-    /// failure.
-    void Rewrite(const std::string& bytes);
+    /// Makes these bytes the whole content, as RegularFile::Rewrite does, if the content is still
+    /// what was loaded.
+    Saved Save(const std::string& newBytes);
 
-    /// The root of the loaded document; it includes the text nodes that are only white space.
-    const wxXmlNode* GetRoot() const;
-    /// Of a loaded file only.
-    const wxXmlDocument& GetDocument() const;
-    /// The content as it was loaded.
-    const std::string& GetBytes() const;
+    /// The library's words for the call that failed or for the syntax error.
+    wxString WhyNotReadable(const wxString& shownPath) const;
+
+    /// The root of the loaded document, or null; it includes the text nodes that are only white
+    /// space.
+    const wxXmlNode* Root() const;
+
+    const XmlLimits& limits;
+    RegularFile file;
+    State state = State::Missing;
+    std::string bytes; // as they were loaded
+    std::unique_ptr<const wxXmlDocument> document;
+    bool isFaithful = false; // whether the document is what its author meant: IsReadFaithfully
+    XmlSyntaxError error;
 
   private:
-    State Parse();
-
-    RegularFile m_file;
-    wxString m_shownPath;
-    std::string m_bytes;
-    std::shared_ptr<const wxXmlDocument> m_document;
+    std::int64_t Longest() const;
 };

@@ -2,6 +2,8 @@
 
 #include "store/xml_encoding.h"
 
+#include <wx/intl.h>
+
 #include <algorithm>
 #include <cstdint>
 #include <cstring>
@@ -11,50 +13,52 @@
 namespace
 {
 
-// Without a document type, no document up to this length can do harm: 16,384 bytes can hold no more
-// than 5,500 levels or elements, 4,100 attributes or 16,384 pieces of a text. With one, 12 KB are
-// enough for entities and defaults that expand to gigabytes.
-constexpr size_t HarmlessBytes = size_t{16} * 1024;
+// Levels of elements. The library saves and destroys a document by recursion: 5,000 levels fit on
+// the stack of 1 MiB that Windows gives a program.
+constexpr int MaxDepth = 2048;
 
-// Levels of elements. The library destroys a document by recursion: 500,000 levels fit on our stack
-// of 64 MiB, 1,000,000 do not.
-constexpr int MaxDepth = 250000;
-
-// Bytes of memory, counted for the document itself and for each node, attribute and character as
-// the library keeps them on a 64-bit system with wide characters of four bytes. 100,000 job
-// settings take about 120 million.
-constexpr std::uint64_t MaxMemory = 208 * std::uint64_t{1000} * 1000;
-constexpr std::uint64_t NodeMemory = 208;
-constexpr std::uint64_t AttributeMemory = 176;
-constexpr std::uint64_t CharacterMemory = 4;
-
-// Characters that the library copies because it appends every piece of a text to a copy of all
-// earlier ones. A piece ends at each line end, at each escaped character and at each border of the
-// buffer below.
-constexpr std::uint64_t MaxCopiedCharacters = 1000 * std::uint64_t{1000} * 1000;
-
-// Attributes that the library steps past to find the last one each time it adds another; and, at
-// each element, the attributes that the document type declares.
-constexpr std::uint64_t MaxAttributeSteps = 100 * std::uint64_t{1000} * 1000;
-
-// Bytes that the parser reads again: it is given the document in pieces of this size, and with each
-// piece it starts an incomplete tag, comment or instruction over.
-constexpr std::uint64_t LibraryBuffer = 1024;
-constexpr std::uint64_t MaxBytesReadAgain = 1000 * std::uint64_t{1000} * 1000;
+// Characters of a text or value, with its entities expanded; 30 times the longest path.
+constexpr size_t LongestValue = 1'000'000;
 
 // Bytes of a document type. The parser compares each default with all others of the same element.
 constexpr std::uint64_t MaxDocumentType = 16 * std::uint64_t{1024};
 
+// A level needs 7 bytes. Without a document type, so many bytes can also hold no more than 3,600
+// attributes, or 14,336 pieces of a text.
+constexpr size_t HarmlessBytes = size_t{7} * MaxDepth;
+
+// Bytes of memory for each node, attribute and character, as the library keeps them on a 64-bit
+// system with wide characters of four bytes.
+constexpr std::uint64_t NodeMemory = 208;
+constexpr std::uint64_t AttributeMemory = 176;
+constexpr std::uint64_t CharacterMemory = 4;
+
+// The parser is given the document in pieces of this many bytes. With each piece it starts an
+// incomplete tag, comment or instruction over.
+constexpr std::uint64_t LibraryBuffer = 1024;
+
+// Counts what the library will do. A step is
+// - a character that it copies: it appends every piece of a text to a copy of all earlier ones, and
+//   a piece ends at each line end, at each escaped character and at each border of its buffer
+// - half an attribute that it passes to find the last one, each time it adds another; or, at each
+//   element, an attribute that the document type declares
+// - a byte that the parser reads again.
 class Look
 {
   public:
-    Look(XML_Parser parser, size_t length) : m_parser(parser), m_memory(length)
+    Look(XML_Parser parser, size_t length, const XmlLimits& limits)
+        : m_parser(parser), m_limits(limits), m_memory(length)
     {
     }
 
     bool IsWithinLimits() const
     {
         return m_isWithinLimits;
+    }
+
+    std::uint64_t Memory() const
+    {
+        return m_memory;
     }
 
     void BeginElement(const char* name, const char** attributes)
@@ -65,11 +69,12 @@ class Look
         for (const char** each = attributes; *each; each += 2)
         {
             ++count;
-            m_memory +=
-                AttributeMemory + CharacterMemory * (std::strlen(each[0]) + std::strlen(each[1]));
+            const size_t length = std::strlen(each[1]);
+            m_isWithinLimits = m_isWithinLimits && length <= LongestValue;
+            m_memory += AttributeMemory + CharacterMemory * (std::strlen(each[0]) + length);
         }
         m_memory += NodeMemory + CharacterMemory * std::strlen(name);
-        m_attributeSteps += count * count / 2 + m_declaredAttributes;
+        m_steps += count * count + m_declaredAttributes;
         ++m_depth;
         Judge();
     }
@@ -90,7 +95,8 @@ class Look
         m_memory += CharacterMemory * static_cast<std::uint64_t>(length) +
                     (m_textLength == 0 ? NodeMemory : 0);
         m_textLength += static_cast<std::uint64_t>(length);
-        m_copiedCharacters += pieces * m_textLength;
+        m_isWithinLimits = m_isWithinLimits && m_textLength <= LongestValue;
+        m_steps += pieces * m_textLength;
         Judge();
     }
 
@@ -160,30 +166,27 @@ class Look
     void TakeToken(std::uint64_t end)
     {
         const std::uint64_t length = end > m_lastEnd ? end - m_lastEnd : 0;
-        m_bytesReadAgain += length * length / (2 * LibraryBuffer);
+        m_steps += length * length / (2 * LibraryBuffer);
         m_lastEnd = std::max(end, m_lastEnd);
     }
 
     void Judge()
     {
-        m_isWithinLimits = m_isWithinLimits && m_depth <= MaxDepth && m_memory <= MaxMemory &&
-                           m_copiedCharacters <= MaxCopiedCharacters &&
-                           m_attributeSteps <= MaxAttributeSteps &&
-                           m_bytesReadAgain <= MaxBytesReadAgain;
+        m_isWithinLimits = m_isWithinLimits && m_depth <= MaxDepth && m_memory <= m_limits.memory &&
+                           m_steps <= m_limits.steps;
         if (!m_isWithinLimits)
             XML_StopParser(m_parser, XML_FALSE);
     }
 
     const XML_Parser m_parser;
+    const XmlLimits& m_limits;
     bool m_isWithinLimits = true;
     bool m_isInDocumentType = false;
     int m_depth = 0;
     std::uint64_t m_memory;
     std::uint64_t m_textLength = 0;
-    std::uint64_t m_copiedCharacters = 0;
-    std::uint64_t m_attributeSteps = 0;
+    std::uint64_t m_steps = 0;
     std::uint64_t m_declaredAttributes = 0;
-    std::uint64_t m_bytesReadAgain = 0;
     std::uint64_t m_documentType = 0;
     std::uint64_t m_lastEnd = 0;
 };
@@ -227,21 +230,34 @@ void SetHandlers(XML_Parser parser, Look& look)
 
 } // namespace
 
-bool IsWithinXmlLimits(const std::string& bytes)
+wxString XmlSyntaxError::Describe() const
 {
-    // UTF-16, in which a document type would look different, has NULs.
-    if (bytes.size() <= HarmlessBytes && bytes.find("<!DOCTYPE") == std::string::npos &&
-        bytes.find('\0') == std::string::npos)
-        return true;
-    if (bytes.size() > MaxXmlBytes)
-        return false;
+    return wxString::Format(_("XML parsing error: '%s' at line %d"), message,
+                            static_cast<int>(line));
+}
+
+XmlLook LookAtXml(const std::string& bytes, const XmlLimits& limits)
+{
+    if (bytes.size() > limits.bytes)
+        return {false, 0, {}};
     const std::unique_ptr<XML_ParserStruct, void (*)(XML_Parser)> parser(XML_ParserCreate(nullptr),
                                                                          XML_ParserFree);
-    Look look(parser.get(), bytes.size());
+    Look look(parser.get(), bytes.size(), limits);
     SetHandlers(parser.get(), look);
     // In one piece, so that nothing is read twice here.
-    if (XML_Parse(parser.get(), bytes.data(), static_cast<int>(bytes.size()), XML_TRUE) !=
+    if (XML_Parse(parser.get(), bytes.data(), static_cast<int>(bytes.size()), XML_TRUE) ==
         XML_STATUS_OK)
-        look.Fail(bytes.size());
-    return look.IsWithinLimits();
+        return {look.IsWithinLimits(), look.Memory(), {}};
+    look.Fail(bytes.size());
+    return {look.IsWithinLimits(),
+            look.Memory(),
+            {wxString::FromUTF8(XML_ErrorString(XML_GetErrorCode(parser.get()))),
+             static_cast<unsigned long>(XML_GetCurrentLineNumber(parser.get()))}};
+}
+
+bool IsHarmlessXml(const std::string& bytes)
+{
+    // UTF-16, in which a document type would look different, has NULs.
+    return bytes.size() <= HarmlessBytes && bytes.find("<!DOCTYPE") == std::string::npos &&
+           bytes.find('\0') == std::string::npos;
 }

@@ -1,6 +1,5 @@
 #include "store/xml_tree.h"
 
-#include <algorithm>
 #include <memory>
 
 namespace
@@ -118,15 +117,6 @@ void MoveTree(wxXmlNode& source, wxXmlNode& target)
     source.SetChildren(nullptr);
     for (wxXmlNode* child = target.GetChildren(); child; child = child->GetNext())
         child->SetParent(&target);
-}
-
-int CountLevels(const wxXmlNode& root)
-{
-    int deepest = 0;
-    int level = 0;
-    for (const wxXmlNode* node = &root; node; node = NextNode(node, root, level))
-        deepest = std::max(deepest, level);
-    return deepest;
 }
 
 void RemoveIgnoredWhiteSpace(wxXmlNode& root)

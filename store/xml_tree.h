@@ -12,9 +12,6 @@ void CopyTree(const wxXmlNode& source, wxXmlNode& target);
 /// attributes nor children before.
 void MoveTree(wxXmlNode& source, wxXmlNode& target);
 
-/// The number of levels below the node: 0 if it has no children.
-int CountLevels(const wxXmlNode& root);
-
 /// Removes from a document loaded with wxXMLDOC_KEEP_WHITESPACE_NODES what loading without that
 /// flag removes: texts that are only white space, and the empty lines before any other text. The
 /// library does this for each piece of a text that the parser delivers, so it loses spaces that are

@@ -18,3 +18,10 @@ bool MayCreateIn(const wxString& directory)
 {
     return access(directory.utf8_str(), W_OK | X_OK) == 0;
 }
+
+std::optional<FailedCall> WhyNotListed(const wxString& directory)
+{
+    if (access(directory.utf8_str(), R_OK) == 0)
+        return {};
+    return FailedCall::Now(FailedCall::Kind::List);
+}

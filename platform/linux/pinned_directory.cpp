@@ -1,23 +1,10 @@
 #include "platform/pinned_directory.h"
 
-#include <wx/filefn.h>
+#include "platform/path_normal_form.h"
 
 #include <fcntl.h>
 #include <sys/stat.h>
 #include <unistd.h>
-
-namespace
-{
-
-// With a separator at the end of the path, a link would be followed.
-wxString WithoutFinalSeparators(wxString path)
-{
-    while (path.length() > 1 && path.EndsWith("/"))
-        path.RemoveLast();
-    return path;
-}
-
-} // namespace
 
 bool IsLink(const wxString& path)
 {
@@ -25,10 +12,11 @@ bool IsLink(const wxString& path)
     return lstat(WithoutFinalSeparators(path).utf8_str(), &status) == 0 && S_ISLNK(status.st_mode);
 }
 
+// With a separator at the end of the path, a link would be followed.
 PinnedDirectory::PinnedDirectory(const wxString& path, Links links)
-    : m_descriptor(
-          open(WithoutFinalSeparators(path).utf8_str(),
-               O_PATH | O_DIRECTORY | O_CLOEXEC | (links == Links::Refuse ? O_NOFOLLOW : 0)))
+    : m_descriptor(links == Links::Follow ? open(path.utf8_str(), O_PATH | O_DIRECTORY | O_CLOEXEC)
+                                          : open(WithoutFinalSeparators(path).utf8_str(),
+                                                 O_PATH | O_DIRECTORY | O_CLOEXEC | O_NOFOLLOW))
 {
 }
 

@@ -25,3 +25,8 @@ bool RefusesLinksOfOthers()
 {
     return false;
 }
+
+bool IsSystemAccount()
+{
+    return false;
+}

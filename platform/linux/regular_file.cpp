@@ -2,8 +2,6 @@
 
 #include "platform/access_rights.h"
 
-#include <wx/log.h>
-
 #include <cerrno>
 #include <fcntl.h>
 #include <sys/stat.h>
@@ -18,99 +16,86 @@ bool IsRegular(int descriptor, struct stat& status)
 }
 
 // Opened so that a pipe in place of the file does not block the tool.
-int OpenDescriptor(const wxString& path, Links links, int flags)
+int OpenDescriptor(const wxString& path, bool followsLinks, int flags)
 {
-    return open(path.utf8_str(),
-                flags | O_NONBLOCK | O_CLOEXEC | (links == Links::Refuse ? O_NOFOLLOW : 0));
+    return open(path.utf8_str(), flags | O_NONBLOCK | O_CLOEXEC | (followsLinks ? 0 : O_NOFOLLOW));
 }
 
-// Whether the name leads to that file and is not a link. Preserves errno.
-bool IsSameFile(const wxString& path, int descriptor)
+// Whether both are the same regular file.
+bool IsSameFile(const struct stat& left, const struct stat& right)
 {
-    const int error = errno;
-    struct stat named = {};
-    struct stat ours = {};
-    const bool isSame = lstat(path.utf8_str(), &named) == 0 && fstat(descriptor, &ours) == 0 &&
-                        named.st_dev == ours.st_dev && named.st_ino == ours.st_ino;
-    errno = error;
-    return isSame;
-}
-
-// Why the file did not open. Preserves errno.
-RegularFile::Status ReasonNotOpen(const wxString& path, Links links)
-{
-    const int error = errno;
-    struct stat status = {};
-    const int found = fstatat(AT_FDCWD, path.utf8_str(), &status,
-                              links == Links::Refuse ? AT_SYMLINK_NOFOLLOW : 0);
-    errno = error;
-    return found == 0 && S_ISREG(status.st_mode) ? RegularFile::Status::Refused
-                                                 : RegularFile::Status::NotThere;
+    return S_ISREG(left.st_mode) && S_ISREG(right.st_mode) && left.st_dev == right.st_dev &&
+           left.st_ino == right.st_ino;
 }
 
 } // namespace
 
-RegularFile::Status RegularFile::Open(const wxString& path, Links links, bool forUpdate)
+RegularFile::Status RegularFile::Open(const PinnedDirectory* directory, const wxString& path,
+                                      bool forUpdate)
 {
     Close();
     m_path = path;
-    m_links = links;
-    m_descriptor = OpenDescriptor(path, links, forUpdate ? O_RDWR : O_RDONLY);
+    m_followsLinks = !directory;
+    m_descriptor = OpenDescriptor(path, m_followsLinks, forUpdate ? O_RDWR : O_RDONLY);
+    m_failure = FailedCall::Now(FailedCall::Kind::Open);
     struct stat status = {};
     if (m_descriptor < 0)
-        return m_status = ReasonNotOpen(path, links);
-    m_status = Status::Open;
-    if (!IsRegular(m_descriptor, status))
     {
-        Close();
-        m_status = Status::NotThere;
+        const int flags = m_followsLinks ? 0 : AT_SYMLINK_NOFOLLOW;
+        return fstatat(AT_FDCWD, path.utf8_str(), &status, flags) == 0 && S_ISREG(status.st_mode)
+                   ? Status::Refused
+                   : Status::NotThere;
     }
-    return m_status;
+    if (IsRegular(m_descriptor, status))
+        return Status::Open;
+    Close();
+    return Status::NotThere;
 }
 
 RegularFile::Status RegularFile::ReopenForUpdate()
 {
-    struct stat before = {};
+    struct stat ours = {};
     struct stat now = {};
-    const int descriptor = OpenDescriptor(m_path, m_links, O_RDWR);
-    m_error = wxSysErrorCode();
+    const bool isKnown = fstat(m_descriptor, &ours) == 0;
+    const int descriptor = OpenDescriptor(m_path, m_followsLinks, O_RDWR);
+    m_failure = FailedCall::Now(FailedCall::Kind::Open);
+    const bool isFound =
+        descriptor < 0 ? lstat(m_path.utf8_str(), &now) == 0 : fstat(descriptor, &now) == 0;
+    const bool isSame = isKnown && isFound && IsSameFile(ours, now);
     if (descriptor < 0)
-        return IsSameFile(m_path, m_descriptor) ? Status::Refused : Status::Gone;
-    if (!IsRegular(m_descriptor, before) || !IsRegular(descriptor, now) ||
-        before.st_dev != now.st_dev || before.st_ino != now.st_ino)
-    {
-        close(descriptor);
+        return isSame ? Status::Refused : Status::Gone;
+    close(isSame ? m_descriptor : descriptor);
+    if (!isSame)
         return Status::Gone;
-    }
-    close(m_descriptor);
     m_descriptor = descriptor;
     return Status::Open;
 }
 
-RegularFile::Status RegularFile::CreateNew(const wxString& path)
+RegularFile::Status RegularFile::CreateNew(const PinnedDirectory& directory, const wxString& name)
 {
     constexpr mode_t Everybody = S_IRUSR | S_IWUSR | S_IRGRP | S_IWGRP | S_IROTH | S_IWOTH;
     Close();
-    m_path = path;
-    m_descriptor = open(path.utf8_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, Everybody);
-    return m_status = m_descriptor < 0 ? Status::Refused : Status::Open;
+    m_path = directory.Reach(name);
+    m_descriptor = open(m_path.utf8_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, Everybody);
+    m_failure = FailedCall::Now(FailedCall::Kind::Open);
+    return m_descriptor < 0 ? Status::Refused : Status::Open;
 }
 
-RegularFile::Status RegularFile::Replace(const wxString& path)
+RegularFile::Status RegularFile::Replace(const PinnedDirectory& directory, const wxString& name)
 {
-    return unlink(path.utf8_str()) == 0 ? CreateNew(path) : m_status = Status::Refused;
+    return unlink(directory.Reach(name).utf8_str()) == 0 ? CreateNew(directory, name)
+                                                         : Status::Refused;
 }
 
-bool RegularFile::MayReplace(const wxString& path)
+bool RegularFile::MayReplace(const PinnedDirectory& directory)
 {
-    return MayCreateIn(path.BeforeLast('/'));
+    return MayCreateIn(directory.Reach(L""));
 }
 
 bool RegularFile::Close()
 {
     const bool isDone = m_descriptor < 0 || close(m_descriptor) == 0;
     m_descriptor = -1;
-    m_status = Status::NotOpen;
     return isDone;
 }
 
@@ -120,22 +105,22 @@ std::int64_t RegularFile::Length() const
     return fstat(m_descriptor, &status) == 0 ? static_cast<std::int64_t>(status.st_size) : -1;
 }
 
-bool RegularFile::Read(std::string& bytes, std::int64_t most) const
+size_t RegularFile::ReadSome(std::int64_t offset, char* bytes, size_t count) const
 {
-    const std::int64_t length = Length();
-    if (length < 0 || length > most)
-        return false;
-    bytes.resize(static_cast<size_t>(length));
-    for (size_t done = 0; done < bytes.size();)
-    {
-        const ssize_t count =
-            pread(m_descriptor, &bytes[done], bytes.size() - done, static_cast<off_t>(done));
-        if (count > 0)
-            done += static_cast<size_t>(count);
-        else if (count == 0 || errno != EINTR)
-            return false;
-    }
-    return true;
+    ssize_t done = -1;
+    do
+        done = pread(m_descriptor, bytes, count, static_cast<off_t>(offset));
+    while (done < 0 && errno == EINTR);
+    return done > 0 ? static_cast<size_t>(done) : 0;
+}
+
+size_t RegularFile::WriteSome(std::int64_t offset, const char* bytes, size_t count)
+{
+    ssize_t done = -1;
+    do
+        done = pwrite(m_descriptor, bytes, count, static_cast<off_t>(offset));
+    while (done < 0 && errno == EINTR);
+    return done > 0 ? static_cast<size_t>(done) : 0;
 }
 
 bool RegularFile::Reserve(std::int64_t from, std::int64_t length)
@@ -143,20 +128,6 @@ bool RegularFile::Reserve(std::int64_t from, std::int64_t length)
     // Most file systems support this; if one does not, only the error of a full disk matters.
     return length == 0 || fallocate(m_descriptor, FALLOC_FL_KEEP_SIZE, from, length) == 0 ||
            (errno != ENOSPC && errno != EDQUOT);
-}
-
-bool RegularFile::Write(std::int64_t offset, const std::string& bytes)
-{
-    for (size_t done = 0; done < bytes.size();)
-    {
-        const ssize_t count = pwrite(m_descriptor, &bytes[done], bytes.size() - done,
-                                     static_cast<off_t>(offset) + static_cast<off_t>(done));
-        if (count > 0)
-            done += static_cast<size_t>(count);
-        else if (count == 0 || errno != EINTR)
-            return false;
-    }
-    return true;
 }
 
 bool RegularFile::SetLength(std::int64_t length)

@@ -1,8 +1,8 @@
 #include "platform/standard_folders.h"
 
 #include "platform/linux/start_up.h"
+#include "platform/path_normal_form.h"
 
-#include <wx/filename.h>
 #include <wx/utils.h>
 
 #include <cstdlib>
@@ -26,21 +26,16 @@ bool IsUsable(const wxString& folder)
     return folder.StartsWith("/");
 }
 
-wxString WithoutFinalSeparator(const wxString& folder)
-{
-    return folder.length() > 1 && folder.EndsWith("/") ? folder.BeforeLast('/') : folder;
-}
-
 } // namespace
 
 wxString GetUserDataFolder()
 {
     const wxString folder = FromEnvironment("XDG_CONFIG_HOME");
-    return IsUsable(folder) ? WithoutFinalSeparator(folder) : wxGetHomeDir() + "/.config";
+    return IsUsable(folder) ? WithoutFinalSeparators(folder) : wxGetHomeDir() + "/.config";
 }
 
 wxString GetMachineDataFolder()
 {
     const wxString folder = FromEnvironment("XDG_CONFIG_DIRS").BeforeFirst(':');
-    return IsUsable(folder) ? WithoutFinalSeparator(folder) : wxString("/etc/xdg");
+    return IsUsable(folder) ? WithoutFinalSeparators(folder) : wxString("/etc/xdg");
 }

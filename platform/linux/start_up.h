@@ -3,8 +3,9 @@
 
 /// Makes file names UTF-8 whatever the environment says: the library never sets a locale for a
 /// console application, and in the "C" locale it loses names that are not ASCII, including those of
-/// the standard folders and the executable. Lets the stack grow to 64 MiB, as far as the hard limit
-/// allows. A static object does both before main().
+/// the standard folders and the executable. Makes a write fail where the system would end the
+/// process: at the longest file that it permits, and to a pipe that nobody reads. A static object
+/// does both before main().
 struct StartUp
 {
     StartUp();

@@ -27,3 +27,10 @@ bool MayCreateIn(const wxString& directory)
 {
     return MayOpen(directory, FILE_ADD_FILE, 0);
 }
+
+std::optional<FailedCall> WhyNotListed(const wxString& directory)
+{
+    if (MayOpen(directory, FILE_LIST_DIRECTORY, 0))
+        return {};
+    return FailedCall::Now(FailedCall::Kind::List);
+}

@@ -1,23 +1,17 @@
 #include "platform/pinned_directory.h"
 
+#include "platform/path_normal_form.h"
 #include "platform/system.h"
 #include "platform/windows/link_handle.h"
 
 #include <wx/filename.h>
 
-#include <array>
+#include <vector>
 
 namespace
 {
 
 // With a separator at the end of the path, a link might be followed.
-wxString WithoutFinalSeparators(wxString path)
-{
-    while (!path.empty() && wxFileName::IsPathSeparator(path.Last()))
-        path.RemoveLast();
-    return path;
-}
-
 HANDLE Open(const wxString& path, DWORD access, Links links)
 {
     const DWORD flags =
@@ -50,17 +44,24 @@ HANDLE Pin(const wxString& path, Links links)
     return INVALID_HANDLE_VALUE;
 }
 
-// The path without links, because a link's target may be replaced. The given path if the other is
-// too long for calls that accept only MAX_PATH characters, including the file name.
-wxString FinalPath(HANDLE handle, const wxString& path)
+// The path without links, which begins with \\?\; empty if the system does not say.
+wxString FinalPath(HANDLE handle)
 {
-    constexpr DWORD Longest = MAX_PATH - 40;
-    std::array<wchar_t, MAX_PATH> buffer{};
+    constexpr DWORD Longest = 32767; // characters
+    std::vector<wchar_t> buffer(Longest + 1);
     const DWORD length =
-        GetFinalPathNameByHandleW(handle, buffer.data(), MAX_PATH, FILE_NAME_NORMALIZED);
-    if (length == 0 || length > Longest)
+        GetFinalPathNameByHandleW(handle, buffer.data(), Longest, FILE_NAME_NORMALIZED);
+    return length <= Longest ? wxString(buffer.data(), length) : wxString();
+}
+
+// The path by which entries are reached: without links, because a link's target may be replaced.
+// The given one if the other is too long for calls that accept only MAX_PATH characters, including
+// the file name.
+wxString ReachedPath(const wxString& final, const wxString& path)
+{
+    constexpr size_t Longest = MAX_PATH - 40;
+    if (final.empty() || final.length() > Longest)
         return path;
-    const wxString final = buffer.data();
     if (final.StartsWith(L"\\\\?\\UNC\\"))
         return L"\\" + final.Mid(7);
     return final.StartsWith(L"\\\\?\\") ? final.Mid(4) : final;
@@ -73,7 +74,11 @@ bool IsLink(const wxString& path)
     WIN32_FIND_DATAW found = {};
     const HANDLE search = FindFirstFileW(WithoutFinalSeparators(path).wc_str(), &found);
     if (search == INVALID_HANDLE_VALUE)
-        return false;
+    {
+        const DWORD error = GetLastError();
+        return error != ERROR_FILE_NOT_FOUND && error != ERROR_PATH_NOT_FOUND &&
+               error != ERROR_INVALID_NAME;
+    }
     FindClose(search);
     // Wine shows a symbolic link of the underlying system with a tag of 0; Windows has no such tag.
     return (found.dwFileAttributes & FILE_ATTRIBUTE_REPARSE_POINT) != 0 &&
@@ -81,8 +86,8 @@ bool IsLink(const wxString& path)
 }
 
 PinnedDirectory::PinnedDirectory(const wxString& path, Links links)
-    : m_handle(Pin(path, links)),
-      m_path(IsOpen() && links == Links::Follow ? FinalPath(m_handle, path) : path)
+    : m_handle(Pin(path, links)), m_finalPath(IsOpen() ? FinalPath(m_handle) : wxString()),
+      m_path(links == Links::Follow ? ReachedPath(m_finalPath, path) : path)
 {
 }
 
@@ -104,6 +109,12 @@ wxString PinnedDirectory::Reach(const wxString& name) const
     if (name.empty() || m_path.empty() || wxFileName::IsPathSeparator(m_path.Last()))
         return m_path + name;
     return m_path + wxFileName::GetPathSeparator() + name;
+}
+
+bool PinnedDirectory::Holds(void* file) const
+{
+    const wxString path = FinalPath(file);
+    return !path.empty() && WithoutFinalSeparators(m_finalPath) == path.BeforeLast('\\');
 }
 
 std::pair<std::uint64_t, std::uint64_t> PinnedDirectory::Identity() const

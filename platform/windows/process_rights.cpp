@@ -5,6 +5,12 @@
 namespace
 {
 
+struct UserToken
+{
+    TOKEN_USER user;
+    BYTE identifier[SECURITY_MAX_SID_SIZE]; // user points to it
+};
+
 bool ReadToken(TOKEN_INFORMATION_CLASS what, void* information, DWORD size)
 {
     HANDLE token = nullptr;
@@ -23,13 +29,16 @@ bool IsElevated()
     return ReadToken(TokenElevation, &elevation, sizeof elevation) && elevation.TokenIsElevated;
 }
 
+bool IsSystemAccount()
+{
+    UserToken token = {};
+    return ReadToken(TokenUser, &token, sizeof token) &&
+           IsWellKnownSid(token.user.User.Sid, WinLocalSystemSid) != 0;
+}
+
 wxString AccountName()
 {
-    struct
-    {
-        TOKEN_USER user;
-        BYTE identifier[SECURITY_MAX_SID_SIZE]; // user points to it
-    } token = {};
+    UserToken token = {};
     if (!ReadToken(TokenUser, &token, sizeof token))
         return {};
 

@@ -3,8 +3,6 @@
 #include "platform/system.h"
 #include "platform/windows/link_handle.h"
 
-#include <wx/log.h>
-
 #include <algorithm>
 #include <limits>
 
@@ -21,22 +19,26 @@ HANDLE OpenHandle(const wxString& path, DWORD access, DWORD flags)
     return handle == INVALID_HANDLE_VALUE ? nullptr : handle;
 }
 
-bool IsReparsePoint(HANDLE handle)
+BY_HANDLE_FILE_INFORMATION InformationOf(HANDLE handle)
 {
     BY_HANDLE_FILE_INFORMATION information = {};
-    return GetFileInformationByHandle(handle, &information) != 0 &&
-           (information.dwFileAttributes & FILE_ATTRIBUTE_REPARSE_POINT) != 0;
+    GetFileInformationByHandle(handle, &information);
+    return information;
 }
 
-// Why the file did not open. Preserves the last error.
-RegularFile::Status ReasonNotOpen(const wxString& path)
+// Opens by its name a file that is already open. Null if the name leads to another one by now.
+HANDLE OpenAgain(const wxString& path, DWORD access, HANDLE file)
 {
-    const DWORD error = GetLastError();
-    const DWORD attributes = GetFileAttributesW(path.wc_str());
-    SetLastError(error);
-    return attributes == INVALID_FILE_ATTRIBUTES || (attributes & FILE_ATTRIBUTE_DIRECTORY) != 0
-               ? RegularFile::Status::NotThere
-               : RegularFile::Status::Refused;
+    const HANDLE again = OpenHandle(path, access, 0);
+    const BY_HANDLE_FILE_INFORMATION ours = InformationOf(file);
+    const BY_HANDLE_FILE_INFORMATION now = InformationOf(again);
+    if (!again ||
+        (ours.dwVolumeSerialNumber == now.dwVolumeSerialNumber &&
+         ours.nFileIndexHigh == now.nFileIndexHigh && ours.nFileIndexLow == now.nFileIndexLow))
+        return again;
+    CloseHandle(again);
+    SetLastError(ERROR_FILE_INVALID);
+    return nullptr;
 }
 
 bool IsDiskFull(DWORD error)
@@ -61,43 +63,46 @@ DWORD LengthOfCall(size_t rest)
 
 } // namespace
 
-// A link is opened as such, so that it can be distinguished from a file. While the link or the file
-// is open, the name leads to nothing else; so a file whose content is elsewhere (in the cloud) can
-// be opened again by its name.
-RegularFile::Status RegularFile::Open(const wxString& path, Links links, bool forUpdate)
+// A link is opened as such, so that it can be distinguished from a file. A file whose content is
+// elsewhere (in the cloud) is then opened again.
+RegularFile::Status RegularFile::Open(const PinnedDirectory* directory, const wxString& path,
+                                      bool forUpdate)
 {
     Close();
     m_path = path;
     const DWORD access = forUpdate ? GENERIC_READ | GENERIC_WRITE : GENERIC_READ;
-    const DWORD flags = links == Links::Refuse ? FILE_FLAG_OPEN_REPARSE_POINT : 0;
+    const DWORD flags = directory ? FILE_FLAG_OPEN_REPARSE_POINT : 0;
     m_handle = OpenHandle(path, access, flags);
+    m_failure = FailedCall::Now(FailedCall::Kind::Open);
     if (!m_handle)
-        return m_status = ReasonNotOpen(path);
-    m_status = Status::Open;
+    {
+        const DWORD attributes = GetFileAttributesW(path.wc_str());
+        return attributes == INVALID_FILE_ATTRIBUTES || (attributes & FILE_ATTRIBUTE_DIRECTORY) != 0
+                   ? Status::NotThere
+                   : Status::Refused;
+    }
     if (GetFileType(m_handle) != FILE_TYPE_DISK ||
-        (links == Links::Refuse && (IsLinkHandle(m_handle) || IsLink(path))))
+        (directory && (IsLinkHandle(m_handle) || IsLink(path) || !directory->Holds(m_handle))))
     {
         Close();
-        m_status = Status::NotThere;
+        return Status::NotThere;
     }
-    else if (flags != 0 && IsReparsePoint(m_handle))
-    {
-        const HANDLE content = OpenHandle(path, access, 0);
-        CloseHandle(m_handle);
-        m_handle = content;
-        m_status = content ? Status::Open : Status::Refused;
-    }
-    return m_status;
+    if (!directory ||
+        (InformationOf(m_handle).dwFileAttributes & FILE_ATTRIBUTE_REPARSE_POINT) == 0)
+        return Status::Open;
+    const HANDLE content = OpenAgain(path, access, m_handle);
+    m_failure = FailedCall::Now(FailedCall::Kind::Open);
+    CloseHandle(m_handle);
+    m_handle = content;
+    return content ? Status::Open : Status::Refused;
 }
 
 RegularFile::Status RegularFile::ReopenForUpdate()
 {
     HANDLE handle = ReOpenFile(m_handle, GENERIC_READ | GENERIC_WRITE, Sharing, 0);
-    // Not every file system supports that. The open handle ensures that the name leads to the same
-    // file.
-    if (handle == INVALID_HANDLE_VALUE)
-        handle = OpenHandle(m_path, GENERIC_READ | GENERIC_WRITE, 0);
-    m_error = wxSysErrorCode();
+    if (handle == INVALID_HANDLE_VALUE) // not every file system supports that
+        handle = OpenAgain(m_path, GENERIC_READ | GENERIC_WRITE, m_handle);
+    m_failure = FailedCall::Now(FailedCall::Kind::Open);
     if (!handle)
         return Status::Refused;
     CloseHandle(m_handle);
@@ -105,23 +110,25 @@ RegularFile::Status RegularFile::ReopenForUpdate()
     return Status::Open;
 }
 
-RegularFile::Status RegularFile::CreateNew(const wxString& path)
+RegularFile::Status RegularFile::CreateNew(const PinnedDirectory& directory, const wxString& name)
 {
     Close();
-    m_path = path;
+    m_path = directory.Reach(name);
     const HANDLE handle =
-        CreateFileW(path.wc_str(), GENERIC_READ | GENERIC_WRITE, Sharing, nullptr, CREATE_NEW,
+        CreateFileW(m_path.wc_str(), GENERIC_READ | GENERIC_WRITE, Sharing, nullptr, CREATE_NEW,
                     FILE_ATTRIBUTE_NORMAL | FILE_FLAG_OPEN_REPARSE_POINT, nullptr);
+    m_failure = FailedCall::Now(FailedCall::Kind::Open);
     m_handle = handle == INVALID_HANDLE_VALUE ? nullptr : handle;
-    return m_status = m_handle ? Status::Open : Status::Refused;
+    return m_handle ? Status::Open : Status::Refused;
 }
 
-RegularFile::Status RegularFile::Replace(const wxString& /*path*/)
+RegularFile::Status RegularFile::Replace(const PinnedDirectory& /*directory*/,
+                                         const wxString& /*name*/)
 {
-    return m_status = Status::Refused;
+    return Status::Refused;
 }
 
-bool RegularFile::MayReplace(const wxString& /*path*/)
+bool RegularFile::MayReplace(const PinnedDirectory& /*directory*/)
 {
     return false;
 }
@@ -130,7 +137,6 @@ bool RegularFile::Close()
 {
     const bool isDone = !m_handle || CloseHandle(m_handle) != 0;
     m_handle = nullptr;
-    m_status = Status::NotOpen;
     return isDone;
 }
 
@@ -140,23 +146,18 @@ std::int64_t RegularFile::Length() const
     return GetFileSizeEx(m_handle, &length) != 0 ? length.QuadPart : -1;
 }
 
-bool RegularFile::Read(std::string& bytes, std::int64_t most) const
+size_t RegularFile::ReadSome(std::int64_t offset, char* bytes, size_t count) const
 {
-    const std::int64_t length = Length();
-    if (length < 0 || length > most)
-        return false;
-    bytes.resize(static_cast<size_t>(length));
-    for (size_t done = 0; done < bytes.size();)
-    {
-        OVERLAPPED place = At(static_cast<std::int64_t>(done));
-        DWORD count = 0;
-        if (ReadFile(m_handle, &bytes[done], LengthOfCall(bytes.size() - done), &count, &place) ==
-                0 ||
-            count == 0)
-            return false;
-        done += count;
-    }
-    return true;
+    OVERLAPPED place = At(offset);
+    DWORD done = 0;
+    return ReadFile(m_handle, bytes, LengthOfCall(count), &done, &place) != 0 ? done : 0;
+}
+
+size_t RegularFile::WriteSome(std::int64_t offset, const char* bytes, size_t count)
+{
+    OVERLAPPED place = At(offset);
+    DWORD done = 0;
+    return WriteFile(m_handle, bytes, LengthOfCall(count), &done, &place) != 0 ? done : 0;
 }
 
 bool RegularFile::Reserve(std::int64_t from, std::int64_t length)
@@ -168,21 +169,6 @@ bool RegularFile::Reserve(std::int64_t from, std::int64_t length)
     // If the file system does not support this, only the error of a full disk matters.
     return SetFileInformationByHandle(m_handle, FileAllocationInfo, &room, sizeof room) != 0 ||
            !IsDiskFull(GetLastError());
-}
-
-bool RegularFile::Write(std::int64_t offset, const std::string& bytes)
-{
-    for (size_t done = 0; done < bytes.size();)
-    {
-        OVERLAPPED place = At(offset + static_cast<std::int64_t>(done));
-        DWORD count = 0;
-        if (WriteFile(m_handle, &bytes[done], LengthOfCall(bytes.size() - done), &count, &place) ==
-                0 ||
-            count == 0)
-            return false;
-        done += count;
-    }
-    return true;
 }
 
 bool RegularFile::SetLength(std::int64_t length)

@@ -1,0 +1,104 @@
+#include "check/folder_cfg_check.h"
+
+#include "check/folder_cfg_loss.h"
+#include "check/template_folders_check.h"
+#include "check/workstation_check.h"
+#include "migrate/template_move.h"
+#include "store/xml_encoding.h"
+
+#include <wx/filename.h>
+
+namespace
+{
+
+void ReportLeft(const wxString& reason, Report& report)
+{
+    report.Problem("Folder.cfg: left as it is (" + reason + ")");
+}
+
+void CheckMissing(const HotFolder& folder, Report& report)
+{
+    const wxString path = folder.privateDir.Reach(FolderCfgName);
+    if (IsLink(path))
+        report.Problem("Folder.cfg: reached over a link");
+    else if (wxFileName::Exists(path))
+        report.Problem("Folder.cfg: is not a file");
+    else
+        report.Note("no Folder.cfg");
+}
+
+void CheckShownState(const wxXmlNode& root, Report& report)
+{
+    const AttributeGap gap = FindAttributeGap(root);
+    if (gap.isDisabled)
+        report.Problem("Folder.cfg: lacks \"" + gap.missing +
+                       "\", so the enabled folder shows as disabled");
+}
+
+// Returns whether the file is rewritten.
+bool CheckMove(HotFolder& folder, const TemplateMove& move, Report& report)
+{
+    XmlFile& cfg = folder.cfg;
+    if (cfg.file.ReopenForUpdate() != RegularFile::Status::Open)
+    {
+        report.Problem("Folder.cfg: cannot be opened for writing (" +
+                       cfg.file.GetFailure().Describe(FolderCfgPath(folder.path)) + ")");
+        return false;
+    }
+    if (move.storedPath == move.newPath && move.newContent == cfg.bytes)
+        return true;
+    report.Add("Folder.cfg: ", {FindFolderCfgLosses(*cfg.document, move.newContent), {}, {}});
+    report.Change("Folder.cfg: " + Shown(move.storedPath) + " -> " + Shown(move.newPath));
+    if (!IsUtf8(cfg.bytes))
+        report.Note("Folder.cfg: comes out as UTF-8");
+    return true;
+}
+
+// Returns whether the file is rewritten.
+bool CheckTemplate(HotFolder& folder, TemplateFolders& folders, TemplateCheck& templates,
+                   Report& report)
+{
+    using Outcome = TemplateMove::Outcome;
+    const TemplateMove move = DecideTemplateMove(folder.cfg, folders);
+    const bool isRewritten = move.outcome == Outcome::Moves && CheckMove(folder, move, report);
+    if (move.outcome == Outcome::Stays)
+        ReportLeft(move.reasonToStay, report);
+    if (move.outcome == Outcome::FromUnknown && !move.storedPath.empty())
+        CheckIsKnown(folders.From(), report);
+    if (move.outcome == Outcome::ToUnknown)
+        CheckIsKnown(folders.To(), report);
+    Findings findings;
+    templates.Judge(isRewritten ? move.newPath : move.storedPath,
+                    move.outcome == Outcome::Elsewhere ? "in a sub-folder"
+                                                       : "in a file that stays as it is",
+                    findings);
+    report.Add({}, findings);
+    return isRewritten;
+}
+
+} // namespace
+
+void CheckFolderCfg(HotFolder& folder, TemplateFolders& folders, TemplateCheck& templates,
+                    Report& report)
+{
+    switch (folder.LoadCfg())
+    {
+    case XmlFile::State::Missing:
+        CheckMissing(folder, report);
+        break;
+    case XmlFile::State::TooLarge:
+        ReportLeft(CfgStays::TooLarge, report);
+        break;
+    case XmlFile::State::NotReadable:
+        report.Problem("Folder.cfg: " +
+                       (folder.cfg.error.message.empty()
+                            ? folder.cfg.WhyNotReadable(FolderCfgPath(folder.path))
+                            : Damage(folder.cfg.error) +
+                                  "; it stays as it is, and the folder shows as disabled"));
+        break;
+    case XmlFile::State::Loaded:
+        if (!CheckTemplate(folder, folders, templates, report))
+            CheckShownState(*folder.cfg.Root(), report);
+        break;
+    }
+}

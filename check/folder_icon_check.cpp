@@ -1,0 +1,126 @@
+#include "check/folder_icon_check.h"
+
+#include "appearance/desktop_ini.h"
+#include "appearance/icon_copy.h"
+#include "appearance/icon_source.h"
+#include "platform/access_rights.h"
+#include "platform/file_copy.h"
+
+namespace
+{
+
+wxString AttributeNames(DWORD attributes)
+{
+    const std::pair<DWORD, const char*> all[] = {
+        {FILE_ATTRIBUTE_READONLY, " READONLY"},
+        {FILE_ATTRIBUTE_HIDDEN, " HIDDEN"},
+        {FILE_ATTRIBUTE_SYSTEM, " SYSTEM"},
+        {FILE_ATTRIBUTE_TEMPORARY, " TEMPORARY"},
+        {FILE_ATTRIBUTE_OFFLINE, " OFFLINE"},
+        {FILE_ATTRIBUTE_NOT_CONTENT_INDEXED, " NOT_CONTENT_INDEXED"},
+    };
+    wxString names;
+    for (const auto& [attribute, name] : all)
+        names += (attributes & attribute) != 0 ? name : "";
+    return names.empty() ? wxString(" none") : names;
+}
+
+void CheckAttributes(const wxString& name, const wxString& path, const AttributeChange& change,
+                     Report& report)
+{
+    if (change.before == change.after)
+        return;
+    if (MayChangeAttributes(path))
+        report.Change(name + ": attributes" + AttributeNames(change.before) + " ->" +
+                      AttributeNames(change.after));
+    else
+        report.Problem(name + ": its attributes cannot be changed");
+}
+
+// Read-only is removed before the keys are written, so it stops nobody who may change attributes.
+bool MayWriteIni(const HotFolder& folder)
+{
+    const wxString path = folder.directory.Reach(DesktopIniName);
+    if ((GetFileAttributesW(path.wc_str()) & FILE_ATTRIBUTE_READONLY) != 0)
+        return MayChangeAttributes(path);
+    RegularFile ini;
+    return ini.OpenForUpdate(folder.directory, DesktopIniName) == RegularFile::Status::Open;
+}
+
+void CheckKeys(const HotFolder& folder, const DesktopIniChange& change, Report& report)
+{
+    if (change.keys.empty())
+        return;
+    wxString names;
+    for (const DesktopIniKey& each : change.keys)
+        names += (names.empty() ? wxString() : wxString(", ")) + each.key;
+    if (MayWriteIni(folder))
+        report.Change("Desktop.ini: " + names);
+    else
+        report.Problem("Desktop.ini: cannot be opened for reading and writing");
+}
+
+void CheckDesktopIni(const HotFolder& folder, const wxString& iconName, Report& report)
+{
+    using Kind = DesktopIniChange::Kind;
+    const DesktopIniChange change = DecideDesktopIni(folder, iconName);
+    const wxString path = folder.directory.Reach(L"");
+    switch (change.kind)
+    {
+    case Kind::Stays:
+        report.Problem(wxString("Desktop.ini: left as it is (") + change.reasonToStay + ")");
+        break;
+    case Kind::NotAFile:
+        report.Problem("Desktop.ini: is not a file");
+        break;
+    case Kind::NotReadable:
+        report.Problem("Desktop.ini: cannot be opened for reading and writing");
+        break;
+    case Kind::Create:
+        if (MayCreateIn(path))
+            report.Change("Desktop.ini: new");
+        else
+            report.Problem(
+                "Desktop.ini: cannot be created, because the hot folder cannot be written to");
+        break;
+    case Kind::Refresh:
+        CheckKeys(folder, change, report);
+        break;
+    case Kind::Nothing:
+        break;
+    }
+    if (change.kind != Kind::Create)
+        CheckAttributes("Desktop.ini", folder.directory.Reach(DesktopIniName), change.ini, report);
+    CheckAttributes("hot folder", path, change.folder, report);
+}
+
+} // namespace
+
+void CheckFolderIcon(HotFolder& folder, const TemplateFolders& folders, Report& report)
+{
+    const IconCopy copy = DecideIconCopy(folder, folders.IsUpgrade(), BundleIconsDirName);
+    switch (copy.outcome)
+    {
+    case IconCopy::Outcome::Linked:
+        report.Problem(copy.name + ": reached over a link");
+        break;
+    case IconCopy::Outcome::NoCopy:
+        report.Note("no copy of the icon to replace: " + copy.name);
+        break;
+    case IconCopy::Outcome::NoSource:
+        if (folders.IsRehearsal())
+            report.NoteOnce(
+                "the icons being installed are not there, so icons are left out of this check");
+        else
+            report.ProblemOnce("source icon missing: " + copy.source);
+        break;
+    case IconCopy::Outcome::Replaces:
+        if (!MayCopyOver(copy.source, folder.privateDir, copy.name))
+            report.Problem(copy.name +
+                           ": cannot be replaced (read-only, in use, or access denied)");
+        else if (!IsCopy(copy.source, folder.privateDir, copy.name))
+            report.Change(copy.name);
+        CheckDesktopIni(folder, copy.name, report);
+        break;
+    }
+}

@@ -1,0 +1,9 @@
+// What a run would do to the icon, Desktop.ini and the attributes of one hot folder.
+#pragma once
+
+#include "check/report.h"
+#include "migrate/template_folders.h"
+#include "store/hot_folder.h"
+
+/// In a rehearsal without the icons of the version being installed, the icon is left out.
+void CheckFolderIcon(HotFolder& folder, const TemplateFolders& folders, Report& report);

@@ -1,0 +1,64 @@
+#include "migrate/template_folders.h"
+
+namespace
+{
+
+TemplateFolder LookUp(bool (*lookUp)(wxFileName&, ValueSource&))
+{
+    wxFileName folder;
+    TemplateFolder found;
+    found.isKnown = lookUp(folder, found.source);
+    found.path = folder.GetFullPath(wxPATH_NATIVE);
+    return found;
+}
+
+} // namespace
+
+TemplateFolders::TemplateFolders(bool isUpgrade) : m_isUpgrade(isUpgrade)
+{
+}
+
+TemplateFolders::TemplateFolders(bool isUpgrade, const wxString& from, const wxString& to)
+    : m_isUpgrade(isUpgrade), m_isRehearsal(!from.empty() || !to.empty())
+{
+    std::optional<TemplateFolder>& folderFrom = isUpgrade ? m_previous : m_default;
+    std::optional<TemplateFolder>& folderTo = isUpgrade ? m_default : m_previous;
+    if (!from.empty())
+        folderFrom = TemplateFolder{true, wxFileName(from).GetFullPath(), {"the given folder", {}}};
+    if (!to.empty())
+        folderTo = TemplateFolder{true, wxFileName(to).GetFullPath(), {"the given folder", {}}};
+}
+
+bool TemplateFolders::IsRehearsal() const
+{
+    return m_isRehearsal;
+}
+
+bool TemplateFolders::IsUpgrade() const
+{
+    return m_isUpgrade;
+}
+
+const TemplateFolder& TemplateFolders::From()
+{
+    return m_isUpgrade ? Previous() : Default();
+}
+
+const TemplateFolder& TemplateFolders::To()
+{
+    return m_isUpgrade ? Default() : Previous();
+}
+
+const TemplateFolder& TemplateFolders::Previous()
+{
+    if (!m_previous)
+        m_previous = LookUp(GetPreviousImposeTemplatePath);
+    return *m_previous;
+}
+
+const TemplateFolder& TemplateFolders::Default()
+{
+    if (!m_default)
+        m_default = LookUp(GetDefaultImposeTemplatePath);
+    return *m_default;
+}
