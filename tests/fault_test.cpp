@@ -37,7 +37,7 @@ Files FilesBefore()
                      {"hot/B/Desktop.ini#", "RS"},
                      {"user/ORX/JPData/P/Presets/presets.xml", Stored(MovedFrom)},
                      {"user/ORX/JPData/Q/Presets/presets.xml",
-                      "\xEF\xBB\xBF{repeat:40:" + Stored(MovedFrom) + "}"},
+                      "\xEF\xBB\xBF" + Stored(MovedFrom) + Text(4000, 'x')},
                      {LogPlace, "an earlier run's\r\n"}})
             .before;
     for (const auto& [place, text] : Files(files))

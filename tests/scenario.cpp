@@ -92,15 +92,21 @@ Scenario& Scenario::IsReported(const Text& lines)
 {
     isOnlyChecked = true;
     report = lines;
+    Text more;
+    for (char folder = 'F'; folder <= 'W'; ++folder)
+        more += Text("\n  note     listed hot folder does not exist: {hot}{/}") + folder;
     for (const auto& [token, text] : Files{
              {"{moves}",
-              "  change   Folder.cfg: {previous}{/}Booklet.tpl -> {default}{/}Booklet.tpl"
-              "\n  note     no such file: {default}{/}Booklet.tpl"},
+              "  change   Folder.cfg: {previous}{/}Booklet.tpl -> {default}{/}Booklet.tpl"},
+             {"{noicon}", "  note     no copy of the icon to replace: hf_folder.ico"},
+             {"{nodisabled}", "  note     no copy of the icon to replace: hf_folder_disabled.ico"},
+             {"\n{more}", more},
+             {"{key}", "there is no such key"},
+             {"{nothing}", ", for the account ACCOUNT; nothing moves. Run as the client's user, "
+                           "after its installation"},
              {"{log}", "{user}{/}ORX_Installers{/}UpgradeDowngrade.log"},
-             {"{Path}", "registry value Path in HKEY_CURRENT_USER\\SOFTWARE[\\Wow6432Node]\\HF"},
-             {"{InstallPath}", "registry value InstallPath in "
-                               "HKEY_LOCAL_MACHINE\\SOFTWARE[\\Wow6432Node]\\Vantorix\\QZA"},
-             {"{unknown}", "missing, longer than 257 characters, or not readable; nothing moves"}})
+             {"{list}", "{machine}{/}hotfolder{/}HotFolderList.cfg"},
+             {"{Path}", "registry value Path in HKEY_CURRENT_USER\\SOFTWARE\\HF"}})
         report = Replaced(report, token, text);
     return *this;
 }
@@ -120,6 +126,7 @@ Files WorkstationBefore(const Scenario& scenario)
     files.insert({{ListPlace, list + "</HotFolders>"},
                   {LogPlace, "The log of an earlier run\r\n"},
                   {"user/ORX/JPData/", ""},
+                  {"previous/", ""},
                   {MachineHive, MachineValue("\"InstallPath\"=\"{APP}\"")},
                   {UserHive, UserValue("\"Path\"=\"{PREVIOUS}\"")}});
     for (auto file = files.begin(); file != files.end();)

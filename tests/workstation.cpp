@@ -22,9 +22,16 @@ const Text Link = "{link:";
 const Text Fifo = "{fifo}";
 const Text PrivateDir = "[_ORX_HotFolder_]";
 // The application data folders also hold what is not the scenarios'.
-const auto Tops = {"hot",           "elsewhere",           "tool",
-                   "user/ORX",      "user/ORX_Installers", "machine/hotfolder",
-                   "user/registry", "machine/registry"};
+const auto Tops = {"hot",
+                   "default",
+                   "previous",
+                   "elsewhere",
+                   "tool",
+                   "user/ORX",
+                   "user/ORX_Installers",
+                   "machine/hotfolder",
+                   "user/registry",
+                   "machine/registry"};
 const auto Attributes = {std::pair('R', FILE_ATTRIBUTE_READONLY),
                          {'H', FILE_ATTRIBUTE_HIDDEN},
                          {'S', FILE_ATTRIBUTE_SYSTEM}};
@@ -35,30 +42,6 @@ const Text Limits = "exec timeout 120 ";
 #else
 const Text Limits = "ulimit -v 700000; exec timeout 10 ";
 #endif
-
-// The text with every {repeat:COUNT:PIECE} replaced.
-Text Repeat(const Text& text)
-{
-    const Text start = "{repeat:";
-    Text result;
-    size_t done = 0;
-    for (size_t at; (at = text.find(start, done)) != Text::npos;)
-    {
-        result.append(text, done, at - done);
-        const size_t colon = text.find(':', at + start.size());
-        done = text.find('}', colon) + 1;
-        const Text piece = text.substr(colon + 1, done - colon - 2);
-        const size_t number = piece.find('#');
-        for (int i = 0; i < std::stoi(text.substr(at + start.size())); ++i)
-        {
-            result += piece;
-            if (number != Text::npos)
-                result.replace(result.size() - piece.size() + number, 1,
-                               std::to_string(1000000 + i).substr(1));
-        }
-    }
-    return result.append(text, done);
-}
 
 } // namespace
 
@@ -73,6 +56,8 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser && geteui
               {"user", m_root / "user data"},
               {"machine", m_root / "machine data"},
               {"tool", m_root / "Tool Größe"},
+              {"default", m_root / "Apps ä" / "template"},
+              {"previous", m_root / "Vorige 版"},
               {"elsewhere", m_root / "elsewhere"}};
     if (IsWindowsProgram())
     {
@@ -87,6 +72,7 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser && geteui
                 {"{app}", root + "Apps ä"},
                 {"{default}", root + "Apps ä" + separator + "template"},
                 {"{previous}", root + "Vorige 版"},
+                {"{machine}", m_wine ? "C:\\ProgramData" : m_dirs["machine"].string()},
                 {"{user}", m_wine ? m_wine->UserDataPath() : m_dirs["user"].string()},
                 {"{/}", separator}};
     for (const auto& [token, value] : Files(m_tokens))
@@ -98,7 +84,6 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser && geteui
     const fs::path icons = fs::path(TOOL_DIR) / "BundleIcons";
     fs::copy(icons, m_dirs["tool"]);
     fs::copy(icons, m_dirs["tool"] / "BundleIcons");
-    fs::create_directory(m_root / "Vorige 版");
     const fs::path programs = m_wine ? WindowsProgram().parent_path() : fs::path(TOOL_DIR);
     for (const char* program : {"FolderUpgrade", "FolderUpgradeCheck", "FolderUpgradeRecorded"})
     {
@@ -130,7 +115,7 @@ Text Workstation::Expand(Text text) const
         return ToUtf16(text.substr(7));
     if (StartsWith(text, "{icon:"))
         return ReadFile(fs::path(TOOL_DIR) / text.substr(6, text.size() - 7));
-    return Repeat(text);
+    return text;
 }
 
 void Workstation::SetAttributes(const Text& place, const Text& letters) const

@@ -4,15 +4,15 @@
 //   hot/NAME/...    the hot folder of that name, [P] is its private directory
 //   user/...        the per-user application data folder; machine/... the machine-wide one
 //   tool/...        the folder of the executable
+//   default/...     the template folder of this version; previous/... that of the previous one
 //   elsewhere/...   files that the tool has no reason to touch, for example targets of links
 // A place that ends in a slash is a directory. One that ends in '#' has the attributes of the file
 // or directory before it, as letters: R read-only, H hidden, S system, X another user's,
 // 0 no permission at all, L a directory that cannot be listed ("hot/A/Desktop.ini#" -> "RS").
 //
-// In texts, {hot}, {user}, {tool}, {app}, {previous} and {default} are replaced with paths (as the
-// tool sees them) and {/} with the path separator; in capitals ({HOT}, {/2}) in the form of the
-// registry editor's text. {repeat:COUNT:TEXT} is the text COUNT times, with the repetition's
-// six-digit number in place of '#'. A whole text can also be
+// In texts, {hot}, {user}, {machine}, {tool}, {app}, {previous} and {default} are replaced with
+// paths (as the tool sees them) and {/} with the path separator; in capitals ({HOT}, {/2}) in the
+// form of the registry editor's text. A whole text can also be
 //   {utf16}TEXT     the text in UTF-16 with a byte-order mark
 //   {icon:NAME}     the bytes of a shipped icon
 //   {link:TARGET}   a symbolic link to another place or to an absolute path; to a directory if its

@@ -9,7 +9,6 @@ namespace
 
 const Text Jobs = "user/ORX/JPData";
 const Text LogFolder = "user/ORX_Installers";
-const Text Ini = "hot/A/Desktop.ini";
 const char* const NoLinks = "Wine does not show links to files as links";
 const char* const NoRefusal = "Wine lets every user open or list a directory";
 
@@ -40,7 +39,10 @@ Files DoneFolder(char name)
 // A run would change nothing here, and there is nothing to report.
 Scenario Done(const Text& name)
 {
-    return Scenario(name).Before(DoneFolder('A')).Preset(Stored("elsewhere"));
+    return Scenario(name)
+        .Before(DoneFolder('A'))
+        .Before({{"default/Booklet.tpl", ""}})
+        .Preset(Stored(MovedTo));
 }
 
 std::vector<Scenario> Machines()
@@ -56,16 +58,15 @@ std::vector<Scenario> Machines()
         Done("WhatIsDoneIsNotReported").IsReported(""),
         Scenario("AnEmptyMachine")
             .Before({{ListPlace, Removed}, {LogPlace, Removed}, {Jobs + "/", Removed}})
-            .Before({{MachineHive, Removed}, {UserHive, Removed}})
             .IsReported(R"(
 Workstation
-  note     there is no HotFolderList.cfg
+  note     there is no {list}
   note     there will be no run log: there is no folder {user}{/}ORX_Installers{/}
 Job presets
   note     there are no presets, because there is no folder {user}{/}ORX{/}JPData{/})"),
         Done("AListIsCutOff").Before({{ListPlace, "<HotFolders>"}}).IsReported(R"(
 Workstation
-  problem  HotFolderList.cfg: XML parsing error: 'no element found' at line 1)"),
+  problem  {list}: damaged (line 1: no element found); no hot folder is migrated)"),
         Done("TheListIsADirectory")
             .Before({{ListPlace, Removed}, {ListPlace + "/", ""}})
             .IsReported(R"(
@@ -79,13 +80,17 @@ Workstation
   problem  none of the listed hot folders exists (another account? mapped drives?)
   note     listed hot folder does not exist: {hot}{/}B
   note     listed hot folder does not exist: {hot}{/}C)"),
-        listed("AListedFolderIsMissingTwiceOrHasTwoNames", "AABC")
-            .Before({{"hot/C/", "{link:hot/A}"}})
+        listed("AListedFolderIsMissingTwiceOrHasTwoNames", "AABCDEFGHIJKLMNOPQRSTUVWXYZ")
+            .Before({{"hot/C/", "{link:hot/A}"}, {"hot/D/", "{link:hot/A}"}})
             .IsReported(R"(
 Workstation
   note     listed hot folder does not exist: {hot}{/}B
-  note     hot folder is listed twice: {hot}{/}A
+  note     listed hot folder does not exist: {hot}{/}E
+{more}
+  note     listed hot folder and 4 more
 {hot}{/}C
+  note     the same directory as {hot}{/}A
+{hot}{/}D
   note     the same directory as {hot}{/}A)"),
         Done("TheLogIsALink")
             .Before({{LogPlace, "{link:elsewhere/a}"}})
@@ -107,7 +112,7 @@ Workstation
   problem  there will be no run log: its folder cannot be written to: {user}{/}ORX_Installers{/})"),
         Done("TheListCannotBeRead").Before({{ListPlace + "#", "0"}}).AsOtherUser().IsReported(R"(
 Workstation
-  problem  HotFolderList.cfg: can't open file*)"),
+  problem  can't open file*)"),
         Done("NoFolderCanBeEntered")
             .Before({{"machine/hotfolder#", "0"}, {LogFolder + "#", "0"}, {Jobs + "#", "0"}})
             .AsOtherUser()
@@ -127,19 +132,12 @@ Job presets
     };
 }
 
-// The registry values of the two template folders.
-std::vector<Scenario> Values()
+// The template folders: what is in the registry, and whether the templates are there.
+std::vector<Scenario> Templates()
 {
-    const Text stays = R"(
+    const Text missing = R"(
 {hot}{/}A
-  note     template elsewhere: {previous}{/}Booklet.tpl)";
-    const Text below = stays + R"(
-Job presets
-  problem  the folder being installed is below the one being left; every further run moves the)"
-                               " paths of presets again";
-    const Text noPresets = R"(
-Job presets
-  note     there are no presets in {user}{/}ORX{/}JPData{/})";
+  problem  no template at {previous}{/}Booklet.tpl)";
     const auto with = [](const Text& name, const Files& hives)
     {
         return Done(name).FolderCfg(Written(MovedFrom)).Before(hives);
@@ -149,59 +147,122 @@ Job presets
         return with(name, {{UserHive, UserValue("\"Path\"=\"" + path + "\"")}});
     };
     return {
-        with("PathIsMissing", {{UserHive, Removed}}).Before(DoneFolder('B')).IsReported(R"(
+        with("PathIsMissing", {{UserHive, UserValue("")}})
+            .Before({{Cfg('B'), Written(MovedFrom)}})
+            .IsReported(R"(
 {hot}{/}A
-  problem  {Path}: {unknown})"),
+  problem  {Path}: missing{nothing}
+  problem  no template at {previous}{/}Booklet.tpl
+{hot}{/}B
+  problem  no template at {previous}{/}Booklet.tpl
+{noicon})"),
         with("OnlyAPresetAsksForPath", {{UserHive, Removed}, {CfgPlace, Removed}}).IsReported(R"(
 {hot}{/}A
   note     no Folder.cfg
-  note     no copy of the icon to replace: hf_folder_disabled.ico
+{nodisabled}
 Job presets
-  problem  {Path}: {unknown})"),
-        with("InstallPathIsMissing", {{MachineHive, Removed}}).IsReported(R"(
+  problem  registry value Path in HKEY_CURRENT_USER\SOFTWARE\Wow6432Node\HF or \SOFTWARE\HF: {key}{nothing})"),
+        withPath("PathIsTooLong", Text(258, 'x')).IsReported(R"(
 {hot}{/}A
-  problem  {InstallPath}: {unknown})"),
+  problem  {Path}: longer than 257 characters{nothing}
+  problem  no template at {previous}{/}Booklet.tpl)"),
+        with("InstallPathIsInTheOtherKey",
+             {{MachineHive, Replaced(MachineValue(""), "SOFTWARE", "SOFTWARE\\Wow6432Node")}})
+            .IsReported(R"(
+{hot}{/}A
+  problem  registry value InstallPath in HKEY_LOCAL_MACHINE\SOFTWARE\Wow6432Node\Vantorix\QZA: )"
+                        R"(missing, and no other key is looked at{nothing}
+  problem  stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl)"),
         with("NothingAsksForInstallPath", {{MachineHive, Removed}, {PresetPlace, Removed}})
-            .FolderCfg(Written("{hot}{/}T"))
-            .IsReported(Replaced(stays, "{previous}{/}Booklet.tpl", "{hot}{/}T") + noPresets),
-        withPath("PathEndsInASeparator", "{PREVIOUS}{/2}")
+            .FolderCfg(Written("{hot}{/}A"))
+            .IsReported(R"(
+Job presets
+  note     there are no presets in {user}{/}ORX{/}JPData{/})"),
+        withPath("PathEndsInASeparator", "{PREVIOUS}{/2}").IsReported(R"(
+Workstation
+  problem  {Path}: ends in a separator; no template of a hot folder moves
+{hot}{/}A
+  problem  stays in the folder being left (in a sub-folder): {previous}{/}Booklet.tpl)"),
+        withPath("PathEndsInASeparatorOnTheWayBack", "{PREVIOUS}{/2}")
+            .FolderCfg(Written("{hot}{/}A"))
+            .Preset("")
+            .Run({"U"})
             .IsReported(R"(
 Workstation
-  problem  {Path}: ends in a separator; no template of a hot folder moves)" +
-                        stays),
-        withPath("PathEndsInASeparatorOnTheWayBack", "{PREVIOUS}{/2}").Run({"U"}).IsReported(R"(
-Workstation
-  problem  {Path}: ends in a separator; it is doubled in the paths of hot folders)" + stays),
+  problem  {Path}: ends in a separator; it is doubled in the paths of hot folders)"),
         withPath("PathIsEmpty", "")
             .IsReported(R"(
 Workstation
   problem  {Path}: empty; only templates stored without a folder move)" +
-                        stays),
-        withPath("PathIsEmptyOnTheWayBack", "").Run({"U"}).IsReported(R"(
+                        missing),
+        withPath("PathIsEmptyOnTheWayBack", "").Preset("").Run({"U"}).IsReported(R"(
 Workstation
-  problem  {Path}: empty; templates move to the root of the drive)" + stays),
-        withPath("PathHoldsAnAmpersand", "{PREVIOUS}&").IsReported(stays + R"(
-Job presets
-  problem  {Path}: holds & or <, which presets store in another form)"),
-        withPath("TheNewFolderIsBelowTheOld", "{APP}").IsReported(below),
-        withPath("TheOldFolderIsBelowTheNew", "{APP}{/2}template{/2}old")
+  problem  {Path}: empty; templates move to the root of the drive)" + missing),
+        withPath("PathHoldsAnAmpersand", "{hot}&")
+            .Preset(Stored("{hot}{/}A"))
             .Run({"U"})
-            .IsReported(below),
-        withPath("WithoutPresetsAFolderBelowIsHarmless", "{APP}&")
-            .Before({{PresetPlace, Removed}})
-            .IsReported(stays + noPresets),
+            .IsReported(missing + R"(
+Job presets
+  problem  {Path}: holds & or <, which is inserted into presets as it is)"),
+        withPath("TheNewFolderIsBelowTheOld", "{APP}")
+            .Before({{"default/template/Booklet.tpl", ""}})
+            .IsReported(missing + R"(
+Job presets
+  change   .P{/}Presets{/}presets.xml: {default}{/}Booklet.tpl -> {default}{/}template{/}Booklet.tpl
+  problem  one template folder is below the other: another run would move paths of presets once more)"),
         withPath("BothFoldersAreTheSame", "{APP}{/2}template")
             .FolderCfg(Written(MovedTo))
-            .Preset(Stored(MovedTo))
             .IsReported(""),
         with("InstallPathIsANumber",
              {{MachineHive, MachineValue("\"InstallPath\"=dword:00000001")}})
+            .Preset(Stored("{hot}{/}A"))
             .IsReported(R"(
 {hot}{/}A
   problem  Folder.cfg: left as it is (new path holds a character that XML cannot store)
+  problem  stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl
 Job presets
-  problem  the folder being installed holds a character that XML cannot store; no path of a)"
-                        " preset moves"),
+  problem  the folder being installed holds a character that XML cannot store; no path of a )"
+                        R"(preset moves)"),
+        Done("TemplatesAreMissing")
+            .FolderCfg(Written("{default}{/}none"))
+            .Before({{Cfg('B'), Written("{previous}{/}Sub{/}T")},
+                     {Cfg('C'), Written("{hot}{/}D{/}T")},
+                     {"hot/D/", "{link:elsewhere/d}"},
+                     {"elsewhere/d/T", ""}})
+            .Preset(Stored("{hot}{/}..{/}Vorige 版{/}T") +
+                    Stored("{hot}{/}..{/}Vorige &#x7248;{/}&amp;") +
+                    Stored("{default}{/}&lt;&#65;&none;") + "ORXImposeTemplate\">\"{previous}")
+            .IsReported(R"(
+{hot}{/}A
+  problem  no template at {default}{/}none
+{hot}{/}B
+  problem  stays in the folder being left (in a sub-folder): {previous}{/}Sub{/}T
+{noicon}
+{hot}{/}C
+  note     not looked at: {hot}{/}D{/}T
+{noicon}
+{hot}{/}D
+  note     no Folder.cfg
+{nodisabled}
+Job presets
+  note     .P{/}Presets{/}presets.xml: a template path has no end
+  problem  .P{/}Presets{/}presets.xml: no template at {default}{/}<A&none;
+  problem  .P{/}Presets{/}presets.xml: stays in the folder being left (other separators): )"
+                        R"({hot}{/}..{/}Vorige 版{/}T
+  problem  .P{/}Presets{/}presets.xml: stays in the folder being left (stored as XML): )"
+                        R"({hot}{/}..{/}Vorige 版{/}&)"),
+        Done("ARehearsal")
+            .FolderCfg(Written("{hot}{/}old{/}T"))
+            .Preset(Stored("{hot}{/}old{/}T") + Stored("{hot}{/}old{/}T"))
+            .Before({{MachineHive, Removed}, {UserHive, Removed}, {"tool/hf_folder.ico", Removed}})
+            .Run({"I", "--from", "{hot}{/}old", "--to", "{hot}{/}new"})
+            .IsReported(R"(
+{hot}{/}A
+  change   Folder.cfg: {hot}{/}old{/}T -> {hot}{/}new{/}T
+Job presets
+  change   .P{/}Presets{/}presets.xml: {hot}{/}old{/}T -> {hot}{/}new{/}T (2 times)
+Templates
+  note     there is no folder {hot}{/}new yet; templates that will be looked for in it: 2)"),
     };
 }
 
@@ -224,89 +285,77 @@ Scenario Losses()
                {entry, entry + " Mine=\"\" Value=\"1\"/>" + entry},
                {end, "<Mine><b/></Mine><Paths/>Note <?mine?><!-- no loss -->" + end}})
         cfg = Replaced(cfg, from, to);
-    return Scenario("Losses")
+    return Done("Losses")
         .Before({{Cfg('A'), Replaced(cfg, "HotFolder", "Old")},
-                 {Cfg('B'), Replaced(Written(MovedFrom), " description=\"\"", "")},
-                 {Cfg('C'), Replaced(Written(MovedFrom), "Enable=\"1\"", "Enable=\"true\"")},
-                 {PresetPlace, ""}})
-        .IsReported(Replaced(
-            Replaced(R"(
+                 {Cfg('B'), Replaced(Written(MovedFrom), " TimeInterval=\"010\"", "")},
+                 {Cfg('C'), Replaced(Written(MovedFrom), "Enable=\"1\"", "Enable=\"true\"")}})
+        .IsReported(
+            R"(
 {hot}{/}A
   problem  Folder.cfg: loses its document type, and with it the entities in its texts
   problem  Folder.cfg: loses the instruction <?top?>
   problem  Folder.cfg: its root <Old> comes out as <HotFolder>
-  problem  Folder.cfg: lacks the attribute "Quickset"; {defaults}
+  problem  Folder.cfg: lacks "Quickset", so the rewrite resets: Quickset_Supported, IsWidthBased
   problem  Folder.cfg: server_version="5b" comes out as "5"
   problem  Folder.cfg: loses the attribute mine="7"
   problem  Folder.cfg: loses <KEYVALUE Key="B" Mine="" Value="1"> in <JobSetting>
-  problem  Folder.cfg: loses {entry} in <JobSetting>
-  problem  Folder.cfg: loses <Mine> in <Old>
+  problem  Folder.cfg: loses <KEYVALUE Key="B" KeyDisplayValue="two" LocDisplayValue="zwei" )"
+            R"(Value="2"> in <JobSetting>
+  problem  Folder.cfg: loses <Mine>
   problem  Folder.cfg: loses <b> in <Mine>
-  problem  Folder.cfg: loses <Paths> in <Old>
-  problem  Folder.cfg: loses the text "Note" in <Old>
+  problem  Folder.cfg: loses <Paths>
+  problem  Folder.cfg: loses the text "Note"
   problem  Folder.cfg: loses the instruction <?mine?>
 {moves}
-  note     no copy of the icon to replace: hf_folder.ico
 {hot}{/}B
-  problem  Folder.cfg: lacks the attribute "description"; {defaults} (the folder comes out disabled)
+  problem  Folder.cfg: lacks "TimeInterval", so the rewrite resets: PPDVersion, )"
+            R"(ServerTypeAndJPDefaultKeyInfo, server_version, server_textversion, server_type, Quickset, )"
+            R"(Quickset_Supported, IsWidthBased
 {moves}
-  note     no copy of the icon to replace: hf_folder_disabled.ico
+{noicon}
 {hot}{/}C
   problem  Folder.cfg: Enable="true" comes out as "0"
 {moves}
-  note     no copy of the icon to replace: hf_folder_disabled.ico)",
-                     "{defaults}", "the rewrite sets it and all that follow it to their defaults"),
-            "{entry}", entry + " Value=\"2\" KeyDisplayValue=\"two\" LocDisplayValue=\"zwei\">"));
+{nodisabled})");
 }
 
-std::vector<Scenario> FoldersAndPresets()
+std::vector<Scenario> Contents()
 {
     const Text hidden = Replaced(Written(MovedTo), " description=\"\"", "");
     const Text utf16 = Replaced(Replaced(Written(MovedFrom), "UTF-8", "UTF-16"), "𝄞", "");
     return {
         Losses(),
         Done("FolderCfgs")
-            .FolderCfg(Written(MovedFrom))
             .Before({{"hot/B/[P]/", ""},
                      {Cfg('C'), "<a><b></a>"},
                      {Cfg('D') + "/", ""},
                      {"hot/E/[P]/", "{link:elsewhere/d}"},
                      {"elsewhere/d/Folder.cfg", Written(MovedFrom)},
-                     {Cfg('F'), Minimal(MovedFrom, "<?xml version='1.0' encoding='x'?>", "ä")},
                      {Cfg('G'), "{utf16}" + utf16},
                      {Cfg('H'), hidden},
-                     {Cfg('I'), Replaced(hidden, "Enable=\"1\"", "Enable=\"0\"")},
-                     {Cfg('J'), Written("{hot}{/}T")}})
+                     {Cfg('I'), Replaced(hidden, "Enable=\"1\"", "Enable=\"0\"")}})
             .IsReported(R"(
-{hot}{/}A
-{moves}
 {hot}{/}B
   note     no Folder.cfg
-  note     no copy of the icon to replace: hf_folder_disabled.ico
+{nodisabled}
 {hot}{/}C
-  problem  Folder.cfg: XML parsing error: 'mismatched tag' at line 1
-  note     no copy of the icon to replace: hf_folder_disabled.ico
+  problem  Folder.cfg: damaged (line 1: mismatched tag); it stays as it is, and the folder shows )"
+                        R"(as disabled
+{nodisabled}
 {hot}{/}D
   problem  Folder.cfg: is not a file
-  note     no copy of the icon to replace: hf_folder_disabled.ico
+{nodisabled}
 {hot}{/}E
   problem  [_ORX_HotFolder_]: reached over a link
-{hot}{/}F
-  problem  Folder.cfg: left as it is (unknown encoding)
-  note     no copy of the icon to replace: hf_folder_disabled.ico
 {hot}{/}G
-  change   Folder.cfg: {previous}{/}Booklet.tpl -> {default}{/}Booklet.tpl
+{moves}
   note     Folder.cfg: comes out as UTF-8
-  note     no such file: {default}{/}Booklet.tpl
-  note     no copy of the icon to replace: hf_folder.ico
+{noicon}
 {hot}{/}H
-  problem  Folder.cfg: lacks the attribute "description", so the enabled folder shows as disabled
-  note     no copy of the icon to replace: hf_folder_disabled.ico
+  problem  Folder.cfg: lacks "description", so the enabled folder shows as disabled
+{nodisabled}
 {hot}{/}I
-  note     no copy of the icon to replace: hf_folder_disabled.ico
-{hot}{/}J
-  note     template elsewhere: {hot}{/}T
-  note     no copy of the icon to replace: hf_folder.ico)"),
+{nodisabled})"),
         Done("Presets")
             .Before({{PresetOf('B') + "/", ""},
                      {Jobs + "/C/Presets/", "{link:elsewhere/d}"},
@@ -314,22 +363,21 @@ std::vector<Scenario> FoldersAndPresets()
                      {PresetOf('D'), Text("\xFF\xFE\0", 3)},
                      {PresetOf('E'), "<p>\xC3\xA4 \xE4</p>"},
                      {PresetOf('F'), "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?><p>\xE4</p>"},
-                     {PresetOf('G'), Stored(MovedFrom) + Stored(MovedFrom)},
-                     {PresetOf('H'), Stored(MovedFrom)},
-                     {PresetOf('I'), "\xEF\xBB\xBF<p/>"},
-                     {PresetOf('J'), "{utf16}<p>ä</p>"}})
+                     {PresetOf('G'), Stored(MovedFrom)},
+                     {PresetOf('H'), "\xEF\xBB\xBF<p/>"},
+                     {PresetOf('I'), "{utf16}<p>ä</p>"}})
             .IsReported(R"(
 Job presets
   change   E{/}Presets{/}presets.xml: comes out as UTF-8
   change   F{/}Presets{/}presets.xml: comes out as UTF-8
-  change   G{/}Presets{/}presets.xml: 2 paths
-  change   H{/}Presets{/}presets.xml: 1 path
-  change   I{/}Presets{/}presets.xml: loses its byte-order mark
-  change   J{/}Presets{/}presets.xml: comes out as UTF-8, without byte-order mark
+  change   G{/}Presets{/}presets.xml: {previous}{/}Booklet.tpl -> {default}{/}Booklet.tpl
+  change   H{/}Presets{/}presets.xml: loses its byte-order mark
+  change   I{/}Presets{/}presets.xml: comes out as UTF-8, without byte-order mark
   problem  B{/}Presets{/}presets.xml: reached over a link, or not a file
   problem  C{/}Presets{/}presets.xml: reached over a link, or not a file
   problem  D{/}Presets{/}presets.xml: left as it is (cannot be decoded)
-  problem  E{/}Presets{/}presets.xml: is not UTF-8, so the whole file is read as Latin-1
+  problem  E{/}Presets{/}presets.xml: is not UTF-8, so the whole file is read as Latin-1; )"
+                        R"(accented characters come out wrong
   problem  F{/}Presets{/}presets.xml: declares the encoding ISO-8859-1, but comes out as UTF-8)"),
         Done("LineEndsOfPresets")
             .Preset("<p>\n</p>")
@@ -352,7 +400,7 @@ Job presets
             .IsReported(R"(
 {hot}{/}A
   problem  Folder.cfg: reached over a link
-  note     no copy of the icon to replace: hf_folder_disabled.ico
+{nodisabled}
 {hot}{/}B
   problem  hf_folder.ico: reached over a link
 {hot}{/}C
@@ -370,6 +418,7 @@ Workstation
   problem  there will be no run log: can't open file*
 {hot}{/}A
   problem  Folder.cfg: cannot be opened for writing (can't open file*
+  problem  stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl
 Job presets
   problem  .P{/}Presets{/}presets.xml: cannot be opened for writing (can't open file*)"),
         Done("NothingCanBeRead")
@@ -387,13 +436,13 @@ Job presets
             .IsReported(R"(
 {hot}{/}A
   problem  Folder.cfg: can't open file*
-  note     no copy of the icon to replace: hf_folder_disabled.ico
+{nodisabled}
 {hot}{/}B
   problem  [_ORX_HotFolder_]: cannot be entered
 {hot}{/}C
   problem  the hot folder cannot be entered
 {hot}{/}D
-  problem  hf_folder.ico: the copy would be refused
+  problem  hf_folder.ico: cannot be replaced (read-only, in use, or access denied)
 Job presets
   problem  .P{/}Presets{/}presets.xml: cannot be opened for reading (can't open file*
   problem  Q{/}Presets{/}presets.xml: {user}{/}ORX{/}JPData{/}Q cannot be entered)"),
@@ -407,13 +456,16 @@ Job presets
             .AsOtherUser()
             .IsReported(R"(
 {hot}{/}A
-  problem  hf_folder.ico: the copy would be refused
+  problem  hf_folder.ico: cannot be replaced (read-only, in use, or access denied)
 {hot}{/}B
   problem  Desktop.ini: cannot be opened for reading and writing
   problem  Desktop.ini: its attributes cannot be changed)"),
         Done("FoldersOfAnotherUser")
             .Before(DoneFolder('B'))
-            .Before({{Ini, Removed}, {Ini + "#", Removed}, {"hot/A#", "SX"}, {"hot/B#", "X"}})
+            .Before({{"hot/A/Desktop.ini", Removed},
+                     {"hot/A/Desktop.ini#", Removed},
+                     {"hot/A#", "SX"},
+                     {"hot/B#", "X"}})
             .AsOtherUser()
             .NotUnderWine(NoRefusal)
             .IsReported(R"(
@@ -425,21 +477,22 @@ Job presets
             .Before({{"tool/BundleIcons#", "0"},
                      {"hot/B/[P]/hf_folder_disabled.ico", ""},
                      {"hot/C/[P]/hf_folder_disabled.ico", ""}})
-            .FolderCfg(Written("{hot}{/}T"))
+            .FolderCfg(Written("{hot}{/}A"))
+            .Preset("")
             .Run({"U"})
             .AsOtherUser()
             .IsReported(R"(
 {hot}{/}A
   problem  source icon missing: {tool}{/}BundleIcons{/}hf_folder.ico
-  note     template elsewhere: {hot}{/}T
 {hot}{/}B
   problem  source icon missing: {tool}{/}BundleIcons{/}hf_folder_disabled.ico
   note     no Folder.cfg
 {hot}{/}C
   note     no Folder.cfg)"),
         Done("KeysAndAttributes")
-            .Before(
-                {{Ini, "[.ShellClassInfo]\r\nIconFile=x\r\n"}, {Ini + "#", "H"}, {"hot/A#", "H"}})
+            .Before({{"hot/A/Desktop.ini", "[.ShellClassInfo]\r\nIconFile=x\r\n"},
+                     {"hot/A/Desktop.ini#", "H"},
+                     {"hot/A#", "H"}})
             .IsReported(R"(
 {hot}{/}A
   change   Desktop.ini: InfoTip, IconFile
@@ -449,8 +502,8 @@ Job presets
 }
 
 TEST_SCENARIOS(Machines);
-TEST_SCENARIOS(Values);
-TEST_SCENARIOS(FoldersAndPresets);
+TEST_SCENARIOS(Templates);
+TEST_SCENARIOS(Contents);
 
 TEST(Check, WritesToAFile)
 {
@@ -463,13 +516,13 @@ TEST(Check, WritesToAFile)
     };
     EXPECT_EQ(0, run("{hot}{/}A{/}Bericht ä 版.txt").status);
     const Text report = ReadFile(workstation.HostPath("hot/A/Bericht ä 版.txt"));
-    const Text rest = workstation.Expand("\nFrom {previous} to {default}\n\n"
-                                         "0 changes, 0 problems, 0 notes\n");
     const size_t head = report.find_first_of("\r\n");
     EXPECT_THAT(report.substr(0, head),
                 testing::MatchesRegex("FolderUpgradeCheck [0-9]+\\.[0-9]+\\.[0-9]+, upgrade, "
                                       "20[0-9-]+ [0-9]+:[0-9]+, [^,]+, (not )?elevated"));
-    EXPECT_EQ(rest, Replaced(report.substr(head), "\r", ""));
+    EXPECT_EQ(workstation.Expand("\nFrom {previous} to {default}\n\n"
+                                 "0 changes, 0 problems, 0 notes\n"),
+              Replaced(report.substr(head), "\r", ""));
 
     const RunResult refused = run("{hot}{/}none{/}a.txt");
     EXPECT_EQ(2, refused.status);
@@ -482,19 +535,18 @@ TEST(Check, WritesToAFile)
 TEST(Check, PrintsItsUsage)
 {
     const Workstation workstation;
+    const Text usage = workstation.Start("FolderUpgradeCheck", {"--help"}).output;
+    EXPECT_TRUE(
+        StartsWith(usage, "Usage: FolderUpgradeCheck I|U [--from FOLDER] [--to FOLDER] [FILE]"));
+    EXPECT_THAT(workstation.Start("FolderUpgradeCheck", {"--version"}).output,
+                testing::MatchesRegex("FolderUpgradeCheck [0-9.]+\r?\n"));
     for (const std::vector<Text>& wrong :
-         {std::vector<Text>{}, {"V"}, {"/I"}, {"I", "report", "V"}})
+         {std::vector<Text>{}, {"V"}, {"/I"}, {"I", "report", "V"}, {"I", "--to"}, {"I", ""}})
     {
         const RunResult run = workstation.Start("FolderUpgradeCheck", wrong);
         EXPECT_EQ(3, run.status);
         EXPECT_EQ("", run.output);
-        EXPECT_EQ(IsWindowsProgram() ? ""
-                                     : R"(Usage: FolderUpgradeCheck I|U [FILE]
-Reports what FolderUpgrade would change with the same switch, and what would prevent a change, )"
-                                       R"(to the standard output or to FILE.
-Exit status: 0 nothing to do, 1 changes, 2 problems, 3 wrong arguments.
-)",
-                  run.libraryLog);
+        EXPECT_EQ(IsWindowsProgram() ? "" : usage, run.libraryLog);
     }
 }
 
