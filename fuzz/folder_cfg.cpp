@@ -1,5 +1,5 @@
-// Arbitrary bytes as a Folder.cfg: what loads is unchanged after saving and loading, and what does not load leaves
-// every value as it was.
+// Arbitrary bytes as a Folder.cfg: what loads is unchanged after saving and loading, and what does
+// not load leaves every value as it was.
 #include "fuzz/fuzzing.h"
 #include "store/folder_cfg_format.h"
 #include "store/folder_cfg_reader.h"
@@ -48,7 +48,8 @@ bool AreEqual(const Values& left, const Values& right)
 {
     const auto& attributes = RootAttributes();
     return std::all_of(attributes.begin(), attributes.end(),
-                       [&](const RootAttribute& each) { return each.Format(left.settings) == each.Format(right.settings); }) &&
+                       [&](const RootAttribute& each)
+                       { return each.Format(left.settings) == each.Format(right.settings); }) &&
            Sections(left) == Sections(right);
 }
 
@@ -68,8 +69,8 @@ bool Read(const wxString& path, Values& values)
 
 void Save(const wxString& path, const Values& values)
 {
-    SaveHotFolderSettings(path, values.settings, values.jobSettings, values.paths, values.filterSetting, values.imposeSettings,
-                          values.preflightSettings);
+    SaveHotFolderSettings(path, values.settings, values.jobSettings, values.paths,
+                          values.filterSetting, values.imposeSettings, values.preflightSettings);
 }
 
 } // namespace

@@ -23,9 +23,15 @@ inline void Check(bool holds, const char* promise)
 }
 
 /// A new file of this process in $TMPDIR.
-inline std::string NewFile() { return wxFileName::CreateTempFileName("fuzz").utf8_string(); }
+inline std::string NewFile()
+{
+    return wxFileName::CreateTempFileName("fuzz").utf8_string();
+}
 
-inline void WriteBytes(const std::string& path, const std::string& bytes) { std::ofstream(path, std::ios::binary) << bytes; }
+inline void WriteBytes(const std::string& path, const std::string& bytes)
+{
+    std::ofstream(path, std::ios::binary) << bytes;
+}
 
 inline std::string ReadBytes(const std::string& path)
 {

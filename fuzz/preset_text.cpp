@@ -1,5 +1,5 @@
-// Any job preset text and any two folders, which are the input's first two lines: only the folder's text in template
-// paths changes, and moving back restores the text.
+// Any job preset text and any two folders, which are the input's first two lines: only the folder's
+// text in template paths changes, and moving back restores the text.
 #include "migrate/preset_text.h"
 
 #include "fuzz/fuzzing.h"
@@ -18,7 +18,10 @@ std::wstring TakeLine(std::wstring& text)
     return line;
 }
 
-std::wstring WithoutFinalSeparators(std::wstring folder) { return folder.erase(folder.find_last_not_of(L'/') + 1); }
+std::wstring WithoutFinalSeparators(std::wstring folder)
+{
+    return folder.erase(folder.find_last_not_of(L'/') + 1);
+}
 
 // The text with every path in the folder moved, computed one character at a time.
 std::wstring Moved(const std::wstring& text, const std::wstring& from, const std::wstring& to)
@@ -28,7 +31,8 @@ std::wstring Moved(const std::wstring& text, const std::wstring& from, const std
     for (size_t i = 0; i < text.size();)
     {
         const size_t end = i + path.size();
-        const bool isPath = text.compare(i, path.size(), path) == 0 && end < text.size() && (text[end] == L'/' || text[end] == L'"');
+        const bool isPath = text.compare(i, path.size(), path) == 0 && end < text.size() &&
+                            (text[end] == L'/' || text[end] == L'"');
         moved += isPath ? SearchText + to : text.substr(i, 1);
         i = isPath ? end : i + 1;
     }
@@ -40,10 +44,12 @@ bool LiesIn(const std::wstring& folder, const std::wstring& outer)
     return (folder + L"/").compare(0, outer.size() + 1, outer + L"/") == 0;
 }
 
-// Whether the folder can exist on a disk, and does not end with what could be the beginning of a search text.
+// Whether the folder can exist on a disk, and does not end with what could be the beginning of a
+// search text.
 bool IsPlain(const std::wstring& folder)
 {
-    return IsXmlText(folder) && folder.find(L'"') == std::wstring::npos && !wxString(folder).EndsWith(Key);
+    return IsXmlText(folder) && folder.find(L'"') == std::wstring::npos &&
+           !wxString(folder).EndsWith(Key);
 }
 
 } // namespace
@@ -61,9 +67,11 @@ void Try(const std::string& input)
     MovePresetPaths(preset, from, to);
     const std::wstring upgraded = canMove ? Moved(text, left, entered) : text;
     Check(preset == upgraded, "only the paths in the folder move");
-    if (!canMove || !IsPlain(left) || !IsPlain(entered) || LiesIn(left, entered) || LiesIn(entered, left))
+    if (!canMove || !IsPlain(left) || !IsPlain(entered) || LiesIn(left, entered) ||
+        LiesIn(entered, left))
         return;
-    Check(MovePresetPaths(preset, from, to) == 0 && preset == upgraded, "a second upgrade changes nothing");
+    Check(MovePresetPaths(preset, from, to) == 0 && preset == upgraded,
+          "a second upgrade changes nothing");
     MovePresetPaths(preset, to, from);
     Check(preset == text || Moved(text, entered, left) != text, "a downgrade restores the text");
 }
