@@ -70,7 +70,7 @@ Job presets
 Workstation
   problem  {list}: damaged (line 1: no element found); no hot folder is migrated
   note     there will be no run log: something else has its name: {log})"),
-        Done("TheListIsADirectoryAndTheLogALink")
+        Done("TheListIsADirectoryAndTheLogIsALink")
             .Before({{ListPlace, Removed}, {ListPlace + "/", ""}, {LogPlace, "{link:elsewhere/a}"}})
             .NotUnderWine(NoLinks)
             .IsReported(R"(
