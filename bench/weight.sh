@@ -1,11 +1,13 @@
 #!/usr/bin/env bash
-# Prints how many lines the product and its tests have, without empty ones, and the share of the tests.
+# Prints how many lines (without empty ones) and characters the product and its tests have, and the tests' share.
 set -euo pipefail
 cd "$(dirname "$0")/.."
 count() {
-    git ls-files "${@:2}" | grep -E "$1" | tr '\n' '\0' | xargs -0 cat | grep -c '[^[:space:]]'
+    git ls-files -z "$@" | grep -zE '\.(cpp|h|sh|py)$' | xargs -0 cat | grep '[^[:space:]]' | wc -lm
 }
-kinds='\.(cpp|h|sh|py)$'
-product=$(count "$kinds" app call check run store migrate appearance platform)
-tests=$(count "$kinds" tests fuzz)
-awk -v p="$product" -v t="$tests" 'BEGIN { printf "product %d, tests %d: %.1f %%\n", p, t, 100 * t / (p + t) }'
+read -r product_lines product < <(count app call check run store migrate appearance platform)
+read -r test_lines tests < <(count tests fuzz samples/installer_test.py)
+awk -v a="$product_lines" -v b="$product" -v c="$test_lines" -v d="$tests" 'BEGIN {
+    printf "product: %d lines, %d characters\ntests: %d lines, %d characters\n", a, b, c, d
+    printf "share of the tests: %.1f %% of the lines, %.1f %% of the characters\n", 100 * c / (a + c), 100 * d / (b + d)
+}'

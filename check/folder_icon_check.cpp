@@ -2,7 +2,6 @@
 
 #include "appearance/desktop_ini.h"
 #include "appearance/icon_copy.h"
-#include "appearance/icon_source.h"
 #include "platform/access_rights.h"
 #include "platform/file_copy.h"
 

@@ -1,11 +1,8 @@
-#include "tests/recording_shell.h"
+// A shell of the version in $SHELL_VERSION that prints its calls, in place of the silent one.
+#include "platform/system.h"
 
-#include <wx/string.h>
-
-std::vector<std::string> ShellCalls;
-DWORD ShellMajorVersion = 6;
-DWORD ShellMinorVersion = 0;
-HRESULT ShellVersionResult = 0;
+#include <cstdio>
+#include <cstdlib>
 
 namespace
 {
@@ -14,51 +11,49 @@ HRESULT GetVersion(DLLVERSIONINFO* version)
 {
     if (version->cbSize != 20 || version->dwMajorVersion != 0)
         return -1;
-    version->dwMajorVersion = ShellMajorVersion;
-    version->dwMinorVersion = ShellMinorVersion;
-    return ShellVersionResult;
+    const char* const text = std::getenv("SHELL_VERSION");
+    return std::sscanf(text, "%u.%u", &version->dwMajorVersion, &version->dwMinorVersion) == 2 ? 0
+                                                                                               : -1;
 }
-
-void Record(const wxString& call) { ShellCalls.push_back(call.utf8_string()); }
 
 } // namespace
 
 HMODULE LoadLibraryW(LPCWSTR name)
 {
-    Record("load " + wxString(name));
+    std::printf("load %ls\n", name);
     return reinterpret_cast<HMODULE>(1);
 }
 
 FARPROC GetProcAddress(HMODULE /*module*/, const char* name)
 {
-    Record("find " + wxString(name));
+    std::printf("find %s\n", name);
     return reinterpret_cast<FARPROC>(reinterpret_cast<void*>(GetVersion));
 }
 
 BOOL FreeLibrary(HMODULE /*module*/)
 {
-    Record("free");
-    return 1;
+    return std::puts("free");
 }
 
-void SHChangeNotify(LONG event, UINT flags, const void* item1, const void* item2)
+void SHChangeNotify(LONG event, UINT flags, const void* item, const void* /*second*/)
 {
-    wxString item = wxString::Format("%lld", static_cast<long long>(reinterpret_cast<std::intptr_t>(item1)));
-    if ((flags & 0xFF) == SHCNF_PATHW)
-        item = static_cast<const wchar_t*>(item1);
-    Record(wxString::Format("notify %x %x %s%s", static_cast<unsigned>(event), flags, item, item2 ? " and more" : ""));
+    const bool isPath = (flags & 0xFF) == SHCNF_PATHW;
+    std::printf("notify %x %x %ls %d\n", static_cast<unsigned>(event), flags,
+                isPath ? static_cast<const wchar_t*>(item) : L"",
+                isPath ? 0 : static_cast<int>(reinterpret_cast<std::intptr_t>(item)));
 }
 
-std::uintptr_t SHGetFileInfoW(LPCWSTR path, DWORD attributes, SHFILEINFOW* info, UINT size, UINT flags)
+std::uintptr_t SHGetFileInfoW(LPCWSTR path, DWORD attributes, SHFILEINFOW* info, UINT size,
+                              UINT flags)
 {
-    Record(wxString::Format("info %s %u %d %x", path, attributes, size == sizeof *info ? 1 : 0, flags));
+    std::printf("info %ls %u %d %x\n", path, attributes, size == sizeof *info, flags);
     info->iIcon = -7;
     return 1;
 }
 
-HRESULT SHGetSetFolderCustomSettings(SHFOLDERCUSTOMSETTINGS* settings, LPCWSTR path, DWORD readOrWrite)
+HRESULT SHGetSetFolderCustomSettings(SHFOLDERCUSTOMSETTINGS* settings, LPCWSTR path, DWORD action)
 {
-    Record(wxString::Format("force %s %x %s %u %d %x", path, settings->dwMask, settings->pszIconFile, settings->cchIconFile,
-                            settings->iIconIndex, readOrWrite));
+    std::printf("force %ls %x %ls %u %d %x\n", path, settings->dwMask, settings->pszIconFile,
+                settings->cchIconFile, settings->iIconIndex, action);
     return settings->dwSize == sizeof *settings ? 0 : -1;
 }

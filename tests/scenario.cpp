@@ -1,20 +1,37 @@
 #include "tests/scenario.h"
 
 #include "tests/scenarios/texts.h"
-#include "tests/text_files.h"
 
 #include <set>
 
-Scenario& Scenario::Add(Files& to, const Files& files)
+Scenario& Scenario::Before(const Files& files)
 {
     for (const auto& [place, text] : files)
-        to[place] = text;
+        before[place] = text;
     return *this;
+}
+
+Scenario& Scenario::After(const Files& files)
+{
+    for (const auto& [place, text] : files)
+        after[place] = text;
+    return *this;
+}
+
+Scenario& Scenario::FolderCfg(const Text& text, const Text& becomes)
+{
+    return Before({{CfgPlace, text}}).After({{CfgPlace, becomes.empty() ? text : becomes}});
+}
+
+Scenario& Scenario::Preset(const Text& text, const Text& becomes)
+{
+    return Before({{PresetPlace, text}}).After({{PresetPlace, becomes.empty() ? text : becomes}});
 }
 
 Scenario& Scenario::Log(const Text& folders, const Text& presets)
 {
-    return WholeLog("{start}" + Text(folders.empty() ? "No Hotfolder listed\n" : "") + "Start: HF updation\n" + folders +
+    return WholeLog("{start}" + Text(folders.empty() ? "No Hotfolder listed\n" : "") +
+                    "Start: HF updation\n" + folders +
                     "End: HF updation\nStart: Updating Impose path for JP Presets\n" + presets +
                     "End: Updating Impose path for JP Presets\n");
 }
@@ -24,9 +41,45 @@ Scenario& Scenario::LogOfA(const Text& impose, const Text& presets, const Text& 
     return Log(FolderLines("A", 1, NoIcon(icon), impose), presets);
 }
 
-Scenario& Scenario::LogOfDisabledA(const Text& impose, const Text& presets) { return LogOfA(impose, presets, "hf_folder_disabled"); }
+Scenario& Scenario::LogOfDisabledA(const Text& impose, const Text& presets)
+{
+    return LogOfA(impose, presets, "hf_folder_disabled");
+}
 
-Scenario& Scenario::LogOfPreset(const Text& line) { return Log("", PresetLine(line)); }
+Scenario& Scenario::LogOfPreset(const Text& line)
+{
+    return Log("", PresetLine(line));
+}
+
+Scenario& Scenario::Shell(const Text& version, const Text& calls)
+{
+    shellVersion = version;
+    shellCalls = calls;
+    return NotUnderWine("Wine's own shell is called there");
+}
+
+Scenario& Scenario::IsReported(const Text& lines)
+{
+    isOnlyChecked = true;
+    report = lines;
+    Text more;
+    for (char folder = 'F'; folder <= 'W'; ++folder)
+        more += Text("\n  note     listed hot folder does not exist: {hot}{/}") + folder;
+    for (const auto& [token, text] : Files{
+             {"{moves}",
+              "  change   Folder.cfg: {previous}{/}Booklet.tpl -> {default}{/}Booklet.tpl"},
+             {"{noicon}", "  note     no copy of the icon to replace: hf_folder.ico"},
+             {"{nodisabled}", "  note     no copy of the icon to replace: hf_folder_disabled.ico"},
+             {"\n{more}", more},
+             {"{key}", "there is no such key"},
+             {"{nothing}", ", for the account ACCOUNT; nothing moves. Run as the client's user, "
+                           "after its installation"},
+             {"{log}", "{user}{/}ORX_Installers{/}UpgradeDowngrade.log"},
+             {"{list}", "{machine}{/}hotfolder{/}HotFolderList.cfg"},
+             {"{Path}", "registry value Path in HKEY_CURRENT_USER\\SOFTWARE\\HF"}})
+        report = Replaced(report, token, text);
+    return *this;
+}
 
 Files WorkstationBefore(const Scenario& scenario)
 {
@@ -36,45 +89,17 @@ Files WorkstationBefore(const Scenario& scenario)
     for (const auto& [place, text] : scenario.before)
     {
         const size_t end = place.find('/', 4);
-        if (StartsWith(place, "hot/") && end != Text::npos && names.insert(place.substr(4, end - 4)).second)
+        if (StartsWith(place, "hot/") && end != Text::npos &&
+            names.insert(place.substr(4, end - 4)).second)
             list += "<HotFolder path=\"{hot}{/}" + place.substr(4, end - 4) + "\"/>";
     }
     files.insert({{ListPlace, list + "</HotFolders>"},
                   {LogPlace, "The log of an earlier run\r\n"},
                   {"user/ORX/JPData/", ""},
+                  {"previous/", ""},
                   {MachineHive, MachineValue("\"InstallPath\"=\"{APP}\"")},
                   {UserHive, UserValue("\"Path\"=\"{PREVIOUS}\"")}});
     for (auto file = files.begin(); file != files.end();)
         file = file->second == Removed ? files.erase(file) : std::next(file);
     return files;
-}
-
-Text LogAfter(const Scenario& scenario)
-{
-    const bool isUpgrade = !scenario.arguments.empty() && (scenario.arguments[0] == "I" || scenario.arguments[0] == "i");
-    Text log = scenario.log;
-    ReplaceAll(log, "{start}",
-               isUpgrade ? "Installation : Upgrade call with switch: I\n" : "Un-installation : Downgrade call with switch: U\n");
-    ReplaceAll(log, "{icons}", isUpgrade ? "" : "BundleIcons{/}");
-    return log;
-}
-
-void TestOn(const Scenario& scenario, const std::string& program, const std::function<void(Workstation&)>& test)
-{
-    if (IsWindowsProgram() && !scenario.notUnderWine.empty())
-        GTEST_SKIP() << scenario.notUnderWine;
-    Text description = scenario.name.what + ": " + program;
-    for (const Text& argument : scenario.arguments)
-        description += " " + argument;
-    const testing::ScopedTrace trace(scenario.name.file, scenario.name.line, description);
-    try
-    {
-        Workstation workstation(scenario.asOtherUser);
-        workstation.LayOut(WorkstationBefore(scenario));
-        test(workstation);
-    }
-    catch (const std::exception& exception)
-    {
-        FAIL() << exception.what();
-    }
 }

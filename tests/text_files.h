@@ -1,15 +1,18 @@
-// Reading and writing whole files, byte for byte.
+// Texts, and files that are read and written whole, byte for byte.
 #pragma once
 
 #include <filesystem>
+#include <map>
 #include <string>
 
-/// If there is no such file, throws an error with its name.
-std::string ReadFile(const std::filesystem::path& path);
-/// Also creates the directories above the file.
-void WriteFile(const std::filesystem::path& path, const std::string& text);
-void ReplaceAll(std::string& text, const std::string& from, const std::string& to);
-bool StartsWith(const std::string& text, const std::string& start);
+using Text = std::string;
+using Files = std::map<Text, Text>; // place -> text
 
+/// Empty if there is no such file.
+Text ReadFile(const std::filesystem::path& path);
+/// Also creates the directories above the file.
+void WriteFile(const std::filesystem::path& path, const Text& text);
+Text Replaced(Text text, const Text& from, const Text& to);
+bool StartsWith(const Text& text, const Text& start);
 /// Converts UTF-8 to UTF-16LE with a byte-order mark.
-std::string ToUtf16(const std::string& text);
+Text ToUtf16(const Text& text);

@@ -4,76 +4,68 @@
 //   hot/NAME/...    the hot folder of that name, [P] is its private directory
 //   user/...        the per-user application data folder; machine/... the machine-wide one
 //   tool/...        the folder of the executable
+//   default/...     the template folder of this version; previous/... that of the previous one
 //   elsewhere/...   files that the tool has no reason to touch, for example targets of links
-// A place that ends in a slash is a directory. One that ends in '#' has the attributes of the file or directory before
-// it, as letters: R read-only, H hidden, S system, X another user's, 0 no permission at all, L a directory that cannot be listed
-// ("hot/A/Desktop.ini#" -> "RS"). A snapshot of elsewhere/ also has the modes there ("R mode 444").
+// A place that ends in a slash is a directory. One that ends in '#' has the attributes of the file
+// or directory before it, as letters: R read-only, H hidden, S system, X another user's,
+// 0 no permission at all, L a directory that cannot be listed ("hot/A/Desktop.ini#" -> "RS").
 //
-// In texts, {hot}, {user}, {tool}, {app}, {previous} and {default} are replaced with paths (as the tool sees them) and
-// {/} with the path separator; in capitals ({HOT}, {/2}) in the form of the registry editor's text. {repeat:COUNT:TEXT}
-// is the text COUNT times, with the repetition's six-digit number in place of '#'. A whole text can also be
+// In texts, {hot}, {user}, {machine}, {tool}, {app}, {previous} and {default} are replaced with
+// paths (as the tool sees them) and {/} with the path separator; in capitals ({HOT}, {/2}) in the
+// form of the registry editor's text. A whole text can also be
 //   {utf16}TEXT     the text in UTF-16 with a byte-order mark
 //   {icon:NAME}     the bytes of a shipped icon
 //   {link:TARGET}   a symbolic link to another place or to an absolute path; to a directory if its
-//                   own place ends in a slash. Links to files and dangling ones work only on this machine.
+//                   own place ends in a slash. Links to files and dangling ones work only on this
+//                   machine.
 //   {fifo}          a FIFO; only on this machine
 #pragma once
 
-#include "tests/process.h"
+#include "tests/text_files.h"
+#include "tests/wine.h"
 
-#include <filesystem>
-#include <map>
 #include <memory>
-#include <string>
 #include <vector>
 
-using Files = std::map<std::string, std::string>; // place -> text
+inline const Text LogPlace = "user/ORX_Installers/UpgradeDowngrade.log";
+inline const Text MachineHive = "machine/registry/HKEY_LOCAL_MACHINE.reg";
+inline const Text UserHive = "user/registry/HKEY_CURRENT_USER.reg";
 
 struct RunResult
 {
-    ProcessResult process;
-    std::string output;     // its standard output
-    std::string libraryLog; // what the library reported, on Windows in message boxes
+    int status;      // as a shell reports it
+    Text output;     // its standard output
+    Text libraryLog; // what the library reported, on Windows in message boxes
 };
-
-class Wine;
-
-inline const char* const LogPlace = "user/ORX_Installers/UpgradeDowngrade.log";
-inline const char* const MachineHive = "machine/registry/HKEY_LOCAL_MACHINE.reg";
-inline const char* const UserHive = "user/registry/HKEY_CURRENT_USER.reg";
 
 class Workstation
 {
   public:
     /// For tests of refusals, everything belongs to a user who is not root, and runs as that user.
-    explicit Workstation(bool asOtherUser);
+    explicit Workstation(bool asOtherUser = false);
     ~Workstation();
     Workstation(const Workstation&) = delete;
     Workstation& operator=(const Workstation&) = delete;
 
+    /// Makes the files, and removes those of an earlier call.
     void LayOut(const Files& files);
-    /// Runs a program in the tool's folder until it ends.
-    RunResult Start(const std::vector<std::string>& arguments, const std::string& program = "FolderUpgrade");
-    /// Every file with its text, every link, every directory and every attribute that is set. Links are not followed.
+    /// Runs a program in the tool's folder until it ends, with limits of time and memory.
+    RunResult Start(const Text& program, const std::vector<Text>& arguments,
+                    const Files& environment = {}) const;
+    /// Every file with its text, every link, every directory and every attribute that is set. Links
+    /// are not followed.
     Files Snapshot() const;
     /// The text with everything in braces replaced, except for a link or a FIFO.
-    std::string Expand(std::string text) const;
-    /// Throws an error with the name if it is not a place.
-    std::filesystem::path HostPath(const std::string& place) const;
+    Text Expand(Text text) const;
+    std::filesystem::path HostPath(const Text& place) const;
 
   private:
-    std::string PlaceOf(const std::filesystem::path& path) const;
-    void Put(const std::string& place, const std::string& text) const;
-    void SetAttributes(const std::string& place, const std::string& letters) const;
+    void Put(const Text& place, const Text& text) const;
+    void SetAttributes(const Text& place, const Text& letters) const;
 
-    template <typename Visit>
-    void ForEachEntry(Visit visit) const;
-
-    bool m_asOtherUser;
-    std::unique_ptr<Wine> m_wine;
+    bool m_asOtherUser; // has an effect only if the test runs as root
     std::filesystem::path m_root;
-    std::map<std::string, std::filesystem::path> m_hostDirs; // first part of a place -> directory
+    std::unique_ptr<Wine> m_wine;
+    std::map<Text, std::filesystem::path> m_dirs; // first part of a place -> directory
     Files m_tokens;
 };
-
-bool IsWindowsProgram();

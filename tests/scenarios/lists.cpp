@@ -4,12 +4,20 @@
 namespace
 {
 
-Text Lines(const Text& name, int position) { return FolderLines(name, position, NoIcon("hf_folder_disabled"), NoCfg(name)); }
+Text Lines(const Text& name, int position)
+{
+    return FolderLines(name, position, NoIcon("hf_folder_disabled"), NoCfg(name));
+}
 
 std::vector<Scenario> Lists()
 {
-    const auto listed = [](const Name& name, const Text& list) {
-        return Scenario(name).Before({{"hot/A/", ""}, {"hot/b ü 漢/", ""}, {"hot/C/", ""}, {"hot/file", "x"}, {ListPlace, list}});
+    const auto listed = [](const Text& name, const Text& list)
+    {
+        return Scenario(name).Before({{"hot/A/", ""},
+                                      {"hot/b ü 漢/", ""},
+                                      {"hot/C/", ""},
+                                      {"hot/file", "x"},
+                                      {ListPlace, list}});
     };
     return {
         listed("ListedFoldersThatExistAreTakenOnceAndInOrder",
@@ -20,15 +28,23 @@ std::vector<Scenario> Lists()
                "<HotFolder z='1' path='{hot}{/}b ü 漢&#10;'/><HotFolder path='{hot}{/}C'/></any>")
             .Log(Lines("C", 1) + Lines("b ü 漢", 2)),
         Scenario("ARepeatInAnotherCaseIsDropped")
-            .Before({{"hot/A/", ""}, {"hot/a/", ""}, {ListPlace, "<l><HotFolder path='{hot}{/}a'/><HotFolder path='{hot}{/}A'/></l>"}})
+            .Before(
+                {{"hot/A/", ""},
+                 {"hot/a/", ""},
+                 {ListPlace, "<l><HotFolder path='{hot}{/}a'/><HotFolder path='{hot}{/}A'/></l>"}})
             .Log(Lines("a", 1)),
-        Scenario("AnEmptyListStillMigratesPresets").Preset(Stored(MovedFrom), Stored(MovedTo)).LogOfPreset(Updated),
+        Scenario("AnEmptyListStillMigratesPresets")
+            .Preset(Stored(MovedFrom), Stored(MovedTo))
+            .LogOfPreset(Updated),
         Scenario("AMissingListStillMigratesPresets")
             .Before({{ListPlace, Removed}})
             .Preset(Stored(MovedFrom), Stored(MovedTo))
             .LogOfPreset(Updated),
-        listed("AMalformedListIsEmpty", "<any><HotFolder path='{hot}{/}A'/>").Log("").LibraryReports(),
-        listed("AUtf16ListIsRead", "{utf16}<a><HotFolder path='{hot}{/}b ü 漢'/></a>").Log(Lines("b ü 漢", 1)),
+        listed("AMalformedListIsEmpty", "<any><HotFolder path='{hot}{/}A'/>")
+            .Log("")
+            .LibraryReports(),
+        listed("AUtf16ListIsRead", "{utf16}<a><HotFolder path='{hot}{/}b ü 漢'/></a>")
+            .Log(Lines("b ü 漢", 1)),
     };
 }
 

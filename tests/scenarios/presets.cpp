@@ -11,24 +11,37 @@ std::vector<Scenario> Presets()
                       "ORXImposeTemplate\">\"{previous}";
     const Text from = Stored(MovedFrom);
     const Text to = Stored(MovedTo);
-    const auto updated = [](const Name& name, const Text& before, const Text& after)
-    { return Scenario(name).Preset(before, after).LogOfPreset(Updated); };
-    const auto left = [](const Name& name, const Text& preset, const Text& reason)
-    { return Scenario(name).Preset(preset).LogOfPreset("preset.xml left as it is (" + reason + "): "); };
+    const auto updated = [](const Text& name, const Text& before, const Text& after)
+    {
+        return Scenario(name).Preset(before).After({{PresetPlace, after}}).LogOfPreset(Updated);
+    };
+    const auto left = [](const Text& name, const Text& preset, const Text& reason)
+    {
+        return Scenario(name).Preset(preset).LogOfPreset("preset.xml left as it is (" + reason +
+                                                         "): ");
+    };
     return {
-        updated("EveryPathInTheFolderMoves", "\r\n" + from + near + "\r\n" + Stored("{previous}{/}Sub{/}x") + Stored("{previous}") + near,
-                "\r\n" + to + near + "\r\n" + Stored("{default}{/}Sub{/}x") + Stored("{default}") + near),
+        updated("EveryPathInTheFolderMoves",
+                "\r\n" + from + near + "\r\n" + Stored("{previous}{/}Sub{/}x") +
+                    Stored("{previous}") + near,
+                "\r\n" + to + near + "\r\n" + Stored("{default}{/}Sub{/}x") + Stored("{default}") +
+                    near),
         updated("APresetWithoutAPathIsStillUpdated", near, near),
         updated("AnEmptyPresetIsUpdated", "", ""),
         updated("AByteOrderMarkAloneGoes", "\xEF\xBB\xBF", ""),
         updated("AByteOrderMarkGoes", "\xEF\xBB\xBF" + from, to),
-        updated("AUtf16PresetComesOutInUtf8", "{utf16}\r\n" + from + "Ě\x1A", "\r\n" + to + "Ě\x1A"),
-        updated("NulAndCtrlZEndNothing", Text("a\0b\x1A\r\n", 6) + from + "end", Text("a\0b\x1A\r\n", 6) + to + "end"),
+        updated("AUtf16PresetComesOutInUtf8", "{utf16}\r\n" + from + "Ě\x1A",
+                "\r\n" + to + "Ě\x1A"),
+        updated("NulAndCtrlZEndNothing", Text("a\0b\x1A\r\n", 6) + from + "end",
+                Text("a\0b\x1A\r\n", 6) + to + "end"),
         updated("BytesThatAreNotUtf8AreTakenAsLatin1", "\xE4\r\n", "ä\r\n"),
         updated("PresetsMoveBack", to, from).Run({"U"}),
         left("HalfAUtf16UnitStays", Text("\xFF\xFE") + Text("a\0b", 3), "cannot be decoded"),
-        left("ALoneSurrogateStays", Text("\xFF\xFE\0\0\0\xD8\0\0a\0\0\0", 12), "cannot be encoded again"),
-        Scenario("AFolderInPlaceOfAPresetIsSkipped").Before({{PresetPlace + "/", ""}}).LogOfPreset("Unable to open preset.xml for read : "),
+        left("ALoneSurrogateStays", Text("\xFF\xFE\0\0\0\xD8\0\0a\0\0\0", 12),
+             "cannot be encoded again"),
+        Scenario("AFolderInPlaceOfAPresetIsSkipped")
+            .Before({{PresetPlace + "/", ""}})
+            .LogOfPreset("Unable to open preset.xml for read : "),
         Scenario("OnlyDirectSubdirectoriesAreSearched")
             .Before({{"user/ORX/JPData/Presets/presets.xml", from},
                      {"user/ORX/JPData/P/Q/Presets/presets.xml", from},

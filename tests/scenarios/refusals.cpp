@@ -8,14 +8,20 @@ std::vector<Scenario> Refusals()
 {
     const Text found = Found(MovedFrom);
     const Text cfg = Written(MovedFrom);
-    const auto refused = [](const Name& name, const Text& place, const Text& attributes) {
+    const auto refused = [](const Text& name, const Text& place, const Text& attributes)
+    {
         return Scenario(name).Before({{place + "#", attributes}}).AsOtherUser().LibraryReports();
     };
     return {
         refused("AReadOnlyFolderCfgStays", CfgPlace, "R").FolderCfg(cfg).LogOfA(found),
         refused("AnUnreadableFolderCfgStays", CfgPlace, "0").FolderCfg(cfg).LogOfDisabledA(""),
-        refused("AnUnreadablePresetStays", PresetPlace, "0").Preset(Stored(MovedFrom)).LogOfPreset("Unable to open preset.xml for read : "),
-        refused("AReadOnlyPresetStays", PresetPlace, "R").Preset(Stored(MovedFrom)).LogOfPreset("Unable to open preset.xml for write : "),
+        refused("AnUnreadablePresetStays", PresetPlace, "0")
+            .Preset(Stored(MovedFrom))
+            .LogOfPreset("Unable to open preset.xml for read : "),
+        refused("AReadOnlyPresetStays", PresetPlace, "R")
+            .Preset(Stored(MovedFrom))
+            .LogOfPreset("Unable to open preset.xml for write : "),
+        refused("AReadOnlyLogStays", LogPlace, "R").FolderCfg(cfg, Written(MovedTo)),
         refused("AnUnreadableListIsEmpty", ListPlace, "0").Before({{"hot/A/", ""}}).Log(""),
     };
 }

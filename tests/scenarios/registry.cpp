@@ -5,15 +5,21 @@ namespace
 {
 
 // A hot folder and a preset whose paths would move, and these hives.
-Scenario Both(const Name& name, const Text& letter, const Files& hives)
+Scenario Both(const Text& name, const Text& letter, const Files& hives)
 {
     const Text path = letter == "I" ? MovedFrom : MovedTo;
     return Scenario(name).Before(hives).FolderCfg(Written(path)).Preset(Stored(path)).Run({letter});
 }
 
-Scenario WithPrevious(const Name& name, const Text& value) { return Both(name, "I", {{UserHive, UserValue(value)}}); }
+Scenario WithPrevious(const Text& name, const Text& value)
+{
+    return Both(name, "I", {{UserHive, UserValue(value)}});
+}
 
-Scenario WithInstalled(const Name& name, const Text& value) { return Both(name, "I", {{MachineHive, MachineValue(value)}}); }
+Scenario WithInstalled(const Text& name, const Text& value)
+{
+    return Both(name, "I", {{MachineHive, MachineValue(value)}});
+}
 
 std::vector<Scenario> Registry()
 {
@@ -24,30 +30,45 @@ std::vector<Scenario> Registry()
     return {
         Both("WithoutAnyHiveNothingMoves", "I", {{MachineHive, Removed}, {UserHive, Removed}})
             .LogOfA(found + NoPrevious, NoDefault + NoPrevious),
-        WithInstalled("WithoutADefaultFolderAnUpgradeMovesNothing", "\"x\"=\"y\"").LogOfA(found + NoDefault, NoDefault),
-        Both("WithoutAPreviousFolderADowngradeMovesNothing", "U", {{UserHive, UserValue("\"x\"=\"y\"")}})
+        WithInstalled("WithoutADefaultFolderAnUpgradeMovesNothing", "\"x\"=\"y\"")
+            .LogOfA(found + NoDefault, NoDefault),
+        Both("WithoutAPreviousFolderADowngradeMovesNothing", "U",
+             {{UserHive, UserValue("\"x\"=\"y\"")}})
             .LogOfA(foundNew + NoPreviousTo, NoPrevious),
-        WithPrevious("A32BitKeyHidesTheOtherEvenWithoutAValue",
-                     "\"Path\"=\"{PREVIOUS}\"\r\n\r\n[HKEY_CURRENT_USER\\software\\wow6432node\\hf]")
+        WithPrevious(
+            "A32BitKeyHidesTheOtherEvenWithoutAValue",
+            "\"Path\"=\"{PREVIOUS}\"\r\n\r\n[HKEY_CURRENT_USER\\software\\wow6432node\\hf]")
             .LogOfA(found + NoPrevious, NoPrevious),
-        WithPrevious("A32BitKeyComesFirst", "\"Path\"=\"x\"\r\n[HKEY_CURRENT_USER\\SOFTWARE\\Wow6432Node\\HF]\r\n\"PATH\"=\"{PREVIOUS}\"")
-            .Before({{MachineHive, MachineValue("\"InstallPath\"=\"x\"\r\n[HKEY_LOCAL_MACHINE\\SOFTWARE\\Wow6432Node\\Vantorix\\QZA]\r\n"
+        WithPrevious("A32BitKeyComesFirst",
+                     "\"Path\"=\"x\"\r\n[HKEY_CURRENT_USER\\SOFTWARE\\Wow6432Node\\HF]\r\n\"PATH\"="
+                     "\"{PREVIOUS}\"")
+            .Before({{MachineHive, MachineValue("\"InstallPath\"=\"x\"\r\n[HKEY_LOCAL_"
+                                                "MACHINE\\SOFTWARE\\Wow6432Node\\Vantorix\\QZA]\r\n"
                                                 "\"InstallPath\"=\"{APP}\"")}})
             .After({{CfgPlace, Written(MovedTo)}, {PresetPlace, Stored(MovedTo)}})
             .LogOfA(found, updated),
-        WithPrevious("ATextOf258CharactersIsTooLong", "\"Path\"=\"" + Text(258, 'x') + "\"").LogOfA(found + NoPrevious, NoPrevious),
-        WithPrevious("ATextOf257CharactersIsRead", "\"Path\"=\"" + Text(257, 'x') + "\"").LogOfA(found, updated),
-        WithInstalled("ANumberAsTheNewFolderMovesNothing", "\"InstallPath\"=dword:00000001").LogOfA(unstorable, updated),
-        WithInstalled("ALoneSurrogateInTheNewFolderMovesNothing", "\"InstallPath\"=hex:43,00,00,d8,3a,00,00,00")
+        WithPrevious("ATextOf258CharactersIsTooLong", "\"Path\"=\"" + Text(258, 'x') + "\"")
+            .LogOfA(found + NoPrevious, NoPrevious),
+        WithPrevious("ATextOf257CharactersIsRead", "\"Path\"=\"" + Text(257, 'x') + "\"")
+            .LogOfA(found, updated),
+        WithInstalled("ANumberAsTheNewFolderMovesNothing", "\"InstallPath\"=dword:00000001")
             .LogOfA(unstorable, updated),
-        WithPrevious("AnUnterminatedOddValueIsReadToItsLastWholeUnit", "\"Path\"=hex(2):78,00,79,00,7a").LogOfA(found, updated),
+        WithInstalled("ALoneSurrogateInTheNewFolderMovesNothing",
+                      "\"InstallPath\"=hex:43,00,00,d8,3a,00,00,00")
+            .LogOfA(unstorable, updated),
+        WithPrevious("AnUnterminatedOddValueIsReadToItsLastWholeUnit",
+                     "\"Path\"=hex(2):78,00,79,00,7a")
+            .LogOfA(found, updated),
         WithPrevious("AFinalSeparatorMovesPresetsOnly", "\"Path\"=\"{PREVIOUS}{/2}\"")
             .After({{PresetPlace, Stored(MovedTo)}})
             .LogOfA(found, updated),
-        Both("AFinalSeparatorIsDoubledInFolderCfgOnly", "U", {{UserHive, UserValue("\"Path\"=\"{PREVIOUS}{/2}\"")}})
-            .After({{CfgPlace, Written("{previous}{/}{/}Booklet.tpl")}, {PresetPlace, Stored(MovedFrom)}})
+        Both("AFinalSeparatorIsDoubledInFolderCfgOnly", "U",
+             {{UserHive, UserValue("\"Path\"=\"{PREVIOUS}{/2}\"")}})
+            .After({{CfgPlace, Written("{previous}{/}{/}Booklet.tpl")},
+                    {PresetPlace, Stored(MovedFrom)}})
             .LogOfA(foundNew, updated),
-        WithPrevious("AnEmptyPreviousFolderReplacesNothing", "\"Path\"=\"\"").LogOfA(found, updated),
+        WithPrevious("AnEmptyPreviousFolderReplacesNothing", "\"Path\"=\"\"")
+            .LogOfA(found, updated),
         Scenario("WithoutATemplateNoFolderIsLookedUp")
             .Before({{MachineHive, Removed}, {UserHive, "garbage"}})
             .FolderCfg("<H><ImposeSetting/></H>")

@@ -9,26 +9,50 @@ std::vector<Scenario> Runs()
     const Text from = Written(MovedFrom);
     const Text to = Written(MovedTo);
     const Text found = Found(MovedFrom);
-    const Text forged = "x&#13;&#10;End: Updating Impose path for JP Presets&#13;&#10;&#x2028;&#x2029;&#x85;&#x7F;&#9;y";
+    const Text forged = "x&#13;&#10;End: Updating Impose path for JP "
+                        "Presets&#13;&#10;&#x2028;&#x2029;&#x85;&#x7F;&#9;y";
     return {
         Scenario("WithoutASwitchNothingChanges").FolderCfg(from).Run({}),
-        Scenario("ADashedSwitchIsInvalid").FolderCfg(from).Run({"-I"}).WholeLog("Invalid call check calling parameter: exiting....\n"),
+        Scenario("ADashedSwitchIsInvalid")
+            .FolderCfg(from)
+            .Run({"-I"})
+            .WholeLog("Invalid call check calling parameter: exiting....\n"),
         Scenario("AnInvalidSwitchIsNotLoggedWithV").FolderCfg(from).Run({"X", "V"}),
         Scenario("VLeavesTheLogAlone").FolderCfg(from, to).Run({"I", "v"}),
         Scenario("AnUpgradeMovesTheTemplate").FolderCfg(from, to).Run({"i"}).LogOfA(found),
-        Scenario("VIsIgnoredBeforeAnotherArgument").FolderCfg(from, to).Run({"I", "V", "x"}).LogOfA(found),
-        Scenario("AnotherSecondArgumentIsIgnored").FolderCfg(from, to).Run({"I", "W"}).LogOfA(found),
-        Scenario("ADowngradeMovesTheTemplateBack").FolderCfg(to, from).Run({"u"}).LogOfA(Found(MovedTo)),
-        Scenario("WithoutALogFolderTheRestIsDone").Before({{LogPlace, Removed}}).FolderCfg(from, to),
-        Scenario("AMissingLogIsCreated").Before({{LogPlace, Removed}, {"user/ORX_Installers/", ""}}).FolderCfg(from, to).LogOfA(found),
-        Scenario("ALogWithAByteOrderMarkLosesIt").Before({{LogPlace, "{utf16}old\r\n"}}).FolderCfg(from, to).LogOfA(found),
-        Scenario("AFolderInPlaceOfTheLogStopsNothing").Before({{LogPlace, Removed}, {Text(LogPlace) + "/", ""}}).FolderCfg(from, to),
+        Scenario("VIsIgnoredBeforeAnotherArgument")
+            .FolderCfg(from, to)
+            .Run({"I", "V", "x"})
+            .LogOfA(found),
+        Scenario("AnotherSecondArgumentIsIgnored")
+            .FolderCfg(from, to)
+            .Run({"I", "W"})
+            .LogOfA(found),
+        Scenario("ADowngradeMovesTheTemplateBack")
+            .FolderCfg(to, from)
+            .Run({"u"})
+            .LogOfA(Found(MovedTo)),
+        Scenario("WithoutALogFolderTheRestIsDone")
+            .Before({{LogPlace, Removed}})
+            .FolderCfg(from, to),
+        Scenario("AMissingLogIsCreated")
+            .Before({{LogPlace, Removed}, {"user/ORX_Installers/", ""}})
+            .FolderCfg(from, to)
+            .LogOfA(found),
+        Scenario("ALogWithAByteOrderMarkLosesIt")
+            .Before({{LogPlace, "{utf16}old\r\n"}})
+            .FolderCfg(from, to)
+            .LogOfA(found),
+        Scenario("AFolderInPlaceOfTheLogStopsNothing")
+            .Before({{LogPlace, Removed}, {Text(LogPlace) + "/", ""}})
+            .FolderCfg(from, to),
         Scenario("APercentSignIsLoggedAsItIs")
             .Before({{"hot/%d %s/", ""}})
             .Log(FolderLines("%d %s", 1, NoIcon("hf_folder_disabled"), NoCfg("%d %s"))),
         Scenario("AStoredPathStaysInItsLine")
             .FolderCfg(Minimal(forged))
-            .LogOfDisabledA(Found(u8"x\uFFFD\uFFFDEnd: Updating Impose path for JP Presets\uFFFD\uFFFD\uFFFD\uFFFD\uFFFD\uFFFD\ty")),
+            .LogOfDisabledA(Found(u8"x\uFFFD\uFFFDEnd: Updating Impose path for JP "
+                                  u8"Presets\uFFFD\uFFFD\uFFFD\uFFFD\uFFFD\uFFFD\ty")),
         Scenario("AFolderNameStaysInItsLine")
             .Before({{"hot/x\ny/", ""}, {ListPlace, "<l><HotFolder path='{hot}{/}x&#10;y'/></l>"}})
             .Log(FolderLines(u8"x\uFFFDy", 1, NoIcon("hf_folder_disabled"), NoCfg(u8"x\uFFFDy")))

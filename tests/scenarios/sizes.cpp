@@ -4,81 +4,114 @@
 namespace
 {
 
-Text Times(int count, const Text& text) { return "{repeat:" + std::to_string(count) + ":" + text + "}"; }
+// The text that many times, with the repetition's six-digit number in place of '#'.
+Text Times(int count, const Text& text)
+{
+    Text result;
+    for (int i = 0; i < count; ++i)
+    {
+        result += text;
+        const size_t number = text.find('#');
+        if (number != Text::npos)
+            result.replace(result.size() - text.size() + number, 1,
+                           std::to_string(1000000 + i).substr(1));
+    }
+    return result;
+}
 
 // A Folder.cfg whose template moves if it can be loaded, with this additional content.
 Text Cfg(const Text& content, const Text& documentType = "")
 {
-    return documentType + "<HotFolder name='n'><ImposeSetting><K k='ORXImposeTemplate' v='" + MovedFrom + "'/></ImposeSetting>" + content +
-           "</HotFolder>";
+    return documentType + "<HotFolder name='n'><ImposeSetting><K k='ORXImposeTemplate' v='" +
+           MovedFrom + "'/></ImposeSetting>" + content + "</HotFolder>";
 }
 
-Text DocumentType(const Text& content) { return "<!DOCTYPE HotFolder [" + content + "]>"; }
+Text DocumentType(const Text& content)
+{
+    return "<!DOCTYPE HotFolder [" + content + "]>";
+}
 
-// Entities that each repeat the previous one ten times, so that aN has 10 to the power of N characters.
+// Entities that each repeat the previous one ten times, so that aN has 10 to the power of N
+// characters.
 Text Entities(int count)
 {
     Text text = "<!ENTITY a0 'x'>";
     for (int i = 1; i <= count; ++i)
-        text += "<!ENTITY a" + std::to_string(i) + " '" + Times(10, "&a" + std::to_string(i - 1) + ";") + "'>";
+        text += "<!ENTITY a" + std::to_string(i) + " '" +
+                Times(10, "&a" + std::to_string(i - 1) + ";") + "'>";
     return text;
 }
 
-// Hot folders with these contents, which either move or are too large; and one folder before and one after them.
-Scenario Folders(const Name& name, const std::vector<Text>& contents, bool isLoaded)
+// Hot folders with these contents, which either move or are too large; and one folder before and
+// one after them.
+Scenario Folders(const Text& name, const std::vector<Text>& contents, bool isLoaded)
 {
     Scenario scenario(name);
     Text log;
     for (size_t i = 0; i <= contents.size() + 1; ++i)
     {
         const bool isGiven = i > 0 && i <= contents.size();
-        const Text folder = "F" + std::to_string(i);
+        const Text folder = "F" + std::to_string(10 + i);
         const Text place = "hot/" + folder + "/[P]/Folder.cfg";
         const bool moves = isLoaded || !isGiven;
         scenario.Before({{place, isGiven ? contents[i - 1] : Cfg("")}});
         if (moves)
             scenario.After({{place, MinimalWritten(MovedTo)}});
         log += FolderLines(folder, static_cast<int>(i) + 1, NoIcon("hf_folder_disabled"),
-                           moves ? "Imposepath:{hot}{/}" + folder + "is: " + MovedFrom + "\n"
-                                 : "HF cfg file left as it is (too large to read safely): " + CfgOf(folder));
+                           moves ? Found(MovedFrom, folder)
+                                 : "HF cfg file left as it is (too large to read safely): " +
+                                       CfgOf(folder));
     }
     return scenario.Log(log);
 }
 
 std::vector<Scenario> Sizes()
 {
-    constexpr int Big = 64 * 1024 * 1024 - 500;
-    const auto tooLarge = [](const Name& name, const std::vector<Text>& contents)
-    { return Folders(name, contents, false).Within(10, 512); };
-    const auto loaded = [](const Name& name, const std::vector<Text>& contents) { return Folders(name, contents, true).Within(10, 512); };
-    const auto listed = [](const Name& name, const Text& list) {
-        return Scenario(name).Before({{"hot/A/", ""}, {ListPlace, "<l>" + list + "</l>"}}).Within(10, 512);
+    const auto listed = [](const Text& name, const Text& list)
+    {
+        return Scenario(name).Before({{"hot/A/", ""}, {ListPlace, "<l>" + list + "</l>"}});
     };
-    const Text entries = Times(100000, "    <KEYVALUE Key=\"K#\" Value=\"1\" KeyDisplayValue=\"\" LocDisplayValue=\"\"/>\n");
-    const Text filter = "<FilterSetting>\n" + Times(100000, "    <x/>\n") + "  </FilterSetting>\n";
-    Text written = MinimalWritten(MovedTo);
-    ReplaceAll(written, "<JobSetting/>\n", "<JobSetting>\n" + entries + "  </JobSetting>\n");
-    ReplaceAll(written, "  <PreflightSettings/>", "  " + filter + "  <PreflightSettings/>");
+    const Text listedA = "<HotFolder path='{hot}{/}A'/>";
+    const Text lines = Times(3000, "123456789\n");
+    const Text oneMillion = Times(1000001, "x");
+    const Text entries = Times(10000, "    <KEYVALUE Key=\"K#\" Value=\"1\" KeyDisplayValue=\"\" "
+                                      "LocDisplayValue=\"\"/>\n");
+    const Text filter = "<FilterSetting>\n" + Times(10000, "    <x/>\n") + "  </FilterSetting>\n";
+    const Text written =
+        Replaced(Replaced(MinimalWritten(MovedTo), "<JobSetting/>\n",
+                          "<JobSetting>\n" + entries + "  </JobSetting>\n"),
+                 "  <PreflightSettings/>", "  " + filter + "  <PreflightSettings/>");
+    const auto defaults = [](int characters)
+    {
+        return DocumentType("<!ATTLIST a b CDATA '" + Times(characters, "x") + "'>");
+    };
     return {
-        tooLarge("ABigFolderCfgStays", {Cfg(Times(Big / 4, "<a/>")), Cfg("<a b='" + Times(Big, "x") + "'/>")}),
-        tooLarge("ADeepFolderCfgStays", {Cfg(Times(2000000, "<e>") + Times(2000000, "</e>")), Times(2000000, "<e>")}),
-        tooLarge("AWideFolderCfgStays", {Cfg("<a " + Times(80000, " b#=''") + "/>")}),
-        tooLarge("ALongTextStays", {Cfg("<a>" + Times(40000, "short line\n") + "</a>"), Cfg("<a>" + Times(8000000, "x") + "</a>")}),
-        tooLarge("ManyLongDefaultsStay", {Cfg(Times(8000, "<a/>"), DocumentType("<!ATTLIST a b CDATA '" + Times(32000, "x") + "'>")),
-                                          Cfg(Times(3000, "<a/>"), DocumentType(Entities(5) + "<!ATTLIST a b CDATA '&a5;'>"))}),
-        loaded("SixteenKilobytesAreHarmless", {Cfg(Times(2300, "<e>") + Times(2300, "</e>")), Cfg("<a>" + Times(16000, "\n") + "</a>"),
-                                               Cfg("<a" + Times(1200, " b#=''") + "/>"), Cfg("<a b='&a6;'/>", DocumentType(Entities(6))),
-                                               Cfg(Times(1900, "<a/>"), DocumentType("<!ATTLIST a b CDATA '" + Times(8000, "x") + "'>"))}),
-        loaded("ATextOf9000LinesIsLoaded", {Cfg("<a>" + Times(9000, "123456789\n") + "</a>")}),
-        loaded("ADepthOf100000IsLoaded", {Cfg(Times(100000, "<e>") + Times(100000, "</e>"))}),
-        loaded("ManyShortTextsAndCommentsAreLoaded", {Cfg("<a>" + Times(60000, "x<!--c-->") + "</a>", DocumentType(""))}),
-        Scenario("100000EntriesAndElementsAreKept")
+        Folders(
+            "WhatIsTooLargeStays",
+            {Cfg(Times(600000, "    ")), Cfg(Times(120000, "<a/>")),
+             Cfg(Times(2100, "<e>") + Times(2100, "</e>")), Times(6000, "<e>"),
+             Cfg("<a " + Times(15000, " b#=''") + "/>"), Cfg("<a b='" + oneMillion + "'/>"),
+             Cfg("<a>" + lines + lines + "</a>"), Cfg("<a>" + oneMillion + "</a>"),
+             Cfg(Times(800, "<a/>"), defaults(8000)),
+             Cfg("<a/>", DocumentType(Times(600, "<!ATTLIST a b# CDATA 'default'>"))),
+             Cfg(Times(300, "<a/>"), DocumentType(Entities(5) + "<!ATTLIST a b CDATA '&a5;'>"))},
+            false),
+        Folders("WhatIsJustSmallEnoughMoves",
+                {Cfg(Times(60000, "    ")), Cfg(Times(90000, "<a/>")),
+                 Cfg(Times(2000, "<e>") + Times(2000, "</e>")),
+                 Cfg("<a " + Times(6000, " b#=''") + "/>"), Cfg("<a>" + lines + "</a>"),
+                 Cfg("<a b='" + Times(300000, "x") + "'/>"),
+                 Cfg("<a>" + Times(20000, "x<!--c-->") + "</a>"),
+                 Cfg(Times(500, "<a/>"), defaults(8000)),
+                 Cfg("<a b='&a4;'/>", DocumentType(Entities(4)))},
+                true),
+        Scenario("TenThousandEntriesAndElementsAreKept")
             .FolderCfg(Cfg("<JobSetting>" + entries + "</JobSetting>" + filter), written)
-            .LogOfDisabledA(Found(MovedFrom))
-            .Within(10, 512),
-        listed("AListThatIsTooDeepIsEmpty", Times(2000000, "<e>")).Log(""),
-        listed("AListThatIsTooBigIsEmpty", "<HotFolder path='{hot}{/}A'/>" + Times(Big / 4, "<a/>")).Log(""),
-        listed("AListOf100000EntriesIsRead", "<HotFolder path='{hot}{/}A'/>" + Times(100000, "<HotFolder path='{hot}{/}missing'/>"))
+            .LogOfDisabledA(Found(MovedFrom)),
+        listed("AListThatIsTooDeepIsEmpty", Times(6000, "<e>")).Log(""),
+        listed("AListThatIsTooBigIsEmpty", listedA + Times(1600000, "<a/>")).Log(""),
+        listed("AListOf100000EntriesIsRead",
+               listedA + Times(100000, "<HotFolder path='{hot}{/}missing'/>"))
             .Log(FolderLines("A", 1, NoIcon("hf_folder_disabled"), NoCfg("A"))),
     };
 }

@@ -4,42 +4,53 @@
 #include "tests/scenario.h"
 #include "tests/text_files.h"
 
-using Text = std::string;
-
 inline const Text MovedFrom = "{previous}{/}Booklet.tpl";
 inline const Text MovedTo = "{default}{/}Booklet.tpl";
 
 inline Text Hive(const Text& key, const Text& value)
 {
-    return "Windows Registry Editor Version 5.00\r\n\r\n[" + key + "]\r\n\"Other\"=dword:00000001\r\n" + value + "\r\n";
+    return "Windows Registry Editor Version 5.00\r\n\r\n[" + key +
+           "]\r\n\"Other\"=dword:00000001\r\n" + value + "\r\n";
 }
 
 /// A hive in which the key of one of the two template folders has this value.
-inline Text MachineValue(const Text& value) { return Hive("HKEY_LOCAL_MACHINE\\SOFTWARE\\Vantorix\\QZA", value); }
-inline Text UserValue(const Text& value) { return Hive("HKEY_CURRENT_USER\\SOFTWARE\\HF", value); }
+inline Text MachineValue(const Text& value)
+{
+    return Hive("HKEY_LOCAL_MACHINE\\SOFTWARE\\Vantorix\\QZA", value);
+}
+inline Text UserValue(const Text& value)
+{
+    return Hive("HKEY_CURRENT_USER\\SOFTWARE\\HF", value);
+}
 
 /// A file of tests/data, with the parts in double braces replaced.
 inline Text Data(const Text& file, const Files& values)
 {
-    Text text = ReadFile(Text(DATA_DIR) + "/" + file);
+    Text text = ReadFile(DATA_DIR "/" + file);
     for (const auto& [name, value] : values)
-        ReplaceAll(text, "{{" + name + "}}", value);
+        text = Replaced(text, "{{" + name + "}}", value);
     return text;
 }
 
 /// A Folder.cfg as the tool writes it.
-inline Text Written(const Text& path, const Text& filter = "  <FilterSetting mode=\"2\" name=\"&lt;\">\n    <a/>\n  </FilterSetting>\n")
+inline Text Written(const Text& path,
+                    const Text& filter = "<FilterSetting mode=\"2\" name=\"&lt;\">\n"
+                                         "    <a/>\n  </FilterSetting>")
 {
-    return Data("written.cfg", {{"path", path}, {"filter", filter}});
+    return Data("written.cfg", {{"path", path}, {"filter", "  " + filter + "\n"}});
 }
 
 /// The same settings as another program may write them.
-inline Text Foreign(const Text& path) { return Data("foreign.cfg", {{"path", path}}); }
+inline Text Foreign(const Text& path)
+{
+    return Data("foreign.cfg", {{"path", path}});
+}
 
 /// A Folder.cfg with only an imposition entry, and the same after a rewrite.
 inline Text Minimal(const Text& path, const Text& declaration = "", const Text& name = "n")
 {
-    return declaration + "<HotFolder name=\"" + name + "\"><ImposeSetting><K k=\"ORXImposeTemplate\" v=\"" + path +
+    return declaration + "<HotFolder name=\"" + name +
+           "\"><ImposeSetting><K k=\"ORXImposeTemplate\" v=\"" + path +
            "\"/></ImposeSetting></HotFolder>";
 }
 
@@ -49,7 +60,10 @@ inline Text MinimalWritten(const Text& path, const Text& name = "n")
 }
 
 /// A template path as a preset stores it.
-inline Text Stored(const Text& path) { return "<K n=\"ORXImposeTemplate\">\"" + path + "\"</K>\r\n"; }
+inline Text Stored(const Text& path)
+{
+    return "<K n=\"ORXImposeTemplate\">\"" + path + "\"</K>\r\n";
+}
 
 // Log lines; {icons} is where the icons of the run's direction come from.
 
@@ -57,19 +71,39 @@ inline Text Stored(const Text& path) { return "<K n=\"ORXImposeTemplate\">\"" + 
 inline Text FolderLines(const Text& name, int position, const Text& icon, const Text& impose)
 {
     const Text end = name + " count:  " + std::to_string(position) + "\n";
-    return icon + "Updated icon for hf{hot}{/}" + end + impose + "updated Impose path for hf{hot}{/}" + end;
+    return icon + "Updated icon for hf{hot}{/}" + end + impose +
+           "updated Impose path for hf{hot}{/}" + end;
 }
 
-inline Text NoIcon(const Text& name) { return "Icon path  not exist: {tool}{/}{icons}" + name + ".ico\n"; }
+inline Text NoIcon(const Text& name)
+{
+    return "Icon path  not exist: {tool}{/}{icons}" + name + ".ico\n";
+}
 inline Text Copied(const Text& icon)
 {
-    return "Icon  copied from : {tool}{/}{icons}" + icon + ".ico To {hot}{/}A{/}[_ORX_HotFolder_]{/}" + icon + ".ico \n";
+    return "Icon  copied from : {tool}{/}{icons}" + icon +
+           ".ico To {hot}{/}A{/}[_ORX_HotFolder_]{/}" + icon + ".ico \n";
 }
-inline Text CfgOf(const Text& name) { return "{hot}{/}" + name + "{/}[_ORX_HotFolder_]{/}Folder.cfg\n"; }
-inline Text NoCfg(const Text& name = "A") { return "HF cfg file unable to read/exist: " + CfgOf(name); }
-inline Text Untouched(const Text& reason) { return "HF cfg file left as it is (" + reason + "): " + CfgOf("A"); }
-inline Text Found(const Text& path) { return "Imposepath:{hot}{/}Ais: " + path + "\n"; }
-inline Text PresetLine(const Text& line) { return line + "{user}{/}ORX{/}JPData{/}.P{/}Presets{/}presets.xml\n"; }
+inline Text CfgOf(const Text& name)
+{
+    return "{hot}{/}" + name + "{/}[_ORX_HotFolder_]{/}Folder.cfg\n";
+}
+inline Text NoCfg(const Text& name = "A")
+{
+    return "HF cfg file unable to read/exist: " + CfgOf(name);
+}
+inline Text Untouched(const Text& reason)
+{
+    return "HF cfg file left as it is (" + reason + "): " + CfgOf("A");
+}
+inline Text Found(const Text& path, const Text& name = "A")
+{
+    return "Imposepath:{hot}{/}" + name + "is: " + path + "\n";
+}
+inline Text PresetLine(const Text& line)
+{
+    return line + "{user}{/}ORX{/}JPData{/}.P{/}Presets{/}presets.xml\n";
+}
 
 inline const Text NoDefault = "Unable to read: Default Impose Template Path\n";
 inline const Text NoPrevious = "Unable to read: Previous Version  Default Impose Template Path\n";

@@ -1,0 +1,545 @@
+// What FolderUpgradeCheck reports. Every other scenario shows that it counts each change and
+// changes nothing itself.
+#include "tests/scenarios/texts.h"
+
+#include <gmock/gmock.h>
+
+namespace
+{
+
+const Text Jobs = "user/ORX/JPData";
+const Text LogFolder = "user/ORX_Installers";
+const char* const NoLinks = "Wine does not show links to files as links";
+const char* const NoRefusal = "Wine lets every user open or list a directory";
+
+Text Cfg(char name)
+{
+    return Replaced(CfgPlace, "A", Text(1, name));
+}
+
+Text PresetOf(char name)
+{
+    return Replaced(PresetPlace, ".P", Text(1, name));
+}
+
+// A hot folder in which a run changes nothing.
+Files DoneFolder(char name)
+{
+    const Text folder = Text("hot/") + name;
+    return {
+        {folder + "#", "S"},
+        {folder + "/Desktop.ini#", "RS"},
+        {folder + "/Desktop.ini",
+         "[.ShellClassInfo]\r\nInfoTip=This folder has been configured as an ORX hot folder.\r\n"
+         "IconFile=.\\[_ORX_HotFolder_]\\hf_folder.ico\r\n"},
+        {folder + "/[P]/hf_folder.ico", "{icon:hf_folder.ico}"},
+        {Cfg(name), Written(MovedTo)}};
+}
+
+// A run would change nothing here, and there is nothing to report.
+Scenario Done(const Text& name)
+{
+    return Scenario(name)
+        .Before(DoneFolder('A'))
+        .Before({{"default/Booklet.tpl", ""}})
+        .Preset(Stored(MovedTo));
+}
+
+std::vector<Scenario> Machines()
+{
+    const auto listed = [](const Text& name, const Text& folders)
+    {
+        Text list = "<HotFolders>";
+        for (const char folder : folders)
+            list += Text("<HotFolder path=\"{hot}{/}") + folder + "\"/>";
+        return Done(name).Before({{ListPlace, list + "</HotFolders>"}});
+    };
+    return {
+        Done("WhatIsDoneIsNotReported").IsReported(""),
+        Scenario("AnEmptyMachine")
+            .Before({{ListPlace, Removed}, {LogPlace, Removed}, {Jobs + "/", Removed}})
+            .IsReported(R"(
+Workstation
+  note     there is no {list}
+  note     there will be no run log: there is no folder {user}{/}ORX_Installers{/}
+Job presets
+  note     there are no presets, because there is no folder {user}{/}ORX{/}JPData{/})"),
+        Done("AListIsCutOffAndAFolderHasTheLogsName")
+            .Before({{ListPlace, "<HotFolders>"}, {LogPlace, Removed}, {LogPlace + "/", ""}})
+            .IsReported(R"(
+Workstation
+  problem  {list}: damaged (line 1: no element found); no hot folder is migrated
+  note     there will be no run log: something else has its name: {log})"),
+        Done("TheListIsADirectoryAndTheLogIsALink")
+            .Before({{ListPlace, Removed}, {ListPlace + "/", ""}, {LogPlace, "{link:elsewhere/a}"}})
+            .NotUnderWine(NoLinks)
+            .IsReported(R"(
+Workstation
+  problem  HotFolderList.cfg: is not a file
+  problem  there will be no run log: it is reached over a link: {log})"),
+        listed("AListIsEmptyAndJPDataCannotBeListed", "")
+            .Before({{Jobs + "#", "L"}})
+            .AsOtherUser()
+            .NotUnderWine(NoRefusal)
+            .IsReported(R"(
+Workstation
+  note     HotFolderList.cfg lists no hot folder
+Job presets
+  problem  {user}{/}ORX{/}JPData{/} cannot be listed)"),
+        listed("NoListedFolderIsThere", "BC").IsReported(R"(
+Workstation
+  problem  none of the listed hot folders exists (another account? mapped drives?)
+  note     listed hot folder does not exist: {hot}{/}B
+  note     listed hot folder does not exist: {hot}{/}C)"),
+        listed("AListedFolderIsMissingTwiceOrHasTwoNames", "AABCDEFGHIJKLMNOPQRSTUVWXYZ")
+            .Before({{"hot/C/", "{link:hot/A}"}, {"hot/D/", "{link:hot/A}"}})
+            .IsReported(R"(
+Workstation
+  note     listed hot folder does not exist: {hot}{/}B
+  note     listed hot folder does not exist: {hot}{/}E
+{more}
+  note     listed hot folder and 4 more
+{hot}{/}C
+  note     the same directory as {hot}{/}A
+{hot}{/}D
+  note     the same directory as {hot}{/}A)"),
+        Done("TheListCannotBeReadNorTheLogCreated")
+            .Before({{ListPlace + "#", "0"},
+                     {LogPlace, Removed},
+                     {LogFolder + "/", ""},
+                     {LogFolder + "#", "X"}})
+            .AsOtherUser()
+            .NotUnderWine(NoRefusal)
+            .IsReported(R"(
+Workstation
+  problem  can't open file*
+  problem  there will be no run log: its folder cannot be written to: {user}{/}ORX_Installers{/})"),
+        Done("NoFolderCanBeEntered")
+            .Before({{"machine/hotfolder#", "0"}, {LogFolder + "#", "0"}, {Jobs + "#", "0"}})
+            .AsOtherUser()
+            .IsReported(R"(
+Workstation
+  problem  HotFolderList.cfg: its folder cannot be entered
+  problem  there will be no run log: its folder cannot be entered: {user}{/}ORX_Installers{/}
+Job presets
+  problem  {user}{/}ORX{/}JPData{/} cannot be entered)"),
+    };
+}
+
+// The template folders: what is in the registry, and whether the templates are there.
+std::vector<Scenario> Templates()
+{
+    const Text missing = R"(
+{hot}{/}A
+  problem  no template at {previous}{/}Booklet.tpl)";
+    const auto with = [](const Text& name, const Files& hives)
+    {
+        return Done(name).FolderCfg(Written(MovedFrom)).Before(hives);
+    };
+    const auto withPath = [&](const Text& name, const Text& path)
+    {
+        return with(name, {{UserHive, UserValue("\"Path\"=\"" + path + "\"")}});
+    };
+    return {
+        with("PathIsMissing", {{UserHive, UserValue("")}})
+            .Before({{Cfg('B'), Written(MovedFrom)}})
+            .IsReported(R"(
+{hot}{/}A
+  problem  {Path}: missing{nothing}
+  problem  no template at {previous}{/}Booklet.tpl
+{hot}{/}B
+  problem  no template at {previous}{/}Booklet.tpl
+{noicon})"),
+        with("OnlyAPresetAsksForPath", {{UserHive, Removed}, {CfgPlace, Removed}}).IsReported(R"(
+{hot}{/}A
+  note     no Folder.cfg
+{nodisabled}
+Job presets
+  problem  registry value Path in HKEY_CURRENT_USER\SOFTWARE\Wow6432Node\HF or \SOFTWARE\HF: {key}{nothing})"),
+        withPath("PathIsTooLong", Text(258, 'x')).IsReported(R"(
+{hot}{/}A
+  problem  {Path}: longer than 257 characters{nothing}
+  problem  no template at {previous}{/}Booklet.tpl)"),
+        with("InstallPathIsInTheOtherKey",
+             {{MachineHive, Replaced(MachineValue(""), "SOFTWARE", "SOFTWARE\\Wow6432Node")}})
+            .IsReported(R"(
+{hot}{/}A
+  problem  registry value InstallPath in HKEY_LOCAL_MACHINE\SOFTWARE\Wow6432Node\Vantorix\QZA: )"
+                        R"(missing, and no other key is looked at{nothing}
+  problem  stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl)"),
+        with("NothingAsksForInstallPath", {{MachineHive, Removed}, {PresetPlace, Removed}})
+            .FolderCfg(Written("{hot}{/}A"))
+            .IsReported(R"(
+Job presets
+  note     there are no presets in {user}{/}ORX{/}JPData{/})"),
+        withPath("PathEndsInASeparator", "{PREVIOUS}{/2}").IsReported(R"(
+Workstation
+  problem  {Path}: ends in a separator; no template of a hot folder moves
+{hot}{/}A
+  problem  stays in the folder being left (in a sub-folder): {previous}{/}Booklet.tpl)"),
+        withPath("PathEndsInASeparatorOnTheWayBack", "{PREVIOUS}{/2}")
+            .FolderCfg(Written("{hot}{/}A"))
+            .Preset("")
+            .Run({"U"})
+            .IsReported(R"(
+Workstation
+  problem  {Path}: ends in a separator; it is doubled in the paths of hot folders)"),
+        withPath("PathIsEmpty", "")
+            .IsReported(R"(
+Workstation
+  problem  {Path}: empty; only templates stored without a folder move)" +
+                        missing),
+        withPath("PathIsEmptyOnTheWayBack", "").Preset("").Run({"U"}).IsReported(R"(
+Workstation
+  problem  {Path}: empty; templates move to the root of the drive)" + missing),
+        withPath("PathHoldsAnAmpersand", "{hot}&")
+            .Preset(Stored("{hot}{/}A"))
+            .Run({"U"})
+            .IsReported(missing + R"(
+Job presets
+  problem  {Path}: holds & or <, which is inserted into presets as it is)"),
+        withPath("TheNewFolderIsBelowTheOld", "{APP}")
+            .Before({{"default/template/Booklet.tpl", ""}})
+            .IsReported(missing + R"(
+Job presets
+  change   .P{/}Presets{/}presets.xml: {default}{/}Booklet.tpl -> {default}{/}template{/}Booklet.tpl
+  problem  one template folder is below the other: another run would move paths of presets once more)"),
+        withPath("BothFoldersAreTheSame", "{APP}{/2}template")
+            .FolderCfg(Written(MovedTo))
+            .IsReported(""),
+        with("InstallPathIsANumber",
+             {{MachineHive, MachineValue("\"InstallPath\"=dword:00000001")}})
+            .Preset(Stored("{hot}{/}A"))
+            .IsReported(R"(
+{hot}{/}A
+  problem  Folder.cfg: left as it is (new path holds a character that XML cannot store)
+  problem  stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl
+Job presets
+  problem  the folder being installed holds a character that XML cannot store; no path of a )"
+                        R"(preset moves)"),
+        Done("TemplatesAreMissing")
+            .FolderCfg(Written("{default}{/}none"))
+            .Before({{Cfg('B'), Written("{previous}{/}Sub{/}T")},
+                     {Cfg('C'), Written("{hot}{/}D{/}T")},
+                     {"hot/D/", "{link:elsewhere/d}"},
+                     {"elsewhere/d/T", ""}})
+            .Preset(Stored("{hot}{/}..{/}Vorige 版{/}T") +
+                    Stored("{hot}{/}..{/}Vorige &#x7248;{/}&amp;") +
+                    Stored("{default}{/}&lt;&#65;&none;") + "ORXImposeTemplate\">\"{previous}")
+            .IsReported(R"(
+{hot}{/}A
+  problem  no template at {default}{/}none
+{hot}{/}B
+  problem  stays in the folder being left (in a sub-folder): {previous}{/}Sub{/}T
+{noicon}
+{hot}{/}C
+  note     not looked at: {hot}{/}D{/}T
+{noicon}
+{hot}{/}D
+  note     no Folder.cfg
+{nodisabled}
+Job presets
+  note     .P{/}Presets{/}presets.xml: a template path has no end
+  problem  .P{/}Presets{/}presets.xml: no template at {default}{/}<A&none;
+  problem  .P{/}Presets{/}presets.xml: stays in the folder being left (other separators): )"
+                        R"({hot}{/}..{/}Vorige 版{/}T
+  problem  .P{/}Presets{/}presets.xml: stays in the folder being left (stored as XML): )"
+                        R"({hot}{/}..{/}Vorige 版{/}&)"),
+        Done("ARehearsal")
+            .FolderCfg(Written("{hot}{/}old{/}T"))
+            .Preset(Stored("{hot}{/}old{/}T") + Stored("{hot}{/}old{/}T"))
+            .Before({{MachineHive, Removed}, {UserHive, Removed}, {"tool/hf_folder.ico", Removed}})
+            .Run({"I", "--from", "{hot}{/}old", "--to", "{hot}{/}new"})
+            .IsReported(R"(
+{hot}{/}A
+  change   Folder.cfg: {hot}{/}old{/}T -> {hot}{/}new{/}T
+Job presets
+  change   .P{/}Presets{/}presets.xml: {hot}{/}old{/}T -> {hot}{/}new{/}T (2 times)
+Templates
+  note     there is no folder {hot}{/}new yet; templates that will be looked for in it: 2)"),
+    };
+}
+
+// What is lost when a template moves.
+Scenario Losses()
+{
+    const Text root = "<HotFolder ";
+    const Text end = "<PreflightSettings>\n";
+    const Text entry = "<KEYVALUE Key=\"B\"";
+    Text cfg = Written(MovedFrom);
+    Text alike;
+    for (int i = 0; i < 2000; ++i)
+        alike += "<r kind=\"alike\" number=\"" + std::to_string(i) + "\" empty=\"\"/>";
+    for (const auto& [from, to] :
+         Files{{" Quickset=\"q\"", ""},
+               {"\"-5\"", "\"5b\""},
+               {"Centralized=\"1\"", "Centralized=\"1 \""}, // no loss
+               {root, "<!DOCTYPE H [<!ENTITY e \"t\">]>\n<?top?>" + root + "mine=\"7\" "},
+               {"<a/>", alike}, // no loss
+               {entry, entry + " Mine=\"\" Value=\"1\"/>" + entry},
+               {end, "<Mine><b/></Mine><Paths/>Note <?mine?><!-- no loss -->" + end}})
+        cfg = Replaced(cfg, from, to);
+    return Done("Losses")
+        .Before({{Cfg('A'), Replaced(cfg, "HotFolder", "Old")},
+                 {Cfg('B'), Replaced(Written(MovedFrom), " TimeInterval=\"010\"", "")},
+                 {Cfg('C'), Replaced(Written(MovedFrom), "Enable=\"1\"", "Enable=\"true\"")}})
+        .IsReported(
+            R"(
+{hot}{/}A
+  problem  Folder.cfg: loses its document type, and with it the entities in its texts
+  problem  Folder.cfg: loses the instruction <?top?>
+  problem  Folder.cfg: its root <Old> comes out as <HotFolder>
+  problem  Folder.cfg: lacks "Quickset", so the rewrite resets: Quickset_Supported, IsWidthBased
+  problem  Folder.cfg: server_version="5b" comes out as "5"
+  problem  Folder.cfg: loses the attribute mine="7"
+  problem  Folder.cfg: loses <KEYVALUE Key="B" Mine="" Value="1"> in <JobSetting>
+  problem  Folder.cfg: loses <KEYVALUE Key="B" KeyDisplayValue="two" LocDisplayValue="zwei" )"
+            R"(Value="2"> in <JobSetting>
+  problem  Folder.cfg: loses <Mine>
+  problem  Folder.cfg: loses <b> in <Mine>
+  problem  Folder.cfg: loses <Paths>
+  problem  Folder.cfg: loses the text "Note"
+  problem  Folder.cfg: loses the instruction <?mine?>
+{moves}
+{hot}{/}B
+  problem  Folder.cfg: lacks "TimeInterval", so the rewrite resets: PPDVersion, )"
+            R"(ServerTypeAndJPDefaultKeyInfo, server_version, server_textversion, server_type, Quickset, )"
+            R"(Quickset_Supported, IsWidthBased
+{moves}
+{noicon}
+{hot}{/}C
+  problem  Folder.cfg: Enable="true" comes out as "0"
+{moves}
+{nodisabled})");
+}
+
+std::vector<Scenario> Contents()
+{
+    const Text hidden = Replaced(Written(MovedTo), " description=\"\"", "");
+    const Text utf16 = Replaced(Replaced(Written(MovedFrom), "UTF-8", "UTF-16"), "𝄞", "");
+    return {
+        Losses(),
+        Done("FolderCfgs")
+            .Before({{"hot/B/[P]/", ""},
+                     {Cfg('C'), "<a><b></a>"},
+                     {Cfg('D') + "/", ""},
+                     {"hot/E/[P]/", "{link:elsewhere/d}"},
+                     {"elsewhere/d/Folder.cfg", Written(MovedFrom)},
+                     {Cfg('G'), "{utf16}" + utf16},
+                     {Cfg('H'), hidden},
+                     {Cfg('I'), Replaced(hidden, "Enable=\"1\"", "Enable=\"0\"")}})
+            .IsReported(R"(
+{hot}{/}B
+  note     no Folder.cfg
+{nodisabled}
+{hot}{/}C
+  problem  Folder.cfg: damaged (line 1: mismatched tag); it stays as it is, and the folder shows )"
+                        R"(as disabled
+{nodisabled}
+{hot}{/}D
+  problem  Folder.cfg: is not a file
+{nodisabled}
+{hot}{/}E
+  problem  [_ORX_HotFolder_]: reached over a link
+{hot}{/}G
+{moves}
+  note     Folder.cfg: comes out as UTF-8
+{noicon}
+{hot}{/}H
+  problem  Folder.cfg: lacks "description", so the enabled folder shows as disabled
+{nodisabled}
+{hot}{/}I
+{nodisabled})"),
+        Done("Presets")
+            .Before({{PresetOf('B') + "/", ""},
+                     {Jobs + "/C/Presets/", "{link:elsewhere/d}"},
+                     {"elsewhere/d/", ""},
+                     {PresetOf('D'), Text("\xFF\xFE\0", 3)},
+                     {PresetOf('E'), "<p>\xC3\xA4 \xE4</p>"},
+                     {PresetOf('F'), "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?><p>\xE4</p>"},
+                     {PresetOf('G'), Stored(MovedFrom)},
+                     {PresetOf('H'), "\xEF\xBB\xBF<p/>"},
+                     {PresetOf('I'), "{utf16}<p>ä</p>"}})
+            .IsReported(R"(
+Job presets
+  change   E{/}Presets{/}presets.xml: comes out as UTF-8
+  change   F{/}Presets{/}presets.xml: comes out as UTF-8
+  change   G{/}Presets{/}presets.xml: {previous}{/}Booklet.tpl -> {default}{/}Booklet.tpl
+  change   H{/}Presets{/}presets.xml: loses its byte-order mark
+  change   I{/}Presets{/}presets.xml: comes out as UTF-8, without byte-order mark
+  problem  B{/}Presets{/}presets.xml: reached over a link, or not a file
+  problem  C{/}Presets{/}presets.xml: reached over a link, or not a file
+  problem  D{/}Presets{/}presets.xml: left as it is (cannot be decoded)
+  problem  E{/}Presets{/}presets.xml: is not UTF-8, so the whole file is read as Latin-1; )"
+                        R"(accented characters come out wrong
+  problem  F{/}Presets{/}presets.xml: declares the encoding ISO-8859-1, but comes out as UTF-8)"),
+        Done("LineEndsOfPresets")
+            .Preset("<p>\n</p>")
+            .Before({{PresetOf('B'), "\xEF\xBB\xBF<p>\n</p>"}})
+            .IsReported(IsWindowsProgram() ? R"(
+Job presets
+  change   .P{/}Presets{/}presets.xml: its line ends become CR LF
+  change   B{/}Presets{/}presets.xml: loses its byte-order mark, and its line ends become CR LF)"
+                                           : R"(
+Job presets
+  change   B{/}Presets{/}presets.xml: loses its byte-order mark)"),
+        Done("Links")
+            .Before(DoneFolder('B'))
+            .Before(DoneFolder('C'))
+            .Before({{CfgPlace, "{link:elsewhere/a}"},
+                     {"hot/B/[P]/hf_folder.ico", "{link:elsewhere/a}"},
+                     {"hot/C/Desktop.ini", "{link:elsewhere/a}"},
+                     {"hot/C/Desktop.ini#", Removed}})
+            .NotUnderWine(NoLinks)
+            .IsReported(R"(
+{hot}{/}A
+  problem  Folder.cfg: reached over a link
+{nodisabled}
+{hot}{/}B
+  problem  hf_folder.ico: reached over a link
+{hot}{/}C
+  problem  Desktop.ini: left as it is (reached over a link))"),
+        Done("ReadOnlyFiles")
+            .FolderCfg(Written(MovedFrom))
+            .Before(DoneFolder('B'))
+            .Before({{PresetPlace + "#", "R"},
+                     {CfgPlace + "#", "R"},
+                     {Cfg('B') + "#", "R"}, // it stays
+                     {LogPlace + "#", "R"}})
+            .AsOtherUser()
+            .IsReported(R"(
+Workstation
+  problem  there will be no run log: can't open file*
+{hot}{/}A
+  problem  Folder.cfg: cannot be opened for writing (can't open file*
+  problem  stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl
+Job presets
+  problem  .P{/}Presets{/}presets.xml: cannot be opened for writing (can't open file*)"),
+        Done("NothingCanBeReadOrReplaced")
+            .Before(DoneFolder('B'))
+            .Before(DoneFolder('C'))
+            .Before(DoneFolder('D'))
+            .Before({{"hot/D/Desktop.ini", "[.ShellClassInfo]"},
+                     {"hot/D/Desktop.ini#", "X"},
+                     {"hot/E/[P]/hf_folder_disabled.ico", "old"},
+                     {"hot/E/[P]/hf_folder_disabled.ico#", "R"},
+                     {"hot/E/[P]#", "X"},
+                     {CfgPlace + "#", "0"},
+                     {"hot/B/[P]#", "0"},
+                     {"hot/C#", "0"},
+                     {"tool/hf_folder.ico#", "0"},
+                     {PresetPlace + "#", "0"},
+                     {PresetOf('Q'), ""},
+                     {Jobs + "/Q#", "0"}})
+            .AsOtherUser()
+            .IsReported(R"(
+{hot}{/}A
+  problem  Folder.cfg: can't open file*
+{nodisabled}
+{hot}{/}B
+  problem  [_ORX_HotFolder_]: cannot be entered
+{hot}{/}C
+  problem  the hot folder cannot be entered
+{hot}{/}D
+  problem  hf_folder.ico: cannot be replaced (read-only, in use, or access denied)
+  problem  Desktop.ini: cannot be opened for reading and writing
+  problem  Desktop.ini: its attributes cannot be changed
+{hot}{/}E
+  problem  hf_folder_disabled.ico: cannot be replaced (read-only, in use, or access denied)
+  change   Desktop.ini: new
+  change   hot folder: attributes none -> SYSTEM
+  note     no Folder.cfg
+Job presets
+  problem  .P{/}Presets{/}presets.xml: cannot be opened for reading (can't open file*
+  problem  Q{/}Presets{/}presets.xml: {user}{/}ORX{/}JPData{/}Q cannot be entered)"),
+        Done("FoldersOfAnotherUser")
+            .Before(DoneFolder('B'))
+            .Before({{"hot/A/Desktop.ini", Removed},
+                     {"hot/A/Desktop.ini#", Removed},
+                     {"hot/A#", "SX"},
+                     {"hot/B#", "X"}})
+            .AsOtherUser()
+            .NotUnderWine(NoRefusal)
+            .IsReported(R"(
+{hot}{/}A
+  problem  Desktop.ini: cannot be created, because the hot folder cannot be written to
+{hot}{/}B
+  problem  hot folder: its attributes cannot be changed)"),
+        Done("SourceIconsAreMissing")
+            .Before({{"tool/BundleIcons#", "0"},
+                     {"hot/B/[P]/hf_folder_disabled.ico", ""},
+                     {"hot/C/[P]/hf_folder_disabled.ico", ""}})
+            .FolderCfg(Written("{hot}{/}A"))
+            .Preset("")
+            .Run({"U"})
+            .AsOtherUser()
+            .IsReported(R"(
+{hot}{/}A
+  problem  source icon missing: {tool}{/}BundleIcons{/}hf_folder.ico
+{hot}{/}B
+  problem  source icon missing: {tool}{/}BundleIcons{/}hf_folder_disabled.ico
+  note     no Folder.cfg
+{hot}{/}C
+  note     no Folder.cfg)"),
+        Done("KeysAndAttributes")
+            .Before({{"hot/A/Desktop.ini", "[.ShellClassInfo]\r\nIconFile=x\r\n"},
+                     {"hot/A/Desktop.ini#", "H"},
+                     {"hot/A#", "H"}})
+            .IsReported(R"(
+{hot}{/}A
+  change   Desktop.ini: InfoTip, IconFile
+  change   Desktop.ini: attributes HIDDEN -> READONLY SYSTEM
+  change   hot folder: attributes HIDDEN -> HIDDEN SYSTEM)"),
+    };
+}
+
+TEST_SCENARIOS(Machines);
+TEST_SCENARIOS(Templates);
+TEST_SCENARIOS(Contents);
+
+TEST(Check, WritesToAFile)
+{
+    Workstation workstation;
+    workstation.LayOut(
+        WorkstationBefore(Done("").Before({{"hot/A/Bericht ä 版.txt", Text(10000, '.')}})));
+    const auto run = [&](const Text& file)
+    {
+        return workstation.Start("FolderUpgradeCheck", {"i", workstation.Expand(file)});
+    };
+    EXPECT_EQ(0, run("{hot}{/}A{/}Bericht ä 版.txt").status);
+    const Text report = ReadFile(workstation.HostPath("hot/A/Bericht ä 版.txt"));
+    const size_t head = report.find_first_of("\r\n");
+    EXPECT_THAT(report.substr(0, head),
+                testing::MatchesRegex("FolderUpgradeCheck [0-9]+\\.[0-9]+\\.[0-9]+, upgrade, "
+                                      "20[0-9-]+ [0-9]+:[0-9]+, [^,]+, (not )?elevated"));
+    EXPECT_EQ(workstation.Expand("\nFrom {previous} to {default}\n\n"
+                                 "0 changes, 0 problems, 0 notes\n"),
+              Replaced(report.substr(head), "\r", ""));
+
+    const RunResult refused = run("{hot}{/}none{/}a.txt");
+    EXPECT_EQ(2, refused.status);
+    EXPECT_EQ("", refused.output);
+    const Text complaint = workstation.Expand(
+        "FolderUpgradeCheck: the report cannot be written to {hot}{/}none{/}a.txt\n");
+    EXPECT_EQ(IsWindowsProgram() ? "" : complaint, refused.libraryLog);
+}
+
+TEST(Check, PrintsItsUsage)
+{
+    const Workstation workstation;
+    const Text usage = workstation.Start("FolderUpgradeCheck", {"--help"}).output;
+    EXPECT_TRUE(
+        StartsWith(usage, "Usage: FolderUpgradeCheck I|U [--from FOLDER] [--to FOLDER] [FILE]"));
+    EXPECT_THAT(workstation.Start("FolderUpgradeCheck", {"--version"}).output,
+                testing::MatchesRegex("FolderUpgradeCheck [0-9.]+\r?\n"));
+    for (const std::vector<Text>& wrong :
+         {std::vector<Text>{}, {"V"}, {"/I"}, {"I", "report", "V"}, {"I", "--to"}, {"I", ""}})
+    {
+        const RunResult run = workstation.Start("FolderUpgradeCheck", wrong);
+        EXPECT_EQ(3, run.status);
+        EXPECT_EQ("", run.output);
+        EXPECT_EQ(IsWindowsProgram() ? "" : usage, run.libraryLog);
+    }
+}
+
+} // namespace
