@@ -118,7 +118,7 @@ class Workstation(lay_out.WineWorkstation):
 
     def lay_out(self, previous):
         """Restores the state before an upgrade, without reports and logs; previous is the registry's text or None."""
-        for name, text in {**self.files(PREVIOUS, b"an older picture"), "machine/hotfolder/HotFolderList.cfg":
+        for name, text in {**self.files(PREVIOUS, b"an older picture"), "Elsewhere/Booklet": b"", "machine/hotfolder/HotFolderList.cfg":
                            rb'<L><HotFolder path="C:\Hot Folders\A"/><HotFolder path="C:\Hot Folders\B"/></L>'}.items():
             self.put(name, text)
         for path in self.logs.glob("*"):
