@@ -35,7 +35,7 @@ Scenario Moving(const Text& name)
         .Before({{MachineHive, MachineValue("\"InstallPath\"=\"{TOOL}\"")},
                  {UserHive, UserValue("\"Path\"=\"{TOOL}{/2}previous\"")}})
         .Before({{"tool/previous/Booklet.tpl", ""}, {"tool/template/Booklet.tpl", ""}})
-        .FolderCfg(Written(Old))
+        .Before({{CfgPlace, Written(Old)}})
         .Preset(Stored(Old), Stored(New));
 }
 
@@ -60,7 +60,7 @@ std::vector<Call> Calls()
     return {
         {Moving("AllIsDoneAndTheLogFolderIsMade").Before({{LogPlace, Removed}}), 0},
         {Moving("TheWayBack")
-             .FolderCfg(Written(New))
+             .Before({{CfgPlace, Written(New)}})
              .Preset(Stored(New), Stored(Old))
              .Run({"u", "--limit", "600"}),
          0},
@@ -79,7 +79,7 @@ std::vector<Call> Calls()
              .Before({{CfgPlace + "#", "R"}, {"hot/B/[P]/Folder.cfg", ""}})
              .AsOtherUser(),
          2, Refused},
-        {Moving("WhatWasResetIsSaid").FolderCfg(reset), 2, Reset},
+        {Moving("WhatWasResetIsSaid").Before({{CfgPlace, reset}}), 2, Reset},
         {Staying("AnAccountWithoutAPath").Before({{UserHive, Removed}}), 2, "; nothing moves"},
         {Staying("TheProgramIsMissing"), 4,
          "\nFolderUpgrade\n  problem  could not be started (error 2: ", Logs, ""},
