@@ -110,8 +110,8 @@ std::vector<Scenario> Sizes()
             .LogOfDisabledA(Found(MovedFrom)),
         listed("AListThatIsTooDeepIsEmpty", Times(6000, "<e>")).Log(""),
         listed("AListThatIsTooBigIsEmpty", listedA + Times(1600000, "<a/>")).Log(""),
-        listed("AListOf100000EntriesIsRead",
-               listedA + Times(100000, "<HotFolder path='{hot}{/}missing'/>"))
+        listed("AListOf20000EntriesIsRead",
+               listedA + Times(20000, "<HotFolder path='{hot}{/}missing'/>"))
             .Log(FolderLines("A", 1, NoIcon("hf_folder_disabled"), NoCfg("A"))),
     };
 }
