@@ -60,7 +60,7 @@ check() {
     on_workstation "$programs/FolderUpgradeCheck" "$switch" >"$scratch/report" || status=$?
     shorten <"$scratch/report"
     case $status in
-        0) echo "Exit status 0: nothing to change" ;;
+        0) echo "Exit status 0: nothing to change, and every template is there" ;;
         1) echo "Exit status 1: changes" ;;
         2) echo "Exit status 2: problems" ;;
         *) exit 1 ;;

@@ -5,6 +5,7 @@
 #include "appearance/folder_icon.h"
 #include "appearance/icon_copy.h"
 #include "migrate/hot_folder_impose_path.h"
+#include "migrate/job_preset_files.h"
 #include "migrate/job_preset_impose_path.h"
 #include "run/attempt.h"
 #include "store/hot_folder_list.h"
@@ -41,9 +42,13 @@ void UpdateHotFolder(const FolderUpgradeApp& app, const wxString& path, int posi
                 UpdateFolderIcon(app, *folder);
             });
     RunLog(L"Updated icon for hf" + path, position);
-    if (folder)
-        Attempt(L"HF cfg file", FolderCfgPath(path),
-                [&]() { UpdateHotFolderImposePath(app, *folder); });
+    Attempt(L"HF cfg file", FolderCfgPath(path),
+            [&]()
+            {
+                if (!folder)
+                    folder.emplace(path);
+                UpdateHotFolderImposePath(app, *folder);
+            });
     RunLog(L"updated Impose path for hf" + path, position);
 }
 
@@ -100,7 +105,7 @@ bool FolderUpgradeApp::OnInit()
     RunLog(L"End: HF updation");
 
     RunLog(L"Start: Updating Impose path for JP Presets");
-    UpdateJobPresetImposePath(*this);
+    Attempt(L"JP Presets", JobPresetRoot(), [&]() { UpdateJobPresetImposePath(*this); });
     RunLog(L"End: Updating Impose path for JP Presets");
     return false;
 }

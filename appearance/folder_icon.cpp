@@ -4,7 +4,7 @@
 #include "platform/file_copy.h"
 #include "platform/library_log.h"
 #include "platform/system.h"
-#include "run/run_log.h"
+#include "run/attempt.h"
 
 #include <wx/filename.h>
 #include <wx/intl.h>
@@ -80,6 +80,6 @@ void UpdateFolderIcon(const FolderUpgradeApp& app, HotFolder& folder)
         ReportError(
             wxString::Format(_("Failed to copy the file '%s' to '%s'"), copy.source, destination) +
             failure->Reason());
-    ApplyFolderIcon(folder, copy.name);
+    Attempt(DesktopIniName, folder.path, [&]() { ApplyFolderIcon(folder, copy.name); });
     RunLog(L"Icon  copied from : " + copy.source + L" To " + destination + L" ");
 }

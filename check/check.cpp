@@ -8,6 +8,7 @@
 #include <wx/datetime.h>
 
 #include <map>
+#include <new>
 
 namespace
 {
@@ -34,13 +35,20 @@ void CheckHotFolders(const HotFolderList& list, TemplateCheck& check)
     {
         const wxString& hotFolder = list.folders[i];
         report.Begin(hotFolder);
-        HotFolder folder(hotFolder);
-        const auto identity = folder.directory.Identity();
-        const auto [first, isNew] = known.emplace(identity, i);
-        if (isNew || identity == std::pair<std::uint64_t, std::uint64_t>())
-            CheckHotFolder(folder, check);
-        else
-            report.Note("the same directory as " + Shown(list.folders[first->second]));
+        try
+        {
+            HotFolder folder(hotFolder);
+            const auto identity = folder.directory.Identity();
+            const auto [first, isNew] = known.emplace(identity, i);
+            if (isNew || identity == std::pair<std::uint64_t, std::uint64_t>())
+                CheckHotFolder(folder, check);
+            else
+                report.Note("the same directory as " + Shown(list.folders[first->second]));
+        }
+        catch (const std::bad_alloc&)
+        {
+            report.Problem("cannot be checked (out of memory)");
+        }
     }
 }
 

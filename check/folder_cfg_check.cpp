@@ -3,6 +3,7 @@
 #include "check/folder_cfg_loss.h"
 #include "check/workstation_check.h"
 #include "migrate/template_move.h"
+#include "platform/path_normal_form.h"
 #include "store/xml_encoding.h"
 
 #include <wx/filename.h>
@@ -53,6 +54,18 @@ bool CheckMove(HotFolder& folder, const TemplateMove& move, Report& report)
     return true;
 }
 
+wxString WhyItStays(const TemplateMove& move, TemplateFolders& folders)
+{
+    using Outcome = TemplateMove::Outcome;
+    if (move.outcome == Outcome::ToUnknown)
+        return "the folder being installed is unknown";
+    if (move.outcome != Outcome::Elsewhere)
+        return "in a file that stays as it is";
+    return IsDirectlyIn(move.storedPath, WithoutFinalSeparators(folders.From().path))
+               ? "the registry value ends in a separator"
+               : "in a sub-folder";
+}
+
 // Returns whether the file is rewritten.
 bool CheckTemplate(HotFolder& folder, TemplateCheck& check)
 {
@@ -67,9 +80,7 @@ bool CheckTemplate(HotFolder& folder, TemplateCheck& check)
     if (move.outcome == Outcome::ToUnknown)
         check.CheckIsKnown(check.folders.To());
     Findings findings;
-    check.Judge(isRewritten ? move.newPath : move.storedPath,
-                move.outcome == Outcome::Elsewhere ? "in a sub-folder"
-                                                   : "in a file that stays as it is",
+    check.Judge(isRewritten ? move.newPath : move.storedPath, WhyItStays(move, check.folders),
                 findings);
     report.Add({}, findings);
     return isRewritten;

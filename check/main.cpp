@@ -36,7 +36,8 @@ bool ReadOptions(const wxArrayString& arguments, Options& options)
         const bool isFrom = arguments[i] == "--from";
         const bool isFolder = isFrom || arguments[i] == "--to";
         wxString& value = isFrom ? options.from : isFolder ? options.to : options.file;
-        if (!value.empty() || (isFolder && ++i == arguments.size()) || arguments[i].empty())
+        if (!value.empty() || (isFolder && ++i == arguments.size()) || arguments[i].empty() ||
+            arguments[i].StartsWith("-"))
             return false;
         value = arguments[i];
     }

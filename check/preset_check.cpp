@@ -2,6 +2,7 @@
 
 #include "check/reach.h"
 #include "migrate/job_preset_files.h"
+#include "migrate/template_move.h"
 #include "store/xml_encoding.h"
 
 #include <wx/convauto.h>
@@ -49,8 +50,6 @@ void CheckContent(const wxString& name, const RewrittenPreset& rewritten, Report
     else if (IsTakenAsLatin1(rewritten.before))
         report.AddLosses(name, {"is not UTF-8, so the whole file is read as Latin-1; accented "
                                 "characters come out wrong"});
-    if (rewritten.bytes != rewritten.before && rewritten.movedPaths == 0)
-        report.Change(name + OtherChange(rewritten.before, rewritten.bytes));
 }
 
 // The character that an entity or a numeric reference stands for; 0 for any other text.
@@ -77,34 +76,34 @@ wxString Decoded(const wxString& path)
     wxString decoded;
     for (size_t i = 0; i < path.length(); ++i)
     {
-        const size_t end = path[i] == '&' ? path.find(';', i) : wxString::npos;
-        const unsigned long code = end != wxString::npos && end - i <= LongestName
-                                       ? CharacterOf(path.Mid(i + 1, end - i - 1))
-                                       : 0;
+        const wxString name = path[i] == '&' ? path.Mid(i + 1, LongestName) : wxString();
+        const size_t end = name.find(';');
+        const unsigned long code = end != wxString::npos ? CharacterOf(name.Left(end)) : 0;
         decoded += code != 0 ? wxUniChar(static_cast<int>(code)) : wxUniChar(path[i]);
-        i = code != 0 ? end : i;
+        i += code != 0 ? end + 1 : 0;
     }
     return decoded;
 }
 
 // Why a path of a preset that is rewritten stays although it leads into the folder being left.
-wxString WhyItStays(const wxString& path, const wxString& decoded, const wxString& from)
+wxString WhyItStays(const wxString& path, const wxString& decoded, TemplateFolders& folders)
 {
+    const wxString& from = folders.From().path;
     if (path != decoded)
         return "stored as XML";
+    if (MovedPresetPath(path, from, folders.To().path) != path)
+        return "another run moves it";
     const wxString begin = decoded.Left(from.length());
+    if (begin == from)
+        return "no path moves";
     return begin.CmpNoCase(from) == 0 ? "other letter case" : "other separators";
 }
 
-void CheckPaths(const wxString& name, const std::string& before, bool isRewritten,
-                TemplateCheck& check)
+// The changes of the file's paths, and what is at the places to which they then lead.
+Findings CheckPaths(const wxString& text, bool isRewritten, TemplateCheck& check)
 {
-    Report& report = check.report;
     const wxString& from = check.folders.From().path;
     const wxString& to = check.folders.To().path;
-    wxString text;
-    if (DecodePreset(before, text))
-        return;
     std::map<std::pair<wxString, wxString>, size_t> paths; // stored and moved -> how often
     Findings findings;
     for (const PresetPath& path : FindPresetPaths(text, from, to))
@@ -117,9 +116,10 @@ void CheckPaths(const wxString& name, const std::string& before, bool isRewritte
     for (const auto& [path, count] : paths)
     {
         const auto& [stored, left] = path;
-        const wxString decoded = Decoded(left);
+        const wxString decoded = IsTooLongPath(left) ? left : Decoded(left);
         check.Judge(decoded,
-                    isRewritten ? WhyItStays(left, decoded, from) : "in a file that stays as it is",
+                    isRewritten ? WhyItStays(left, decoded, check.folders)
+                                : "in a file that stays as it is",
                     findings);
         if (stored == left)
             continue;
@@ -127,10 +127,10 @@ void CheckPaths(const wxString& name, const std::string& before, bool isRewritte
             Shown(stored) + " -> " + Shown(left) +
             (count == 1 ? wxString() : wxString::Format(" (%zu times)", count)));
         if (MovedPresetPath(left, from, to) != left)
-            report.ProblemOnce("one template folder is below the other: another run would move "
-                               "paths of presets once more");
+            check.report.ProblemOnce("one template folder is below the other: another run would "
+                                     "move paths of presets once more");
     }
-    report.Add(name, findings);
+    return findings;
 }
 
 void CheckPreset(JobPresetFile& preset, const wxString& name, TemplateCheck& check)
@@ -151,7 +151,9 @@ void CheckPreset(JobPresetFile& preset, const wxString& name, TemplateCheck& che
     const RewrittenPreset rewritten =
         preset.Decide(check.folders.From().path, check.folders.To().path);
     wxString text;
-    if (DecodePreset(rewritten.before, text) == nullptr && !FindPresetPaths(text, {}, {}).empty())
+    if (DecodePreset(rewritten.before, text))
+        text.clear();
+    if (!FindPresetPaths(text, {}, {}).empty())
         check.CheckForPresets();
     if (!check.folders.From().isKnown || !check.folders.To().isKnown)
         return;
@@ -163,7 +165,10 @@ void CheckPreset(JobPresetFile& preset, const wxString& name, TemplateCheck& che
                        reopening.Describe(preset.GetPath()) + ")");
     else
         CheckContent(name, rewritten, report);
-    CheckPaths(name, rewritten.before, isRewritten, check);
+    Findings findings = CheckPaths(text, isRewritten, check);
+    if (isRewritten && findings.changes.empty() && rewritten.bytes != rewritten.before)
+        findings.changes.push_back(OtherChange(rewritten.before, rewritten.bytes));
+    report.Add(name, findings);
 }
 
 // Why a presets.xml that may exist cannot be seen; empty if it does not exist.

@@ -7,15 +7,19 @@
 #include "store/xml_text.h"
 
 #include <wx/filename.h>
+#include <wx/log.h>
 
 namespace
 {
 
-// With one kind of separator, without dots, and in lower case if case does not matter.
+// With variables expanded, one kind of separator, without dots, and in lower case if case does not
+// matter: as the paths of hot folders are compared.
 wxString Comparable(const wxString& path)
 {
+    const wxLogNull noWarnings; // of variables that are not there
     wxFileName name(path, wxPATH_NATIVE);
-    name.Normalize(wxPATH_NORM_DOTS | wxPATH_NORM_CASE, wxString(), wxPATH_NATIVE);
+    name.Normalize(wxPATH_NORM_ENV_VARS | wxPATH_NORM_DOTS | wxPATH_NORM_CASE, wxString(),
+                   wxPATH_NATIVE);
     return WithoutFinalSeparators(name.GetFullPath(wxPATH_NATIVE));
 }
 
@@ -31,25 +35,41 @@ bool IsIn(const wxString& path, const wxString& folder)
            (inner.length() == outer.length() || wxFileName::IsPathSeparator(inner[outer.length()]));
 }
 
-// Whether the path can be looked at without leaving this machine. Links up to the trusted folder,
-// from the registry, do not count.
-bool MayLookAt(const wxString& path, const wxString& trusted)
+enum class Place
 {
-    if (IsTooLongPath(path) || !IsOnLocalDrive(Comparable(path)))
-        return false;
+    There,
+    Missing,
+    NotLookedAt
+};
+
+// Looks at one directory after another, from the drive on, without leaving this machine. Links up
+// to the trusted folder, from the registry, are followed.
+Place Look(const wxString& path, const wxString& trusted)
+{
     wxFileName name(WithoutFinalSeparators(path), wxPATH_NATIVE);
-    if (name.GetPath().Lower().Contains(".lnk"))
-        return false;
+    if (!IsTooLongPath(path))
+        name.Normalize(wxPATH_NORM_DOTS, wxString(), wxPATH_NATIVE);
+    if (IsTooLongPath(path) || !IsOnLocalDrive(name.GetFullPath()))
+        return Place::NotLookedAt;
     const size_t trustedDepth =
-        IsIn(path, trusted) ? wxFileName::DirName(trusted).GetDirCount() : 0;
-    if (IsLink(name.GetFullPath()))
-        return false;
-    for (; name.GetDirCount() > trustedDepth; name.RemoveLastDir())
+        IsIn(path, trusted) ? wxFileName::DirName(Comparable(trusted)).GetDirCount() : 0;
+    wxFileName reached(name);
+    while (reached.GetDirCount() > 0)
+        reached.RemoveLastDir();
+    for (size_t i = 0; i <= name.GetDirCount(); ++i)
     {
-        if (IsLink(name.GetPath(wxPATH_GET_VOLUME)))
-            return false;
+        const bool isLast = i == name.GetDirCount();
+        if (!isLast && name.GetDirs()[i].Lower().EndsWith(".lnk"))
+            return Place::NotLookedAt;
+        if (!isLast)
+            reached.AppendDir(name.GetDirs()[i]);
+        const wxString next = isLast ? name.GetFullPath() : reached.GetPath(wxPATH_GET_VOLUME);
+        if (i >= trustedDepth && IsLink(next))
+            return Place::NotLookedAt;
+        if (!wxFileName::Exists(next))
+            return Place::Missing;
     }
-    return true;
+    return Place::There;
 }
 
 } // namespace
@@ -103,20 +123,30 @@ void TemplateCheck::Judge(const wxString& path, const wxString& whyItStays, Find
         return;
     // Either folder can be in the other.
     if (IsIn(path, from) && !(IsIn(path, to) && IsIn(to, from)))
+    {
         findings.problems.push_back("stays in the folder being left (" + whyItStays +
                                     "): " + Shown(path));
-    else if (!MayLookAt(path, to))
+        return;
+    }
+    const Place place = Look(path, to);
+    if (place == Place::NotLookedAt)
         findings.notes.push_back("not looked at: " + Shown(path));
-    else if (IsIn(path, to) && !wxDirExists(to))
+    else if (place == Place::Missing && IsIn(path, to) && !wxDirExists(to))
         ++m_awaited;
-    else if (!wxFileName::Exists(path))
+    else if (place == Place::Missing)
         findings.problems.push_back("no template at " + Shown(path));
 }
 
 void TemplateCheck::ReportAwaited()
 {
-    if (m_awaited > 0)
-        report.Note(wxString::Format(
-            "there is no folder %s yet; templates that will be looked for in it: %zu",
-            folders.To().path, m_awaited));
+    if (m_awaited == 0)
+        return;
+    const wxString text =
+        wxString::Format("there is no folder %s; templates that will be looked for in it: %zu",
+                         folders.To().path, m_awaited);
+    // It may not be there yet before an installation, and before a removal has put it back.
+    if (folders.IsUpgrade() && !folders.IsRehearsal())
+        report.Problem(text);
+    else
+        report.Note(text);
 }

@@ -16,7 +16,7 @@ class TemplateCheck
     void CheckPreviousFolder();
     /// Reports once that a folder that is needed is unknown.
     void CheckIsKnown(const TemplateFolder& folder);
-    /// Both, and what matters only in the text of presets.
+    /// Reports once that either folder is unknown, and what matters only in the text of presets.
     void CheckForPresets();
 
     /// Judges a path as a run leaves it: whether it still leads into the folder being left, and

@@ -13,9 +13,14 @@ namespace
 
 bool IsDriveThere(const wxString& folder)
 {
-    const wxString root = wxFileName(folder, wxPATH_NATIVE).GetVolume();
-    return root.empty() ||
-           wxDirExists(root + wxFileName::GetVolumeSeparator() + wxFileName::GetPathSeparator());
+    const wxFileName name(folder, wxPATH_NATIVE);
+    if (!name.HasVolume())
+        return true;
+    const wxString separator = wxFileName::GetPathSeparator();
+    const bool isShare = name.GetVolume().length() > 1;
+    const wxString share = name.GetDirCount() > 0 ? name.GetDirs()[0] : wxString();
+    return wxDirExists(isShare ? name.GetVolume() + separator + share + separator
+                               : name.GetVolume() + ":" + separator);
 }
 
 void CheckEntries(const HotFolderList& list, Report& report)

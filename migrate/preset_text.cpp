@@ -1,6 +1,8 @@
 #include "migrate/preset_text.h"
 
+#include "platform/memory.h"
 #include "platform/path_normal_form.h"
+#include "platform/regular_file.h"
 #include "platform/unicode_text.h"
 #include "store/folder_cfg_format.h"
 #include "store/xml_text.h"
@@ -8,6 +10,8 @@
 #include <wx/convauto.h>
 #include <wx/textbuf.h>
 
+#include <cstdint>
+#include <new>
 #include <vector>
 
 namespace
@@ -17,6 +21,9 @@ wxString Introduction()
 {
     return wxString(FolderCfg::ImposeTemplateKey) + "\">\"";
 }
+
+// A character as it is and in the new text, wide, and twice in the new bytes.
+constexpr std::uint64_t MemoryForEachCharacter = 2 * sizeof(wchar_t) + 2;
 
 bool EndsFolder(const wxString& text, size_t position)
 {
@@ -57,7 +64,8 @@ bool IsEmptyText(const std::string& bytes)
 
 } // namespace
 
-size_t MovePresetPaths(wxString& text, const wxString& oldFolder, const wxString& newFolder)
+std::optional<size_t> MovePresetPaths(wxString& text, const wxString& oldFolder,
+                                      const wxString& newFolder)
 {
     const wxString from = WithoutFinalSeparators(oldFolder);
     const wxString to = WithoutFinalSeparators(newFolder);
@@ -67,9 +75,14 @@ size_t MovePresetPaths(wxString& text, const wxString& oldFolder, const wxString
     if (folders.empty())
         return 0;
 
+    const size_t length =
+        text.length() + folders.size() * to.length() - folders.size() * from.length();
+    if (length > static_cast<size_t>(LongestFile))
+        return {};
+    RequireMemory(length * MemoryForEachCharacter);
     // A text that grows piece by piece would be in memory three times at worst.
     wxString moved;
-    moved.reserve(text.length() + folders.size() * to.length() - folders.size() * from.length());
+    moved.reserve(length);
     size_t copied = 0; // the number of characters of the text that are in moved
     for (const size_t folder : folders)
     {
@@ -126,9 +139,14 @@ RewrittenPreset RewritePreset(const std::string& before, const wxString& from, c
     preset.reasonToStay = DecodePreset(before, text);
     if (preset.reasonToStay)
         return preset;
-    preset.movedPaths = MovePresetPaths(text, from, to);
+    const std::optional<size_t> moved = MovePresetPaths(text, from, to);
+    preset.movedPaths = moved.value_or(0);
     if (wxTextBuffer::typeDefault == wxTextFileType_Dos)
         text.Replace("\n", "\r\n");
     preset.bytes = text.utf8_string();
+    if (preset.bytes.empty() && !text.empty())
+        throw std::bad_alloc(); // the library gives an empty text then
+    if (!moved || preset.bytes.size() > static_cast<size_t>(LongestFile))
+        preset.reasonToStay = PresetStays::NewTooLarge;
     return preset;
 }

@@ -3,6 +3,7 @@
 
 #include <wx/string.h>
 
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -10,8 +11,9 @@
 /// where the search text ORXImposeTemplate">" is directly followed by the folder's text, and that
 /// by a path separator or the closing double quote. Separators at the end of either folder are
 /// ignored. Replaces nothing if either folder is empty, or if XML cannot hold the text of the new
-/// one. Returns the number of replacements. Takes time proportional to the length of the text.
-size_t MovePresetPaths(wxString& text, const wxString& from, const wxString& to);
+/// one. Returns the number of replacements; nothing if the text would have more than LongestFile
+/// characters, and so could not be read again. Takes time proportional to the length of the text.
+std::optional<size_t> MovePresetPaths(wxString& text, const wxString& from, const wxString& to);
 
 /// The template paths of the text, each with what MovePresetPaths makes of it; what follows the
 /// search text up to the next double quote. isCutOff: the last one has no double quote.
@@ -37,6 +39,7 @@ namespace PresetStays
 constexpr const char* NotRead = "cannot be read";
 constexpr const char* NotDecoded = "cannot be decoded";
 constexpr const char* NotEncodedAgain = "cannot be encoded again";
+constexpr const char* NewTooLarge = "the new content would be too large";
 
 } // namespace PresetStays
 

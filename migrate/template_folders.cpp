@@ -1,5 +1,7 @@
 #include "migrate/template_folders.h"
 
+#include "platform/path_normal_form.h"
+
 namespace
 {
 
@@ -12,6 +14,13 @@ TemplateFolder LookUp(bool (*lookUp)(wxFileName&, ValueSource&))
     return found;
 }
 
+TemplateFolder Given(const wxString& path, const wxString& option)
+{
+    wxFileName folder(WithoutFinalSeparators(path));
+    folder.MakeAbsolute();
+    return {true, folder.GetFullPath(wxPATH_NATIVE), {option, {}}};
+}
+
 } // namespace
 
 TemplateFolders::TemplateFolders(bool isUpgrade) : m_isUpgrade(isUpgrade)
@@ -21,12 +30,10 @@ TemplateFolders::TemplateFolders(bool isUpgrade) : m_isUpgrade(isUpgrade)
 TemplateFolders::TemplateFolders(bool isUpgrade, const wxString& from, const wxString& to)
     : m_isUpgrade(isUpgrade), m_isRehearsal(!from.empty() || !to.empty())
 {
-    std::optional<TemplateFolder>& folderFrom = isUpgrade ? m_previous : m_default;
-    std::optional<TemplateFolder>& folderTo = isUpgrade ? m_default : m_previous;
     if (!from.empty())
-        folderFrom = TemplateFolder{true, wxFileName(from).GetFullPath(), {"the given folder", {}}};
+        (isUpgrade ? m_previous : m_default) = Given(from, "--from");
     if (!to.empty())
-        folderTo = TemplateFolder{true, wxFileName(to).GetFullPath(), {"the given folder", {}}};
+        (isUpgrade ? m_default : m_previous) = Given(to, "--to");
 }
 
 bool TemplateFolders::IsRehearsal() const

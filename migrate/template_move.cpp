@@ -9,6 +9,7 @@
 
 #include <wx/confbase.h>
 #include <wx/filename.h>
+#include <wx/log.h>
 #include <wx/tokenzr.h>
 
 #include <algorithm>
@@ -124,6 +125,7 @@ bool IsDirectlyIn(const wxString& stored, const wxString& folder)
 {
     if (IsTooLongPath(stored))
         return false;
+    const wxLogNull noWarnings; // of variables that are not there
     wxFileName left(wxFileName(stored, wxPATH_NATIVE).GetPath(wxPATH_GET_VOLUME, wxPATH_NATIVE),
                     wxPATH_NATIVE);
     wxFileName right(folder, wxPATH_NATIVE);

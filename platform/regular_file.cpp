@@ -134,7 +134,7 @@ bool RegularFile::HasContentOf(const RegularFile& other) const
     return length == other.Length();
 }
 
-bool RegularFile::Rewrite(const std::string& before, const std::string& after, Wait wait)
+bool RegularFile::Rewrite(const std::string& before, const std::string& after)
 {
     const auto oldLength = static_cast<std::int64_t>(before.size());
     const auto newLength = static_cast<std::int64_t>(after.size());
@@ -150,8 +150,7 @@ bool RegularFile::Rewrite(const std::string& before, const std::string& after, W
     // Another program may have made it longer a moment ago.
     if (Write(0, written.data(), written.size()) && (Length() == newLength || SetLength(newLength)))
     {
-        if (wait == Wait::ForDisk)
-            WaitForDisk();
+        WaitForDisk();
         return true;
     }
     m_failure = FailedCall::Now(FailedCall::Kind::Write);

@@ -51,12 +51,6 @@ class RegularFile
         Open
     };
 
-    enum class Wait
-    {
-        ForDisk,
-        ForNothing
-    };
-
     RegularFile() = default;
     ~RegularFile();
     RegularFile(const RegularFile&) = delete;
@@ -95,10 +89,10 @@ class RegularFile
     /// If the system supports it, reserves space for a longer content before a byte changes (so a
     /// full disk leaves the file as it was). Writes once; a shorter content is written with line
     /// feeds up to the old length, and the file is then cut. If any of that fails, restores the old
-    /// bytes and returns false. Finally waits for the disk, if requested; if that fails, the new
+    /// bytes and returns false. Finally waits for the disk; if that fails, the new
     /// content stays. If the process is ended meanwhile, the file has the old content, the new one,
     /// or the new one followed by line feeds, provided that the system does not interrupt a write.
-    bool Rewrite(const std::string& before, const std::string& after, Wait wait = Wait::ForDisk);
+    bool Rewrite(const std::string& before, const std::string& after);
 
     /// Copies the content of the other file in pieces, after reserving space for it.
     bool TakeContent(const RegularFile& source);

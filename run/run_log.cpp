@@ -6,6 +6,7 @@
 #include "run/run_log_place.h"
 
 #include <exception>
+#include <new>
 
 bool RunLogEnabled = true;
 
@@ -16,7 +17,10 @@ std::string FormatLine(const wxString& message, int count)
 {
     const wxString line = count == NoCount ? wxString::Format("%s", message)
                                            : wxString::Format("%s count:  %d", message, count);
-    return ToOneLine(line).utf8_string() + "\r\n";
+    const std::string bytes = ToOneLine(line).utf8_string();
+    if (bytes.empty() && !line.empty())
+        throw std::bad_alloc(); // the library gives an empty text then
+    return bytes + "\r\n";
 }
 
 class LogFile

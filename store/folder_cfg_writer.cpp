@@ -13,6 +13,7 @@ namespace
 {
 
 constexpr int IndentationStep = 2;
+
 // The library's memory stream copies all its bytes for every kilobyte that is added. This one
 // refuses more than can be read again.
 class StringOutputStream : public wxOutputStream
@@ -24,7 +25,7 @@ class StringOutputStream : public wxOutputStream
   protected:
     size_t OnSysWrite(const void* data, size_t size) override
     {
-        isFull = bytes.size() + size > FolderCfgLimits.bytes;
+        isFull = isFull || bytes.size() + size > FolderCfgLimits.bytes;
         if (isFull)
             m_lasterror = wxSTREAM_WRITE_ERROR;
         else
@@ -134,7 +135,7 @@ std::string FolderCfgBytes(const HotFolderSettings& settings, const JobSettingTa
     WritePreflightSettings(root, preflightSettings);
     StringOutputStream stream;
     if (!document.Save(stream, IndentationStep) && !stream.isFull)
-        throw std::bad_alloc(); // the only other reason
+        throw std::bad_alloc(); // the library could not convert a text
     const bool isReadable =
         !stream.isFull &&
         (IsHarmlessXml(stream.bytes) || LookAtXml(stream.bytes, FolderCfgLimits).isWithinLimits);

@@ -42,7 +42,7 @@ const std::vector<RootAttribute>& RootAttributes()
         {L"TimeInterval", F::Text, &S::TimeInterval, 22},
         {L"PPDVersion", F::Text, &S::PPDVersion, 12},
         {L"ServerTypeAndJPDefaultKeyInfo", F::Text, &S::ServerTypeAndJPDefaultKeyInfo, 13},
-        {L"server_version", F::Number, &S::server_version, 5},
+        {L"server_version", F::Number, &S::server_version, 5, true},
         {L"server_textversion", F::Text, &S::server_textversion, 6},
         {L"server_type", F::Text, &S::server_type, 7},
         {L"Quickset", F::Text, &S::Quickset, 16},
@@ -87,7 +87,7 @@ size_t ReadRootAttributes(const AttributeMap& attributes, HotFolderSettings& set
     {
         const auto found = attributes.find(attribute.name);
         const bool isMissing = found == attributes.end();
-        if (isMissing && attribute.form != AttributeForm::Number)
+        if (isMissing && !attribute.isOptional)
             break;
         attribute.Read(isMissing ? wxString(L"-1") : found->second, settings);
         ++read;

@@ -13,8 +13,7 @@
 enum class AttributeForm
 {
     Text,        // as it is
-    Number,      // base 10, up to the first character that is not a digit; 0 without digits; -1 if
-                 // the attribute is missing, which does not end the chain of those that are read
+    Number,      // base 10, up to the first character that is not a digit; 0 without digits
     NumericFlag, // whether such a number is not 0
     TextFlag     // whether the text, without trailing white space, is exactly "1"
 };
@@ -28,6 +27,7 @@ struct RootAttribute
     AttributeForm form;
     Field field;
     int writtenPlace;
+    bool isOptional = false; // missing, it becomes -1 and does not end the chain
 
     void Read(const wxString& text, HotFolderSettings& settings) const;
     wxString Format(const HotFolderSettings& settings) const;
@@ -39,8 +39,8 @@ const std::vector<RootAttribute>& RootAttributes();
 /// The same, in the order in which they are written.
 std::vector<const RootAttribute*> WrittenRootAttributes();
 
-/// Reads the attributes as a chain, up to the first that is missing and not a number: from there on
-/// all fields stay as they were. Returns how many attributes of the table come before it.
+/// Reads the attributes as a chain, up to the first that is missing and not optional: from there
+/// on all fields stay as they were. Returns how many attributes of the table come before it.
 size_t ReadRootAttributes(const AttributeMap& attributes, HotFolderSettings& settings);
 
 /// Up to "server_name": without them, a Folder.cfg counts as not read.

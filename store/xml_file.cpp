@@ -9,6 +9,7 @@ XmlFile::XmlFile(const XmlLimits& itsLimits) : limits(itsLimits)
 XmlFile::State XmlFile::Load(RegularFile::Status opened)
 {
     const std::string bytesBefore = std::move(bytes);
+    std::unique_ptr<const wxXmlDocument> documentBefore = std::move(document);
     bytes.clear();
     state = State::Loaded;
     if (opened != RegularFile::Status::Open)
@@ -17,9 +18,12 @@ XmlFile::State XmlFile::Load(RegularFile::Status opened)
         state = State::TooLarge;
     else if (!file.Read(bytes))
         state = State::NotReadable;
-    if (state == State::Loaded && document && bytes == bytesBefore)
+    if (state == State::Loaded && documentBefore && bytes == bytesBefore)
+    {
+        document = std::move(documentBefore);
         return state;
-    document = nullptr;
+    }
+    documentBefore = nullptr; // another one takes its memory
     error = {};
     if (state != State::Loaded)
         return state;

@@ -25,8 +25,8 @@ constexpr size_t LongestValue = 1'000'000;
 // Bytes of a document type. The parser compares each default with all others of the same element.
 constexpr std::uint64_t MaxDocumentType = 16 * std::uint64_t{1024};
 
-// A level needs 7 bytes. Without a document type, so many bytes can also hold no more than 3,600
-// attributes, or 14,336 pieces of a text.
+// A level needs 7 bytes, or 3 if the document is malformed: 4,779 levels. Without a document type,
+// so many bytes can also hold no more than 3,600 attributes, or 14,336 pieces of a text.
 constexpr size_t HarmlessBytes = size_t{7} * MaxDepth;
 
 // Bytes of memory for each node, attribute and character, as the library keeps them on a 64-bit

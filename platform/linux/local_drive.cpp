@@ -3,6 +3,7 @@
 #include <wx/filename.h>
 
 #include <cstdio>
+#include <map>
 #include <memory>
 #include <mntent.h>
 
@@ -15,25 +16,31 @@ bool IsServed(const wxString& type)
            type.StartsWith("fuse") || type == "9p" || type == "autofs";
 }
 
+// For each directory at which a file system is mounted, with a final separator, whether it is on
+// this machine.
+std::map<wxString, bool> ReadMounts()
+{
+    std::map<wxString, bool> directories;
+    const std::unique_ptr<std::FILE, int (*)(std::FILE*)> mounts(
+        setmntent("/proc/self/mounts", "r"), endmntent);
+    while (const mntent* mount = mounts ? getmntent(mounts.get()) : nullptr)
+    {
+        const wxString directory = wxString::FromUTF8(mount->mnt_dir);
+        directories[directory == "/" ? directory : directory + "/"] = !IsServed(mount->mnt_type);
+    }
+    return directories;
+}
+
 } // namespace
 
 bool IsOnLocalDrive(const wxString& path)
 {
-    if (!path.StartsWith("/"))
-        return false;
-    const std::unique_ptr<std::FILE, int (*)(std::FILE*)> mounts(
-        setmntent("/proc/self/mounts", "r"), endmntent);
-    size_t longest = 0;
-    bool isLocal = mounts != nullptr;
-    while (const mntent* mount = mounts ? getmntent(mounts.get()) : nullptr)
+    static const std::map<wxString, bool> mounts = ReadMounts();
+    bool isLocal = false;
+    for (const auto& [directory, isHere] : mounts) // the longest one that holds the path is last
     {
-        const wxString directory = wxString::FromUTF8(mount->mnt_dir);
-        const bool holds =
-            directory == "/" || path == directory || path.StartsWith(directory + "/");
-        if (!holds || directory.length() < longest)
-            continue;
-        longest = directory.length();
-        isLocal = !IsServed(mount->mnt_type);
+        if ((path + "/").StartsWith(directory))
+            isLocal = isHere;
     }
-    return isLocal;
+    return path.StartsWith("/") && isLocal;
 }

@@ -49,8 +49,9 @@ wxString FinalPath(HANDLE handle)
 {
     constexpr DWORD Longest = 32767; // characters
     std::vector<wchar_t> buffer(Longest + 1);
-    const DWORD length =
-        GetFinalPathNameByHandleW(handle, buffer.data(), Longest, FILE_NAME_NORMALIZED);
+    DWORD length = GetFinalPathNameByHandleW(handle, buffer.data(), Longest, FILE_NAME_NORMALIZED);
+    if (length == 0) // some network file systems do not normalise
+        length = GetFinalPathNameByHandleW(handle, buffer.data(), Longest, FILE_NAME_OPENED);
     return length <= Longest ? wxString(buffer.data(), length) : wxString();
 }
 

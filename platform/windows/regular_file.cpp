@@ -19,22 +19,25 @@ HANDLE OpenHandle(const wxString& path, DWORD access, DWORD flags)
     return handle == INVALID_HANDLE_VALUE ? nullptr : handle;
 }
 
-BY_HANDLE_FILE_INFORMATION InformationOf(HANDLE handle)
+bool IsReparsePoint(HANDLE handle)
 {
     BY_HANDLE_FILE_INFORMATION information = {};
-    GetFileInformationByHandle(handle, &information);
-    return information;
+    return GetFileInformationByHandle(handle, &information) != 0 &&
+           (information.dwFileAttributes & FILE_ATTRIBUTE_REPARSE_POINT) != 0;
 }
 
 // Opens by its name a file that is already open. Null if the name leads to another one by now.
 HANDLE OpenAgain(const wxString& path, DWORD access, HANDLE file)
 {
     const HANDLE again = OpenHandle(path, access, 0);
-    const BY_HANDLE_FILE_INFORMATION ours = InformationOf(file);
-    const BY_HANDLE_FILE_INFORMATION now = InformationOf(again);
-    if (!again ||
-        (ours.dwVolumeSerialNumber == now.dwVolumeSerialNumber &&
-         ours.nFileIndexHigh == now.nFileIndexHigh && ours.nFileIndexLow == now.nFileIndexLow))
+    if (!again)
+        return nullptr;
+    BY_HANDLE_FILE_INFORMATION ours = {};
+    BY_HANDLE_FILE_INFORMATION now = {};
+    if (GetFileInformationByHandle(file, &ours) != 0 &&
+        GetFileInformationByHandle(again, &now) != 0 &&
+        ours.dwVolumeSerialNumber == now.dwVolumeSerialNumber &&
+        ours.nFileIndexHigh == now.nFileIndexHigh && ours.nFileIndexLow == now.nFileIndexLow)
         return again;
     CloseHandle(again);
     SetLastError(ERROR_FILE_INVALID);
@@ -87,8 +90,7 @@ RegularFile::Status RegularFile::Open(const PinnedDirectory* directory, const wx
         Close();
         return Status::NotThere;
     }
-    if (!directory ||
-        (InformationOf(m_handle).dwFileAttributes & FILE_ATTRIBUTE_REPARSE_POINT) == 0)
+    if (!directory || !IsReparsePoint(m_handle))
         return Status::Open;
     const HANDLE content = OpenAgain(path, access, m_handle);
     m_failure = FailedCall::Now(FailedCall::Kind::Open);
@@ -119,6 +121,8 @@ RegularFile::Status RegularFile::CreateNew(const PinnedDirectory& directory, con
                     FILE_ATTRIBUTE_NORMAL | FILE_FLAG_OPEN_REPARSE_POINT, nullptr);
     m_failure = FailedCall::Now(FailedCall::Kind::Open);
     m_handle = handle == INVALID_HANDLE_VALUE ? nullptr : handle;
+    if (m_handle && !directory.Holds(m_handle))
+        Close();
     return m_handle ? Status::Open : Status::Refused;
 }
 
