@@ -46,7 +46,7 @@ bool CheckMove(HotFolder& folder, const TemplateMove& move, Report& report)
     }
     if (move.storedPath == move.newPath && move.newContent == cfg.bytes)
         return true;
-    report.Add("Folder.cfg: ", {FindFolderCfgLosses(*cfg.document, move.newContent), {}, {}});
+    report.AddLosses("Folder.cfg: ", FindFolderCfgLosses(*cfg.document, move.newContent));
     report.Change("Folder.cfg: " + Shown(move.storedPath) + " -> " + Shown(move.newPath));
     if (!IsUtf8(cfg.bytes))
         report.Note("Folder.cfg: comes out as UTF-8");

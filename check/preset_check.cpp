@@ -47,8 +47,8 @@ void CheckContent(const wxString& name, const RewrittenPreset& rewritten, Report
     if (!encoding.empty() && encoding.CmpNoCase("UTF-8") != 0)
         report.Problem(name + "declares the encoding " + encoding + ", but comes out as UTF-8");
     else if (IsTakenAsLatin1(rewritten.before))
-        report.Problem(name + "is not UTF-8, so the whole file is read as Latin-1; accented "
-                              "characters come out wrong");
+        report.AddLosses(name, {"is not UTF-8, so the whole file is read as Latin-1; accented "
+                                "characters come out wrong"});
     if (rewritten.bytes != rewritten.before && rewritten.movedPaths == 0)
         report.Change(name + OtherChange(rewritten.before, rewritten.bytes));
 }

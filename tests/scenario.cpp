@@ -28,30 +28,6 @@ Scenario& Scenario::Preset(const Text& text, const Text& becomes)
     return Before({{PresetPlace, text}}).After({{PresetPlace, becomes.empty() ? text : becomes}});
 }
 
-Scenario& Scenario::Run(const std::vector<Text>& given)
-{
-    arguments = given;
-    return *this;
-}
-
-Scenario& Scenario::AsOtherUser()
-{
-    asOtherUser = true;
-    return *this;
-}
-
-Scenario& Scenario::NotUnderWine(const Text& reason)
-{
-    notUnderWine = reason;
-    return *this;
-}
-
-Scenario& Scenario::WholeLog(const Text& text)
-{
-    log = text;
-    return *this;
-}
-
 Scenario& Scenario::Log(const Text& folders, const Text& presets)
 {
     return WholeLog("{start}" + Text(folders.empty() ? "No Hotfolder listed\n" : "") +
@@ -73,12 +49,6 @@ Scenario& Scenario::LogOfDisabledA(const Text& impose, const Text& presets)
 Scenario& Scenario::LogOfPreset(const Text& line)
 {
     return Log("", PresetLine(line));
-}
-
-Scenario& Scenario::LibraryReports()
-{
-    libraryReports = true;
-    return *this;
 }
 
 Scenario& Scenario::Shell(const Text& version, const Text& calls)

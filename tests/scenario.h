@@ -17,8 +17,29 @@ inline const Text ListPlace = "machine/hotfolder/HotFolderList.cfg";
 inline const Text CfgPlace = "hot/A/[P]/Folder.cfg";
 inline const Text PresetPlace = "user/ORX/JPData/.P/Presets/presets.xml";
 
+// A member function that sets a field.
+#define SETTER(name, field, ...)                                                                   \
+    Scenario& name(const decltype(field)& value __VA_ARGS__)                                       \
+    {                                                                                              \
+        field = value;                                                                             \
+        return *this;                                                                              \
+    }
+
 struct Scenario
 {
+    Text name;
+    Files before;
+    std::vector<Text> arguments = {"I"};
+    Files after;
+    Text log; // empty for that of the earlier run
+    bool libraryReports = false;
+    bool asOtherUser = false;
+    Text notUnderWine;
+    Text shellVersion;
+    Text shellCalls;
+    bool isOnlyChecked = false;
+    Text report;
+
     explicit Scenario(const Text& whatHappens) : name(whatHappens)
     {
     }
@@ -34,13 +55,14 @@ struct Scenario
     /// The same for presets.xml of the one directory with presets.
     Scenario& Preset(const Text& text, const Text& becomes = "");
     /// The command line arguments; {"I"} if not given.
-    Scenario& Run(const std::vector<Text>& given);
+    SETTER(Run, arguments, )
     /// For tests of refusals: root is refused nothing.
-    Scenario& AsOtherUser();
-    Scenario& NotUnderWine(const Text& reason);
+    SETTER(AsOtherUser, asOtherUser, = true)
+    /// The reason why the scenario is skipped there.
+    SETTER(NotUnderWine, notUnderWine, )
 
     /// The whole log, with LF instead of CR LF; if no log is given, that of the earlier run stays.
-    Scenario& WholeLog(const Text& text);
+    SETTER(WholeLog, log, )
     /// The log of a run with these lines about the hot folders and the presets.
     Scenario& Log(const Text& folders, const Text& presets = "");
     /// The same if A is the only hot folder, has no icon to replace, and has these lines about its
@@ -50,26 +72,13 @@ struct Scenario
     /// The same if there are no hot folders and one preset, with this line.
     Scenario& LogOfPreset(const Text& line);
     /// The library itself reports an error, on Windows in a message box.
-    Scenario& LibraryReports();
+    SETTER(LibraryReports, libraryReports, = true)
     /// The calls to a shell of this version; only on this machine.
     Scenario& Shell(const Text& version, const Text& calls);
 
     /// FolderUpgrade is not started, and FolderUpgradeCheck reports this, without the head, the sum
     /// and empty lines. A line that ends in * continues in the system's own words.
     Scenario& IsReported(const Text& lines);
-
-    Text name;
-    Files before;
-    std::vector<Text> arguments = {"I"};
-    Files after;
-    Text log; // empty for that of the earlier run
-    bool libraryReports = false;
-    bool asOtherUser = false;
-    Text notUnderWine;
-    Text shellVersion;
-    Text shellCalls;
-    bool isOnlyChecked = false;
-    Text report;
 };
 
 /// Everything on the workstation before the run, the usual files included.

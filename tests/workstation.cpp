@@ -46,6 +46,20 @@ const Text& Limits()
     return limits;
 }
 
+Text Repeated(int count, const Text& text)
+{
+    Text result;
+    for (int i = 0; i < count; ++i)
+    {
+        result += text;
+        const size_t number = text.find('#');
+        if (number != Text::npos)
+            result.replace(result.size() - text.size() + number, 1,
+                           std::to_string(1000000 + i).substr(1));
+    }
+    return result;
+}
+
 } // namespace
 
 Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser && geteuid() == 0)
@@ -87,7 +101,8 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser && geteui
     const fs::path icons = ProgramDir() / "BundleIcons";
     fs::copy(icons, m_dirs["tool"]);
     fs::copy(icons, m_dirs["tool"] / "BundleIcons");
-    for (const char* program : {"FolderUpgrade", "FolderUpgradeCheck", "FolderUpgradeRecorded"})
+    for (const char* program :
+         {"FolderUpgrade", "FolderUpgradeCheck", "FolderUpgradeRun", "FolderUpgradeRecorded"})
     {
         const fs::path file = ProgramDir() / (program + Text(m_wine ? ".exe" : ""));
         if (fs::exists(file))
@@ -113,6 +128,14 @@ Text Workstation::Expand(Text text) const
 {
     for (const auto& [token, value] : m_tokens)
         text = Replaced(text, token, value);
+    const Text times = "{times:";
+    for (size_t at = text.find(times); at != Text::npos; at = text.find(times, at))
+    {
+        const size_t colon = text.find(':', at + times.size());
+        const size_t end = text.find('}', colon);
+        const int count = std::stoi(text.substr(at + times.size(), colon));
+        text.replace(at, end + 1 - at, Repeated(count, text.substr(colon + 1, end - colon - 1)));
+    }
     if (StartsWith(text, "{utf16}"))
         return ToUtf16(text.substr(7));
     if (StartsWith(text, "{icon:"))
@@ -241,7 +264,7 @@ Files Workstation::Snapshot() const
         for (const auto& entry : fs::recursive_directory_iterator(directory.path()))
         {
             const Text rest = entry.path().lexically_relative(directory.path()).string();
-            if (!StartsWith(rest, "FolderUpgrade")) // the programs
+            if (top != Text("tool") || !StartsWith(rest, "FolderUpgrade"))
                 add(top + "/" + Replaced(rest, PrivateDir, "[P]"), entry);
         }
     }

@@ -27,60 +27,47 @@ Text Cfg(const Text& enabled)
 
 std::vector<Scenario> Icons()
 {
-    // The new icon is in the tool's folder, the previous version's in BundleIcons.
-    const auto shows = [](const Text& name, const Text& icon, const Text& copied)
+    struct Row
     {
-        return Scenario(name)
-            .Before({{Icon(icon), "old"},
-                     {Icon("other"), "stays"},
-                     {"hot/A/Error.er", ""},
-                     {"tool/BundleIcons/" + icon + ".ico", "bundled"}})
-            .After({{"hot/A#", "S"},
-                    {Ini + "#", "RS"},
-                    {Icon(icon), copied},
-                    {Ini, Header + IconFile(icon) + "IconIndex=00\r\n" + InfoTip}})
-            .Log(FolderLines("A", 1, Copied(icon), ""));
+        Text name;
+        Text icon;
+        Text enabled;
+        Text error; // a place; a directory of the file's name does not count
     };
-    const auto upgradeShows = [&](const Text& name, const Text& icon)
+    std::vector<Scenario> scenarios = {Scenario("WithoutItsIconAFolderStays")
+                                           .Before({{Icon("hf_folder_disabled"), "old"},
+                                                    {"tool/BundleIcons/hf_folder_disabled.ico", ""},
+                                                    {Ini, "; mine\n"}})
+                                           .FolderCfg(Cfg("1"))
+                                           .LogOfA("")};
+    for (const auto& [name, icon, enabled, error] :
+         {Row{"Active", "hf_folder", "1", "hot/A/[P]/Error.er/"},
+          {"Disabled", "hf_folder_disabled", "01", "hot/A/[P]/Error.er/"},
+          {"ErrorActive", "hf_error_active", "1", "hot/A/[P]/Error.er"},
+          {"ErrorInactive", "hf_error_inactive", "", "hot/A/[P]/Error.er"}})
     {
-        return shows(name, icon, "{icon:" + icon + ".ico}")
-            .Before({{"tool/" + icon + ".ico#", "R"}})
-            .After({{Icon(icon) + "#", "R"}});
-    };
-    const auto downgradeShows = [&](const Text& name, const Text& icon)
-    {
-        return shows(name, icon, "bundled").Run({"U"});
-    };
-    const Files error = {{"hot/A/[P]/Error.er", ""}};
-    const Files noError = {{"hot/A/[P]/Error.er/", ""}}; // a directory of that name
-    return {
-        upgradeShows("AnUpgradeShowsActive", "hf_folder").FolderCfg(Cfg("1")).Before(noError),
-        downgradeShows("ADowngradeShowsActive", "hf_folder").FolderCfg(Cfg("1")).Before(noError),
-        upgradeShows("AnUpgradeShowsDisabled", "hf_folder_disabled")
-            .FolderCfg(Cfg("01"))
-            .Before(noError),
-        downgradeShows("ADowngradeShowsDisabled", "hf_folder_disabled")
-            .FolderCfg(Cfg("01"))
-            .Before(noError),
-        upgradeShows("AnUpgradeShowsErrorActive", "hf_error_active")
-            .FolderCfg(Cfg("1"))
-            .Before(error),
-        downgradeShows("ADowngradeShowsErrorActive", "hf_error_active")
-            .FolderCfg(Cfg("1"))
-            .Before(error),
-        upgradeShows("AnUpgradeShowsErrorInactive", "hf_error_inactive")
-            .FolderCfg(Cfg(""))
-            .Before(error),
-        downgradeShows("ADowngradeShowsErrorInactive", "hf_error_inactive")
-            .FolderCfg(Cfg(""))
-            .Before(error),
-        Scenario("WithoutItsIconAFolderStays")
-            .Before({{Icon("hf_folder_disabled"), "old"},
-                     {"tool/BundleIcons/hf_folder_disabled.ico", "-"},
-                     {Ini, "; mine\n"}})
-            .FolderCfg(Cfg("1"))
-            .LogOfA(""),
-    };
+        const Scenario shown =
+            Scenario("AnUpgradeShows" + name)
+                .FolderCfg(Cfg(enabled))
+                .Before({{Icon(icon), "old"},
+                         {Icon("other"), "stays"},
+                         {"hot/A/Error.er", ""},
+                         {error, ""},
+                         {"tool/" + icon + ".ico#", "R"},
+                         {"tool/BundleIcons/" + icon + ".ico", "of the previous version"}})
+                .After({{"hot/A#", "S"},
+                        {Ini + "#", "RS"},
+                        {Icon(icon), "{icon:" + icon + ".ico}"},
+                        {Icon(icon) + "#", "R"},
+                        {Ini, Header + IconFile(icon) + "IconIndex=00\r\n" + InfoTip}})
+                .Log(FolderLines("A", 1, Copied(icon), ""));
+        scenarios.push_back(shown);
+        scenarios.push_back(shown);
+        scenarios.back().name = "ADowngradeShows" + name;
+        scenarios.back().Run({"U"}).After(
+            {{Icon(icon), "of the previous version"}, {Icon(icon) + "#", Removed}});
+    }
+    return scenarios;
 }
 
 // A folder that already has a user's Desktop.ini.
@@ -105,41 +92,33 @@ std::vector<Scenario> DesktopInis()
                     {Icon("hf_folder_disabled"), "{icon:hf_folder_disabled.ico}"}})
             .Log(FolderLines("A", 1, Copied("hf_folder_disabled"), NoCfg()));
     };
-    const auto has = [](const Text& letters)
-    {
-        return Files{{Ini + "#", letters}};
-    };
-    const auto folderHas = [](const Text& letters)
-    {
-        return Files{{"hot/A#", letters}};
-    };
     return {
         refresh("OurDesktopIniIsRefreshed",
                 Header + IconFile("hf_folder") + "IconIndex=00\r\nInfoTip=old\r\n",
                 Header + disabled + "IconIndex=00\r\n" + InfoTip)
-            .Before(has("RS"))
-            .Before(folderHas("R")),
-        refresh("AUsersDesktopIniKeepsEverythingElse", users, usersAfter).Before(folderHas("RS")),
+            .Before({{Ini + "#", "RS"}, {"hot/A#", "R"}}),
+        refresh("AUsersDesktopIniKeepsEverythingElse", users, usersAfter)
+            .Before({{"hot/A#", "RS"}}),
         refresh("HiddenStaysOnTheFolderAlone", users, usersAfter)
-            .Before(has("HRS"))
-            .Before(folderHas("HR"))
-            .After(folderHas("HS")),
-        refresh("AReadOnlyDesktopIniIsWritten", users, usersAfter).Before(has("R")),
-        refresh("ASystemDesktopIniIsWritten", users, usersAfter).Before(has("S")),
+            .Before({{Ini + "#", "HRS"}, {"hot/A#", "HR"}})
+            .After({{"hot/A#", "HS"}}),
+        refresh("AReadOnlyDesktopIniIsWritten", users, usersAfter).Before({{Ini + "#", "R"}}),
+        refresh("ASystemDesktopIniIsWritten", users, usersAfter).Before({{Ini + "#", "S"}}),
         refresh("AMissingSectionIsAddedAfterTheLastLine", "[x]\r\na=b",
                 "[x]\r\na=b\r\n" + Header + InfoTip + disabled),
         refresh("AUtf16DesktopIniStaysUtf16",
                 "{utf16}" + Header + "IconFile=ü.ico\r\nInfoTip=old\r\n",
                 "{utf16}" + Header + disabled + InfoTip)
-            .Before(has("RS")),
-        refresh("AnEmptyDesktopIniIsFilled", "", Header + InfoTip + disabled).Before(has("RS")),
+            .Before({{Ini + "#", "RS"}}),
+        refresh("AnEmptyDesktopIniIsFilled", "", Header + InfoTip + disabled)
+            .Before({{Ini + "#", "RS"}}),
         refresh("AReadOnlyDesktopIniOfTheUsersIsWritten", "", Header + InfoTip + disabled)
-            .Before(has("RS"))
+            .Before({{Ini + "#", "RS"}})
             .AsOtherUser()
             .NotUnderWine(WineLosesSystem),
         refresh("ADesktopIniOfAnotherUserStays", "[x]\r\n", "[x]\r\n")
-            .Before(has("X"))
-            .After(has(Removed))
+            .Before({{Ini + "#", "X"}})
+            .After({{Ini + "#", Removed}})
             .AsOtherUser()
             .NotUnderWine(WineLosesSystem),
         refresh("AReadOnlyIconIsReplaced", Header + InfoTip + disabled, Header + InfoTip + disabled)
@@ -162,38 +141,29 @@ std::vector<Scenario> DesktopInis()
 std::vector<Scenario> ShellCalls()
 {
     const Text version = "load shell32.dll\nfind DllGetVersion\nfree\n";
-    const auto notices = [](const Text& folder) -> Text
-    {
-        const Text ini = "{hot}{/}" + folder + "{/}Desktop.ini";
-        return "notify 800 1005 " + ini + " 0\ninfo " + ini +
-               " 0 1 4000\nnotify 8000 1003  -7\nnotify 8 1005 " + ini +
-               " 0\nnotify 8000000 1000  0\n";
-    };
-    const auto told = [&](const Text& name, const Text& shell, const Text& calls)
+    const Text force = "force {hot}{/}A 10 .\\[_ORX_HotFolder_]\\hf_folder_disabled.ico 0 0 2\n";
+    const Text notices = Replaced("notify 800 1005 {ini} 0\ninfo {ini} 0 1 4000\n"
+                                  "notify 8000 1003  -7\nnotify 8 1005 {ini} 0\n"
+                                  "notify 8000000 1000  0\n",
+                                  "{ini}", "{hot}{/}A{/}Desktop.ini");
+    const Text iconFile = IconFile("hf_folder_disabled");
+    const auto told = [&](const Text& name, const Text& shell, const Text& calls, const Text& ini)
     {
         return Scenario(name)
-            .Before({{Icon("hf_folder_disabled"), "{icon:hf_folder_disabled.ico}"}})
-            .After({{Ini + "#", "RS"}})
+            .Before({{Icon("hf_folder_disabled"), "{icon:hf_folder_disabled.ico}"}, {Ini, ""}})
+            .After({{Ini + "#", "RS"}, {"hot/A#", ini.empty() ? Removed : "S"}, {Ini, ini}})
             .Log(FolderLines("A", 1, Copied("hf_folder_disabled"), NoCfg()))
-            .Shell(shell, calls);
+            .Shell(shell, version + calls);
     };
-    const Text force = "force {hot}{/}A 10 .\\[_ORX_HotFolder_]\\hf_folder_disabled.ico 0 0 2\n";
-    const Text ini = Header + InfoTip + IconFile("hf_folder_disabled");
-    const Files system = {{"hot/A#", "S"}};
     return {
-        told("ANewDesktopIniIsAnnounced", "6.0", version + notices("A"))
-            .After(system)
-            .After({{Ini, Header + IconFile("hf_folder_disabled") + "IconIndex=00\r\n" + InfoTip}}),
-        told("AnExistingDesktopIniIsForced", "4.72", version + force + notices("A"))
-            .Before({{Ini, ""}})
-            .After(system)
-            .After({{Ini, ini}}),
-        told("OnlyTheLowerHalfOfAVersionCounts", "65540.72", version + force + notices("A"))
-            .Before({{Ini, ""}})
-            .After(system)
-            .After({{Ini, ini}}),
-        told("AnOldShellIsNotTold", "4.71", version).Before({{Ini, ""}}),
-        told("AnUnknownShellIsNotTold", "unknown", version).Before({{Ini, ""}}),
+        told("ANewDesktopIniIsAnnounced", "6.0", notices,
+             Header + iconFile + "IconIndex=00\r\n" + InfoTip)
+            .Before({{Ini, Removed}}),
+        told("AnExistingDesktopIniIsForced", "4.72", force + notices, Header + InfoTip + iconFile),
+        told("OnlyTheLowerHalfOfAVersionCounts", "65540.72", force + notices,
+             Header + InfoTip + iconFile),
+        told("AnOldShellIsNotTold", "4.71", "", ""),
+        told("AnUnknownShellIsNotTold", "unknown", "", ""),
     };
 }
 

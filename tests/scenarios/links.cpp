@@ -5,7 +5,6 @@ namespace
 {
 
 const char* const WineFollowsLinks = "Wine shows neither links to files nor dangling ones as links";
-const char* const NoPipes = "Windows has no pipes among files";
 
 const Text LogDir = "user/ORX_Installers";
 const Text PresetDir = "user/ORX/JPData/.P/Presets";
@@ -73,51 +72,39 @@ std::vector<Scenario> PlantedLinks()
             .LogOfA(Found(MovedFrom), "", "hf_error_active")
             .NotUnderWine(WineFollowsLinks),
     };
-    // Two links in that place: one to a file, and a dangling one.
+    // In that place: a link to a file, a dangling link, and a pipe.
     const auto add =
         [&](const Scenario& scenario, const Text& place, const Text& target, const Text& text)
     {
-        for (const Text& pointsTo : {target, Text("elsewhere/missing")})
+        const std::pair<Text, Text> kinds[] = {{"IsALink", LinkTo(target)},
+                                               {"IsADanglingLink", LinkTo("elsewhere/missing")},
+                                               {"IsAPipe", "{fifo}"}};
+        for (const auto& [name, planted] : kinds)
         {
             scenarios.push_back(scenario);
+            scenarios.back().name += name;
             scenarios.back()
-                .Before({{target, text}, {place, LinkTo(pointsTo)}})
-                .NotUnderWine(WineFollowsLinks);
+                .Before({{target, text}, {place, planted}})
+                .NotUnderWine("Wine shows none of these links as a link, and Windows has no pipes");
         }
-        scenarios.back().name += "EvenIfDangling";
     };
-    add(WithIcon("ALinkedFolderCfgIsNotRead").After({{Ini, ini}, {Ini + "#", "RS"}}), CfgPlace,
+    add(WithIcon("AFolderCfg").After({{Ini, ini}, {Ini + "#", "RS"}}), CfgPlace,
         "elsewhere/Folder.cfg", cfg);
-    add(Scenario("ALinkedIconIsIgnored").LogOfDisabledA(NoCfg()), Icon, "elsewhere/icon.ico",
-        "old");
-    add(WithIcon("ALinkedDesktopIniStays")
+    add(Scenario("AnIcon").LogOfDisabledA(NoCfg()), Icon, "elsewhere/icon.ico", "old");
+    add(WithIcon("DesktopIni")
             .Log(FolderLines("A", 1, iniStays + Copied("hf_folder_disabled"), NoCfg())),
         Ini, "elsewhere/Desktop.ini", "[.ShellClassInfo]\r\n");
-    add(Scenario("ALinkedPresetIsNotOpened").LogOfPreset(CannotOpenPreset),
-        PresetDir + "/presets.xml", "elsewhere/presets.xml", preset);
-    add(Scenario("ALinkedLogStays").FolderCfg(cfg, Written(MovedTo)), LogPlace, "elsewhere/log",
-        "-");
+    scenarios.back().Log(FolderLines("A", 1, Copied("hf_folder_disabled"), NoCfg()));
+    add(Scenario("APreset").LogOfPreset(CannotOpenPreset), PresetDir + "/presets.xml",
+        "elsewhere/presets.xml", preset);
+    add(Scenario("TheLog").FolderCfg(cfg, Written(MovedTo)), LogPlace, "elsewhere/log", "-");
+    scenarios.push_back(Scenario("TheListIsAPipe")
+                            .Before({{ListPlace, "{fifo}"}, {"hot/A/", ""}})
+                            .Log("")
+                            .NotUnderWine("Windows has no pipes among files"));
     return scenarios;
 }
 
-std::vector<Scenario> PlantedPipes()
-{
-    const Text cfg = Written(MovedFrom);
-    const auto pipe = [](const Text& name, const Text& place)
-    {
-        return Scenario(name).Before({{place, "{fifo}"}}).NotUnderWine(NoPipes);
-    };
-    return {
-        pipe("APipeIsNotAFolderCfg", CfgPlace).LogOfDisabledA(NoCfg()),
-        pipe("APipeIsNotAnIcon", Icon).LogOfDisabledA(NoCfg()),
-        WithIcon("APipeIsNotADesktopIni").Before({{Ini, "{fifo}"}}).NotUnderWine(NoPipes),
-        pipe("APipeIsNotAPreset", PresetPlace).LogOfPreset(CannotOpenPreset),
-        pipe("APipeIsNotAList", ListPlace).Before({{"hot/A/", ""}}).Log(""),
-        pipe("APipeIsNotALog", LogPlace).FolderCfg(cfg, Written(MovedTo)),
-    };
-}
-
 TEST_SCENARIOS(PlantedLinks);
-TEST_SCENARIOS(PlantedPipes);
 
 } // namespace

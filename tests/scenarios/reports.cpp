@@ -64,17 +64,28 @@ Workstation
   note     there will be no run log: there is no folder {user}{/}ORX_Installers{/}
 Job presets
   note     there are no presets, because there is no folder {user}{/}ORX{/}JPData{/})"),
-        Done("AListIsCutOff").Before({{ListPlace, "<HotFolders>"}}).IsReported(R"(
-Workstation
-  problem  {list}: damaged (line 1: no element found); no hot folder is migrated)"),
-        Done("TheListIsADirectory")
-            .Before({{ListPlace, Removed}, {ListPlace + "/", ""}})
+        Done("AListIsCutOffAndAFolderHasTheLogsName")
+            .Before({{ListPlace, "<HotFolders>"}, {LogPlace, Removed}, {LogPlace + "/", ""}})
             .IsReported(R"(
 Workstation
-  problem  HotFolderList.cfg: is not a file)"),
-        listed("AListIsEmpty", "").IsReported(R"(
+  problem  {list}: damaged (line 1: no element found); no hot folder is migrated
+  note     there will be no run log: something else has its name: {log})"),
+        Done("TheListIsADirectoryAndTheLogIsALink")
+            .Before({{ListPlace, Removed}, {ListPlace + "/", ""}, {LogPlace, "{link:elsewhere/a}"}})
+            .NotUnderWine(NoLinks)
+            .IsReported(R"(
 Workstation
-  note     HotFolderList.cfg lists no hot folder)"),
+  problem  HotFolderList.cfg: is not a file
+  problem  there will be no run log: it is reached over a link: {log})"),
+        listed("AListIsEmptyAndJPDataCannotBeListed", "")
+            .Before({{Jobs + "#", "L"}})
+            .AsOtherUser()
+            .NotUnderWine(NoRefusal)
+            .IsReported(R"(
+Workstation
+  note     HotFolderList.cfg lists no hot folder
+Job presets
+  problem  {user}{/}ORX{/}JPData{/} cannot be listed)"),
         listed("NoListedFolderIsThere", "BC").IsReported(R"(
 Workstation
   problem  none of the listed hot folders exists (another account? mapped drives?)
@@ -92,27 +103,17 @@ Workstation
   note     the same directory as {hot}{/}A
 {hot}{/}D
   note     the same directory as {hot}{/}A)"),
-        Done("TheLogIsALink")
-            .Before({{LogPlace, "{link:elsewhere/a}"}})
-            .NotUnderWine(NoLinks)
-            .IsReported(R"(
-Workstation
-  problem  there will be no run log: it is reached over a link: {log})"),
-        Done("AFolderHasTheLogsName")
-            .Before({{LogPlace, Removed}, {LogPlace + "/", ""}})
-            .IsReported(R"(
-Workstation
-  note     there will be no run log: something else has its name: {log})"),
-        Done("TheLogFolderBelongsToAnotherUser")
-            .Before({{LogPlace, Removed}, {LogFolder + "/", ""}, {LogFolder + "#", "X"}})
+        Done("TheListCannotBeReadNorTheLogCreated")
+            .Before({{ListPlace + "#", "0"},
+                     {LogPlace, Removed},
+                     {LogFolder + "/", ""},
+                     {LogFolder + "#", "X"}})
             .AsOtherUser()
             .NotUnderWine(NoRefusal)
             .IsReported(R"(
 Workstation
+  problem  can't open file*
   problem  there will be no run log: its folder cannot be written to: {user}{/}ORX_Installers{/})"),
-        Done("TheListCannotBeRead").Before({{ListPlace + "#", "0"}}).AsOtherUser().IsReported(R"(
-Workstation
-  problem  can't open file*)"),
         Done("NoFolderCanBeEntered")
             .Before({{"machine/hotfolder#", "0"}, {LogFolder + "#", "0"}, {Jobs + "#", "0"}})
             .AsOtherUser()
@@ -122,13 +123,6 @@ Workstation
   problem  there will be no run log: its folder cannot be entered: {user}{/}ORX_Installers{/}
 Job presets
   problem  {user}{/}ORX{/}JPData{/} cannot be entered)"),
-        Done("JPDataCannotBeListed")
-            .Before({{Jobs + "#", "L"}})
-            .AsOtherUser()
-            .NotUnderWine(NoRefusal)
-            .IsReported(R"(
-Job presets
-  problem  {user}{/}ORX{/}JPData{/} cannot be listed)"),
     };
 }
 
@@ -421,11 +415,16 @@ Workstation
   problem  stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl
 Job presets
   problem  .P{/}Presets{/}presets.xml: cannot be opened for writing (can't open file*)"),
-        Done("NothingCanBeRead")
+        Done("NothingCanBeReadOrReplaced")
             .Before(DoneFolder('B'))
             .Before(DoneFolder('C'))
             .Before(DoneFolder('D'))
-            .Before({{CfgPlace + "#", "0"},
+            .Before({{"hot/D/Desktop.ini", "[.ShellClassInfo]"},
+                     {"hot/D/Desktop.ini#", "X"},
+                     {"hot/E/[P]/hf_folder_disabled.ico", "old"},
+                     {"hot/E/[P]/hf_folder_disabled.ico#", "R"},
+                     {"hot/E/[P]#", "X"},
+                     {CfgPlace + "#", "0"},
                      {"hot/B/[P]#", "0"},
                      {"hot/C#", "0"},
                      {"tool/hf_folder.ico#", "0"},
@@ -443,23 +442,16 @@ Job presets
   problem  the hot folder cannot be entered
 {hot}{/}D
   problem  hf_folder.ico: cannot be replaced (read-only, in use, or access denied)
+  problem  Desktop.ini: cannot be opened for reading and writing
+  problem  Desktop.ini: its attributes cannot be changed
+{hot}{/}E
+  problem  hf_folder_disabled.ico: cannot be replaced (read-only, in use, or access denied)
+  change   Desktop.ini: new
+  change   hot folder: attributes none -> SYSTEM
+  note     no Folder.cfg
 Job presets
   problem  .P{/}Presets{/}presets.xml: cannot be opened for reading (can't open file*
   problem  Q{/}Presets{/}presets.xml: {user}{/}ORX{/}JPData{/}Q cannot be entered)"),
-        Done("IconsOfAnotherUser")
-            .Before(DoneFolder('B'))
-            .Before({{"hot/A/[P]/hf_folder.ico", "old"},
-                     {"hot/A/[P]/hf_folder.ico#", "R"},
-                     {"hot/A/[P]#", "X"},
-                     {"hot/B/Desktop.ini", "[.ShellClassInfo]"},
-                     {"hot/B/Desktop.ini#", "X"}})
-            .AsOtherUser()
-            .IsReported(R"(
-{hot}{/}A
-  problem  hf_folder.ico: cannot be replaced (read-only, in use, or access denied)
-{hot}{/}B
-  problem  Desktop.ini: cannot be opened for reading and writing
-  problem  Desktop.ini: its attributes cannot be changed)"),
         Done("FoldersOfAnotherUser")
             .Before(DoneFolder('B'))
             .Before({{"hot/A/Desktop.ini", Removed},
