@@ -1,13 +1,14 @@
 #include "tests/text_files.h"
 
 #include <fstream>
-#include <iterator>
+#include <sstream>
 #include <stdexcept>
 
 Text ReadFile(const std::filesystem::path& path)
 {
-    std::ifstream file(path, std::ios::binary);
-    return {std::istreambuf_iterator<char>(file), {}};
+    std::ostringstream text;
+    text << std::ifstream(path, std::ios::binary).rdbuf();
+    return text.str();
 }
 
 void WriteFile(const std::filesystem::path& path, const Text& text)

@@ -19,7 +19,7 @@ fi
 
 prefixes=$(mktemp -d)
 chmod 755 "$prefixes"
-export FOLDER_UPGRADE_WINDOWS_PROGRAM=$program_dir/FolderUpgrade.exe
+export FOLDER_UPGRADE_PROGRAMS=$program_dir
 export FOLDER_UPGRADE_WINE_PREFIX=$prefixes/root FOLDER_UPGRADE_WINE_PREFIX_OTHER=$prefixes/other
 export WINEDEBUG=-all WINEDLLOVERRIDES="mscoree=;mshtml=" LC_ALL=C.UTF-8
 as_other() {

@@ -25,14 +25,15 @@ bool PressButton()
 
 } // namespace
 
-fs::path WindowsProgram()
+fs::path ProgramDir()
 {
-    return FromEnvironment("FOLDER_UPGRADE_WINDOWS_PROGRAM");
+    const fs::path given = FromEnvironment("FOLDER_UPGRADE_PROGRAMS");
+    return given.empty() ? PROGRAM_DIR : given;
 }
 
 bool IsWindowsProgram()
 {
-    return !WindowsProgram().empty();
+    return fs::exists(ProgramDir() / "FolderUpgrade.exe");
 }
 
 Text Quoted(const Text& text)

@@ -4,8 +4,8 @@
 
 #include "tests/text_files.h"
 
-/// The Windows program to test, from the environment; empty to test the native one.
-std::filesystem::path WindowsProgram();
+/// The folder of the programs to test: $FOLDER_UPGRADE_PROGRAMS, else the one of this build.
+std::filesystem::path ProgramDir();
 bool IsWindowsProgram();
 /// The text as one word for a shell.
 Text Quoted(const Text& text);

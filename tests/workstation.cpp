@@ -36,12 +36,29 @@ const auto Attributes = {std::pair('R', FILE_ATTRIBUTE_READONLY),
                          {'H', FILE_ATTRIBUTE_HIDDEN},
                          {'S', FILE_ATTRIBUTE_SYSTEM}};
 
-// A build with sanitizers needs more of both.
-#ifdef __SANITIZE_ADDRESS__
-const Text Limits = "exec timeout 120 ";
-#else
-const Text Limits = "ulimit -v 700000; exec timeout 10 ";
-#endif
+// The limits of a run, as the beginning of its command. A program with sanitizers needs more.
+const Text& Limits()
+{
+    static const Text program = ReadFile(ProgramDir() / "FolderUpgrade");
+    static const Text limits = program.find("__asan_init") == Text::npos
+                                   ? "ulimit -v 700000; exec timeout 10 "
+                                   : "exec timeout 120 ";
+    return limits;
+}
+
+Text Repeated(int count, const Text& text)
+{
+    Text result;
+    for (int i = 0; i < count; ++i)
+    {
+        result += text;
+        const size_t number = text.find('#');
+        if (number != Text::npos)
+            result.replace(result.size() - text.size() + number, 1,
+                           std::to_string(1000000 + i).substr(1));
+    }
+    return result;
+}
 
 } // namespace
 
@@ -81,13 +98,13 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser && geteui
         std::transform(capitals.begin(), capitals.end(), capitals.begin(), ::toupper);
         m_tokens[capitals] = Replaced(value, "\\", "\\\\");
     }
-    const fs::path icons = fs::path(TOOL_DIR) / "BundleIcons";
+    const fs::path icons = ProgramDir() / "BundleIcons";
     fs::copy(icons, m_dirs["tool"]);
     fs::copy(icons, m_dirs["tool"] / "BundleIcons");
-    const fs::path programs = m_wine ? WindowsProgram().parent_path() : fs::path(TOOL_DIR);
-    for (const char* program : {"FolderUpgrade", "FolderUpgradeCheck", "FolderUpgradeRun", "FolderUpgradeRecorded"})
+    for (const char* program :
+         {"FolderUpgrade", "FolderUpgradeCheck", "FolderUpgradeRun", "FolderUpgradeRecorded"})
     {
-        const fs::path file = programs / (program + Text(m_wine ? ".exe" : ""));
+        const fs::path file = ProgramDir() / (program + Text(m_wine ? ".exe" : ""));
         if (fs::exists(file))
             fs::copy(file, m_dirs["tool"]);
     }
@@ -111,10 +128,18 @@ Text Workstation::Expand(Text text) const
 {
     for (const auto& [token, value] : m_tokens)
         text = Replaced(text, token, value);
+    const Text times = "{times:";
+    for (size_t at = text.find(times); at != Text::npos; at = text.find(times, at))
+    {
+        const size_t colon = text.find(':', at + times.size());
+        const size_t end = text.find('}', colon);
+        const int count = std::stoi(text.substr(at + times.size(), colon));
+        text.replace(at, end + 1 - at, Repeated(count, text.substr(colon + 1, end - colon - 1)));
+    }
     if (StartsWith(text, "{utf16}"))
         return ToUtf16(text.substr(7));
     if (StartsWith(text, "{icon:"))
-        return ReadFile(fs::path(TOOL_DIR) / text.substr(6, text.size() - 7));
+        return ReadFile(ProgramDir() / text.substr(6, text.size() - 7));
     return text;
 }
 
@@ -203,7 +228,7 @@ RunResult Workstation::Start(const Text& program, const std::vector<Text>& argum
     command += ">" + Quoted(output) + "2>" + Quoted(errors);
     Text boxes;
     const int status = m_wine ? m_wine->Run(command, HostPath(LogPlace), boxes)
-                              : std::system((Limits + command).c_str());
+                              : std::system((Limits() + command).c_str());
     return {WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status), ReadFile(output),
             m_wine ? boxes : ReadFile(errors)};
 }
@@ -239,7 +264,8 @@ Files Workstation::Snapshot() const
         for (const auto& entry : fs::recursive_directory_iterator(directory.path()))
         {
             const Text rest = entry.path().lexically_relative(directory.path()).string();
-            add(top + "/" + Replaced(rest, PrivateDir, "[P]"), entry);
+            if (top != Text("tool") || !StartsWith(rest, "FolderUpgrade"))
+                add(top + "/" + Replaced(rest, PrivateDir, "[P]"), entry);
         }
     }
     return files;

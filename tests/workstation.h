@@ -12,7 +12,8 @@
 //
 // In texts, {hot}, {user}, {machine}, {tool}, {app}, {previous} and {default} are replaced with
 // paths (as the tool sees them) and {/} with the path separator; in capitals ({HOT}, {/2}) in the
-// form of the registry editor's text. A whole text can also be
+// form of the registry editor's text. {times:COUNT:TEXT} is TEXT COUNT times, with the repetition's
+// six-digit number in place of '#'. A whole text can also be
 //   {utf16}TEXT     the text in UTF-16 with a byte-order mark
 //   {icon:NAME}     the bytes of a shipped icon
 //   {link:TARGET}   a symbolic link to another place or to an absolute path; to a directory if its
@@ -52,8 +53,8 @@ class Workstation
     /// Runs a program in the tool's folder until it ends, with limits of time and memory.
     RunResult Start(const Text& program, const std::vector<Text>& arguments,
                     const Files& environment = {}) const;
-    /// Every file with its text, every link, every directory and every attribute that is set. Links
-    /// are not followed.
+    /// Every file but the programs with its text, every link, every directory and every attribute
+    /// that is set. Links are not followed.
     Files Snapshot() const;
     /// The text with everything in braces replaced, except for a link or a FIFO.
     Text Expand(Text text) const;

@@ -53,10 +53,7 @@ std::vector<Call> Calls()
 {
     const Text after = "FolderUpgrade-upgrade-after.txt";
     const Text reset = Replaced(Written(Old), " description=\"\"", "");
-    Text manyFolders = "<l>";
-    for (int i = 0; i < 200000; ++i)
-        manyFolders += "<HotFolder path='/missing/" + std::to_string(i) + "'/>";
-    manyFolders += "</l>";
+    const Text manyFolders = "<l>" + Times(200000, "<HotFolder path='/missing/#'/>") + "</l>";
     return {
         {Moving("AllIsDoneAndTheLogFolderIsMade").Before({{LogPlace, Removed}}), 0},
         {Moving("TheWayBack")
@@ -110,9 +107,7 @@ TEST_P(CallsOfAnInstaller, LeaveTheirResults)
     if (call.program != "FolderUpgrade")
         fs::remove(program);
     if (call.program == "endless")
-        fs::copy((IsWindowsProgram() ? WindowsProgram().parent_path() : fs::path(TOOL_DIR)) /
-                     "tests" / ("endless" + suffix),
-                 program);
+        fs::copy(ProgramDir() / "tests" / ("endless" + suffix), program);
     std::vector<Text> arguments;
     for (const Text& argument : call.scenario.arguments)
         arguments.push_back(workstation.Expand(argument));

@@ -12,15 +12,17 @@ Text Filter(const Text& content)
 // A chain of nested elements, as the library writes it; levels are counted from 1.
 Text Nested(int levels)
 {
-    Text opened;
-    Text closed;
-    for (int level = 1; level <= levels; ++level)
+    const auto indentation = [](int level)
     {
-        const Text indentation = "\n" + Text(static_cast<size_t>(2 * level + 2), ' ');
-        opened += indentation + (level < levels ? "<e>" : "<e/>");
-        closed = (level < levels ? indentation + "</e>" : "") + closed;
-    }
-    return opened + closed + "\n  ";
+        return "\n" + Text(static_cast<size_t>(2 * level + 2), ' ');
+    };
+    Text text;
+    for (int level = 1; level < levels; ++level)
+        text += indentation(level) + "<e>";
+    text += indentation(levels) + "<e/>";
+    for (int level = levels - 1; level > 0; --level)
+        text += indentation(level) + "</e>";
+    return text + "\n  ";
 }
 
 // The same on one line.

@@ -4,21 +4,6 @@
 namespace
 {
 
-// The text that many times, with the repetition's six-digit number in place of '#'.
-Text Times(int count, const Text& text)
-{
-    Text result;
-    for (int i = 0; i < count; ++i)
-    {
-        result += text;
-        const size_t number = text.find('#');
-        if (number != Text::npos)
-            result.replace(result.size() - text.size() + number, 1,
-                           std::to_string(1000000 + i).substr(1));
-    }
-    return result;
-}
-
 // A Folder.cfg whose template moves if it can be loaded, with this additional content.
 Text Cfg(const Text& content, const Text& documentType = "")
 {

@@ -4,6 +4,11 @@
 #include "tests/scenario.h"
 #include "tests/text_files.h"
 
+inline Text Times(int count, const Text& text)
+{
+    return "{times:" + std::to_string(count) + ":" + text + "}";
+}
+
 inline const Text MovedFrom = "{previous}{/}Booklet.tpl";
 inline const Text MovedTo = "{default}{/}Booklet.tpl";
 
