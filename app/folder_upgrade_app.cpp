@@ -3,7 +3,7 @@
 #include "run/folder_upgrade_app.h"
 
 #include "appearance/folder_icon.h"
-#include "appearance/icon_source.h"
+#include "appearance/icon_copy.h"
 #include "migrate/hot_folder_impose_path.h"
 #include "migrate/job_preset_impose_path.h"
 #include "run/attempt.h"

@@ -1,9 +1,24 @@
 #include "appearance/icon_copy.h"
 
 #include "appearance/folder_icon_state.h"
-#include "appearance/icon_source.h"
+#include "platform/path_normal_form.h"
 
-#include <wx/filename.h>
+#include <wx/stdpaths.h>
+
+namespace
+{
+
+wxString SourceIconPath(const wxString& iconName, bool isUpgrade, const wxString& bundleIconsDir)
+{
+    wxFileName source(wxStandardPaths::Get().GetExecutablePath());
+    if (!isUpgrade)
+        source.AppendDir(bundleIconsDir);
+    source.SetFullName(iconName);
+    source.Normalize(NormalizeAll, wxString(), wxPATH_NATIVE);
+    return source.GetFullPath();
+}
+
+} // namespace
 
 IconCopy DecideIconCopy(HotFolder& folder, bool isUpgrade, const wxString& bundleIconsDir)
 {

@@ -5,6 +5,9 @@
 
 #include <wx/string.h>
 
+/// The name of the folder beside the executable that holds the previous version's icons.
+constexpr const wchar_t* BundleIconsDirName = L"BundleIcons";
+
 struct IconCopy
 {
     enum class Outcome
@@ -20,6 +23,6 @@ struct IconCopy
     wxString source; // full path
 };
 
-/// Decides with the folder's state, for which it loads Folder.cfg. The name of the folder of the
-/// previous version's icons is that of IconSource.
+/// Decides with the folder's state, for which it loads Folder.cfg. An upgrade takes the icon from
+/// the executable's directory, a downgrade from the bundle icons directory in it.
 IconCopy DecideIconCopy(HotFolder& folder, bool isUpgrade, const wxString& bundleIconsDir);

@@ -20,7 +20,7 @@ import sys
 import tempfile
 
 ROOT = pathlib.Path(__file__).resolve().parents[1]
-MODULES = ("app", "check", "run", "store", "migrate", "appearance", "platform")
+MODULES = ("app", "call", "check", "run", "store", "migrate", "appearance", "platform")
 NOT_SHIPPED, UNDER_WINE = "platform/linux/", "platform/windows/"
 TIME_LIMIT = 600  # seconds for a build or a part of the tests
 STRING = r'"(?:[^"\\]|\\.)*"'
@@ -82,7 +82,7 @@ def passes_once(root, is_under_wine):
     memory = 4 << 30  # some faults make a loop that never stops allocating
     environment = {**os.environ, "TMPDIR": str(scratch), "GTEST_FAIL_FAST": "1"}
     if is_under_wine:
-        programs = [root / "windows" / name for name in ("FolderUpgrade.exe", "FolderUpgradeCheck.exe")]
+        programs = [root / "windows" / name for name in ("FolderUpgrade.exe", "FolderUpgradeCheck.exe", "FolderUpgradeRun.exe")]
         command = [root / "tests/under_wine.sh", root / "windows", root / "native"]
         passed = run([root / "tests/import_tables.sh", *programs]) and run(command, env={**environment, "GTEST_FILTER": "-Sizes/*:AtEachCall/*"})
     else:

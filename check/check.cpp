@@ -2,7 +2,6 @@
 
 #include "check/hot_folder_check.h"
 #include "check/preset_check.h"
-#include "check/template_folders_check.h"
 #include "check/workstation_check.h"
 #include "platform/process_rights.h"
 
@@ -27,9 +26,9 @@ void WriteHead(TemplateFolders& folders, Report& report)
 }
 
 // A directory that is listed under two names is checked once.
-void CheckHotFolders(const HotFolderList& list, TemplateFolders& folders, TemplateCheck& templates,
-                     Report& report)
+void CheckHotFolders(const HotFolderList& list, TemplateCheck& check)
 {
+    Report& report = check.report;
     std::map<std::pair<std::uint64_t, std::uint64_t>, size_t> known; // identity -> position
     for (size_t i = 0; i < list.folders.size(); ++i)
     {
@@ -39,7 +38,7 @@ void CheckHotFolders(const HotFolderList& list, TemplateFolders& folders, Templa
         const auto identity = folder.directory.Identity();
         const auto [first, isNew] = known.emplace(identity, i);
         if (isNew || identity == std::pair<std::uint64_t, std::uint64_t>())
-            CheckHotFolder(folder, folders, templates, report);
+            CheckHotFolder(folder, check);
         else
             report.Note("the same directory as " + Shown(list.folders[first->second]));
     }
@@ -50,19 +49,16 @@ void CheckHotFolders(const HotFolderList& list, TemplateFolders& folders, Templa
 void CheckRun(TemplateFolders& folders, Report& report)
 {
     WriteHead(folders, report);
+    TemplateCheck check(folders, report);
     report.Begin("Workstation");
     CheckAccount(report);
-    CheckPreviousFolder(folders, report);
+    check.CheckPreviousFolder();
     const HotFolderList list = LoadHotFolderList();
     CheckHotFolderList(list, report);
     CheckRunLog(report);
-    TemplateCheck templates(folders);
-    CheckHotFolders(list, folders, templates, report);
+    CheckHotFolders(list, check);
     report.Begin("Job presets");
-    CheckPresets(folders, templates, report);
+    CheckPresets(check);
     report.Begin("Templates");
-    if (templates.GetAwaited() > 0)
-        report.Note(wxString::Format(
-            "there is no folder %s yet; templates that will be looked for in it: %zu",
-            folders.To().path, templates.GetAwaited()));
+    check.ReportAwaited();
 }

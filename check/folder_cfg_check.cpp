@@ -1,7 +1,6 @@
 #include "check/folder_cfg_check.h"
 
 #include "check/folder_cfg_loss.h"
-#include "check/template_folders_check.h"
 #include "check/workstation_check.h"
 #include "migrate/template_move.h"
 #include "store/xml_encoding.h"
@@ -47,7 +46,7 @@ bool CheckMove(HotFolder& folder, const TemplateMove& move, Report& report)
     }
     if (move.storedPath == move.newPath && move.newContent == cfg.bytes)
         return true;
-    report.Add("Folder.cfg: ", {FindFolderCfgLosses(*cfg.document, move.newContent), {}, {}});
+    report.AddLosses("Folder.cfg: ", FindFolderCfgLosses(*cfg.document, move.newContent));
     report.Change("Folder.cfg: " + Shown(move.storedPath) + " -> " + Shown(move.newPath));
     if (!IsUtf8(cfg.bytes))
         report.Note("Folder.cfg: comes out as UTF-8");
@@ -55,32 +54,32 @@ bool CheckMove(HotFolder& folder, const TemplateMove& move, Report& report)
 }
 
 // Returns whether the file is rewritten.
-bool CheckTemplate(HotFolder& folder, TemplateFolders& folders, TemplateCheck& templates,
-                   Report& report)
+bool CheckTemplate(HotFolder& folder, TemplateCheck& check)
 {
+    Report& report = check.report;
     using Outcome = TemplateMove::Outcome;
-    const TemplateMove move = DecideTemplateMove(folder.cfg, folders);
+    const TemplateMove move = DecideTemplateMove(folder.cfg, check.folders);
     const bool isRewritten = move.outcome == Outcome::Moves && CheckMove(folder, move, report);
     if (move.outcome == Outcome::Stays)
         ReportLeft(move.reasonToStay, report);
     if (move.outcome == Outcome::FromUnknown && !move.storedPath.empty())
-        CheckIsKnown(folders.From(), report);
+        check.CheckIsKnown(check.folders.From());
     if (move.outcome == Outcome::ToUnknown)
-        CheckIsKnown(folders.To(), report);
+        check.CheckIsKnown(check.folders.To());
     Findings findings;
-    templates.Judge(isRewritten ? move.newPath : move.storedPath,
-                    move.outcome == Outcome::Elsewhere ? "in a sub-folder"
-                                                       : "in a file that stays as it is",
-                    findings);
+    check.Judge(isRewritten ? move.newPath : move.storedPath,
+                move.outcome == Outcome::Elsewhere ? "in a sub-folder"
+                                                   : "in a file that stays as it is",
+                findings);
     report.Add({}, findings);
     return isRewritten;
 }
 
 } // namespace
 
-void CheckFolderCfg(HotFolder& folder, TemplateFolders& folders, TemplateCheck& templates,
-                    Report& report)
+void CheckFolderCfg(HotFolder& folder, TemplateCheck& check)
 {
+    Report& report = check.report;
     switch (folder.LoadCfg())
     {
     case XmlFile::State::Missing:
@@ -97,7 +96,7 @@ void CheckFolderCfg(HotFolder& folder, TemplateFolders& folders, TemplateCheck& 
                                   "; it stays as it is, and the folder shows as disabled"));
         break;
     case XmlFile::State::Loaded:
-        if (!CheckTemplate(folder, folders, templates, report))
+        if (!CheckTemplate(folder, check))
             CheckShownState(*folder.cfg.Root(), report);
         break;
     }

@@ -4,5 +4,4 @@
 #include "check/template_check.h"
 #include "store/hot_folder.h"
 
-void CheckFolderCfg(HotFolder& folder, TemplateFolders& folders, TemplateCheck& templates,
-                    Report& report);
+void CheckFolderCfg(HotFolder& folder, TemplateCheck& check);

@@ -167,7 +167,8 @@ std::vector<wxString> FindFolderCfgLosses(const wxXmlDocument& document,
                          ">");
     FindLostAttributes(root, losses);
     wxXmlDocument after;
-    if (LoadXml(rewritten, FolderCfgLimits, after).state == XmlLoad::State::Loaded)
+    LoadXml(rewritten, FolderCfgLimits, after);
+    if (after.IsOk())
         FindLostContent(root, *after.GetRoot(), losses);
     return losses;
 }

@@ -2,7 +2,6 @@
 
 #include "appearance/desktop_ini.h"
 #include "appearance/icon_copy.h"
-#include "appearance/icon_source.h"
 #include "platform/access_rights.h"
 #include "platform/file_copy.h"
 
@@ -96,9 +95,10 @@ void CheckDesktopIni(const HotFolder& folder, const wxString& iconName, Report& 
 
 } // namespace
 
-void CheckFolderIcon(HotFolder& folder, const TemplateFolders& folders, Report& report)
+void CheckFolderIcon(HotFolder& folder, TemplateCheck& check)
 {
-    const IconCopy copy = DecideIconCopy(folder, folders.IsUpgrade(), BundleIconsDirName);
+    Report& report = check.report;
+    const IconCopy copy = DecideIconCopy(folder, check.folders.IsUpgrade(), BundleIconsDirName);
     switch (copy.outcome)
     {
     case IconCopy::Outcome::Linked:
@@ -108,7 +108,7 @@ void CheckFolderIcon(HotFolder& folder, const TemplateFolders& folders, Report& 
         report.Note("no copy of the icon to replace: " + copy.name);
         break;
     case IconCopy::Outcome::NoSource:
-        if (folders.IsRehearsal())
+        if (check.folders.IsRehearsal())
             report.NoteOnce(
                 "the icons being installed are not there, so icons are left out of this check");
         else

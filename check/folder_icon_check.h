@@ -1,9 +1,8 @@
 // What a run would do to the icon, Desktop.ini and the attributes of one hot folder.
 #pragma once
 
-#include "check/report.h"
-#include "migrate/template_folders.h"
+#include "check/template_check.h"
 #include "store/hot_folder.h"
 
 /// In a rehearsal without the icons of the version being installed, the icon is left out.
-void CheckFolderIcon(HotFolder& folder, const TemplateFolders& folders, Report& report);
+void CheckFolderIcon(HotFolder& folder, TemplateCheck& check);

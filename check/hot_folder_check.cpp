@@ -25,15 +25,14 @@ wxString FindObstacle(const HotFolder& folder)
 
 } // namespace
 
-void CheckHotFolder(HotFolder& folder, TemplateFolders& folders, TemplateCheck& templates,
-                    Report& report)
+void CheckHotFolder(HotFolder& folder, TemplateCheck& check)
 {
     const wxString obstacle = FindObstacle(folder);
     if (!obstacle.empty())
     {
-        report.Problem(obstacle);
+        check.report.Problem(obstacle);
         return;
     }
-    CheckFolderCfg(folder, folders, templates, report);
-    CheckFolderIcon(folder, folders, report);
+    CheckFolderCfg(folder, check);
+    CheckFolderIcon(folder, check);
 }

@@ -5,5 +5,4 @@
 #include "store/hot_folder.h"
 
 /// Changes nothing.
-void CheckHotFolder(HotFolder& folder, TemplateFolders& folders, TemplateCheck& templates,
-                    Report& report);
+void CheckHotFolder(HotFolder& folder, TemplateCheck& check);

@@ -1,7 +1,6 @@
 #include "check/preset_check.h"
 
 #include "check/reach.h"
-#include "check/template_folders_check.h"
 #include "migrate/job_preset_files.h"
 #include "store/xml_encoding.h"
 
@@ -48,8 +47,8 @@ void CheckContent(const wxString& name, const RewrittenPreset& rewritten, Report
     if (!encoding.empty() && encoding.CmpNoCase("UTF-8") != 0)
         report.Problem(name + "declares the encoding " + encoding + ", but comes out as UTF-8");
     else if (IsTakenAsLatin1(rewritten.before))
-        report.Problem(name + "is not UTF-8, so the whole file is read as Latin-1; accented "
-                              "characters come out wrong");
+        report.AddLosses(name, {"is not UTF-8, so the whole file is read as Latin-1; accented "
+                                "characters come out wrong"});
     if (rewritten.bytes != rewritten.before && rewritten.movedPaths == 0)
         report.Change(name + OtherChange(rewritten.before, rewritten.bytes));
 }
@@ -98,10 +97,11 @@ wxString WhyItStays(const wxString& path, const wxString& decoded, const wxStrin
 }
 
 void CheckPaths(const wxString& name, const std::string& before, bool isRewritten,
-                TemplateFolders& folders, TemplateCheck& templates, Report& report)
+                TemplateCheck& check)
 {
-    const wxString& from = folders.From().path;
-    const wxString& to = folders.To().path;
+    Report& report = check.report;
+    const wxString& from = check.folders.From().path;
+    const wxString& to = check.folders.To().path;
     wxString text;
     if (DecodePreset(before, text))
         return;
@@ -118,10 +118,9 @@ void CheckPaths(const wxString& name, const std::string& before, bool isRewritte
     {
         const auto& [stored, left] = path;
         const wxString decoded = Decoded(left);
-        templates.Judge(decoded,
-                        isRewritten ? WhyItStays(left, decoded, from)
-                                    : "in a file that stays as it is",
-                        findings);
+        check.Judge(decoded,
+                    isRewritten ? WhyItStays(left, decoded, from) : "in a file that stays as it is",
+                    findings);
         if (stored == left)
             continue;
         findings.changes.push_back(
@@ -134,9 +133,9 @@ void CheckPaths(const wxString& name, const std::string& before, bool isRewritte
     report.Add(name, findings);
 }
 
-void CheckPreset(JobPresetFile& preset, const wxString& name, TemplateFolders& folders,
-                 TemplateCheck& templates, Report& report)
+void CheckPreset(JobPresetFile& preset, const wxString& name, TemplateCheck& check)
 {
+    Report& report = check.report;
     const RegularFile& file = preset.GetFile();
     const RegularFile::Status opened = preset.OpenForReading();
     if (opened != RegularFile::Status::Open)
@@ -149,11 +148,12 @@ void CheckPreset(JobPresetFile& preset, const wxString& name, TemplateFolders& f
     }
     const RegularFile::Status reopened = preset.GetFile().ReopenForUpdate();
     const FailedCall reopening = file.GetFailure();
-    const RewrittenPreset rewritten = preset.Decide(folders.From().path, folders.To().path);
+    const RewrittenPreset rewritten =
+        preset.Decide(check.folders.From().path, check.folders.To().path);
     wxString text;
     if (DecodePreset(rewritten.before, text) == nullptr && !FindPresetPaths(text, {}, {}).empty())
-        CheckFoldersForPresets(folders, report);
-    if (!folders.From().isKnown || !folders.To().isKnown)
+        check.CheckForPresets();
+    if (!check.folders.From().isKnown || !check.folders.To().isKnown)
         return;
     const bool isRewritten = !rewritten.reasonToStay && reopened == RegularFile::Status::Open;
     if (rewritten.reasonToStay)
@@ -163,7 +163,7 @@ void CheckPreset(JobPresetFile& preset, const wxString& name, TemplateFolders& f
                        reopening.Describe(preset.GetPath()) + ")");
     else
         CheckContent(name, rewritten, report);
-    CheckPaths(name, rewritten.before, isRewritten, folders, templates, report);
+    CheckPaths(name, rewritten.before, isRewritten, check);
 }
 
 // Why a presets.xml that may exist cannot be seen; empty if it does not exist.
@@ -179,14 +179,14 @@ wxString WhyMissing(const JobPresetFile& preset, const wxString& directory)
 }
 
 // False if there is no preset.
-bool CheckDirectory(const wxString& directory, const wxString& root, TemplateFolders& folders,
-                    TemplateCheck& templates, Report& report)
+bool CheckDirectory(const wxString& directory, const wxString& root, TemplateCheck& check)
 {
+    Report& report = check.report;
     JobPresetFile preset(directory);
     const wxString name = preset.GetPath().Mid(root.length()) + ": ";
     if (preset.IsThere())
     {
-        CheckPreset(preset, name, folders, templates, report);
+        CheckPreset(preset, name, check);
         return true;
     }
     const wxString obstacle = WhyMissing(preset, directory);
@@ -197,8 +197,9 @@ bool CheckDirectory(const wxString& directory, const wxString& root, TemplateFol
 
 } // namespace
 
-void CheckPresets(TemplateFolders& folders, TemplateCheck& templates, Report& report)
+void CheckPresets(TemplateCheck& check)
 {
+    Report& report = check.report;
     const wxString root = JobPresetRoot();
     const JobPresetDirs directories = ListJobPresetDirs(root);
     const wxString obstacle = WhyOutOfReach(root);
@@ -208,7 +209,7 @@ void CheckPresets(TemplateFolders& folders, TemplateCheck& templates, Report& re
         report.Problem(root + " cannot be listed");
     bool hasPresets = !obstacle.empty() || directories.failure;
     for (const wxString& directory : directories.paths)
-        hasPresets = CheckDirectory(directory, root, folders, templates, report) || hasPresets;
+        hasPresets = CheckDirectory(directory, root, check) || hasPresets;
     if (!hasPresets)
         report.Note(directories.isThere
                         ? "there are no presets in " + root

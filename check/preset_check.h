@@ -3,4 +3,4 @@
 
 #include "check/template_check.h"
 
-void CheckPresets(TemplateFolders& folders, TemplateCheck& templates, Report& report);
+void CheckPresets(TemplateCheck& check);

@@ -9,6 +9,8 @@
 namespace
 {
 
+constexpr size_t MostOfAKind = 20;
+
 wxString Count(size_t number, const wxString& what)
 {
     return wxString::Format("%zu %s%s", number, what, number == 1 ? "" : "s");
@@ -30,10 +32,12 @@ Report::Report(const wxString& fileName) : m_toFile(!fileName.empty())
     path.MakeAbsolute();
     const PinnedDirectory directory(path.GetPath(wxPATH_GET_VOLUME | wxPATH_GET_SEPARATOR),
                                     Links::Follow);
-    const wxString name = path.GetFullName();
-    m_isWritten = (m_file.OpenForUpdate(directory, name) == RegularFile::Status::Open &&
-                   m_file.SetLength(0)) ||
-                  m_file.CreateNew(directory, name) == RegularFile::Status::Open;
+    m_isWritten = m_file.OpenEmpty(directory, path.GetFullName());
+}
+
+Report::Report(const PinnedDirectory& directory, const wxString& name)
+    : m_toFile(true), m_isWritten(m_file.OpenEmpty(directory, name))
+{
 }
 
 void Report::Head(const wxString& text)
@@ -69,6 +73,23 @@ void Report::Add(const wxString& prefix, const Findings& findings)
     AddSome(NoteKind, prefix, findings.notes);
 }
 
+void Report::AddLosses(const wxString& prefix, const std::vector<wxString>& losses)
+{
+    AddSome(ProblemKind, prefix, losses);
+    for (size_t i = 0; i < losses.size() && i < MostOfAKind; ++i)
+        m_losses.insert(m_title + ": " + prefix + losses[i]);
+}
+
+void Report::RepeatLosses(const Report& before)
+{
+    Begin("Lost or reset by the run");
+    for (const wxString& loss : before.m_losses)
+    {
+        if (m_losses.count(loss) == 0)
+            Problem(loss);
+    }
+}
+
 void Report::ProblemOnce(const wxString& text)
 {
     if (m_once.insert(text).second)
@@ -81,12 +102,14 @@ void Report::NoteOnce(const wxString& text)
         Note(text);
 }
 
-bool Report::End()
+bool Report::End(const wxString& lastLine)
 {
     EndBlock();
     Write("");
     Write(Count(m_counts[ChangeKind], "change") + ", " + Count(m_counts[ProblemKind], "problem") +
           ", " + Count(m_counts[NoteKind], "note"));
+    if (!lastLine.empty())
+        Write(lastLine);
     return m_isWritten;
 }
 
@@ -107,11 +130,10 @@ void Report::Add(Kind kind, const wxString& text)
 
 void Report::AddSome(Kind kind, const wxString& prefix, const std::vector<wxString>& texts)
 {
-    constexpr size_t Most = 20;
-    for (size_t i = 0; i < texts.size() && i < Most; ++i)
+    for (size_t i = 0; i < texts.size() && i < MostOfAKind; ++i)
         Add(kind, prefix + texts[i]);
-    if (texts.size() > Most)
-        Add(kind, prefix + wxString::Format("and %zu more", texts.size() - Most));
+    if (texts.size() > MostOfAKind)
+        Add(kind, prefix + wxString::Format("and %zu more", texts.size() - MostOfAKind));
 }
 
 void Report::EndBlock()

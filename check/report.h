@@ -34,6 +34,7 @@ class Report
     /// Writes to the file, or to the standard output if the name is empty. A link or a pipe in
     /// place of the file is not written to.
     explicit Report(const wxString& fileName);
+    Report(const PinnedDirectory& directory, const wxString& name);
 
     /// Writes a line of the head, which comes before all blocks.
     void Head(const wxString& text);
@@ -47,12 +48,17 @@ class Report
     void Note(const wxString& text);
     /// The first 20 of each kind, each after the prefix, and how many more there are.
     void Add(const wxString& prefix, const Findings& findings);
+    /// Problems that a run hides: it loses or resets what a later check can no longer see.
+    void AddLosses(const wxString& prefix, const std::vector<wxString>& losses);
+    /// A block with the losses of a check before the run that this one does not have.
+    void RepeatLosses(const Report& before);
     /// What concerns many blocks: written only with the first of them.
     void ProblemOnce(const wxString& text);
     void NoteOnce(const wxString& text);
 
-    /// Writes the totals. Returns false if anything could not be written.
-    bool End();
+    /// Writes the totals, then the last line unless it is empty. Returns false if anything could
+    /// not be written.
+    bool End(const wxString& lastLine = wxString());
 
     int ExitStatus() const;
 
@@ -77,4 +83,5 @@ class Report
     std::array<wxArrayString, KindCount> m_block;
     std::array<size_t, KindCount> m_counts = {};
     std::set<wxString> m_once;
+    std::set<wxString> m_losses; // each after the title of its block
 };

@@ -6,23 +6,28 @@
 
 #include <wx/string.h>
 
+/// The two template folders and the report, for all parts of a check.
 class TemplateCheck
 {
   public:
-    explicit TemplateCheck(TemplateFolders& folders);
+    TemplateCheck(TemplateFolders& itsFolders, Report& itsReport);
+
+    /// Reports what is wrong with the previous version's folder, whether or not a template moves.
+    void CheckPreviousFolder();
+    /// Reports once that a folder that is needed is unknown.
+    void CheckIsKnown(const TemplateFolder& folder);
+    /// Both, and what matters only in the text of presets.
+    void CheckForPresets();
 
     /// Judges a path as a run leaves it: whether it still leads into the folder being left, and
     /// whether anything is there. No server is asked, and no link followed.
     void Judge(const wxString& path, const wxString& whyItStays, Findings& findings);
+    /// Reports how many templates are in the folder being installed, if it is not there as a whole.
+    void ReportAwaited();
 
-    /// The number of templates in the folder being installed, if it is not there as a whole.
-    size_t GetAwaited() const;
+    TemplateFolders& folders;
+    Report& report;
 
   private:
-    TemplateFolders& m_folders;
     size_t m_awaited = 0;
 };
-
-/// Whether the path is in the folder, at any depth, in any letter case and with any separators that
-/// the system takes for the same. Only names are compared.
-bool IsIn(const wxString& path, const wxString& folder);

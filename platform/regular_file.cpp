@@ -67,6 +67,12 @@ RegularFile::Status RegularFile::OpenForUpdate(const PinnedDirectory& directory,
     return Open(&directory, directory.Reach(name), true);
 }
 
+bool RegularFile::OpenEmpty(const PinnedDirectory& directory, const wxString& name)
+{
+    return (OpenForUpdate(directory, name) == Status::Open && SetLength(0)) ||
+           CreateNew(directory, name) == Status::Open;
+}
+
 size_t RegularFile::ReadAt(std::int64_t offset, char* bytes, size_t count) const
 {
     size_t done = 0;

@@ -73,6 +73,8 @@ class RegularFile
     /// Creates an empty file and opens it for update; fails and changes nothing if anything of that
     /// name exists (CREATE_NEW, O_EXCL).
     Status CreateNew(const PinnedDirectory& directory, const wxString& name);
+    /// Opens for update and empties it, or creates it. Returns false if that fails.
+    bool OpenEmpty(const PinnedDirectory& directory, const wxString& name);
     /// Puts a new, empty file in place of one that cannot be written. Not on Windows, where a
     /// file's own permissions prevent that.
     Status Replace(const PinnedDirectory& directory, const wxString& name);

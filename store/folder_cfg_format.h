@@ -8,6 +8,8 @@
 // file.
 #pragma once
 
+#include "store/hot_folder_settings.h"
+
 namespace FolderCfg
 {
 
@@ -36,6 +38,30 @@ constexpr const wchar_t* Key = L"Key";
 constexpr const wchar_t* Value = L"Value";
 constexpr const wchar_t* KeyDisplayValue = L"KeyDisplayValue";
 constexpr const wchar_t* LocDisplayValue = L"LocDisplayValue";
+
+/// A text of an entry, and the attribute that stores it; of the paths, the element.
+template <typename Entry>
+struct Field
+{
+    const wchar_t* name;
+    wxString Entry::*text;
+};
+
+/// In the order in which they are written.
+constexpr Field<InputFormat> InputFormatFields[] = {{ShortName, &InputFormat::ShortName},
+                                                    {DisplayName, &InputFormat::DisplayName}};
+constexpr Field<HotFolderPaths> PathFields[] = {{Failfolder, &HotFolderPaths::Failfolder},
+                                                {Workfolder, &HotFolderPaths::Workfolder},
+                                                {Movefolder, &HotFolderPaths::Movefolder},
+                                                {Hotfolder, &HotFolderPaths::Hotfolder}};
+constexpr Field<JobSettingEntry> JobSettingFields[] = {
+    {Value, &JobSettingEntry::Value},
+    {KeyDisplayValue, &JobSettingEntry::KeyDisplayValue},
+    {LocDisplayValue, &JobSettingEntry::LocDisplayValue}};
+constexpr Field<ImposeSettingEntry> ImposeSettingFields[] = {
+    {Value, &ImposeSettingEntry::Value}, {KeyDisplayValue, &ImposeSettingEntry::KeyDisplayValue}};
+constexpr Field<PreflightSetting> PreflightFields[] = {{Key, &PreflightSetting::Key},
+                                                       {Value, &PreflightSetting::Value}};
 
 /// The level of the filter setting in the document; the root has level 0.
 constexpr int FilterSettingLevel = 1;

@@ -5,73 +5,38 @@
 #include "store/xml_lookup.h"
 #include "store/xml_tree.h"
 
-#include <array>
-
 namespace
 {
 
-const wxXmlNode* FindSection(const wxXmlNode* root, const wchar_t* name)
+// Sets as many fields as there are attributes, from this one on.
+template <typename Entry, typename Fields>
+void ReadFields(const wxXmlAttribute* attribute, const Fields& fields, Entry& entry)
 {
-    return root ? FindElement(root, name, true) : nullptr;
-}
-
-// The values of a node's first four attributes, which the node still owns, and the number of them.
-struct Positional
-{
-    explicit Positional(const wxXmlNode& node)
+    for (const auto& field : fields)
     {
-        for (const wxXmlAttribute* attribute = node.GetAttributes();
-             attribute && count < values.size(); attribute = attribute->GetNext())
-            values[count++] = &attribute->GetValue();
+        if (!attribute)
+            return;
+        entry.*field.text = attribute->GetValue();
+        attribute = attribute->GetNext();
     }
-
-    // Copies the value at that position, if there is one.
-    void Get(size_t position, wxString& value) const
-    {
-        if (position < count)
-            value = *values[position];
-    }
-
-    std::array<const wxString*, 4> values{};
-    size_t count = 0;
-};
-
-void FillEntry(const Positional& attributes, JobSettingEntry& entry)
-{
-    attributes.Get(1, entry.Value);
-    attributes.Get(2, entry.KeyDisplayValue);
-    attributes.Get(3, entry.LocDisplayValue);
 }
 
-void FillEntry(const Positional& attributes, ImposeSettingEntry& entry)
-{
-    attributes.Get(1, entry.Value);
-    attributes.Get(2, entry.KeyDisplayValue);
-}
-
-template <typename Table>
-void ReadKeyValues(const wxXmlNode* section, Table& table)
+template <typename Table, typename Fields>
+void ReadKeyValues(const wxXmlNode* section, const Fields& fields, Table& table)
 {
     if (!section)
         return;
     Table read;
     for (const wxXmlNode* child = section->GetChildren(); child; child = child->GetNext())
     {
-        const Positional attributes(*child);
-        if (attributes.count < 2)
+        const wxXmlAttribute* key = child->GetAttributes();
+        if (!key || !key->GetNext())
             continue;
-        const auto [place, isNew] = read.try_emplace(*attributes.values[0]);
+        const auto [place, isNew] = read.try_emplace(key->GetValue());
         if (isNew)
-            FillEntry(attributes, place->second);
+            ReadFields(key->GetNext(), fields, place->second);
     }
     table.swap(read);
-}
-
-void ReadPath(const wxXmlNode& section, const wchar_t* name, wxString& path)
-{
-    const wxXmlNode* element = FirstNamed(section.GetChildren(), name);
-    if (element && element->GetAttributes())
-        path = element->GetAttributes()->GetValue();
 }
 
 } // namespace
@@ -99,40 +64,42 @@ int ReadHotFolderSettings(const wxXmlNode* root, HotFolderSettings& settings)
 
 void ReadFilterSetting(const wxXmlNode* root, wxXmlNode& node)
 {
-    const wxXmlNode* section = FindSection(root, FolderCfg::FilterSettingSection);
+    const wxXmlNode* section = FindElement(root, FolderCfg::FilterSettingSection, true);
     if (!section)
         return;
     node = wxXmlNode();
-    CopyTree(*section, node);
-    RemoveIgnoredWhiteSpace(node);
-    RemoveSavedIndentation(node, FolderCfg::FilterSettingLevel);
+    CopyTree(*section, node, FolderCfg::FilterSettingLevel);
 }
 
 int ReadPaths(const wxXmlNode* root, HotFolderPaths& paths)
 {
-    const wxXmlNode* section = FindSection(root, FolderCfg::PathsSection);
+    const wxXmlNode* section = FindElement(root, FolderCfg::PathsSection, true);
     if (!section)
         return 1;
-    ReadPath(*section, FolderCfg::Workfolder, paths.Workfolder);
-    ReadPath(*section, FolderCfg::Failfolder, paths.Failfolder);
-    ReadPath(*section, FolderCfg::Movefolder, paths.Movefolder);
-    ReadPath(*section, FolderCfg::Hotfolder, paths.Hotfolder);
+    for (const auto& field : FolderCfg::PathFields)
+    {
+        const wxXmlNode* element = FirstNamed(section->GetChildren(), field.name);
+        if (element && element->GetAttributes())
+            paths.*field.text = element->GetAttributes()->GetValue();
+    }
     return 0;
 }
 
 void ReadJobSettings(const wxXmlNode* root, JobSettingTable& table)
 {
-    ReadKeyValues(FindSection(root, FolderCfg::JobSettingSection), table);
+    ReadKeyValues(FindElement(root, FolderCfg::JobSettingSection, true),
+                  FolderCfg::JobSettingFields, table);
 }
 
 void ReadImposeSettings(const wxXmlNode* root, ImposeSettingTable& table)
 {
-    ReadKeyValues(FindSection(root, FolderCfg::ImposeSettingSection), table);
+    ReadKeyValues(FindElement(root, FolderCfg::ImposeSettingSection, true),
+                  FolderCfg::ImposeSettingFields, table);
 }
 
 void ReadInputFormats(const wxXmlNode* root, std::vector<InputFormat>& formats)
 {
-    const wxXmlNode* section = FindSection(root, FolderCfg::InputFormatsSection);
+    const wxXmlNode* section = FindElement(root, FolderCfg::InputFormatsSection, true);
     if (!section)
         return;
     for (const wxXmlNode* child = section->GetChildren(); child; child = child->GetNext())
@@ -141,28 +108,26 @@ void ReadInputFormats(const wxXmlNode* root, std::vector<InputFormat>& formats)
         CollectAttributes(*child, attributes);
         if (attributes.empty())
             continue;
-        InputFormat format;
+        InputFormat& format = formats.emplace_back();
         // Without a short name, the display name is not read.
-        if (GetAttribute(attributes, FolderCfg::ShortName, format.ShortName))
-            GetAttribute(attributes, FolderCfg::DisplayName, format.DisplayName);
-        formats.push_back(format);
+        for (const auto& field : FolderCfg::InputFormatFields)
+        {
+            if (!GetAttribute(attributes, field.name, format.*field.text))
+                break;
+        }
     }
 }
 
 void ReadPreflightSettings(const wxXmlNode* root, PreflightSettingList& list)
 {
-    const wxXmlNode* section = FindSection(root, FolderCfg::PreflightSection);
+    const wxXmlNode* section = FindElement(root, FolderCfg::PreflightSection, true);
     if (!section)
         return;
     PreflightSettingList read;
     for (const wxXmlNode* child = section->GetChildren(); child; child = child->GetNext())
     {
-        const Positional attributes(*child);
-        if (attributes.count == 0)
-            continue;
-        PreflightSetting& setting = read.emplace_back();
-        attributes.Get(0, setting.Key);
-        attributes.Get(1, setting.Value);
+        if (child->GetAttributes())
+            ReadFields(child->GetAttributes(), FolderCfg::PreflightFields, read.emplace_back());
     }
     list.swap(read);
 }

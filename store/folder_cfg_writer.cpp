@@ -33,45 +33,40 @@ class StringOutputStream : public wxOutputStream
     }
 };
 
-// One section under construction. It remembers its last child: finding it each time would take time
-// proportional to the square of the number of children.
-class Section
+template <typename Fields, typename Entry>
+void AddAttributes(wxXmlNode& element, const Fields& fields, const Entry& entry)
 {
-  public:
-    Section(wxXmlNode& root, const wxString& name) : m_node(Append(root, name, nullptr))
-    {
-    }
+    for (const auto& field : fields)
+        element.AddAttribute(field.name, entry.*field.text);
+}
 
-    wxXmlNode& Add(const wxString& name)
-    {
-        m_last = Append(*m_node, name, m_last);
-        return *m_last;
-    }
-
-  private:
-    static wxXmlNode* Append(wxXmlNode& parent, const wxString& name, wxXmlNode* last)
-    {
-        auto* child = new wxXmlNode(wxXML_ELEMENT_NODE, name); // from here on owned by the parent
-        if (last || !parent.GetChildren())
-            parent.InsertChildAfter(child, last);
-        else
-            parent.AddChild(child);
-        return child;
-    }
-
-    wxXmlNode* m_node;
-    wxXmlNode* m_last = nullptr;
-};
-
-// Made once for each section, not for each entry.
-struct KeyValueNames
+template <typename Fields, typename Entry>
+void AddAttributes(wxXmlNode& element, const Fields& fields,
+                   const std::pair<const wxString, Entry>& entry)
 {
-    wxString element = L"KEYVALUE";
-    wxString key = FolderCfg::Key;
-    wxString value = FolderCfg::Value;
-    wxString keyDisplayValue = FolderCfg::KeyDisplayValue;
-    wxString locDisplayValue = FolderCfg::LocDisplayValue;
-};
+    element.AddAttribute(FolderCfg::Key, entry.first);
+    AddAttributes(element, fields, entry.second);
+}
+
+// Appends a section with an element for each entry, after the last one: finding that each time
+// would take time proportional to the square of their number.
+template <typename Fields, typename Entries>
+void WriteSection(wxXmlNode* root, const wchar_t* name, const wxString& element,
+                  const Fields& fields, const Entries& entries)
+{
+    if (!root)
+        return;
+    auto* section = new wxXmlNode(wxXML_ELEMENT_NODE, name);
+    root->AddChild(section); // from here on owned by the root
+    wxXmlNode* last = nullptr;
+    for (const auto& entry : entries)
+    {
+        auto* child = new wxXmlNode(wxXML_ELEMENT_NODE, element);
+        section->InsertChildAfter(child, last); // from here on owned by the section
+        AddAttributes(*child, fields, entry);
+        last = child;
+    }
+}
 
 void WriteFilterSetting(wxXmlNode& root, wxXmlNode& filterSetting)
 {
@@ -86,70 +81,39 @@ void WriteFilterSetting(wxXmlNode& root, wxXmlNode& filterSetting)
 
 void WriteInputFormats(wxXmlNode* root, const std::vector<InputFormat>& formats)
 {
-    if (!root)
-        return;
-    Section section(*root, FolderCfg::InputFormatsSection);
-    for (const InputFormat& format : formats)
-    {
-        wxXmlNode& child = section.Add(L"InputFormat");
-        child.AddAttribute(FolderCfg::ShortName, format.ShortName);
-        child.AddAttribute(FolderCfg::DisplayName, format.DisplayName);
-    }
+    WriteSection(root, FolderCfg::InputFormatsSection, L"InputFormat", FolderCfg::InputFormatFields,
+                 formats);
 }
 
 void WritePaths(wxXmlNode* root, const HotFolderPaths& paths)
 {
     if (!root)
         return;
-    Section section(*root, FolderCfg::PathsSection);
-    section.Add(FolderCfg::Failfolder).AddAttribute(FolderCfg::Path, paths.Failfolder);
-    section.Add(FolderCfg::Workfolder).AddAttribute(FolderCfg::Path, paths.Workfolder);
-    section.Add(FolderCfg::Movefolder).AddAttribute(FolderCfg::Path, paths.Movefolder);
-    section.Add(FolderCfg::Hotfolder).AddAttribute(FolderCfg::Path, paths.Hotfolder);
+    auto* section = new wxXmlNode(wxXML_ELEMENT_NODE, FolderCfg::PathsSection);
+    root->AddChild(section); // as above
+    for (const auto& field : FolderCfg::PathFields)
+    {
+        auto* child = new wxXmlNode(wxXML_ELEMENT_NODE, field.name);
+        section->AddChild(child);
+        child->AddAttribute(FolderCfg::Path, paths.*field.text);
+    }
 }
 
 void WriteJobSettings(wxXmlNode* root, const JobSettingTable& table)
 {
-    if (!root)
-        return;
-    Section section(*root, FolderCfg::JobSettingSection);
-    const KeyValueNames names;
-    for (const auto& [key, entry] : table)
-    {
-        wxXmlNode& child = section.Add(names.element);
-        child.AddAttribute(names.key, key);
-        child.AddAttribute(names.value, entry.Value);
-        child.AddAttribute(names.keyDisplayValue, entry.KeyDisplayValue);
-        child.AddAttribute(names.locDisplayValue, entry.LocDisplayValue);
-    }
+    WriteSection(root, FolderCfg::JobSettingSection, L"KEYVALUE", FolderCfg::JobSettingFields,
+                 table);
 }
 
 void WriteImposeSettings(wxXmlNode* root, const ImposeSettingTable& table)
 {
-    if (!root)
-        return;
-    Section section(*root, FolderCfg::ImposeSettingSection);
-    const KeyValueNames names;
-    for (const auto& [key, entry] : table)
-    {
-        wxXmlNode& child = section.Add(names.element);
-        child.AddAttribute(names.key, key);
-        child.AddAttribute(names.value, entry.Value);
-        child.AddAttribute(names.keyDisplayValue, entry.KeyDisplayValue);
-    }
+    WriteSection(root, FolderCfg::ImposeSettingSection, L"KEYVALUE", FolderCfg::ImposeSettingFields,
+                 table);
 }
 
 void WritePreflightSettings(wxXmlNode* root, const PreflightSettingList& list)
 {
-    if (!root)
-        return;
-    Section section(*root, FolderCfg::PreflightSection);
-    for (const PreflightSetting& setting : list)
-    {
-        wxXmlNode& child = section.Add(L"Preflight");
-        child.AddAttribute(FolderCfg::Key, setting.Key);
-        child.AddAttribute(FolderCfg::Value, setting.Value);
-    }
+    WriteSection(root, FolderCfg::PreflightSection, L"Preflight", FolderCfg::PreflightFields, list);
 }
 
 std::string FolderCfgBytes(const HotFolderSettings& settings, const JobSettingTable& jobSettings,

@@ -13,30 +13,13 @@ namespace
 {
 
 const char* const DataDirName = "hotfolder";
-const char* const ListName = "HotFolderList";
-const char* const ListExtension = "cfg";
+const char* const ListName = "HotFolderList.cfg";
 const char* const FolderElement = "HotFolder";
 const char* const PathAttribute = "path";
 
-struct FoldedHash
-{
-    size_t operator()(const wxString& text) const
-    {
-        return wxStringHash()(text.Lower());
-    }
-};
-
-struct EqualIgnoringCase
-{
-    bool operator()(const wxString& left, const wxString& right) const
-    {
-        return left.CmpNoCase(right) == 0;
-    }
-};
-
-// Comparing each path with every path before it would take time proportional to the square of the
-// list's length.
-using PathSet = std::unordered_set<wxString, FoldedHash, EqualIgnoringCase>;
+// Paths in lower case. Comparing each path with every path before it (CmpNoCase) would take time
+// proportional to the square of the list's length.
+using PathSet = std::unordered_set<wxString, wxStringHash>;
 
 wxString ReadPath(const wxXmlNode& element)
 {
@@ -51,11 +34,7 @@ wxString ReadPath(const wxXmlNode& element)
 
 wxString GetHotFolderListPath()
 {
-    wxFileName file;
-    file.AssignDir(GetHotFolderDataDir());
-    file.SetName(ListName);
-    file.SetExt(ListExtension);
-    return file.GetFullPath();
+    return GetHotFolderDataDir() + ListName;
 }
 
 wxString GetHotFolderDataDir()
@@ -86,7 +65,7 @@ HotFolderList LoadHotFolderList()
             continue;
         if (!wxDirExists(folder))
             list.missing.Add(folder);
-        else if (known.insert(folder).second)
+        else if (known.insert(folder.Lower()).second)
             list.folders.Add(folder);
         else
             list.repeated.Add(folder);
@@ -99,10 +78,12 @@ void ReadHotFolderList(wxArrayString& folders)
     const HotFolderList list = LoadHotFolderList();
     if (!list.whyNotReadable.empty())
         ReportError(list.whyNotReadable);
-    PathSet known(folders.begin(), folders.end());
+    PathSet known;
+    for (const wxString& folder : folders)
+        known.insert(folder.Lower());
     for (const wxString& folder : list.folders)
     {
-        if (known.insert(folder).second)
+        if (known.count(folder.Lower()) == 0)
             folders.Add(folder);
     }
 }

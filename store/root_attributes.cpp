@@ -26,33 +26,29 @@ const std::vector<RootAttribute>& RootAttributes()
 {
     using S = HotFolderSettings;
     using F = AttributeForm;
-    constexpr bool Required = false;
-    constexpr bool Optional = true;
     static const std::vector<RootAttribute> attributes = {
-        {L"name", F::Text, &S::name, Required, 1},
-        {L"description", F::Text, &S::description, Required, 2},
-        {L"server_ip", F::Text, &S::server_ip, Required, 3},
-        {L"server_name", F::Text, &S::server_name, Required, 4},
-        {L"Enable", F::TextFlag, &S::Enable, Required, 18},
-        {L"BaseVirtualPrinter", F::Text, &S::BaseVirtualPrinter, Required, 8},
-        {L"BaseVirtualPrinterName", F::Text, &S::BaseVirtualPrinterName, Required, 9},
-        {L"BaseVirtualPrinterDisplayName", F::Text, &S::BaseVirtualPrinterDisplayName, Required,
-         10},
-        {L"HFPresetName", F::Text, &S::HFPresetName, Required, 11},
-        {L"Centralized", F::TextFlag, &S::Centralized, Required, 19},
-        {L"Isjobpresetattached", F::TextFlag, &S::Isjobpresetattached, Required, 20},
-        {L"IsCustomInterval", F::TextFlag, &S::IsCustomInterval, Required, 21},
-        {L"TimeInterval", F::Text, &S::TimeInterval, Required, 22},
-        {L"PPDVersion", F::Text, &S::PPDVersion, Required, 12},
-        {L"ServerTypeAndJPDefaultKeyInfo", F::Text, &S::ServerTypeAndJPDefaultKeyInfo, Required,
-         13},
-        {L"server_version", F::Number, &S::server_version, Optional, 5},
-        {L"server_textversion", F::Text, &S::server_textversion, Required, 6},
-        {L"server_type", F::Text, &S::server_type, Required, 7},
-        {L"Quickset", F::Text, &S::Quickset, Required, 16},
-        {L"Quickset_Supported", F::NumericFlag, &S::Quickset_Supported, Required, 14},
-        {L"Quickset_Enabled", F::NumericFlag, &S::Quickset_Enabled, Required, 15},
-        {L"IsWidthBased", F::NumericFlag, &S::IsWidthBased, Required, 17},
+        {L"name", F::Text, &S::name, 1},
+        {L"description", F::Text, &S::description, 2},
+        {L"server_ip", F::Text, &S::server_ip, 3},
+        {L"server_name", F::Text, &S::server_name, 4},
+        {L"Enable", F::TextFlag, &S::Enable, 18},
+        {L"BaseVirtualPrinter", F::Text, &S::BaseVirtualPrinter, 8},
+        {L"BaseVirtualPrinterName", F::Text, &S::BaseVirtualPrinterName, 9},
+        {L"BaseVirtualPrinterDisplayName", F::Text, &S::BaseVirtualPrinterDisplayName, 10},
+        {L"HFPresetName", F::Text, &S::HFPresetName, 11},
+        {L"Centralized", F::TextFlag, &S::Centralized, 19},
+        {L"Isjobpresetattached", F::TextFlag, &S::Isjobpresetattached, 20},
+        {L"IsCustomInterval", F::TextFlag, &S::IsCustomInterval, 21},
+        {L"TimeInterval", F::Text, &S::TimeInterval, 22},
+        {L"PPDVersion", F::Text, &S::PPDVersion, 12},
+        {L"ServerTypeAndJPDefaultKeyInfo", F::Text, &S::ServerTypeAndJPDefaultKeyInfo, 13},
+        {L"server_version", F::Number, &S::server_version, 5},
+        {L"server_textversion", F::Text, &S::server_textversion, 6},
+        {L"server_type", F::Text, &S::server_type, 7},
+        {L"Quickset", F::Text, &S::Quickset, 16},
+        {L"Quickset_Supported", F::NumericFlag, &S::Quickset_Supported, 14},
+        {L"Quickset_Enabled", F::NumericFlag, &S::Quickset_Enabled, 15},
+        {L"IsWidthBased", F::NumericFlag, &S::IsWidthBased, 17},
     };
     return attributes;
 }
@@ -90,9 +86,10 @@ size_t ReadRootAttributes(const AttributeMap& attributes, HotFolderSettings& set
     for (const RootAttribute& attribute : RootAttributes())
     {
         const auto found = attributes.find(attribute.name);
-        if (found == attributes.end() && !attribute.isOptional)
+        const bool isMissing = found == attributes.end();
+        if (isMissing && attribute.form != AttributeForm::Number)
             break;
-        attribute.Read(found == attributes.end() ? wxString(L"-1") : found->second, settings);
+        attribute.Read(isMissing ? wxString(L"-1") : found->second, settings);
         ++read;
     }
     return read;

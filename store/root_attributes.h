@@ -13,7 +13,8 @@
 enum class AttributeForm
 {
     Text,        // as it is
-    Number,      // base 10, up to the first character that is not a digit; 0 without digits
+    Number,      // base 10, up to the first character that is not a digit; 0 without digits; -1 if
+                 // the attribute is missing, which does not end the chain of those that are read
     NumericFlag, // whether such a number is not 0
     TextFlag     // whether the text, without trailing white space, is exactly "1"
 };
@@ -26,7 +27,6 @@ struct RootAttribute
     const wchar_t* name;
     AttributeForm form;
     Field field;
-    bool isOptional; // missing, it becomes -1 and does not end the chain of those that are read
     int writtenPlace;
 
     void Read(const wxString& text, HotFolderSettings& settings) const;
@@ -39,7 +39,7 @@ const std::vector<RootAttribute>& RootAttributes();
 /// The same, in the order in which they are written.
 std::vector<const RootAttribute*> WrittenRootAttributes();
 
-/// Reads the attributes as a chain, up to the first that is missing and not optional: from there on
+/// Reads the attributes as a chain, up to the first that is missing and not a number: from there on
 /// all fields stay as they were. Returns how many attributes of the table come before it.
 size_t ReadRootAttributes(const AttributeMap& attributes, HotFolderSettings& settings);
 

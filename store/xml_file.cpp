@@ -1,7 +1,5 @@
 #include "store/xml_file.h"
 
-#include "store/xml_encoding.h"
-
 XmlFile::XmlFile(const XmlLimits& itsLimits) : limits(itsLimits)
 {
 }
@@ -26,13 +24,15 @@ XmlFile::State XmlFile::Load(RegularFile::Status opened)
     if (state != State::Loaded)
         return state;
     auto parsed = std::make_unique<wxXmlDocument>();
-    const XmlLoad load = LoadXml(bytes, limits, *parsed);
-    error = load.error;
-    if (load.state != XmlLoad::State::Loaded)
-        return state =
-                   load.state == XmlLoad::State::TooLarge ? State::TooLarge : State::NotReadable;
-    isFaithful = IsReadFaithfully(bytes);
-    document = std::move(parsed);
+    const XmlLook look = LoadXml(bytes, limits, *parsed);
+    error = look.error;
+    isFaithful = look.isFaithful;
+    if (!look.isWithinLimits)
+        state = State::TooLarge;
+    else if (!parsed->IsOk())
+        state = State::NotReadable;
+    else
+        document = std::move(parsed);
     return state;
 }
 

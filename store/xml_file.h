@@ -49,7 +49,7 @@ struct XmlFile
     State state = State::Missing;
     std::string bytes; // as they were loaded
     std::unique_ptr<const wxXmlDocument> document;
-    bool isFaithful = false; // whether the document is what its author meant: IsReadFaithfully
+    bool isFaithful = false; // whether the document is what its author meant: see XmlLook
     XmlSyntaxError error;
 
   private:

@@ -5,9 +5,11 @@
 #include <wx/intl.h>
 
 #include <algorithm>
+#include <bitset>
 #include <cstdint>
 #include <cstring>
 #include <expat.h>
+#include <limits>
 #include <memory>
 
 namespace
@@ -46,121 +48,128 @@ constexpr std::uint64_t LibraryBuffer = 1024;
 class Look
 {
   public:
-    Look(XML_Parser parser, size_t length, const XmlLimits& limits)
-        : m_parser(parser), m_limits(limits), m_memory(length)
+    // Handles everything in the same way as the library, so that both see the same document.
+    explicit Look(const XmlLimits& limits)
+        : m_parser(XML_ParserCreate(nullptr), XML_ParserFree), m_limits(limits)
     {
+        const XML_Parser parser = m_parser.get();
+        XML_SetUserData(parser, this);
+        XML_SetElementHandler(
+            parser,
+            [](void* look, const char* name, const char** attributes)
+            { Of(look).BeginElement(name, attributes); },
+            [](void* look, const char*) { Of(look).EndElement(); });
+        XML_SetCharacterDataHandler(parser, [](void* look, const char*, int length)
+                                    { Of(look).Text(static_cast<std::uint64_t>(length)); });
+        XML_SetDefaultHandler(parser, [](void* look, const char*, int) { Of(look).Other(); });
+        XML_SetDoctypeDeclHandler(
+            parser,
+            [](void* look, const char*, const char*, const char*, int)
+            { Of(look).m_documentTypeEnd = Of(look).Position() + MaxDocumentType; },
+            [](void* look) { Of(look).m_documentTypeEnd = NoEnd; });
+        XML_SetAttlistDeclHandler(
+            parser,
+            [](void* look, const char*, const char*, const char*, const char*, int)
+            {
+                ++Of(look).m_declaredAttributes;
+                Of(look).Other();
+            });
+        XML_SetUnknownEncodingHandler(
+            parser,
+            [](void* look, const char* name, XML_Encoding* encoding)
+            {
+                Of(look).m_misread = FillEncodingMap(wxString::FromUTF8(name), encoding->map);
+                return static_cast<int>(XML_STATUS_OK);
+            },
+            this);
     }
 
-    bool IsWithinLimits() const
+    XmlLook At(const std::string& bytes)
     {
-        return m_isWithinLimits;
+        m_look.memory = bytes.size();
+        // In one piece, so that nothing is read twice here.
+        if (XML_Parse(m_parser.get(), bytes.data(), static_cast<int>(bytes.size()), XML_TRUE) !=
+            XML_STATUS_OK)
+            Fail(bytes.size());
+        m_look.isFaithful =
+            std::none_of(bytes.begin(), bytes.end(),
+                         [&](char each) { return m_misread[static_cast<unsigned char>(each)]; });
+        return m_look;
     }
 
-    std::uint64_t Memory() const
+  private:
+    static Look& Of(void* look)
     {
-        return m_memory;
+        return *static_cast<Look*>(look);
     }
 
     void BeginElement(const char* name, const char** attributes)
     {
-        EndText();
-        TakeToken();
         std::uint64_t count = 0;
-        for (const char** each = attributes; *each; each += 2)
+        size_t longest = 0;
+        size_t characters = std::strlen(name);
+        for (; *attributes; attributes += 2)
         {
             ++count;
-            const size_t length = std::strlen(each[1]);
-            m_isWithinLimits = m_isWithinLimits && length <= LongestValue;
-            m_memory += AttributeMemory + CharacterMemory * (std::strlen(each[0]) + length);
+            const size_t length = std::strlen(attributes[1]);
+            longest = std::max(longest, length);
+            characters += std::strlen(attributes[0]) + length;
         }
-        m_memory += NodeMemory + CharacterMemory * std::strlen(name);
+        m_look.memory += NodeMemory + AttributeMemory * count + CharacterMemory * characters;
         m_steps += count * count + m_declaredAttributes;
         ++m_depth;
-        Judge();
+        TakeToken(End());
+        Judge(longest);
     }
 
     void EndElement()
     {
-        EndText();
-        TakeToken();
+        TakeToken(End());
         --m_depth;
     }
 
-    void Text(int length)
+    void Text(std::uint64_t length)
     {
-        const std::uint64_t begin = Position();
-        const std::uint64_t end = End();
-        const std::uint64_t pieces = 1 + end / LibraryBuffer - begin / LibraryBuffer;
-        m_lastEnd = end;
-        m_memory += CharacterMemory * static_cast<std::uint64_t>(length) +
-                    (m_textLength == 0 ? NodeMemory : 0);
-        m_textLength += static_cast<std::uint64_t>(length);
-        m_isWithinLimits = m_isWithinLimits && m_textLength <= LongestValue;
+        const std::uint64_t pieces = 1 + End() / LibraryBuffer - Position() / LibraryBuffer;
+        m_lastEnd = End();
+        m_look.memory += CharacterMemory * length + (m_textLength == 0 ? NodeMemory : 0);
+        m_textLength += length;
         m_steps += pieces * m_textLength;
-        Judge();
+        Judge(m_textLength);
     }
 
     // Anything else: declarations, comments, instructions, a document type.
     void Other()
     {
-        EndText();
-        TakeToken();
-        m_memory += NodeMemory +
-                    CharacterMemory * static_cast<std::uint64_t>(XML_GetCurrentByteCount(m_parser));
-        if (m_isInDocumentType && Position() - m_documentType > MaxDocumentType)
-            m_isWithinLimits = false;
-        Judge();
-    }
-
-    void DeclareAttribute()
-    {
-        ++m_declaredAttributes;
-        Other();
-    }
-
-    void BeginDocumentType()
-    {
-        m_documentType = Position();
-        m_isInDocumentType = true;
-    }
-
-    void EndDocumentType()
-    {
-        m_isInDocumentType = false;
+        TakeToken(End());
+        m_look.memory += NodeMemory + CharacterMemory * (End() - Position());
+        m_look.isWithinLimits = m_look.isWithinLimits && Position() <= m_documentTypeEnd;
+        Judge(0);
     }
 
     // The document is not well-formed. It may end inside a tag, or the last event may be followed
     // by one long token that is not allowed there.
     void Fail(size_t length)
     {
-        const XML_Error error = XML_GetErrorCode(m_parser);
+        const XML_Error error = XML_GetErrorCode(m_parser.get());
         const bool isUnfinished =
             error == XML_ERROR_UNCLOSED_TOKEN || error == XML_ERROR_PARTIAL_CHAR ||
             error == XML_ERROR_UNCLOSED_CDATA_SECTION || error == XML_ERROR_SYNTAX;
         TakeToken(isUnfinished ? length : End());
-        Judge();
+        Judge(0);
+        m_look.error = {wxString::FromUTF8(XML_ErrorString(error)),
+                        static_cast<unsigned long>(XML_GetCurrentLineNumber(m_parser.get()))};
     }
 
-  private:
     std::uint64_t Position() const
     {
         return static_cast<std::uint64_t>(
-            std::max<XML_Index>(XML_GetCurrentByteIndex(m_parser), 0));
+            std::max<XML_Index>(XML_GetCurrentByteIndex(m_parser.get()), 0));
     }
 
     std::uint64_t End() const
     {
-        return Position() + static_cast<std::uint64_t>(XML_GetCurrentByteCount(m_parser));
-    }
-
-    void EndText()
-    {
-        m_textLength = 0;
-    }
-
-    void TakeToken()
-    {
-        TakeToken(End());
+        return Position() + static_cast<std::uint64_t>(XML_GetCurrentByteCount(m_parser.get()));
     }
 
     void TakeToken(std::uint64_t end)
@@ -168,65 +177,31 @@ class Look
         const std::uint64_t length = end > m_lastEnd ? end - m_lastEnd : 0;
         m_steps += length * length / (2 * LibraryBuffer);
         m_lastEnd = std::max(end, m_lastEnd);
+        m_textLength = 0;
     }
 
-    void Judge()
+    void Judge(std::uint64_t longestValue)
     {
-        m_isWithinLimits = m_isWithinLimits && m_depth <= MaxDepth && m_memory <= m_limits.memory &&
-                           m_steps <= m_limits.steps;
-        if (!m_isWithinLimits)
-            XML_StopParser(m_parser, XML_FALSE);
+        m_look.isWithinLimits = m_look.isWithinLimits && longestValue <= LongestValue &&
+                                m_depth <= MaxDepth && m_look.memory <= m_limits.memory &&
+                                m_steps <= m_limits.steps;
+        if (!m_look.isWithinLimits)
+            XML_StopParser(m_parser.get(), XML_FALSE);
     }
 
-    const XML_Parser m_parser;
+    static constexpr std::uint64_t NoEnd = std::numeric_limits<std::uint64_t>::max();
+
+    const std::unique_ptr<XML_ParserStruct, void (*)(XML_Parser)> m_parser;
     const XmlLimits& m_limits;
-    bool m_isWithinLimits = true;
-    bool m_isInDocumentType = false;
+    XmlLook m_look;
+    std::bitset<256> m_misread;
     int m_depth = 0;
-    std::uint64_t m_memory;
     std::uint64_t m_textLength = 0;
     std::uint64_t m_steps = 0;
     std::uint64_t m_declaredAttributes = 0;
-    std::uint64_t m_documentType = 0;
+    std::uint64_t m_documentTypeEnd = NoEnd; // where one that began must have ended
     std::uint64_t m_lastEnd = 0;
 };
-
-Look& LookOf(void* data)
-{
-    return *static_cast<Look*>(data);
-}
-
-int FillEncoding(void* /*data*/, const char* name, XML_Encoding* encoding)
-{
-    const EncodingMap map = GetEncodingMap(wxString::FromUTF8(name));
-    std::copy(map.begin(), map.end(), encoding->map);
-    encoding->data = nullptr;
-    encoding->convert = nullptr;
-    encoding->release = nullptr;
-    return XML_STATUS_OK;
-}
-
-// In the same way as the library, so that both see the same document.
-void SetHandlers(XML_Parser parser, Look& look)
-{
-    XML_SetUserData(parser, &look);
-    XML_SetElementHandler(
-        parser,
-        [](void* data, const char* name, const char** attributes)
-        { LookOf(data).BeginElement(name, attributes); },
-        [](void* data, const char*) { LookOf(data).EndElement(); });
-    XML_SetCharacterDataHandler(parser, [](void* data, const char*, int length)
-                                { LookOf(data).Text(length); });
-    XML_SetDefaultHandler(parser, [](void* data, const char*, int) { LookOf(data).Other(); });
-    XML_SetDoctypeDeclHandler(
-        parser,
-        [](void* data, const char*, const char*, const char*, int)
-        { LookOf(data).BeginDocumentType(); },
-        [](void* data) { LookOf(data).EndDocumentType(); });
-    XML_SetAttlistDeclHandler(parser, [](void* data, const char*, const char*, const char*,
-                                         const char*, int) { LookOf(data).DeclareAttribute(); });
-    XML_SetUnknownEncodingHandler(parser, FillEncoding, nullptr);
-}
 
 } // namespace
 
@@ -238,26 +213,15 @@ wxString XmlSyntaxError::Describe() const
 
 XmlLook LookAtXml(const std::string& bytes, const XmlLimits& limits)
 {
-    if (bytes.size() > limits.bytes)
-        return {false, 0, {}};
-    const std::unique_ptr<XML_ParserStruct, void (*)(XML_Parser)> parser(XML_ParserCreate(nullptr),
-                                                                         XML_ParserFree);
-    Look look(parser.get(), bytes.size(), limits);
-    SetHandlers(parser.get(), look);
-    // In one piece, so that nothing is read twice here.
-    if (XML_Parse(parser.get(), bytes.data(), static_cast<int>(bytes.size()), XML_TRUE) ==
-        XML_STATUS_OK)
-        return {look.IsWithinLimits(), look.Memory(), {}};
-    look.Fail(bytes.size());
-    return {look.IsWithinLimits(),
-            look.Memory(),
-            {wxString::FromUTF8(XML_ErrorString(XML_GetErrorCode(parser.get()))),
-             static_cast<unsigned long>(XML_GetCurrentLineNumber(parser.get()))}};
+    XmlLook tooLong;
+    tooLong.isWithinLimits = false;
+    return bytes.size() > limits.bytes ? tooLong : Look(limits).At(bytes);
 }
 
 bool IsHarmlessXml(const std::string& bytes)
 {
-    // UTF-16, in which a document type would look different, has NULs.
+    // UTF-16, in which a document type or another encoding would look different, has NULs.
     return bytes.size() <= HarmlessBytes && bytes.find("<!DOCTYPE") == std::string::npos &&
-           bytes.find('\0') == std::string::npos;
+           bytes.find('\0') == std::string::npos &&
+           bytes.find("encoding") == bytes.find("encoding=\"UTF-8\"");
 }

@@ -33,10 +33,13 @@ struct XmlSyntaxError
     wxString Describe() const;
 };
 
+constexpr std::uint64_t HarmlessMemory = 2'000'000; // bytes
+
 struct XmlLook
 {
     bool isWithinLimits = true;
-    std::uint64_t memory = 0; // that the library takes
+    bool isFaithful = true; // whether the library reads every character of its encoding correctly
+    std::uint64_t memory = HarmlessMemory; // that the library takes
     XmlSyntaxError error;
 };
 
@@ -46,7 +49,6 @@ struct XmlLook
 /// the number of bytes.
 XmlLook LookAtXml(const std::string& bytes, const XmlLimits& limits);
 
-/// Whether every document like this one is within all limits, and takes at most HarmlessMemory, so
-/// that looking at it is not worth the time.
-constexpr std::uint64_t HarmlessMemory = 2'000'000;
+/// Whether every document like this one is within all limits, is read faithfully and takes at most
+/// HarmlessMemory, so that looking at it is not worth the time.
 bool IsHarmlessXml(const std::string& bytes);

@@ -1,31 +1,5 @@
 #include "store/xml_lookup.h"
 
-namespace
-{
-
-const wxXmlNode* FirstElement(const wxXmlNode* node)
-{
-    while (node && node->GetType() != wxXML_ELEMENT_NODE)
-        node = node->GetNext();
-    return node;
-}
-
-// The next element in document order below root, or null. A loop and not a recursion, so that no
-// document can exhaust the stack.
-const wxXmlNode* NextElement(const wxXmlNode* element, const wxXmlNode* root)
-{
-    if (const wxXmlNode* child = FirstElement(element->GetChildren()))
-        return child;
-    for (; element != root; element = element->GetParent())
-    {
-        if (const wxXmlNode* sibling = FirstElement(element->GetNext()))
-            return sibling;
-    }
-    return nullptr;
-}
-
-} // namespace
-
 const wxXmlNode* FirstNamed(const wxXmlNode* node, const wxString& name)
 {
     while (node && (node->GetType() != wxXML_ELEMENT_NODE || node->GetName() != name))
@@ -35,14 +9,13 @@ const wxXmlNode* FirstNamed(const wxXmlNode* node, const wxString& name)
 
 const wxXmlNode* FindElement(const wxXmlNode* node, const wxString& name, bool recursive)
 {
-    for (const wxXmlNode* parent = node; parent; parent = NextElement(parent, node))
-    {
-        if (const wxXmlNode* found = FirstNamed(parent->GetChildren(), name))
-            return found;
-        if (!recursive)
-            break;
-    }
-    return nullptr;
+    if (!node)
+        return nullptr;
+    const wxXmlNode* found = FirstNamed(node->GetChildren(), name);
+    for (const wxXmlNode* child = node->GetChildren(); child && recursive && !found;
+         child = child->GetNext())
+        found = FindElement(child, name, recursive);
+    return found;
 }
 
 void CollectAttributes(const wxXmlNode& element, AttributeMap& attributes)

@@ -13,7 +13,7 @@ using AttributeMap = std::map<wxString, wxString>;
 
 /// The first element of that name below the node, or null. The node's direct children come before
 /// any subtree; with recursive set, the subtrees are then searched one after another in document
-/// order. The node itself never matches. Works at any depth of nesting.
+/// order. The node itself never matches, and null has no elements.
 const wxXmlNode* FindElement(const wxXmlNode* node, const wxString& name, bool recursive);
 
 /// The first element of that name among the node and the siblings after it, or null.

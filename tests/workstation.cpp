@@ -85,7 +85,7 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser && geteui
     fs::copy(icons, m_dirs["tool"]);
     fs::copy(icons, m_dirs["tool"] / "BundleIcons");
     const fs::path programs = m_wine ? WindowsProgram().parent_path() : fs::path(TOOL_DIR);
-    for (const char* program : {"FolderUpgrade", "FolderUpgradeCheck", "FolderUpgradeRecorded"})
+    for (const char* program : {"FolderUpgrade", "FolderUpgradeCheck", "FolderUpgradeRun", "FolderUpgradeRecorded"})
     {
         const fs::path file = programs / (program + Text(m_wine ? ".exe" : ""));
         if (fs::exists(file))

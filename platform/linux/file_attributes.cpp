@@ -25,28 +25,33 @@ class Node
 {
   public:
     explicit Node(LPCWSTR path)
-        : m_descriptor(open(NativePath(path).c_str(), O_PATH | O_NOFOLLOW | O_CLOEXEC)),
+        : m_descriptor(open(NativePath(path).utf8_str(), O_PATH | O_NOFOLLOW | O_CLOEXEC)),
           m_path("/proc/self/fd/" + std::to_string(m_descriptor))
     {
+        if (fstat(m_descriptor, &m_status) != 0)
+            m_status = {};
     }
 
     ~Node()
     {
-        if (m_descriptor >= 0)
-            close(m_descriptor);
+        close(m_descriptor);
     }
 
     Node(const Node&) = delete;
     Node& operator=(const Node&) = delete;
 
-    bool GetStatus(struct stat& status) const
+    // 0 if there is nothing, or a link.
+    mode_t Mode() const
     {
-        return m_descriptor >= 0 && fstat(m_descriptor, &status) == 0 && !S_ISLNK(status.st_mode);
+        return S_ISLNK(m_status.st_mode) ? 0 : m_status.st_mode;
     }
 
-    bool ChangeMode(mode_t from, mode_t to) const
+    bool ChangeMode(mode_t mode)
     {
-        return from == to || chmod(m_path.c_str(), to & 07777) == 0;
+        if (mode != m_status.st_mode && chmod(m_path.c_str(), mode & 07777) != 0)
+            return false;
+        m_status.st_mode = mode;
+        return true;
     }
 
     DWORD ReadStored() const
@@ -69,23 +74,15 @@ class Node
   private:
     const int m_descriptor;
     const std::string m_path;
+    struct stat m_status = {};
 };
 
-mode_t FileModeMask()
+// Those that are in the extended attribute.
+DWORD Stored(DWORD attributes, mode_t mode)
 {
-    static const mode_t mask = []()
-    {
-        const mode_t current = umask(0);
-        umask(current);
-        return current;
-    }();
-    return mask;
-}
-
-// The mode with write permission for those who may read, as far as the umask permits.
-mode_t Writable(mode_t mode)
-{
-    return mode | ((S_IRUSR | S_IWUSR | ((mode & (S_IRGRP | S_IROTH)) >> 1)) & ~FileModeMask());
+    const DWORD others = FILE_ATTRIBUTE_NORMAL | FILE_ATTRIBUTE_DIRECTORY |
+                         (S_ISDIR(mode) ? 0 : FILE_ATTRIBUTE_READONLY);
+    return attributes & ~others;
 }
 
 } // namespace
@@ -93,44 +90,31 @@ mode_t Writable(mode_t mode)
 DWORD GetFileAttributesW(LPCWSTR path)
 {
     const Node node(path);
-    struct stat status = {};
-    if (!node.GetStatus(status))
+    const mode_t mode = node.Mode();
+    if (mode == 0)
         return INVALID_FILE_ATTRIBUTES;
-    DWORD attributes = node.ReadStored() & ~(FILE_ATTRIBUTE_NORMAL | FILE_ATTRIBUTE_DIRECTORY);
-    if (S_ISDIR(status.st_mode))
+    DWORD attributes = Stored(node.ReadStored(), mode);
+    if (S_ISDIR(mode))
         return attributes | FILE_ATTRIBUTE_DIRECTORY;
-    attributes &= ~FILE_ATTRIBUTE_READONLY;
-    if ((status.st_mode & AnyWrite) == 0)
+    if ((mode & AnyWrite) == 0)
         attributes |= FILE_ATTRIBUTE_READONLY;
     return attributes != 0 ? attributes : FILE_ATTRIBUTE_NORMAL;
 }
 
 BOOL SetFileAttributesW(LPCWSTR path, DWORD attributes)
 {
-    const Node node(path);
-    struct stat status = {};
-    if (!node.GetStatus(status))
-        return 0;
-    DWORD stored = attributes & ~(FILE_ATTRIBUTE_NORMAL | FILE_ATTRIBUTE_DIRECTORY);
-    mode_t mode = status.st_mode;
-    if (!S_ISDIR(status.st_mode))
-    {
-        stored &= ~FILE_ATTRIBUTE_READONLY;
-        const bool isReadOnly = (attributes & FILE_ATTRIBUTE_READONLY) != 0;
-        const mode_t writable = (mode & AnyWrite) != 0 ? mode : Writable(mode);
-        mode = isReadOnly ? mode & ~AnyWrite : writable;
-    }
-    if (stored == node.ReadStored())
-        return node.ChangeMode(status.st_mode, mode) ? 1 : 0;
+    Node node(path);
+    const mode_t before = node.Mode();
     // Not even the owner can change an extended attribute of a file without write permission.
-    const mode_t between =
-        (status.st_mode & S_IWUSR) != 0 ? status.st_mode : status.st_mode | S_IWUSR;
-    const DWORD before = node.ReadStored();
-    const bool isStored = node.ChangeMode(status.st_mode, between) && node.WriteStored(stored);
-    if (isStored && node.ChangeMode(between, mode))
+    const mode_t writable = before | S_IWUSR;
+    mode_t after = before;
+    if (!S_ISDIR(before))
+        after = (attributes & FILE_ATTRIBUTE_READONLY) != 0 ? before & ~AnyWrite : writable;
+    if (before == 0)
+        return 0;
+    if (node.ChangeMode(writable) && node.WriteStored(Stored(attributes, before)) &&
+        node.ChangeMode(after))
         return 1;
-    if (isStored)
-        node.WriteStored(before);
-    node.ChangeMode(between, status.st_mode);
+    node.ChangeMode(before);
     return 0;
 }

@@ -1,12 +1,8 @@
 #include "platform/linux/native_path.h"
 
-#include <wx/string.h>
-
-#include <algorithm>
-
-std::string NativePath(const wchar_t* path)
+wxString NativePath(const wxString& path)
 {
-    std::string native = wxString(path).utf8_string();
-    std::replace(native.begin(), native.end(), '\\', '/');
+    wxString native = path;
+    native.Replace("\\", "/");
     return native;
 }

@@ -1,7 +1,7 @@
 // Paths as the system calls of this platform take them.
 #pragma once
 
-#include <string>
+#include <wx/string.h>
 
-/// The path in UTF-8, whatever the locale, with every backslash turned into a slash.
-std::string NativePath(const wchar_t* path);
+/// The path with every backslash turned into a slash.
+wxString NativePath(const wxString& path);

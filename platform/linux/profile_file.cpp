@@ -5,40 +5,28 @@
 #include "platform/regular_file.h"
 #include "platform/system.h"
 
-#include <wx/string.h>
-
-#include <algorithm>
 #include <string>
 
 namespace
 {
 
-const std::wstring LineEnd = L"\r\n";
+const char* const LineEnd = "\r\n";
 
-struct ProfilePath
+// For writing, refuses a read-only file, even to root, and creates a missing one.
+bool Open(LPCWSTR path, bool forWriting, RegularFile& file)
 {
-    explicit ProfilePath(const wxString& path)
-        : directory(path.BeforeLast('/'), Links::Follow), name(path.AfterLast('/'))
-    {
-    }
-
-    explicit ProfilePath(LPCWSTR path) : ProfilePath(wxString::FromUTF8(NativePath(path)))
-    {
-    }
-
-    const PinnedDirectory directory;
-    const wxString name;
-};
-
-// Returns false for a read-only file, even for root; creates a missing file.
-bool OpenForWriting(LPCWSTR path, RegularFile& file)
-{
-    const ProfilePath profile(path);
-    const DWORD attributes = GetFileAttributesW(path);
-    if (attributes == INVALID_FILE_ATTRIBUTES)
-        return file.CreateNew(profile.directory, profile.name) == RegularFile::Status::Open;
-    return (attributes & FILE_ATTRIBUTE_READONLY) == 0 &&
-           file.OpenForUpdate(profile.directory, profile.name) == RegularFile::Status::Open;
+    const wxString native = NativePath(path);
+    const PinnedDirectory directory(native.BeforeLast('/'), Links::Follow);
+    const wxString name = native.AfterLast('/');
+    const DWORD attributes = forWriting ? GetFileAttributesW(path) : 0;
+    RegularFile::Status status = RegularFile::Status::Refused;
+    if (!forWriting)
+        status = file.OpenForReading(directory, name);
+    else if (attributes == INVALID_FILE_ATTRIBUTES)
+        status = file.CreateNew(directory, name);
+    else if ((attributes & FILE_ATTRIBUTE_READONLY) == 0)
+        status = file.OpenForUpdate(directory, name);
+    return status == RegularFile::Status::Open;
 }
 
 } // namespace
@@ -47,27 +35,27 @@ BOOL WritePrivateProfileStringW(LPCWSTR section, LPCWSTR key, LPCWSTR value, LPC
 {
     RegularFile file;
     std::string bytes;
-    if (!OpenForWriting(path, file) || !file.Read(bytes))
+    if (!Open(path, true, file) || !file.Read(bytes))
         return 0;
     ProfileText profile(bytes);
-    std::wstring& text = profile.text;
+    wxString& text = profile.text;
     const ProfilePlace place = FindInProfile(text, section, key);
-    const std::wstring end = value + LineEnd;
+    const wxString setting = wxString(key) + "=" + value + LineEnd;
     if (place.hasKey)
     {
         // The name stays as it is spelled.
-        const size_t sign = text.find(L'=', place.begin);
+        const size_t sign = text.find('=', place.begin);
         const bool hasSign = sign < place.next;
         const size_t begin = hasSign ? sign + 1 : place.begin;
-        text.replace(begin, place.next - begin, hasSign ? end : key + (L"=" + end));
+        text.replace(begin, place.next - begin, hasSign ? setting.AfterFirst('=') : setting);
     }
     else
     {
-        const size_t at = place.hasSection ? place.begin : text.size();
-        const std::wstring title =
-            place.hasSection ? L"" : L"[" + std::wstring(section) + L"]" + LineEnd;
-        const bool needsEnd = at > 0 && text[at - 1] != L'\n';
-        text.insert(at, (needsEnd ? LineEnd : L"") + title + key + L"=" + end);
+        const size_t at = place.hasSection ? place.begin : text.length();
+        const wxString title =
+            place.hasSection ? wxString() : "[" + wxString(section) + "]" + LineEnd;
+        const bool needsEnd = at > 0 && text[at - 1] != '\n';
+        text.insert(at, (needsEnd ? LineEnd : "") + title + setting);
     }
     const std::string changed = profile.Bytes();
     return changed == bytes || file.Rewrite(bytes, changed) ? 1 : 0;
@@ -76,17 +64,12 @@ BOOL WritePrivateProfileStringW(LPCWSTR section, LPCWSTR key, LPCWSTR value, LPC
 DWORD GetPrivateProfileStringW(LPCWSTR section, LPCWSTR key, LPCWSTR defaultValue, LPWSTR buffer,
                                DWORD capacity, LPCWSTR path)
 {
-    std::string bytes;
-    std::wstring value = defaultValue;
-    const ProfilePath profile(path);
     RegularFile file;
-    if (file.OpenForReading(profile.directory, profile.name) == RegularFile::Status::Open &&
-        file.Read(bytes))
-    {
-        const ProfilePlace place = FindInProfile(ProfileText(bytes).text, section, key);
-        if (place.hasKey)
-            value = place.value;
-    }
+    std::string bytes;
+    ProfilePlace place;
+    if (Open(path, false, file) && file.Read(bytes))
+        place = FindInProfile(ProfileText(bytes).text, section, key);
+    const std::wstring value = place.hasKey ? place.value.ToStdWstring() : defaultValue;
     const size_t length = value.copy(buffer, capacity - 1);
     buffer[length] = L'\0';
     return static_cast<DWORD>(length);

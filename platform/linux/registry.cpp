@@ -5,60 +5,52 @@
 #include "platform/standard_folders.h"
 #include "platform/system.h"
 
-#include <wx/string.h>
+#include <wx/strconv.h>
+#include <wx/tokenzr.h>
 
 #include <algorithm>
-#include <cstdlib>
 #include <memory>
 #include <string>
 
 struct RegistryKey
 {
     ProfileText hive;
-    std::wstring section;
+    wxString section;
 };
 
 namespace
 {
 
 // UTF-16LE with a NUL. Each backslash and quote in the text has a backslash before it.
-std::string TextData(const std::wstring& text, bool isUtf8)
+std::string TextData(const wxString& text, bool isUtf8)
 {
-    std::wstring plain;
-    for (size_t i = 1; i < text.size() && text[i] != L'"'; ++i)
+    wxString plain;
+    for (size_t i = 1; i < text.length() && text[i] != '"'; ++i)
     {
-        i += text[i] == L'\\' && i + 1 < text.size() ? 1 : 0;
+        i += text[i] == '\\' && i + 1 < text.length() ? 1 : 0;
         plain += text[i];
     }
-    std::string data;
     if (isUtf8)
-        plain = wxString::FromUTF8(std::string(plain.begin(), plain.end())).ToStdWstring();
-    const wxCharBuffer units = wxString(plain).mb_str(wxMBConvUTF16LE());
-    data.assign(units.data(), units.length());
-    return data + std::string(2, '\0');
+        plain = wxString::FromUTF8(plain.To8BitData());
+    const wxCharBuffer units = plain.mb_str(wxMBConvUTF16LE());
+    return std::string(units.data(), units.length()) + std::string(2, '\0');
 }
 
 // Bytes separated by commas; after a comma, a backslash continues them on the next line.
-std::string BytesData(const std::wstring& text)
+std::string BytesData(const wxString& text)
 {
-    const wchar_t* at = text.c_str() + std::min(text.find(L':') + 1, text.size());
+    wxStringTokenizer bytes(text.AfterFirst(':'), ",\\ \t\r\n", wxTOKEN_STRTOK);
     std::string data;
-    wchar_t* end = nullptr;
-    for (auto byte = std::wcstoul(at, &end, 16); end != at; byte = std::wcstoul(at, &end, 16))
-    {
+    for (unsigned long byte = 0; bytes.GetNextToken().ToULong(&byte, 16);)
         data += static_cast<char>(byte);
-        at = end + std::wcsspn(end, L",\\");
-    }
     return data;
 }
 
-std::string NumberData(const std::wstring& text)
+std::string NumberData(const wxString& text)
 {
-    const unsigned long number = std::wcstoul(text.c_str() + text.find(L':') + 1, nullptr, 16);
-    std::string data;
-    for (unsigned shift = 0; shift < 32; shift += 8)
-        data += static_cast<char>(number >> shift);
-    return data;
+    unsigned long number = 0;
+    text.AfterFirst(':').ToULong(&number, 16);
+    return std::string(reinterpret_cast<const char*>(&number), sizeof(DWORD));
 }
 
 } // namespace
@@ -74,8 +66,8 @@ LSTATUS RegOpenKeyExW(HKEY hive, LPCWSTR path, DWORD options, REGSAM /*access*/,
         file.OpenForReading(folder + "/registry/" + name + ".reg") != RegularFile::Status::Open ||
         !file.Read(bytes))
         return ERROR_FILE_NOT_FOUND;
-    auto opened = std::make_unique<RegistryKey>(
-        RegistryKey{ProfileText(bytes), (name + "\\" + path).ToStdWstring()});
+    auto opened =
+        std::make_unique<RegistryKey>(RegistryKey{ProfileText(bytes), name + "\\" + path});
     if (!FindInProfile(opened->hive.text, opened->section, {}).hasSection)
         return ERROR_FILE_NOT_FOUND;
     *key = opened.release(); // owned by the caller until RegCloseKey
@@ -85,15 +77,14 @@ LSTATUS RegOpenKeyExW(HKEY hive, LPCWSTR path, DWORD options, REGSAM /*access*/,
 LSTATUS RegQueryValueExW(HKEY key, LPCWSTR name, DWORD* /*reserved*/, DWORD* /*type*/, BYTE* data,
                          DWORD* size)
 {
-    const std::wstring& text = key->hive.text;
-    const ProfilePlace place =
-        FindInProfile(text, key->section, L"\"" + std::wstring(name) + L"\"");
+    const wxString& text = key->hive.text;
+    const ProfilePlace place = FindInProfile(text, key->section, "\"" + wxString(name) + "\"");
     if (!place.hasKey)
         return ERROR_FILE_NOT_FOUND;
-    const wchar_t form = place.value.empty() ? L'\0' : place.value[0];
-    const std::string value = form == L'"'   ? TextData(place.value, key->hive.width == 1)
-                              : form == L'd' ? NumberData(place.value)
-                                             : BytesData(text.substr(place.begin));
+    const std::string value = place.value.StartsWith("\"")
+                                  ? TextData(place.value, key->hive.width == 1)
+                              : place.value.StartsWith("d") ? NumberData(place.value)
+                                                            : BytesData(text.Mid(place.begin));
     const bool fits = value.size() <= *size;
     *size = static_cast<DWORD>(value.size());
     if (fits)
