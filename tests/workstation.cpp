@@ -85,7 +85,8 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser && geteui
     fs::copy(icons, m_dirs["tool"]);
     fs::copy(icons, m_dirs["tool"] / "BundleIcons");
     const fs::path programs = m_wine ? WindowsProgram().parent_path() : fs::path(TOOL_DIR);
-    for (const char* program : {"FolderUpgrade", "FolderUpgradeCheck", "FolderUpgradeRun", "FolderUpgradeRecorded"})
+    for (const char* program :
+         {"FolderUpgrade", "FolderUpgradeCheck", "FolderUpgradeRun", "FolderUpgradeRecorded"})
     {
         const fs::path file = programs / (program + Text(m_wine ? ".exe" : ""));
         if (fs::exists(file))
@@ -226,7 +227,7 @@ Files Workstation::Snapshot() const
             if ((attributes & attribute) != 0)
                 files[place + "#"] += letter;
         }
-        const bool isProgram = StartsWith(path.filename().string(), "FolderUpgrade");
+        const bool isProgram = StartsWith(place, "tool/FolderUpgrade");
         files[place + end] = entry.is_fifo()                     ? Fifo
                              : entry.is_directory() || isProgram ? ""
                                                                  : ReadFile(path);
