@@ -79,9 +79,9 @@ char Event(const char* call, const char* path)
 using Call = long (*)(long, long, long, long, long);
 
 // The arguments are integers and pointers, which are all passed alike.
-long Try(const char* name, bool isPath, long failure, long a, long b, long c, long d, long e)
+long Try(Call real, const char* name, bool isPath, long failure, long a, long b, long c, long d,
+         long e)
 {
-    const auto real = reinterpret_cast<Call>(dlsym(RTLD_NEXT, name));
     char path[32] = {};
     std::snprintf(path, sizeof path, "/proc/self/fd/%ld", a);
     const int before = errno;
@@ -102,7 +102,8 @@ long Try(const char* name, bool isPath, long failure, long a, long b, long c, lo
     extern "C" long Wrapped_##name(long a, long b, long c, long d, long e) __asm__(#name);         \
     long Wrapped_##name(long a, long b, long c, long d, long e)                                    \
     {                                                                                              \
-        return Try(#name, isPath, failure, a, b, c, d, e);                                         \
+        static const auto real = reinterpret_cast<Call>(dlsym(RTLD_NEXT, #name));                  \
+        return Try(real, #name, isPath, failure, a, b, c, d, e);                                   \
     }
 
 WRAP(open64, true, -1)

@@ -86,7 +86,7 @@ class Faults : public testing::TestWithParam<Fault>
         m_status = m_workstation
                        .Start("FolderUpgrade", {"I"},
                               {{"LD_PRELOAD", FAILING_CALLS},
-                               {"ASAN_OPTIONS", "verify_asan_link_order=0"},
+                               {"ASAN_OPTIONS", "verify_asan_link_order=0:detect_leaks=0"},
                                {"FAULT_ROOT", root},
                                {"FAULT_NUMBER", std::to_string(number)},
                                {"FAULT_EVENTS", events},

@@ -251,7 +251,10 @@ Files Workstation::Snapshot() const
             if ((attributes & attribute) != 0)
                 files[place + "#"] += letter;
         }
-        files[place + end] = entry.is_fifo() ? Fifo : entry.is_directory() ? "" : ReadFile(path);
+        const bool isProgram = StartsWith(place, "tool/FolderUpgrade");
+        files[place + end] = entry.is_fifo()                     ? Fifo
+                             : entry.is_directory() || isProgram ? ""
+                                                                 : ReadFile(path);
     };
     for (const Text top : Tops)
     {

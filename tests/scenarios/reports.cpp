@@ -166,7 +166,7 @@ Job presets
 {hot}{/}A
   problem  registry value InstallPath in HKEY_LOCAL_MACHINE\SOFTWARE\Wow6432Node\Vantorix\QZA: )"
                         R"(missing, and no other key is looked at{nothing}
-  problem  stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl)"),
+  problem  stays in the folder being left (the folder being installed is unknown): {previous}{/}Booklet.tpl)"),
         with("NothingAsksForInstallPath", {{MachineHive, Removed}, {PresetPlace, Removed}})
             .FolderCfg(Written("{hot}{/}A"))
             .IsReported(R"(
@@ -176,7 +176,7 @@ Job presets
 Workstation
   problem  {Path}: ends in a separator; no template of a hot folder moves
 {hot}{/}A
-  problem  stays in the folder being left (in a sub-folder): {previous}{/}Booklet.tpl)"),
+  problem  stays in the folder being left (the registry value ends in a separator): {previous}{/}Booklet.tpl)"),
         withPath("PathEndsInASeparatorOnTheWayBack", "{PREVIOUS}{/2}")
             .FolderCfg(Written("{hot}{/}A"))
             .Preset("")
@@ -256,7 +256,7 @@ Job presets
 Job presets
   change   .P{/}Presets{/}presets.xml: {hot}{/}old{/}T -> {hot}{/}new{/}T (2 times)
 Templates
-  note     there is no folder {hot}{/}new yet; templates that will be looked for in it: 2)"),
+  note     there is no folder {hot}{/}new; templates that will be looked for in it: 2)"),
     };
 }
 

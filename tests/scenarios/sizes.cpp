@@ -70,6 +70,22 @@ std::vector<Scenario> Sizes()
     {
         return DocumentType("<!ATTLIST a b CDATA '" + Times(characters, "x") + "'>");
     };
+    // A Folder.cfg that could not be read again after a rewrite.
+    const auto outgrown = [](const Text& name, const Text& filter)
+    {
+        return Scenario(name)
+            .FolderCfg(Cfg("<FilterSetting>" + filter + "</FilterSetting>"))
+            .LogOfDisabledA(Found(MovedFrom) +
+                            "HF cfg file left as it is (the new content would be too large): " +
+                            CfgOf("A"));
+    };
+    const auto elsewhere = [](const Text& name, const Text& stored, const Text& path = "")
+    {
+        return Scenario(name)
+            .FolderCfg(Replaced(Cfg("", DocumentType(Replaced(Entities(5), "'x'", "'$'"))),
+                                MovedFrom, stored))
+            .LogOfDisabledA(Found(path.empty() ? stored : path));
+    };
     return {
         Folders(
             "WhatIsTooLargeStays",
@@ -93,6 +109,11 @@ std::vector<Scenario> Sizes()
         Scenario("TenThousandEntriesAndElementsAreKept")
             .FolderCfg(Cfg("<JobSetting>" + entries + "</JobSetting>" + filter), written)
             .LogOfDisabledA(Found(MovedFrom)),
+        outgrown("ManyQuotesWouldBeTooLarge", "<a b='" + Times(350000, "\"") + "'/>"),
+        outgrown("DeepIndentationWouldBeTooLarge",
+                 Times(1020, "<e>") + Times(2000, "<a/>") + Times(1020, "</e>")),
+        elsewhere("APathOf200000VariablesIsElsewhere", Times(200000, "$")),
+        elsewhere("AnExpandedPathOf300000VariablesIsElsewhere", "&a5;&a5;&a5;", Times(300000, "$")),
         listed("AListThatIsTooDeepIsEmpty", Times(6000, "<e>")).Log(""),
         listed("AListThatIsTooBigIsEmpty", listedA + Times(1600000, "<a/>")).Log(""),
         listed("AListOf20000EntriesIsRead",
