@@ -71,13 +71,13 @@ std::vector<Scenario> Sizes()
         return DocumentType("<!ATTLIST a b CDATA '" + Times(characters, "x") + "'>");
     };
     // A Folder.cfg that could not be read again after a rewrite.
-    const auto outgrown = [](const Text& name, const Text& filter)
+    const auto outgrown = [](const Text& name, const Text& inFilter)
     {
         return Scenario(name)
-            .FolderCfg(Cfg("<FilterSetting>" + filter + "</FilterSetting>"))
-            .LogOfDisabledA(Found(MovedFrom) +
-                            "HF cfg file left as it is (the new content would be too large): " +
-                            CfgOf("A"));
+            .FolderCfg(Cfg("<FilterSetting>" + inFilter + "</FilterSetting>"))
+            .LogOfDisabledA(
+                Found(MovedFrom) +
+                "HF cfg file left as it is (the new content would be too large): " + CfgOf("A"));
     };
     const auto elsewhere = [](const Text& name, const Text& stored, const Text& path = "")
     {
