@@ -88,7 +88,7 @@ def passes_once(root, is_under_wine):
     else:
         passed = all(run([root / "native/tests/scenario_test"], cwd=scratch, env={**environment, "GTEST_FILTER": tests},
                          preexec_fn=lambda: resource.setrlimit(resource.RLIMIT_AS, (memory, memory)))
-                     for tests in ("-Sizes/*:AtEachCall/*", "Sizes/*:AtEachCall/*"))
+                     for tests in ("-Sizes/*:AtEachCall/*", "Sizes/*", "AtEachCall/*"))
     shutil.rmtree(scratch)
     return passed
 

@@ -38,7 +38,8 @@ def wrong_includes(table):
         for number, line in enumerate(text.splitlines(), 1):
             match = INCLUDE.match(line)
             other = pathlib.PurePosixPath(match[2]).parent.as_posix() if match else folder
-            if (match and match[1] == '"' or other in table) and not is_allowed(table, folder, other):
+            is_ours = match and match[1] == '"' or other in table
+            if is_ours and not is_allowed(table, folder, other):
                 yield f'{path}:{number}: {folder} must not include {match[2]}'
 
 
