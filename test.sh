@@ -73,8 +73,6 @@ native() {
     cmake/install_packages.sh build test fuzz bench
     build sanitize
     run_tests sanitize
-    build fuzz
-    run_tests fuzz
     build bench
     run_tests bench
     checks
