@@ -8,12 +8,14 @@
 XmlLook LoadXml(const std::string& bytes, const XmlLimits& limits, wxXmlDocument& document)
 {
     const bool isHarmless = IsHarmlessXml(bytes);
-    const XmlLook look = isHarmless ? XmlLook() : LookAtXml(bytes, limits);
+    XmlLook look = isHarmless ? XmlLook() : LookAtXml(bytes, limits);
     if (!look.isWithinLimits)
         return look;
     RequireMemory(look.memory * limits.copies);
     const wxLogNull noSyntaxErrors;
     wxMemoryInputStream stream(bytes.data(), bytes.size());
     const bool isLoaded = document.Load(stream, L"UTF-8", wxXMLDOC_KEEP_WHITESPACE_NODES);
-    return isHarmless && !isLoaded ? LookAtXml(bytes, limits) : look;
+    if (isHarmless && !isLoaded)
+        look = LookAtXml(bytes, limits);
+    return look;
 }

@@ -17,11 +17,11 @@ struct XmlLimits
 /// A Folder.cfg is parsed, copied, written and parsed again. Within these limits a run and a check
 /// each take at most 0.5 s and 200 MB for it. The sample has 7 KB; 10,000 job settings and 10,000
 /// elements of a filter setting take about 16 million bytes of memory.
-constexpr XmlLimits FolderCfgLimits = {2 * 1024 * 1024, 24'000'000, 6, 100'000'000};
+constexpr XmlLimits FolderCfgLimits = {size_t{2} * 1024 * 1024, 24'000'000, 6, 100'000'000};
 
 /// The list of hot folders is parsed once. 250,000 folders of 60 characters take about 250 million
 /// bytes of memory.
-constexpr XmlLimits ListLimits = {64 * 1024 * 1024, 320'000'000, 2, 1'000'000'000};
+constexpr XmlLimits ListLimits = {size_t{64} * 1024 * 1024, 320'000'000, 2, 1'000'000'000};
 
 /// Where and why a document is not well-formed, in the parser's words.
 struct XmlSyntaxError
