@@ -13,7 +13,8 @@
 /// ignored. Replaces nothing if either folder is empty, or if XML cannot hold the text of the new
 /// one. Returns the number of replacements; nothing if the text would have more than LongestFile
 /// characters, and so could not be read again. Takes time proportional to the length of the text.
-std::optional<size_t> MovePresetPaths(wxString& text, const wxString& from, const wxString& to);
+std::optional<size_t> MovePresetPaths(wxString& text, const wxString& oldFolder,
+                                      const wxString& newFolder);
 
 /// The template paths of the text, each with what MovePresetPaths makes of it; what follows the
 /// search text up to the next double quote. isCutOff: the last one has no double quote.
