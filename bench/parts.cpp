@@ -28,11 +28,6 @@ const char* const NewTemplates = "/srv/imposition/new/template";
 // A folder of this process, used as the user's application data folder and as a hot folder.
 fs::path root;
 
-wxString CfgPath(const char* name)
-{
-    return wxString::FromUTF8((root / name).string());
-}
-
 void LoadCfg(benchmark::State& state)
 {
     std::ifstream file(fs::path(SAMPLE_HOT_FOLDER) / "[_ORX_HotFolder_]/Folder.cfg",
@@ -41,7 +36,7 @@ void LoadCfg(benchmark::State& state)
     for (auto _ : state)
     {
         wxXmlDocument document;
-        if (LoadXml(bytes, document, wxXMLDOC_KEEP_WHITESPACE_NODES) != XmlLoad::Loaded)
+        if (!LoadXml(bytes, FolderCfgLimits, document).isWithinLimits)
             state.SkipWithError("not loaded");
     }
 }
@@ -54,9 +49,14 @@ void SaveCfg(benchmark::State& state)
     for (std::int64_t i = 0; i < state.range(0); ++i)
         table[wxString::Format("ORXSetting%05d", static_cast<int>(i))] = {"As the server says", "1",
                                                                           "Wie der Server sagt"};
+    std::string content;
     for (auto _ : state)
-        SaveHotFolderSettings(CfgPath("saved.cfg"), {}, table, {}, wxXmlNode(), {}, {});
-    state.counters["bytes"] = static_cast<double>(fs::file_size(root / "saved.cfg"));
+    {
+        wxXmlNode noFilter;
+        content = FolderCfgBytes({}, table, {}, noFilter, {}, {});
+        std::ofstream(root / "saved.cfg", std::ios::binary) << content;
+    }
+    state.counters["bytes"] = static_cast<double>(content.size());
 }
 BENCHMARK(SaveCfg)->Arg(30)->Arg(10000)->Unit(benchmark::kMicrosecond);
 
@@ -77,7 +77,8 @@ void MovePaths(benchmark::State& state)
     for (auto _ : state)
     {
         moved = MovePresetPaths(text, isForth ? OldTemplates : NewTemplates,
-                                isForth ? NewTemplates : OldTemplates);
+                                isForth ? NewTemplates : OldTemplates)
+                    .value_or(0);
         isForth = !isForth;
     }
     state.counters["hits"] = static_cast<double>(moved);
@@ -94,8 +95,9 @@ BENCHMARK(LogLine)->Iterations(1000)->Unit(benchmark::kMicrosecond);
 
 void RefreshIcon(benchmark::State& state)
 {
+    const HotFolder folder(wxString::FromUTF8(root.string()));
     for (auto _ : state)
-        ApplyFolderIcon(wxString::FromUTF8(root.string()), "hf_folder.ico");
+        ApplyFolderIcon(folder, "hf_folder.ico");
     if (!fs::exists(root / "Desktop.ini"))
         state.SkipWithError("not applied");
 }
