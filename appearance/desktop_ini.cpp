@@ -95,7 +95,7 @@ DesktopIniChange DecideDesktopIni(const HotFolder& folder, const wxString& iconN
     change.isCustomised = GetPackedShellVersion() >= CustomFolderVersion;
     DecideKind(folder, change);
     if (change.isCustomised)
-        change.folder = DecideAttributes(folder.directory.Reach(L""), FILE_ATTRIBUTE_SYSTEM,
+        change.folder = DecideAttributes(folder.directory.Reach({}), FILE_ATTRIBUTE_SYSTEM,
                                          FILE_ATTRIBUTE_READONLY);
     // A refresh first removes all attributes.
     const DWORD removed = change.kind == Kind::Refresh ? ~ReadOnlyAndSystem : 0;

@@ -42,7 +42,7 @@ bool ApplyFolderIcon(const HotFolder& folder, const wxString& iconName)
     using Kind = DesktopIniChange::Kind;
     const wxString iniPath = IniPath(folder.path);
     const wxString reachedIni = folder.directory.Reach(DesktopIniName);
-    const wxString reachedFolder = folder.directory.Reach(L"");
+    const wxString reachedFolder = folder.directory.Reach({});
     const DesktopIniChange change = DecideDesktopIni(folder, iconName);
     if (change.kind == Kind::Stays)
         RunLog(

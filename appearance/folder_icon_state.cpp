@@ -22,7 +22,7 @@ bool IsEnabled(HotFolder& folder)
 bool HasError(const HotFolder& folder)
 {
     const wxString path = folder.privateDir.Reach(ErrorFileName);
-    return wxFileName::IsDirReadable(folder.privateDir.Reach(L"")) &&
+    return wxFileName::IsDirReadable(folder.privateDir.Reach({})) &&
            (IsLink(path) ||
             (wxFileName::Exists(path, wxFILE_EXISTS_ANY | wxFILE_EXISTS_NO_FOLLOW) &&
              !wxDirExists(path)));

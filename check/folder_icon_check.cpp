@@ -63,7 +63,7 @@ void CheckDesktopIni(const HotFolder& folder, const wxString& iconName, Report& 
 {
     using Kind = DesktopIniChange::Kind;
     const DesktopIniChange change = DecideDesktopIni(folder, iconName);
-    const wxString path = folder.directory.Reach(L"");
+    const wxString path = folder.directory.Reach({});
     switch (change.kind)
     {
     case Kind::Stays:

@@ -94,15 +94,16 @@ void CheckRunLog(Report& report)
 {
     const wxString folder = RunLogDirPath();
     const wxString path = folder + RunLogFileName;
-    if (IsLink(folder.Left(folder.length() - 1)) || IsLink(path))
-    {
-        report.Problem("there will be no run log: it is reached over a link: " + path);
-        return;
-    }
+    // First, because what cannot be looked at counts as a link.
     const wxString obstacle = WhyOutOfReach(folder);
     if (!obstacle.empty())
     {
         report.Problem("there will be no run log: its folder " + obstacle + ": " + folder);
+        return;
+    }
+    if (IsLink(folder.Left(folder.length() - 1)) || IsLink(path))
+    {
+        report.Problem("there will be no run log: it is reached over a link: " + path);
         return;
     }
     if (!wxDirExists(folder))

@@ -89,7 +89,7 @@ RegularFile::Status RegularFile::Replace(const PinnedDirectory& directory, const
 
 bool RegularFile::MayReplace(const PinnedDirectory& directory)
 {
-    return MayCreateIn(directory.Reach(L""));
+    return MayCreateIn(directory.Reach({}));
 }
 
 bool RegularFile::Close()
