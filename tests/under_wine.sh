@@ -43,4 +43,13 @@ wait
 WINEPREFIX=$prefixes/root "$server" -p || true
 as_other "$server" -p || true
 
-timeout 1500 "$test_dir/tests/scenario_test"
+outcome=0
+timeout 1500 "$test_dir/tests/scenario_test" | tee "$prefixes/log" || outcome=$?
+# What test.sh counts, and what it shows of the skipped ones. The reason is the line before.
+awk '
+    /^\[  SKIPPED \] .* ms\)$/ { sub(/.*\//, "", $4); print "skipped " $4 ": " reason; ++skipped }
+    /^\[       OK \]/ { ++passed }
+    /^\[  FAILED  \] .* ms\)$/ { ++failed }
+    NF { reason = $0 }
+    END { printf "%d passed, %d failed, %d skipped\n", passed, failed, skipped }' "$prefixes/log"
+exit "$outcome"
