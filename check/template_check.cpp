@@ -49,7 +49,9 @@ Place Look(const wxString& path, const wxString& trusted)
     wxFileName name(WithoutFinalSeparators(path), wxPATH_NATIVE);
     if (!IsTooLongPath(path))
         name.Normalize(wxPATH_NORM_DOTS, wxString(), wxPATH_NATIVE);
-    if (IsTooLongPath(path) || !IsOnLocalDrive(name.GetFullPath()))
+    const bool isOnServer = path.length() > 1 && wxFileName::IsPathSeparator(path[0]) &&
+                            wxFileName::IsPathSeparator(path[1]);
+    if (IsTooLongPath(path) || isOnServer || !IsOnLocalDrive(name.GetFullPath()))
         return Place::NotLookedAt;
     const size_t trustedDepth =
         IsIn(path, trusted) ? wxFileName::DirName(Comparable(trusted)).GetDirCount() : 0;

@@ -12,7 +12,7 @@ packages() {
     case $1 in
         build) echo g++ cmake ninja-build libwxgtk3.2-dev libexpat1-dev ;;
         sample) echo attr python3 ;;
-        test) echo libgtest-dev ;;
+        test) echo libgtest-dev libgmock-dev ;;
         fuzz) echo clang libclang-rt-dev python3 ;;
         checks) echo clang-format clang-tidy cppcheck shellcheck python3 ;;
         coverage) echo gcovr ;;
