@@ -61,9 +61,13 @@ wxString WhyItStays(const TemplateMove& move, TemplateFolders& folders)
         return "the folder being installed is unknown";
     if (move.outcome != Outcome::Elsewhere)
         return "in a file that stays as it is";
-    return IsDirectlyIn(move.storedPath, WithoutFinalSeparators(folders.From().path))
-               ? "the registry value ends in a separator"
-               : "in a sub-folder";
+    const wxString from = WithoutFinalSeparators(folders.From().path);
+    wxFileName folded(IsTooLongPath(move.storedPath) ? wxString() : move.storedPath);
+    folded.Normalize(wxPATH_NORM_DOTS, wxString(), wxPATH_NATIVE);
+    if (IsDirectlyIn(move.storedPath, from))
+        return "the registry value ends in a separator";
+    return IsDirectlyIn(folded.GetFullPath(), from) ? "its last folder is a dot"
+                                                    : "in a sub-folder";
 }
 
 // Returns whether the file is rewritten.

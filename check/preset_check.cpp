@@ -10,6 +10,7 @@
 
 #include <algorithm>
 #include <map>
+#include <set>
 
 namespace
 {
@@ -105,6 +106,7 @@ Findings CheckPaths(const wxString& text, bool isRewritten, TemplateCheck& check
     const wxString& from = check.folders.From().path;
     const wxString& to = check.folders.To().path;
     std::map<std::pair<wxString, wxString>, size_t> paths; // stored and moved -> how often
+    std::set<wxString> judged;
     Findings findings;
     for (const PresetPath& path : FindPresetPaths(text, from, to))
     {
@@ -117,10 +119,11 @@ Findings CheckPaths(const wxString& text, bool isRewritten, TemplateCheck& check
     {
         const auto& [stored, left] = path;
         const wxString decoded = IsTooLongPath(left) ? left : Decoded(left);
-        check.Judge(decoded,
-                    isRewritten ? WhyItStays(left, decoded, check.folders)
-                                : "in a file that stays as it is",
-                    findings);
+        if (judged.insert(left).second)
+            check.Judge(decoded,
+                        isRewritten ? WhyItStays(left, decoded, check.folders)
+                                    : "in a file that stays as it is",
+                        findings);
         if (stored == left)
             continue;
         findings.changes.push_back(
