@@ -36,7 +36,7 @@ std::map<wxString, bool> ReadMounts()
 bool IsOnLocalDrive(const wxString& path)
 {
     static const std::map<wxString, bool> mounts = ReadMounts();
-    bool isLocal = true; // the root of a changed root is not in the list
+    bool isLocal = true;                           // the root of a changed root is not in the list
     for (const auto& [directory, isHere] : mounts) // the longest one that holds the path is last
     {
         if ((path + "/").StartsWith(directory))
