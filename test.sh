@@ -83,7 +83,6 @@ windows() {
     say "Building wxWidgets for Windows, unless it is there"
     cmake/windows/build_wxwidgets.sh
     build windows
-    build native
     run_tests windows
 }
 

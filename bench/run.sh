@@ -53,7 +53,7 @@ if [ "$what" = windows ]; then
     cmake/install_packages.sh mingw windows
     quietly cmake --preset bench-windows
     quietly cmake --build --preset bench-windows
-    { machine && xvfb-run -a bench/measure.py windows build/bench-windows '' '' "$@"; } | tee "$build/windows.md"
+    { machine && bench/measure.py windows build/bench-windows '' '' "$@"; } | tee "$build/windows.md"
     exit
 fi
 

@@ -12,13 +12,13 @@ packages() {
     case $1 in
         build) echo g++ cmake ninja-build libwxgtk3.2-dev libexpat1-dev ;;
         sample) echo attr python3 ;;
-        test) echo libgtest-dev libgmock-dev ;;
+        test) echo libgtest-dev ;;
         fuzz) echo clang libclang-rt-dev python3 ;;
         checks) echo clang-format clang-tidy cppcheck shellcheck python3 ;;
         coverage) echo gcovr ;;
         bench) echo libbenchmark-dev python3 python3-lxml ;;
         mingw) echo g++-mingw-w64-x86-64-posix dpkg-dev make ;;
-        windows) echo googletest wine64 xvfb xauth xdotool zip wixl msitools nsis osslsigncode openssl python3 ;;
+        windows) echo googletest wine64 zip wixl msitools nsis osslsigncode openssl python3 ;;
         *) echo "No such group of packages: $1" >&2; return 2 ;;
     esac
 }

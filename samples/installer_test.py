@@ -3,11 +3,10 @@
 
     samples/installer_test.py BUILD_DIR
 
-BUILD_DIR is the build folder of the preset "windows". Wine gets its own prefix and display. The
+BUILD_DIR is the build folder of the preset "windows". Wine gets its own prefix. The
 workstation has two hot folders (one template moves) and a job preset. Nobody presses the button of
 a message box.
 """
-import os
 import pathlib
 import re
 import subprocess
@@ -206,8 +205,5 @@ class Installers(unittest.TestCase):
 
 
 if __name__ == "__main__":
-    if not os.environ.get("INSTALLER_TEST_DISPLAY"):
-        os.environ["INSTALLER_TEST_DISPLAY"] = "1"
-        os.execvp("xvfb-run", ["xvfb-run", "-a", sys.executable, *sys.argv])
     BUILD = pathlib.Path(sys.argv.pop()).resolve()
     unittest.main()

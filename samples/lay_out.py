@@ -87,7 +87,7 @@ class Workstation:
 
 
 class WineWorkstation(Workstation):
-    """Drive C: of a new Wine prefix; its programs need a display."""
+    """Drive C: of a new Wine prefix, whose windows nobody sees."""
     separator = "\\"
     loader, server = "/usr/lib/wine/wine64", "/usr/lib/wine/wineserver64"
 
@@ -97,10 +97,14 @@ class WineWorkstation(Workstation):
         self.user, self.machine = self.root / "users/root/AppData/Roaming", self.root / "ProgramData"
         self.environment = {**os.environ, "WINEPREFIX": str(prefix), "HOME": str(prefix), "USER": "root", "LC_ALL": "C.UTF-8",
                             "WINEDEBUG": "-all", "WINEDLLOVERRIDES": "mscoree=;mshtml="}
+        self.environment.pop("DISPLAY", None)
+        for command in (("wineboot", "--init"),
+                        ("reg", "add", r"HKCU\Software\Wine\Drivers", "/v", "Graphics", "/d", "null", "/f")):
+            if self.wine(*command) != 0:
+                self.close()
+                raise RuntimeError("Wine made no prefix")
+        self.close()  # the driver is chosen when the server starts
         subprocess.run([self.server, "-p"], env=self.environment, check=True)  # it keeps running between the programs
-        if self.wine("wineboot", "--init") != 0:
-            self.close()
-            raise RuntimeError("Wine made no prefix")
 
     def wine(self, *command, output=subprocess.DEVNULL):
         """The exit status. The output must not be a pipe, because Wine's services keep it open."""

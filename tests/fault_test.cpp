@@ -63,8 +63,6 @@ class Faults : public testing::TestWithParam<Fault>
   protected:
     void SetUp() override
     {
-        if (IsWindowsProgram())
-            GTEST_SKIP() << "Windows loads nothing before its own libraries";
         Run(0, "f", {});
         m_after = m_workstation.Snapshot();
         m_workstation.LayOut(m_files);

@@ -55,7 +55,7 @@ Scenario& Scenario::Shell(const Text& version, const Text& calls)
 {
     shellVersion = version;
     shellCalls = calls;
-    return NotUnderWine("Wine's own shell is called there");
+    return NotOnWindows("the system's own shell is called");
 }
 
 Scenario& Scenario::IsReported(const Text& lines)

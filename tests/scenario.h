@@ -34,6 +34,7 @@ struct Scenario
     Text log; // empty for that of the earlier run
     bool libraryReports = false;
     bool asOtherUser = false;
+    Text notOnWindows;
     Text notUnderWine;
     Text shellVersion;
     Text shellCalls;
@@ -58,7 +59,8 @@ struct Scenario
     SETTER(Run, arguments, )
     /// For tests of refusals: root is refused nothing.
     SETTER(AsOtherUser, asOtherUser, = true)
-    /// The reason why the scenario is skipped there.
+    /// The reason why the scenario is skipped there, or only under Wine.
+    SETTER(NotOnWindows, notOnWindows, )
     SETTER(NotUnderWine, notUnderWine, )
 
     /// The whole log, with LF instead of CR LF; if no log is given, that of the earlier run stays.
@@ -84,6 +86,19 @@ struct Scenario
 /// Everything on the workstation before the run, the usual files included.
 Files WorkstationBefore(const Scenario& scenario);
 
+/// The reason why the scenario is skipped on this system, empty if it is not.
+inline Text WhySkipped(const Scenario& scenario)
+{
+    const Text onWindows = IsWindows ? scenario.notOnWindows : "";
+    return IsWine() && onWindows.empty() ? scenario.notUnderWine : onWindows;
+}
+
+/// The name of its test. Under Wine root is refused nothing, so these are run by another user.
+inline Text TestName(const Scenario& scenario)
+{
+    return scenario.name + (scenario.asOtherUser ? "_AsOtherUser" : "");
+}
+
 /// The places that differ in two snapshots, with both texts, or Removed.
 using Difference = std::pair<Text, Text>;
 std::map<Text, Difference> Differences(const Files& left, const Files& right);
@@ -101,4 +116,4 @@ inline void PrintTo(const Scenario& scenario, std::ostream* stream)
 /// Makes tests from the scenarios that the function returns, with its name.
 #define TEST_SCENARIOS(function)                                                                   \
     INSTANTIATE_TEST_SUITE_P(function, Workstations, testing::ValuesIn(function()),                \
-                             [](const auto& scenario) { return scenario.param.name; })
+                             [](const auto& scenario) { return TestName(scenario.param); })

@@ -28,15 +28,11 @@ Text ProfileMeaning(Text text)
     return testing::PrintToString(meaning);
 }
 
-// The text as far as it is the tool's. Wine does not show that a directory is read-only.
+// The text as far as it is the tool's.
 Text Meaning(const Text& place, const Text& text)
 {
-    const bool isAttributes = place.back() == '#';
-    if (!IsWindowsProgram())
-        return text;
-    if (isAttributes && std::count(place.begin(), place.end(), '/') == 1)
-        return text.substr(StartsWith(text, "R") ? 1 : 0);
-    return !isAttributes && place.find("Desktop.ini") != Text::npos ? ProfileMeaning(text) : text;
+    const bool isProfile = place.back() != '#' && place.find("Desktop.ini") != Text::npos;
+    return IsWindows && isProfile ? ProfileMeaning(text) : text;
 }
 
 } // namespace
@@ -61,9 +57,10 @@ void ExpectEqual(const Files& expected, const Files& actual, const Text& when)
     for (const auto& [place, difference] : Differences(expected, actual))
     {
         const auto& [wanted, got] = difference;
-        const auto end = wanted.begin() + static_cast<long>(std::min(wanted.size(), got.size()));
+        const auto end =
+            wanted.begin() + static_cast<std::ptrdiff_t>(std::min(wanted.size(), got.size()));
         const auto at = std::mismatch(wanted.begin(), end, got.begin()).first - wanted.begin();
-        const size_t from = static_cast<size_t>(std::max(at - 200, 0L));
+        const size_t from = static_cast<size_t>(std::max<std::ptrdiff_t>(at - 200, 0));
         EXPECT_EQ(wanted.substr(from, 2000), got.substr(from, 2000)) << place << when;
     }
 }
@@ -173,7 +170,7 @@ void RunAndCompare(const Scenario& scenario)
     EXPECT_EQ(workstation.Expand(scenario.shellCalls), run.output);
     EXPECT_EQ(scenario.libraryReports, !run.libraryLog.empty()) << run.libraryLog;
     const Files after = workstation.Snapshot();
-    if (IsWindowsProgram() && scenario.libraryReports)
+    if (IsWindows && scenario.libraryReports)
     {
         EXPECT_EQ("A message box, with the run log\n" + after.at(LogPlace), run.libraryLog)
             << "One box, after everything was done";
@@ -194,7 +191,7 @@ void RunAndCompare(const Scenario& scenario)
 
 TEST_P(Workstations, IsAsExpectedAfterTheRun)
 {
-    if (IsWindowsProgram() && !GetParam().notUnderWine.empty())
-        GTEST_SKIP() << GetParam().notUnderWine;
+    if (!WhySkipped(GetParam()).empty())
+        GTEST_SKIP() << WhySkipped(GetParam());
     RunAndCompare(GetParam());
 }

@@ -33,7 +33,7 @@ bool StartsWith(const Text& text, const Text& start)
 Text ToUtf16(const Text& text)
 {
     Text result = "\xFF\xFE";
-    for (const char16_t unit : std::filesystem::path(text).u16string()) // as file names are UTF-8
+    for (const char16_t unit : std::filesystem::u8path(text).u16string())
         result += {static_cast<char>(unit & 0xFF), static_cast<char>(unit >> 8)};
     return result;
 }

@@ -5,13 +5,9 @@
 #include <wx/string.h>
 
 #include <algorithm>
-#include <array>
 #include <cctype>
-#include <cstdlib>
+#include <functional>
 #include <stdexcept>
-#include <sys/stat.h>
-#include <sys/wait.h>
-#include <unistd.h>
 
 namespace fs = std::filesystem;
 
@@ -21,29 +17,31 @@ namespace
 const Text Link = "{link:";
 const Text Fifo = "{fifo}";
 const Text PrivateDir = "[_ORX_HotFolder_]";
-// The application data folders also hold what is not the scenarios'.
-const auto Tops = {"hot",
-                   "default",
-                   "previous",
-                   "elsewhere",
-                   "tool",
-                   "user/ORX",
-                   "user/ORX_Installers",
-                   "machine/hotfolder",
-                   "user/registry",
-                   "machine/registry"};
+// The application data folders also hold what is not the scenarios'. Links lead elsewhere, so that
+// comes last.
+std::vector<Text> Tops()
+{
+    std::vector<Text> tops = {"hot",
+                              "default",
+                              "previous",
+                              "machine/hotfolder",
+                              "tool",
+                              "user/ORX",
+                              "user/ORX_Installers",
+                              "elsewhere"};
+    if (!IsWindows) // where hives are files
+        tops.insert(tops.end(), {"machine/registry", "user/registry"});
+    return tops;
+}
+
 const auto Attributes = {std::pair('R', FILE_ATTRIBUTE_READONLY),
                          {'H', FILE_ATTRIBUTE_HIDDEN},
                          {'S', FILE_ATTRIBUTE_SYSTEM}};
 
-// The limits of a run, as the beginning of its command. A program with sanitizers needs more.
-const Text& Limits()
+// path::wstring depends on the locale.
+wxString WideName(const fs::path& path)
 {
-    static const Text program = ReadFile(ProgramDir() / "FolderUpgrade");
-    static const Text limits = program.find("__asan_init") == Text::npos
-                                   ? "ulimit -v 700000; exec timeout 10 "
-                                   : "exec timeout 120 ";
-    return limits;
+    return wxString::FromUTF8(path.u8string());
 }
 
 Text Repeated(int count, const Text& text)
@@ -62,66 +60,54 @@ Text Repeated(int count, const Text& text)
 
 } // namespace
 
-Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser && geteuid() == 0)
+Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser), m_root(NewRoot())
 {
-    Text pattern = (fs::temp_directory_path() / "work station XXXXXX").string();
-    if (!mkdtemp(pattern.data()))
-        throw std::runtime_error("no temporary folder");
-    m_root = pattern;
-    fs::permissions(m_root, fs::perms(0755));
     m_dirs = {{"hot", m_root / "Hot Folders"},
-              {"user", m_root / "user data"},
-              {"machine", m_root / "machine data"},
-              {"tool", m_root / "Tool Größe"},
-              {"default", m_root / "Apps ä" / "template"},
-              {"previous", m_root / "Vorige 版"},
+              {"user", UserDataDir(m_root)},
+              {"machine", MachineDataDir(m_root)},
+              {"tool", m_root / fs::u8path("Tool Größe")},
+              {"default", m_root / fs::u8path("Apps ä") / "template"},
+              {"previous", m_root / fs::u8path("Vorige 版")},
               {"elsewhere", m_root / "elsewhere"}};
-    if (IsWindowsProgram())
-    {
-        m_wine = std::make_unique<Wine>(m_asOtherUser, m_root);
-        m_dirs["user"] = m_wine->UserDataDir();
-        m_dirs["machine"] = m_wine->MachineDataDir();
-    }
-    const Text separator = m_wine ? "\\" : "/";
-    const Text root = (m_wine ? "H:" : m_root.string()) + separator;
-    m_tokens = {{"{hot}", root + "Hot Folders"},
-                {"{tool}", root + "Tool Größe"},
-                {"{app}", root + "Apps ä"},
-                {"{default}", root + "Apps ä" + separator + "template"},
-                {"{previous}", root + "Vorige 版"},
-                {"{machine}", m_wine ? "C:\\ProgramData" : m_dirs["machine"].string()},
-                {"{user}", m_wine ? m_wine->UserDataPath() : m_dirs["user"].string()},
-                {"{/}", separator}};
+    for (const auto& [name, folder] : m_dirs)
+        m_tokens["{" + name + "}"] = folder.u8string();
+    m_tokens["{app}"] = m_dirs["default"].parent_path().u8string();
+    m_tokens["{/}"] = Separator;
     for (const auto& [token, value] : Files(m_tokens))
     {
         Text capitals = token == "{/}" ? "{/2}" : token;
         std::transform(capitals.begin(), capitals.end(), capitals.begin(), ::toupper);
         m_tokens[capitals] = Replaced(value, "\\", "\\\\");
     }
-    const fs::path icons = ProgramDir() / "BundleIcons";
-    fs::copy(icons, m_dirs["tool"]);
-    fs::copy(icons, m_dirs["tool"] / "BundleIcons");
-    for (const char* program :
+    fs::create_directories(m_dirs["tool"] / "BundleIcons");
+    for (const auto& icon : fs::directory_iterator(ProgramDir() / "BundleIcons"))
+    {
+        for (const char* folder : {"", "BundleIcons"})
+            fs::copy_file(icon.path(), m_dirs["tool"] / folder / icon.path().filename());
+    }
+    for (const Text name :
          {"FolderUpgrade", "FolderUpgradeCheck", "FolderUpgradeRun", "FolderUpgradeRecorded"})
     {
-        const fs::path file = ProgramDir() / (program + Text(m_wine ? ".exe" : ""));
-        if (fs::exists(file))
-            fs::copy(file, m_dirs["tool"]);
+        const fs::path program = name + ProgramSuffix;
+        if (fs::exists(ProgramDir() / program))
+            fs::copy_file(ProgramDir() / program, m_dirs["tool"] / program);
     }
 }
 
 Workstation::~Workstation()
 {
-    std::error_code ignored;
-    fs::remove_all(m_root, ignored);
+    for (const Text& top : Tops())
+        RemoveTree(HostPath(top));
+    RemoveTree(m_root);
 }
 
 fs::path Workstation::HostPath(const Text& place) const
 {
     const size_t end = std::min(place.find('/'), place.size());
     const Text rest = Replaced(place.substr(end), "[P]", PrivateDir);
-    return m_dirs.at(place.substr(0, end)).string() +
-           rest.substr(0, rest.find_last_not_of('/') + 1);
+    return fs::u8path(m_dirs.at(place.substr(0, end)).u8string() +
+                      rest.substr(0, rest.find_last_not_of('/') + 1))
+        .make_preferred();
 }
 
 Text Workstation::Expand(Text text) const
@@ -139,11 +125,11 @@ Text Workstation::Expand(Text text) const
     if (StartsWith(text, "{utf16}"))
         return ToUtf16(text.substr(7));
     if (StartsWith(text, "{icon:"))
-        return ReadFile(ProgramDir() / text.substr(6, text.size() - 7));
+        return ReadFile(ProgramDir() / "BundleIcons" / text.substr(6, text.size() - 7));
     return text;
 }
 
-void Workstation::SetAttributes(const Text& place, const Text& letters) const
+void Workstation::SetAttributes(const Text& place, const Text& letters)
 {
     const fs::path path = HostPath(place);
     const auto has = [&](char letter)
@@ -153,12 +139,19 @@ void Workstation::SetAttributes(const Text& place, const Text& letters) const
     DWORD attributes = 0;
     for (const auto& [letter, attribute] : Attributes)
         attributes |= has(letter) ? attribute : 0;
-    if ((attributes != 0 &&
-         SetFileAttributesW(wxString::FromUTF8(path.string()).wc_str(), attributes) == 0) ||
-        (has('X') && chown(path.c_str(), 0, 0) != 0))
-        throw std::runtime_error("cannot set " + letters + " of " + place);
-    if (has('0') || has('L'))
-        fs::permissions(path, has('0') ? fs::perms::none : fs::perms::owner_exec);
+    // Wine cannot set the others on a file that is read-only already.
+    for (const DWORD each : {attributes & ~FILE_ATTRIBUTE_READONLY, attributes})
+    {
+        if (each != 0 && SetFileAttributesW(WideName(path).wc_str(), each) == 0)
+            throw std::runtime_error("cannot set " + letters + " of " + place);
+    }
+    for (const char letter : {'X', '0', 'L'})
+    {
+        if (has(letter) && IsWindows && letter == '0' && fs::is_regular_file(path))
+            m_inUse.push_back(path);
+        else if (has(letter))
+            Refuse(path, letter);
+    }
 }
 
 void Workstation::Put(const Text& place, const Text& text) const
@@ -167,109 +160,95 @@ void Workstation::Put(const Text& place, const Text& text) const
     fs::create_directories(path.parent_path());
     if (StartsWith(text, Link))
     {
-        const Text target = Expand(text.substr(Link.size(), text.rfind('}') - Link.size()));
-        fs::create_symlink(target[0] == '/' ? fs::path(target) : HostPath(target), path);
+        const fs::path target = HostPath(text.substr(Link.size(), text.size() - Link.size() - 1));
+        if (place.back() == '/')
+            fs::create_directories(target);
+        MakeLink(target, path);
     }
     else if (place.back() == '/')
         fs::create_directories(path);
-    else if (text != Fifo)
+    else if (text == Fifo)
+        MakeFifo(path);
+    else
         WriteFile(path, Expand(text));
-    else if (mkfifo(path.c_str(), 0644) != 0)
-        throw std::runtime_error("no FIFO at " + place);
 }
 
 void Workstation::LayOut(const Files& files)
 {
-    for (const Text top : Tops)
+    m_inUse.clear();
+    std::vector<fs::path> folders = {m_root};
+    for (const Text& top : Tops())
     {
+        folders.push_back(HostPath(top));
         if (top != "tool")
-            fs::remove_all(HostPath(top));
+            RemoveTree(folders.back());
     }
+    std::vector<Text> hives;
     for (const auto& [place, text] : files)
     {
-        if (place.back() != '#')
+        const bool isHive = place == MachineHive || place == UserHive;
+        if (isHive)
+            hives.push_back(Expand(text));
+        if (place.back() != '#' && !(IsWindows && isHive))
             Put(place, text);
     }
     if (m_asOtherUser)
+        GiveAway(folders);
+    SetRegistry(hives);
+    // In this order, files come before their directory, which may not be accessible afterwards.
+    for (auto file = files.rbegin(); file != files.rend(); ++file)
     {
-        Text command = "chown -Rh nobody:nogroup " + Quoted(m_root);
-        for (const Text top : Tops)
-            command += fs::exists(HostPath(top)) ? Quoted(HostPath(top)) : "";
-        if (std::system(command.c_str()) != 0)
-            throw std::runtime_error("cannot give files away");
-    }
-    Files hives = files;
-    if (m_wine)
-        m_wine->ImportHives(Expand(hives[MachineHive]), Expand(hives[UserHive]));
-    for (const auto& [place, text] : files)
-    {
-        if (place.back() == '#')
-            SetAttributes(place.substr(0, place.size() - 1), text);
+        if (file->first.back() == '#')
+            SetAttributes(file->first.substr(0, file->first.size() - 1), file->second);
     }
 }
 
 RunResult Workstation::Start(const Text& program, const std::vector<Text>& arguments,
-                             const Files& environment) const
+                             const Files& environment, int killAfter) const
 {
-    Text command =
-        m_asOtherUser ? "setpriv --reuid=nobody --regid=nogroup --clear-groups env " : "env ";
-    for (const auto& [name, value] : environment)
-        command += name + "=" + Quoted(value);
-    if (m_wine)
-        command += m_wine->Command() + Quoted(Expand("{tool}{/}") + program + ".exe");
-    else
-        command += "LC_ALL=C XDG_CONFIG_HOME=" + Quoted(m_dirs.at("user")) +
-                   "XDG_CONFIG_DIRS=" + Quoted(m_dirs.at("machine").string() + ":/nowhere") +
-                   Quoted(m_dirs.at("tool") / program);
-    for (const Text& argument : arguments)
-        command += Quoted(argument);
-    const fs::path output = m_root / "output";
-    const fs::path errors = m_root / "errors";
-    command += ">" + Quoted(output) + "2>" + Quoted(errors);
-    Text boxes;
-    const int status = m_wine ? m_wine->Run(command, HostPath(LogPlace), boxes)
-                              : std::system((Limits() + command).c_str());
-    return {WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status), ReadFile(output),
-            m_wine ? boxes : ReadFile(errors)};
+    std::vector<std::shared_ptr<void>> inUse;
+    for (const fs::path& path : m_inUse)
+        inUse.push_back(UseAlone(path));
+    return RunToEnd({m_dirs.at("tool") / (program + ProgramSuffix), arguments, environment,
+                     m_asOtherUser, killAfter},
+                    m_root, HostPath(LogPlace));
 }
 
 Files Workstation::Snapshot() const
 {
     Files files;
-    const auto add = [&](const Text& place, const fs::directory_entry& entry)
+    const std::function<void(const Text&, const fs::path&)> add =
+        [&](const Text& place, const fs::path& path)
     {
-        const fs::path& path = entry.path();
-        const Text end = entry.is_directory() ? "/" : "";
-        if (entry.is_symlink())
+        const bool isDirectory = fs::is_directory(path);
+        Text& text = files[place + (isDirectory ? "/" : "")];
+        if (IsSymbolicLink(path))
         {
-            files[place + end] = Link + fs::read_symlink(path).string() + "}";
+            text = Link;
             return;
         }
-        const DWORD attributes = GetFileAttributesW(wxString::FromUTF8(path.string()).wc_str());
+        DWORD attributes = GetFileAttributesW(WideName(path).wc_str());
+        if (IsWine() && isDirectory) // where it says whether it can be written to
+            attributes &= ~FILE_ATTRIBUTE_READONLY;
         for (const auto& [letter, attribute] : Attributes)
         {
             if ((attributes & attribute) != 0)
                 files[place + "#"] += letter;
         }
-        const bool isProgram = StartsWith(place, "tool/FolderUpgrade");
-        files[place + end] = entry.is_fifo()                     ? Fifo
-                             : entry.is_directory() || isProgram ? ""
-                                                                 : ReadFile(path);
-    };
-    for (const Text top : Tops)
-    {
-        const fs::directory_entry directory(HostPath(top));
-        if (!directory.exists())
-            continue;
-        add(top, directory);
-        if (directory.is_symlink())
-            continue;
-        for (const auto& entry : fs::recursive_directory_iterator(directory.path()))
+        if (!isDirectory)
+            text = fs::is_fifo(path) ? Fifo : ReadFile(path);
+        std::error_code ignored; // of a directory that cannot be listed, or a file
+        for (const auto& entry : fs::directory_iterator(path, ignored))
         {
-            const Text rest = entry.path().lexically_relative(directory.path()).string();
-            if (top != Text("tool") || !StartsWith(rest, "FolderUpgrade"))
-                add(top + "/" + Replaced(rest, PrivateDir, "[P]"), entry);
+            const Text name = entry.path().filename().u8string();
+            if (place != "tool" || !StartsWith(name, "FolderUpgrade"))
+                add(place + "/" + (name == PrivateDir ? "[P]" : name), entry.path());
         }
+    };
+    for (const Text& top : Tops())
+    {
+        if (fs::exists(HostPath(top)))
+            add(top, HostPath(top));
     }
     return files;
 }

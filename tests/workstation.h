@@ -7,42 +7,32 @@
 //   default/...     the template folder of this version; previous/... that of the previous one
 //   elsewhere/...   files that the tool has no reason to touch, for example targets of links
 // A place that ends in a slash is a directory. One that ends in '#' has the attributes of the file
-// or directory before it, as letters: R read-only, H hidden, S system, X another user's,
-// 0 no permission at all, L a directory that cannot be listed ("hot/A/Desktop.ini#" -> "RS").
+// or directory before it, as letters: R read-only, H hidden, S system; and, for another user than
+// root, X not writable, 0 in use or not accessible at all, L a directory that cannot be listed
+// ("hot/A/Desktop.ini#" -> "RS").
 //
 // In texts, {hot}, {user}, {machine}, {tool}, {app}, {previous} and {default} are replaced with
-// paths (as the tool sees them) and {/} with the path separator; in capitals ({HOT}, {/2}) in the
-// form of the registry editor's text. {times:COUNT:TEXT} is TEXT COUNT times, with the repetition's
-// six-digit number in place of '#'. A whole text can also be
+// paths and {/} with the path separator; in capitals ({HOT}, {/2}) in the form of the registry
+// editor's text. {times:COUNT:TEXT} is TEXT COUNT times, with the repetition's six-digit number in
+// place of '#'. A whole text can also be
 //   {utf16}TEXT     the text in UTF-16 with a byte-order mark
 //   {icon:NAME}     the bytes of a shipped icon
-//   {link:TARGET}   a symbolic link to another place or to an absolute path; to a directory if its
-//                   own place ends in a slash. Links to files and dangling ones work only on this
-//                   machine.
-//   {fifo}          a FIFO; only on this machine
+//   {link:PLACE}    a symbolic link to another place; to a directory if its own place ends in a
+//                   slash
+//   {fifo}          a FIFO; not on Windows
 #pragma once
 
-#include "tests/text_files.h"
-#include "tests/wine.h"
-
-#include <memory>
-#include <vector>
+#include "tests/test_system.h"
 
 inline const Text LogPlace = "user/ORX_Installers/UpgradeDowngrade.log";
 inline const Text MachineHive = "machine/registry/HKEY_LOCAL_MACHINE.reg";
 inline const Text UserHive = "user/registry/HKEY_CURRENT_USER.reg";
 
-struct RunResult
-{
-    int status;      // as a shell reports it
-    Text output;     // its standard output
-    Text libraryLog; // what the library reported, on Windows in message boxes
-};
-
 class Workstation
 {
   public:
     /// For tests of refusals, everything belongs to a user who is not root, and runs as that user.
+    /// On Windows, the test itself has to be run by such a user.
     explicit Workstation(bool asOtherUser = false);
     ~Workstation();
     Workstation(const Workstation&) = delete;
@@ -52,7 +42,7 @@ class Workstation
     void LayOut(const Files& files);
     /// Runs a program in the tool's folder until it ends, with limits of time and memory.
     RunResult Start(const Text& program, const std::vector<Text>& arguments,
-                    const Files& environment = {}) const;
+                    const Files& environment = {}, int killAfter = 0) const;
     /// Every file but the programs with its text, every link, every directory and every attribute
     /// that is set. Links are not followed.
     Files Snapshot() const;
@@ -62,11 +52,11 @@ class Workstation
 
   private:
     void Put(const Text& place, const Text& text) const;
-    void SetAttributes(const Text& place, const Text& letters) const;
+    void SetAttributes(const Text& place, const Text& letters);
 
-    bool m_asOtherUser; // has an effect only if the test runs as root
+    bool m_asOtherUser;
     std::filesystem::path m_root;
-    std::unique_ptr<Wine> m_wine;
     std::map<Text, std::filesystem::path> m_dirs; // first part of a place -> directory
     Files m_tokens;
+    std::vector<std::filesystem::path> m_inUse; // while a program runs
 };

@@ -98,16 +98,15 @@ void PrintTo(const Call& call, std::ostream* stream)
 TEST_P(CallsOfAnInstaller, LeaveTheirResults)
 {
     const Call& call = GetParam();
-    if (IsWindowsProgram() && !call.scenario.notUnderWine.empty())
-        GTEST_SKIP() << call.scenario.notUnderWine;
+    if (!WhySkipped(call.scenario).empty())
+        GTEST_SKIP() << WhySkipped(call.scenario);
     Workstation workstation(call.scenario.asOtherUser);
     workstation.LayOut(WorkstationBefore(call.scenario));
-    const Text suffix = IsWindowsProgram() ? ".exe" : "";
-    const fs::path program = workstation.HostPath("tool/FolderUpgrade" + suffix);
+    const fs::path program = workstation.HostPath(Text("tool/FolderUpgrade") + ProgramSuffix);
     if (call.program != "FolderUpgrade")
         fs::remove(program);
     if (call.program == "endless")
-        fs::copy(ProgramDir() / "tests" / ("endless" + suffix), program);
+        fs::copy_file(ProgramDir() / (Text("endless") + ProgramSuffix), program);
     std::vector<Text> arguments;
     for (const Text& argument : call.scenario.arguments)
         arguments.push_back(workstation.Expand(argument));
@@ -135,7 +134,7 @@ TEST_P(CallsOfAnInstaller, LeaveTheirResults)
 }
 
 INSTANTIATE_TEST_SUITE_P(Calls, CallsOfAnInstaller, testing::ValuesIn(Calls()),
-                         [](const auto& call) { return call.param.scenario.name; });
+                         [](const auto& call) { return TestName(call.param.scenario); });
 
 TEST(CallOfAnInstaller, PrintsItsUsage)
 {
@@ -152,7 +151,7 @@ TEST(CallOfAnInstaller, PrintsItsUsage)
         const RunResult run = workstation.Start("FolderUpgradeRun", arguments);
         EXPECT_EQ(3, run.status);
         EXPECT_TRUE(
-            IsWindowsProgram() ||
+            IsWindows ||
             StartsWith(run.libraryLog, "Usage: FolderUpgradeRun I|U [--limit SECONDS] [FOLDER]\n"));
     }
 }

@@ -125,7 +125,7 @@ std::vector<Scenario> DesktopInis()
             .Before({{Icon("hf_folder_disabled") + "#", "R"}})
             .After({{Icon("hf_folder_disabled") + "#", Removed}})
             .AsOtherUser()
-            .NotUnderWine("Wine, like Windows, lets no user but root replace it"),
+            .NotOnWindows("a copy onto a read-only file is refused"),
         Scenario("AFolderOfAnotherUserStays")
             .Before({{Icon("hf_folder_disabled"), "old"},
                      {Icon("hf_folder_disabled") + "#", "X"},

@@ -2,7 +2,7 @@
 // changes nothing itself.
 #include "tests/scenarios/texts.h"
 
-#include <gmock/gmock.h>
+#include <regex>
 
 namespace
 {
@@ -80,7 +80,7 @@ Workstation
         listed("AListIsEmptyAndJPDataCannotBeListed", "")
             .Before({{Jobs + "#", "L"}})
             .AsOtherUser()
-            .NotUnderWine(NoRefusal)
+            .NotOnWindows("the scenario has no way to refuse it")
             .IsReported(R"(
 Workstation
   note     HotFolderList.cfg lists no hot folder
@@ -376,11 +376,11 @@ Job presets
         Done("LineEndsOfPresets")
             .Preset("<p>\n</p>")
             .Before({{PresetOf('B'), "\xEF\xBB\xBF<p>\n</p>"}})
-            .IsReported(IsWindowsProgram() ? R"(
+            .IsReported(IsWindows ? R"(
 Job presets
   change   .P{/}Presets{/}presets.xml: its line ends become CR LF
   change   B{/}Presets{/}presets.xml: loses its byte-order mark, and its line ends become CR LF)"
-                                           : R"(
+                                  : R"(
 Job presets
   change   B{/}Presets{/}presets.xml: loses its byte-order mark)"),
         Done("Links")
@@ -509,9 +509,11 @@ TEST(Check, WritesToAFile)
     EXPECT_EQ(0, run("{hot}{/}A{/}Bericht ä 版.txt").status);
     const Text report = ReadFile(workstation.HostPath("hot/A/Bericht ä 版.txt"));
     const size_t head = report.find_first_of("\r\n");
-    EXPECT_THAT(report.substr(0, head),
-                testing::MatchesRegex("FolderUpgradeCheck [0-9]+\\.[0-9]+\\.[0-9]+, upgrade, "
-                                      "20[0-9-]+ [0-9]+:[0-9]+, [^,]+, (not )?elevated"));
+    EXPECT_TRUE(std::regex_match(
+        report.substr(0, head),
+        std::regex("FolderUpgradeCheck [0-9]+\\.[0-9]+\\.[0-9]+, upgrade, 20[0-9-]+ "
+                   "[0-9]+:[0-9]+, [^,]+, (not )?elevated")))
+        << report;
     EXPECT_EQ(workstation.Expand("\nFrom {previous} to {default}\n\n"
                                  "0 changes, 0 problems, 0 notes\n"),
               Replaced(report.substr(head), "\r", ""));
@@ -521,7 +523,7 @@ TEST(Check, WritesToAFile)
     EXPECT_EQ("", refused.output);
     const Text complaint = workstation.Expand(
         "FolderUpgradeCheck: the report cannot be written to {hot}{/}none{/}a.txt\n");
-    EXPECT_EQ(IsWindowsProgram() ? "" : complaint, refused.libraryLog);
+    EXPECT_EQ(IsWindows ? "" : complaint, refused.libraryLog);
 }
 
 TEST(Check, PrintsItsUsage)
@@ -530,15 +532,15 @@ TEST(Check, PrintsItsUsage)
     const Text usage = workstation.Start("FolderUpgradeCheck", {"--help"}).output;
     EXPECT_TRUE(
         StartsWith(usage, "Usage: FolderUpgradeCheck I|U [--from FOLDER] [--to FOLDER] [FILE]"));
-    EXPECT_THAT(workstation.Start("FolderUpgradeCheck", {"--version"}).output,
-                testing::MatchesRegex("FolderUpgradeCheck [0-9.]+\r?\n"));
+    EXPECT_TRUE(std::regex_match(workstation.Start("FolderUpgradeCheck", {"--version"}).output,
+                                 std::regex("FolderUpgradeCheck [0-9.]+\r?\n")));
     for (const std::vector<Text>& wrong :
          {std::vector<Text>{}, {"V"}, {"/I"}, {"I", "report", "V"}, {"I", "--to"}, {"I", ""}})
     {
         const RunResult run = workstation.Start("FolderUpgradeCheck", wrong);
         EXPECT_EQ(3, run.status);
         EXPECT_EQ("", run.output);
-        EXPECT_EQ(IsWindowsProgram() ? "" : usage, run.libraryLog);
+        EXPECT_EQ(IsWindows ? "" : usage, run.libraryLog);
     }
 }
 

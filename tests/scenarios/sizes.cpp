@@ -117,7 +117,7 @@ std::vector<Scenario> Sizes()
         listed("AListThatIsTooDeepIsEmpty", Times(6000, "<e>")).Log(""),
         listed("AListThatIsTooBigIsEmpty", listedA + Times(1600000, "<a/>")).Log(""),
         listed("AListOf20000EntriesIsRead",
-               listedA + Times(20000, "<HotFolder path='{hot}{/}missing'/>"))
+               listedA + Times(20000, "<HotFolder path='{/}missing'/>"))
             .Log(FolderLines("A", 1, NoIcon("hf_folder_disabled"), NoCfg("A"))),
     };
 }

@@ -31,7 +31,7 @@ inline Text UserValue(const Text& value)
 /// A file of tests/data, with the parts in double braces replaced.
 inline Text Data(const Text& file, const Files& values)
 {
-    Text text = ReadFile(DATA_DIR "/" + file);
+    Text text = ReadFile(ProgramDir() / DATA_DIR / file);
     for (const auto& [name, value] : values)
         text = Replaced(text, "{{" + name + "}}", value);
     return text;

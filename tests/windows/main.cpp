@@ -1,0 +1,90 @@
+// Runs the scenarios on a machine where nothing can be lost.
+#include "platform/process_rights.h"
+#include "platform/system.h"
+#include "tests/test_system.h"
+#include "tests/windows/trial_machine.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <cstdio>
+
+namespace
+{
+
+constexpr int NotHere = 3; // the exit status; 0 and 1 are those of the tests
+
+Text Version()
+{
+    using Get = LONG(WINAPI*)(OSVERSIONINFOW*); // GetVersionEx says what the manifest lets it
+    OSVERSIONINFOW version = {};
+    version.dwOSVersionInfoSize = sizeof version;
+    const auto get = reinterpret_cast<Get>(
+        reinterpret_cast<void*>(GetProcAddress(GetModuleHandleW(L"ntdll.dll"), "RtlGetVersion")));
+    get(&version);
+    return std::to_string(version.dwMajorVersion) + "." + std::to_string(version.dwMinorVersion) +
+           "." + std::to_string(version.dwBuildNumber) + (IsWine() ? " (Wine)" : "");
+}
+
+void PrintCount()
+{
+    int skipped = 0;
+    const testing::UnitTest& all = *testing::UnitTest::GetInstance();
+    for (int i = 0; i < all.total_test_suite_count(); ++i)
+    {
+        const testing::TestSuite& suite = *all.GetTestSuite(i);
+        for (int j = 0; j < suite.total_test_count(); ++j)
+        {
+            const testing::TestInfo& test = *suite.GetTestInfo(j);
+            if (!test.result()->Skipped())
+                continue;
+            std::printf("skipped %s: %s\n", test.name(),
+                        test.result()->GetTestPartResult(0).message());
+            ++skipped;
+        }
+    }
+    std::printf("%d passed, %d failed, %d skipped\n", all.successful_test_count(),
+                all.failed_test_count(), skipped);
+}
+
+// Why the scenarios do not run; empty if they do.
+Text WhyNot(int argc, char** argv)
+{
+    if (!IsElevated())
+        return "The scenarios need administrator's rights.\n";
+    const bool isDisposable = std::any_of(
+        argv, argv + argc,
+        [](const char* argument) { return argument == Text("--this-machine-is-disposable"); });
+    if (!isDisposable)
+        return "The scenarios change the registry and the application data of this account. If\n"
+               "nothing on this machine matters, add --this-machine-is-disposable.\n";
+    Text reasons;
+    for (const Text& found :
+         std::filesystem::exists(TrialDir()) ? std::vector<Text>() : FindInstallation())
+        reasons += "The hot folder client may be installed: there is " + found + "\n";
+    return reasons;
+}
+
+} // namespace
+
+int main(int argc, char** argv)
+{
+    testing::InitGoogleTest(&argc, argv);
+    std::setvbuf(stdout, nullptr, _IONBF, 0);
+    std::printf("Windows %s\nAccount %s, %s\nRedirection policy: %s\n\n", Version().c_str(),
+                AccountName().utf8_str().data(), IsElevated() ? "elevated" : "not elevated",
+                RefusesLinksOfOthers() ? "links of others are refused"
+                                       : "unknown to this system, or not in force");
+    const Text whyNot = WhyNot(argc, argv);
+    if (!whyNot.empty())
+    {
+        std::printf("%sNothing was changed.\n", whyNot.c_str());
+        return NotHere;
+    }
+    RemoveTrial();
+    std::filesystem::create_directory(TrialDir());
+    const int status = RUN_ALL_TESTS();
+    RemoveTrial();
+    PrintCount();
+    return status;
+}

@@ -1,0 +1,78 @@
+// What only Windows can answer. Under Wine the same is done and printed, but not judged.
+#include "platform/system.h"
+#include "tests/scenarios/texts.h"
+
+#include <chrono>
+
+namespace fs = std::filesystem;
+
+namespace
+{
+
+const Text Icon = "hot/A/[P]/hf_folder_disabled.ico";
+
+void Judge(bool isRight, const Text& found)
+{
+    std::printf("%s: %s\n", isRight ? "as expected" : "NOT as expected", found.c_str());
+    EXPECT_TRUE(isRight || IsWine()) << found;
+}
+
+TEST(OnlyOnWindows, TheShellShowsTheNewIcon)
+{
+    Workstation workstation;
+    workstation.LayOut(WorkstationBefore(Scenario("").Before({{Icon, "old"}})));
+    workstation.Start("FolderUpgrade", {"I"});
+    SHFILEINFOW info = {};
+    SHGetFileInfoW(workstation.HostPath("hot/A").c_str(), 0, &info, sizeof info,
+                   SHGFI_ICONLOCATION);
+    const fs::path shown = info.szDisplayName;
+    Judge(shown == workstation.HostPath(Icon), "the folder's icon is " + shown.u8string());
+}
+
+TEST(OnlyOnWindows, AReadOnlyFolderAndDesktopIniAreRefreshed)
+{
+    const Text ini = "hot/A/Desktop.ini";
+    Workstation workstation;
+    workstation.LayOut(WorkstationBefore(Scenario("").Before(
+        {{Icon, "old"}, {"hot/A#", "R"}, {ini, "[.ShellClassInfo]\r\n"}, {ini + "#", "RS"}})));
+    workstation.Start("FolderUpgrade", {"I"});
+    Files files = workstation.Snapshot();
+    Judge(files["hot/A#"] == "S" && files[ini + "#"] == "RS" &&
+              files[ini].find("hf_folder_disabled.ico") != Text::npos,
+          "folder " + files["hot/A#"] + ", Desktop.ini " + files[ini + "#"] + " " + files[ini]);
+}
+
+TEST(OnlyOnWindows, KillsTearNoFile)
+{
+    Scenario scenario("");
+    for (char folder = 'A'; folder <= 'Z'; ++folder)
+        scenario.Before({{Text("hot/") + folder + "/[P]/Folder.cfg", Written(MovedFrom)}});
+    Workstation workstation;
+    const Text before = workstation.Expand(Written(MovedFrom));
+    const Text after = workstation.Expand(Written(MovedTo));
+    workstation.LayOut(WorkstationBefore(scenario));
+    const auto start = std::chrono::steady_clock::now();
+    workstation.Start("FolderUpgrade", {"I", "V"});
+    const std::chrono::duration<double, std::milli> duration =
+        std::chrono::steady_clock::now() - start;
+    int torn = 0;
+    int inTheMiddle = 0;
+    for (int kill = 1; kill <= 50; ++kill)
+    {
+        workstation.LayOut(WorkstationBefore(scenario));
+        workstation.Start("FolderUpgrade", {"I", "V"}, {},
+                          1 + static_cast<int>(duration.count() * kill / 50));
+        int moved = 0;
+        for (const auto& [place, text] : workstation.Snapshot())
+        {
+            const bool isCfg = place.find("Folder.cfg") != Text::npos;
+            moved += isCfg && text == after ? 1 : 0;
+            torn += isCfg && text != before && text != after ? 1 : 0;
+        }
+        inTheMiddle += moved > 0 && moved < 26 ? 1 : 0;
+    }
+    Judge(torn == 0, std::to_string(torn) + " files torn by 50 kills, " +
+                         std::to_string(inTheMiddle) + " of them while files were rewritten");
+}
+
+} // namespace
