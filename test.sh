@@ -41,7 +41,8 @@ count() {
     awk '
         /<testcase / { status = $0; sub(/.* status="/, "", status); sub(/".*/, "", status); own = "" }
         { sub(/^[ \t]*<system-out>/, "") }
-        /^skipped / { print }
+        /^\[  SKIPPED \] .* ms\)$/ { sub(/.*\//, "", $4); print "skipped " $4 ": " reason }
+        NF { reason = $0 }
         /^[0-9]+ passed, [0-9]+ failed, [0-9]+ skipped$/ { own = $0 }
         /<skipped message/ { status = "skipped" }
         /<\/testcase>/ {

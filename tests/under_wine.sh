@@ -1,5 +1,6 @@
 #!/usr/bin/env bash
-# Unpacks the trial's kit in a new Wine prefix, runs trial.cmd there as a person would, and prints what it writes.
+# Unpacks the trial's kit in a new Wine prefix, runs trial.cmd there as a person would, and prints what it writes. Before
+# that, trial.cmd has to refuse to run where the client seems to be installed.
 #
 #     tests/under_wine.sh KIT USER [ARGUMENT...]
 #
@@ -27,7 +28,15 @@ as_user "$wine" wineboot --init 2>/dev/null
 as_user "$wine" reg add 'HKCU\Software\Wine\Drivers' /v Graphics /d null /f >/dev/null
 as_user "$server" -k
 (cd "$home/drive_c" && cmake -E tar xf "$kit" && mv FolderUpgrade-*-trial trial && chown -R "$user" trial)
-outcome=0
-as_user "$wine" cmd /c 'C:\trial\trial.cmd' "$@" >/dev/null || outcome=$?
+try() {
+    outcome=0
+    as_user "$wine" cmd /c 'C:\trial\trial.cmd' "$@" >/dev/null || outcome=$?
+}
+as_user "$wine" reg add 'HKLM\SOFTWARE\Vantorix' /v Name /d kept /f >/dev/null
+try
+grep -q '^Nothing was changed\.' "$home/drive_c/trial/trial.txt" && [ $outcome = 3 ]
+as_user "$wine" reg query 'HKLM\SOFTWARE\Vantorix' /v Name >/dev/null
+as_user "$wine" reg delete 'HKLM\SOFTWARE\Vantorix' /f >/dev/null
+try "$@"
 tr -d '\r' <"$home/drive_c/trial/trial.txt"
 exit $outcome

@@ -6,7 +6,6 @@
 
 #include <gtest/gtest.h>
 
-#include <algorithm>
 #include <cstdio>
 
 namespace
@@ -26,36 +25,12 @@ Text Version()
            "." + std::to_string(version.dwBuildNumber) + (IsWine() ? " (Wine)" : "");
 }
 
-void PrintCount()
-{
-    int skipped = 0;
-    const testing::UnitTest& all = *testing::UnitTest::GetInstance();
-    for (int i = 0; i < all.total_test_suite_count(); ++i)
-    {
-        const testing::TestSuite& suite = *all.GetTestSuite(i);
-        for (int j = 0; j < suite.total_test_count(); ++j)
-        {
-            const testing::TestInfo& test = *suite.GetTestInfo(j);
-            if (!test.result()->Skipped())
-                continue;
-            std::printf("skipped %s: %s\n", test.name(),
-                        test.result()->GetTestPartResult(0).message());
-            ++skipped;
-        }
-    }
-    std::printf("%d passed, %d failed, %d skipped\n", all.successful_test_count(),
-                all.failed_test_count(), skipped);
-}
-
 // Why the scenarios do not run; empty if they do.
 Text WhyNot(int argc, char** argv)
 {
     if (!IsElevated())
         return "The scenarios need administrator's rights.\n";
-    const bool isDisposable = std::any_of(
-        argv, argv + argc,
-        [](const char* argument) { return argument == Text("--this-machine-is-disposable"); });
-    if (!isDisposable)
+    if (argc != 2 || argv[1] != Text("--this-machine-is-disposable"))
         return "The scenarios change the registry and the application data of this account. If\n"
                "nothing on this machine matters, add --this-machine-is-disposable.\n";
     Text reasons;
@@ -85,6 +60,8 @@ int main(int argc, char** argv)
     std::filesystem::create_directory(TrialDir());
     const int status = RUN_ALL_TESTS();
     RemoveTrial();
-    PrintCount();
+    const testing::UnitTest& all = *testing::UnitTest::GetInstance();
+    std::printf("%d passed, %d failed, %d skipped\n", all.successful_test_count(),
+                all.failed_test_count(), all.skipped_test_count());
     return status;
 }
