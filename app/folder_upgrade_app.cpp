@@ -18,20 +18,6 @@
 namespace
 {
 
-enum class Switch
-{
-    Upgrade,
-    Downgrade,
-    Invalid
-};
-
-Switch ReadSwitch(const wxString& text)
-{
-    if (text.CmpNoCase("I") == 0)
-        return Switch::Upgrade;
-    return text.CmpNoCase("U") == 0 ? Switch::Downgrade : Switch::Invalid;
-}
-
 void UpdateHotFolder(const FolderUpgradeApp& app, const wxString& path, int position)
 {
     std::optional<HotFolder> folder;
@@ -80,20 +66,14 @@ bool FolderUpgradeApp::OnInit()
         return false;
     if (argc == 3 && argv[2].CmpNoCase("V") == 0)
         RunLogEnabled = false;
-    switch (ReadSwitch(argv[1]))
+    m_isUpgrade = argv[1].CmpNoCase("I") == 0;
+    if (!m_isUpgrade && argv[1].CmpNoCase("U") != 0)
     {
-    case Switch::Upgrade:
-        m_isUpgrade = true;
-        RunLog(L"Installation : Upgrade call with switch: I");
-        break;
-    case Switch::Downgrade:
-        m_isUpgrade = false;
-        RunLog(L"Un-installation : Downgrade call with switch: U");
-        break;
-    case Switch::Invalid:
         RunLog(L"Invalid call check calling parameter: exiting....");
         return false;
     }
+    RunLog(m_isUpgrade ? L"Installation : Upgrade call with switch: I"
+                       : L"Un-installation : Downgrade call with switch: U");
 
     const wxArrayString folders = ListHotFolders();
     if (folders.empty())
