@@ -8,7 +8,6 @@ namespace
 {
 
 const wchar_t* const ErrorFileName = L"Error.er";
-const wchar_t* const IconExtension = L".ico";
 
 bool IsEnabled(HotFolder& folder)
 {
@@ -28,30 +27,13 @@ bool HasError(const HotFolder& folder)
              !wxDirExists(path)));
 }
 
-const wchar_t* IconBaseName(FolderIconState state)
-{
-    switch (state)
-    {
-    case FolderIconState::Active:
-        return L"hf_folder";
-    case FolderIconState::Inactive:
-        return L"hf_folder_disabled";
-    case FolderIconState::ErrorActive:
-        return L"hf_error_active";
-    case FolderIconState::ErrorInactive:
-        break;
-    }
-    return L"hf_error_inactive";
-}
-
 } // namespace
 
 bool GetFolderIconName(HotFolder& folder, wxString& iconName)
 {
     const bool isEnabled = IsEnabled(folder);
-    FolderIconState state = isEnabled ? FolderIconState::Active : FolderIconState::Inactive;
+    iconName = isEnabled ? L"hf_folder.ico" : L"hf_folder_disabled.ico";
     if (HasError(folder))
-        state = isEnabled ? FolderIconState::ErrorActive : FolderIconState::ErrorInactive;
-    iconName = wxString(IconBaseName(state)) + IconExtension;
+        iconName = isEnabled ? L"hf_error_active.ico" : L"hf_error_inactive.ico";
     return true;
 }

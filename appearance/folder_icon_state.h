@@ -5,14 +5,6 @@
 
 #include <wx/string.h>
 
-enum class FolderIconState
-{
-    Active = 1,
-    Inactive = 2,
-    ErrorActive = 3,
-    ErrorInactive = 4
-};
-
 /// Gives the file name, without a directory, of the icon for the folder's current state, which
 /// depends on whether its Folder.cfg enables it and whether its private directory holds a file
 /// "Error.er". A folder whose Folder.cfg cannot be read is not enabled; one whose private directory
