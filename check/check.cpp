@@ -16,7 +16,7 @@ namespace
 void WriteHead(TemplateFolders& folders, Report& report)
 {
     report.Head(wxString("FolderUpgradeCheck ") + PROGRAM_VERSION + ", " +
-                (folders.IsUpgrade() ? "upgrade" : "downgrade") + ", " +
+                (folders.isUpgrade ? "upgrade" : "downgrade") + ", " +
                 wxDateTime::Now().Format("%Y-%m-%d %H:%M") + ", " + AccountName() + ", " +
                 (IsElevated() ? "elevated" : "not elevated"));
     const auto shown = [](const TemplateFolder& folder)

@@ -98,7 +98,7 @@ void CheckDesktopIni(const HotFolder& folder, const wxString& iconName, Report& 
 void CheckFolderIcon(HotFolder& folder, TemplateCheck& check)
 {
     Report& report = check.report;
-    const IconCopy copy = DecideIconCopy(folder, check.folders.IsUpgrade(), BundleIconsDirName);
+    const IconCopy copy = DecideIconCopy(folder, check.folders.isUpgrade, BundleIconsDirName);
     switch (copy.outcome)
     {
     case IconCopy::Outcome::Linked:
@@ -108,7 +108,7 @@ void CheckFolderIcon(HotFolder& folder, TemplateCheck& check)
         report.Note("no copy of the icon to replace: " + copy.name);
         break;
     case IconCopy::Outcome::NoSource:
-        if (check.folders.IsRehearsal())
+        if (check.folders.isRehearsal)
             report.NoteOnce(
                 "the icons being installed are not there, so icons are left out of this check");
         else

@@ -88,11 +88,11 @@ void TemplateCheck::CheckPreviousFolder()
         return;
     if (previous.path.empty())
         report.Problem(previous.source.name +
-                       (folders.IsUpgrade() ? ": empty; only templates stored without a folder move"
-                                            : ": empty; templates move to the root of the drive"));
+                       (folders.isUpgrade ? ": empty; only templates stored without a folder move"
+                                          : ": empty; templates move to the root of the drive"));
     else if (wxFileName::IsPathSeparator(previous.path.Last()))
         report.Problem(previous.source.name +
-                       (folders.IsUpgrade()
+                       (folders.isUpgrade
                             ? ": ends in a separator; no template of a hot folder moves"
                             : ": ends in a separator; it is doubled in the paths of hot folders"));
 }
@@ -147,7 +147,7 @@ void TemplateCheck::ReportAwaited()
         wxString::Format("there is no folder %s; templates that will be looked for in it: %zu",
                          folders.To().path, m_awaited);
     // It may not be there yet before an installation, and before a removal has put it back.
-    if (folders.IsUpgrade() && !folders.IsRehearsal())
+    if (folders.isUpgrade && !folders.isRehearsal)
         report.Problem(text);
     else
         report.Note(text);
