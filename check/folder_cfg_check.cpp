@@ -101,7 +101,7 @@ void CheckFolderCfg(HotFolder& folder, TemplateCheck& check)
         CheckMissing(folder, report);
         break;
     case XmlFile::State::TooLarge:
-        ReportLeft(CfgStays::TooLarge, report);
+        ReportLeft(CfgTooLarge, report);
         break;
     case XmlFile::State::NotReadable:
         report.Problem("Folder.cfg: " +

@@ -139,18 +139,17 @@ Findings CheckPaths(const wxString& text, bool isRewritten, TemplateCheck& check
 void CheckPreset(JobPresetFile& preset, const wxString& name, TemplateCheck& check)
 {
     Report& report = check.report;
-    const RegularFile& file = preset.GetFile();
     const RegularFile::Status opened = preset.OpenForReading();
     if (opened != RegularFile::Status::Open)
     {
         report.Problem(name + (opened == RegularFile::Status::Refused
                                    ? "cannot be opened for reading (" +
-                                         file.GetFailure().Describe(preset.GetPath()) + ")"
+                                         preset.file.GetFailure().Describe(preset.path) + ")"
                                    : wxString("reached over a link, or not a file")));
         return;
     }
-    const RegularFile::Status reopened = preset.GetFile().ReopenForUpdate();
-    const FailedCall reopening = file.GetFailure();
+    const RegularFile::Status reopened = preset.file.ReopenForUpdate();
+    const FailedCall reopening = preset.file.GetFailure();
     const RewrittenPreset rewritten =
         preset.Decide(check.folders.From().path, check.folders.To().path);
     wxString text;
@@ -164,8 +163,8 @@ void CheckPreset(JobPresetFile& preset, const wxString& name, TemplateCheck& che
     if (rewritten.reasonToStay)
         report.Problem(name + "left as it is (" + rewritten.reasonToStay + ")");
     else if (!isRewritten)
-        report.Problem(name + "cannot be opened for writing (" +
-                       reopening.Describe(preset.GetPath()) + ")");
+        report.Problem(name + "cannot be opened for writing (" + reopening.Describe(preset.path) +
+                       ")");
     else
         CheckContent(name, rewritten, report);
     Findings findings = CheckPaths(text, isRewritten, check);
@@ -177,7 +176,7 @@ void CheckPreset(JobPresetFile& preset, const wxString& name, TemplateCheck& che
 // Why a presets.xml that may exist cannot be seen; empty if it does not exist.
 wxString WhyMissing(const JobPresetFile& preset, const wxString& directory)
 {
-    for (const wxString& each : {directory, wxFileName(preset.GetPath()).GetPath()})
+    for (const wxString& each : {directory, wxFileName(preset.path).GetPath()})
     {
         const wxString obstacle = WhyOutOfReach(each);
         if (!obstacle.empty())
@@ -191,7 +190,7 @@ bool CheckDirectory(const wxString& directory, const wxString& root, TemplateChe
 {
     Report& report = check.report;
     JobPresetFile preset(directory);
-    const wxString name = preset.GetPath().Mid(root.length()) + ": ";
+    const wxString name = preset.path.Mid(root.length()) + ": ";
     if (preset.IsThere())
     {
         CheckPreset(preset, name, check);

@@ -15,20 +15,13 @@ void LogUntouched(const wxString& cfgPath, const wxString& reason)
 
 void Save(HotFolder& folder, const std::string& content, const wxString& cfgPath)
 {
-    switch (SaveHotFolderSettings(folder, content))
-    {
-    case XmlFile::Saved::Refused:
+    const XmlFile::Saved saved = SaveHotFolderSettings(folder, content);
+    if (saved == XmlFile::Saved::Refused)
         ReportError(folder.cfg.file.GetFailure().Describe(cfgPath));
-        break;
-    case XmlFile::Saved::NotReadAgain:
-        LogUntouched(cfgPath, CfgStays::NotLoadedAgain);
-        break;
-    case XmlFile::Saved::Changed:
-        LogUntouched(cfgPath, CfgStays::Changed);
-        break;
-    case XmlFile::Saved::Done:
-        break;
-    }
+    else if (saved == XmlFile::Saved::NotReadAgain)
+        LogUntouched(cfgPath, L"cannot be loaded again");
+    else if (saved == XmlFile::Saved::Changed)
+        LogUntouched(cfgPath, L"changed meanwhile");
 }
 
 void MoveTemplate(HotFolder& folder, const wxString& cfgPath, bool isUpgrade)
@@ -72,7 +65,7 @@ void UpdateHotFolderImposePath(const FolderUpgradeApp& app, HotFolder& folder)
         RunLog(L"HF cfg file unable to read/exist: " + cfgPath);
         break;
     case XmlFile::State::TooLarge:
-        LogUntouched(cfgPath, CfgStays::TooLarge);
+        LogUntouched(cfgPath, CfgTooLarge);
         break;
     case XmlFile::State::NotReadable:
         ReportError(folder.cfg.WhyNotReadable(cfgPath));

@@ -17,8 +17,8 @@ void LogFailure(const RegularFile& file, const wxString& path)
 // in the content is logged.
 void UpdatePreset(JobPresetFile& preset, const wxString& from, const wxString& to)
 {
-    const wxString& path = preset.GetPath();
-    RegularFile& file = preset.GetFile();
+    const wxString& path = preset.path;
+    RegularFile& file = preset.file;
     const RegularFile::Status opened = preset.OpenForReading();
     if (opened != RegularFile::Status::Open)
     {
@@ -83,7 +83,7 @@ void UpdateJobPresetImposePath(const FolderUpgradeApp& app)
     {
         JobPresetFile preset(directory);
         if (preset.IsThere())
-            Attempt(L"preset.xml", preset.GetPath(),
+            Attempt(L"preset.xml", preset.path,
                     [&]() { UpdatePreset(preset, folders.From().path, folders.To().path); });
     }
 }

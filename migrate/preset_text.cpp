@@ -103,10 +103,10 @@ const char* DecodePreset(const std::string& bytes, wxString& text)
         return nullptr;
     wxString(bytes.data(), wxConvAuto(), bytes.length()).swap(text); // assigning would copy it
     if (text.empty())
-        return PresetStays::NotDecoded;
+        return "cannot be decoded";
     if (wxTextBuffer::typeDefault == wxTextFileType_Dos)
         text.Replace("\r\n", "\n");
-    return IsUnicodeText(text) ? nullptr : PresetStays::NotEncodedAgain;
+    return IsUnicodeText(text) ? nullptr : "cannot be encoded again";
 }
 
 wxString MovedPresetPath(const wxString& path, const wxString& from, const wxString& to)
@@ -140,13 +140,12 @@ RewrittenPreset RewritePreset(const std::string& before, const wxString& from, c
     if (preset.reasonToStay)
         return preset;
     const std::optional<size_t> moved = MovePresetPaths(text, from, to);
-    preset.movedPaths = moved.value_or(0);
     if (wxTextBuffer::typeDefault == wxTextFileType_Dos)
         text.Replace("\n", "\r\n");
     preset.bytes = text.utf8_string();
     if (preset.bytes.empty() && !text.empty())
         throw std::bad_alloc(); // the library gives an empty text then
     if (!moved || preset.bytes.size() > static_cast<size_t>(LongestFile))
-        preset.reasonToStay = PresetStays::NewTooLarge;
+        preset.reasonToStay = "the new content would be too large";
     return preset;
 }

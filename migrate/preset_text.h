@@ -33,22 +33,10 @@ wxString MovedPresetPath(const wxString& path, const wxString& from, const wxStr
 /// Decodes a preset file's bytes. Returns why it stays as it is, or null.
 const char* DecodePreset(const std::string& bytes, wxString& text);
 
-/// Why a preset file stays as it is.
-namespace PresetStays
-{
-
-constexpr const char* NotRead = "cannot be read";
-constexpr const char* NotDecoded = "cannot be decoded";
-constexpr const char* NotEncodedAgain = "cannot be encoded again";
-constexpr const char* NewTooLarge = "the new content would be too large";
-
-} // namespace PresetStays
-
 /// A preset file's new content, or why the file has to stay as it is.
 struct RewrittenPreset
 {
     const char* reasonToStay = nullptr;
-    size_t movedPaths = 0;
     std::string before;
     std::string bytes;
 };

@@ -75,7 +75,7 @@ void DecideFolder(const XmlFile& cfg, TemplateFolders& folders, TemplateMove& mo
     move.outcome = TemplateMove::Outcome::Elsewhere;
     // In an unknown encoding, only ASCII is read correctly.
     if (!cfg.isFaithful && (isInFolder || !move.storedPath.IsAscii()))
-        Stay(move, CfgStays::UnknownEncoding);
+        Stay(move, L"unknown encoding");
     else if (isInFolder)
         move.outcome =
             folders.To().isKnown ? TemplateMove::Outcome::Moves : TemplateMove::Outcome::ToUnknown;
@@ -84,7 +84,7 @@ void DecideFolder(const XmlFile& cfg, TemplateFolders& folders, TemplateMove& mo
     move.newPath = folders.To().path + wxFileName::GetPathSeparator(wxPATH_NATIVE) +
                    wxFileName(move.storedPath, wxPATH_NATIVE).GetFullName();
     if (!IsXmlText(move.newPath))
-        Stay(move, CfgStays::NotStorable);
+        Stay(move, L"new path holds a character that XML cannot store");
 }
 
 // The content of Folder.cfg with the root's settings and this imposition table.
@@ -104,7 +104,7 @@ void MakeContent(const wxXmlNode& root, const ImposeSettingTable& imposeSettings
     move.newContent = FolderCfgBytes(settings, jobSettings, paths, filterSetting, imposeSettings,
                                      preflightSettings);
     if (move.newContent.empty())
-        Stay(move, CfgStays::NewTooLarge);
+        Stay(move, L"the new content would be too large");
 }
 
 } // namespace

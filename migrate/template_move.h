@@ -8,18 +8,8 @@
 
 #include <string>
 
-/// Why a Folder.cfg stays as it is although its template could move, or is not looked at.
-namespace CfgStays
-{
-
-constexpr const wchar_t* TooLarge = L"too large to read safely";
-constexpr const wchar_t* UnknownEncoding = L"unknown encoding";
-constexpr const wchar_t* NotStorable = L"new path holds a character that XML cannot store";
-constexpr const wchar_t* NewTooLarge = L"the new content would be too large";
-constexpr const wchar_t* NotLoadedAgain = L"cannot be loaded again";
-constexpr const wchar_t* Changed = L"changed meanwhile";
-
-} // namespace CfgStays
+/// Why a Folder.cfg is not looked at, and stays as it is.
+constexpr const wchar_t* CfgTooLarge = L"too large to read safely";
 
 struct TemplateMove
 {
