@@ -4,7 +4,7 @@
 #include "platform/path_normal_form.h"
 #include "platform/standard_output.h"
 #include "platform/started_process.h"
-#include "run/run_log_place.h"
+#include "run/run_log.h"
 
 #include <wx/app.h>
 #include <wx/debug.h>

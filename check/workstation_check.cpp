@@ -4,7 +4,7 @@
 #include "platform/access_rights.h"
 #include "platform/process_rights.h"
 #include "platform/regular_file.h"
-#include "run/run_log_place.h"
+#include "run/run_log.h"
 
 #include <wx/filename.h>
 

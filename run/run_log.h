@@ -4,6 +4,12 @@
 
 #include <wx/string.h>
 
+constexpr const wchar_t* RunLogFileName = L"UpgradeDowngrade.log";
+
+/// The log's folder, with a final separator. Does not check that it exists; the tool never creates
+/// it.
+wxString RunLogDirPath();
+
 /// Whether the run writes its log; true at process start, cleared by the command line.
 extern bool RunLogEnabled;
 
