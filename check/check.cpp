@@ -1,11 +1,14 @@
 #include "check/check.h"
 
-#include "check/hot_folder_check.h"
+#include "check/folder_cfg_check.h"
+#include "check/folder_icon_check.h"
 #include "check/preset_check.h"
+#include "check/reach.h"
 #include "check/workstation_check.h"
 #include "platform/process_rights.h"
 
 #include <wx/datetime.h>
+#include <wx/filename.h>
 
 #include <map>
 #include <new>
@@ -24,6 +27,32 @@ void WriteHead(TemplateFolders& folders, Report& report)
         return folder.path.empty() ? wxString("(unknown)") : folder.path;
     };
     report.Head("From " + shown(folders.From()) + " to " + shown(folders.To()));
+}
+
+// What prevents a run from reaching anything in the private directory.
+wxString FindObstacle(const HotFolder& folder)
+{
+    const wxString obstacle = WhyOutOfReach(folder.path);
+    if (!obstacle.empty())
+        return "the hot folder " + obstacle;
+    const wxString privateDir = folder.directory.Reach(PrivateDirName);
+    if (IsLink(privateDir))
+        return wxString(PrivateDirName) + ": reached over a link";
+    if (wxDirExists(privateDir) && !MayEnter(folder.privateDir))
+        return wxString(PrivateDirName) + ": cannot be entered";
+    return {};
+}
+
+void CheckHotFolder(HotFolder& folder, TemplateCheck& check)
+{
+    const wxString obstacle = FindObstacle(folder);
+    if (!obstacle.empty())
+    {
+        check.report.Problem(obstacle);
+        return;
+    }
+    CheckFolderCfg(folder, check);
+    CheckFolderIcon(folder, check);
 }
 
 // A directory that is listed under two names is checked once.
