@@ -4,7 +4,7 @@
 #include "platform/local_drive.h"
 #include "platform/path_normal_form.h"
 #include "platform/process_rights.h"
-#include "store/xml_text.h"
+#include "store/xml_document.h"
 
 #include <wx/filename.h>
 #include <wx/log.h>

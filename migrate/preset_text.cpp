@@ -5,7 +5,7 @@
 #include "platform/regular_file.h"
 #include "platform/unicode_text.h"
 #include "store/folder_cfg_format.h"
-#include "store/xml_text.h"
+#include "store/xml_document.h"
 
 #include <wx/convauto.h>
 #include <wx/textbuf.h>

@@ -4,8 +4,8 @@
 #include "store/folder_cfg_format.h"
 #include "store/folder_cfg_reader.h"
 #include "store/folder_cfg_writer.h"
+#include "store/xml_document.h"
 #include "store/xml_lookup.h"
-#include "store/xml_text.h"
 
 #include <wx/confbase.h>
 #include <wx/filename.h>

@@ -26,11 +26,6 @@ constexpr const wchar_t* PreflightSection = L"PreflightSettings";
 /// key.
 constexpr const wchar_t* ImposeTemplateKey = L"ORXImposeTemplate";
 
-constexpr const wchar_t* Failfolder = L"Failfolder";
-constexpr const wchar_t* Workfolder = L"Workfolder";
-constexpr const wchar_t* Movefolder = L"Movefolder";
-constexpr const wchar_t* Hotfolder = L"Hotfolder";
-
 constexpr const wchar_t* ShortName = L"ShortName";
 constexpr const wchar_t* DisplayName = L"DisplayName";
 constexpr const wchar_t* Path = L"path";
@@ -50,10 +45,10 @@ struct Field
 /// In the order in which they are written.
 constexpr Field<InputFormat> InputFormatFields[] = {{ShortName, &InputFormat::ShortName},
                                                     {DisplayName, &InputFormat::DisplayName}};
-constexpr Field<HotFolderPaths> PathFields[] = {{Failfolder, &HotFolderPaths::Failfolder},
-                                                {Workfolder, &HotFolderPaths::Workfolder},
-                                                {Movefolder, &HotFolderPaths::Movefolder},
-                                                {Hotfolder, &HotFolderPaths::Hotfolder}};
+constexpr Field<HotFolderPaths> PathFields[] = {{L"Failfolder", &HotFolderPaths::Failfolder},
+                                                {L"Workfolder", &HotFolderPaths::Workfolder},
+                                                {L"Movefolder", &HotFolderPaths::Movefolder},
+                                                {L"Hotfolder", &HotFolderPaths::Hotfolder}};
 constexpr Field<JobSettingEntry> JobSettingFields[] = {
     {Value, &JobSettingEntry::Value},
     {KeyDisplayValue, &JobSettingEntry::KeyDisplayValue},

@@ -15,7 +15,7 @@ struct XmlFile
     {
         Missing,     // no regular file of that name, or a refused link
         NotReadable, // refused by the system, or malformed; see WhyNotReadable
-        TooLarge,    // see store/xml_limits.h
+        TooLarge,    // see XmlLimits
         Loaded
     };
 
@@ -51,7 +51,4 @@ struct XmlFile
     std::unique_ptr<const wxXmlDocument> document;
     bool isFaithful = false; // whether the document is what its author meant: see XmlLook
     XmlSyntaxError error;
-
-  private:
-    std::int64_t Longest() const;
 };
