@@ -45,9 +45,8 @@ class RegularFile
   public:
     enum class Status
     {
-        NotThere, // no such file, not a regular file, or a refused link
+        NotThere, // no such file, not a regular file, a refused link, or another file by now
         Refused,  // it exists, but access is denied or another program blocks it
-        Gone,     // the name no longer leads to the same file
         Open
     };
 
@@ -73,9 +72,7 @@ class RegularFile
     /// file's own permissions prevent that.
     Status Replace(const PinnedDirectory& directory, const wxString& name);
     static bool MayReplace(const PinnedDirectory& directory);
-    /// Returns false if the system reports an error, which does not matter: all bytes have already
-    /// been written.
-    bool Close();
+    void Close();
 
     /// In bytes; -1 if it cannot be determined.
     std::int64_t Length() const;

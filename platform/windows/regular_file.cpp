@@ -3,9 +3,6 @@
 #include "platform/system.h"
 #include "platform/windows/link_handle.h"
 
-#include <algorithm>
-#include <limits>
-
 namespace
 {
 
@@ -50,18 +47,12 @@ bool IsDiskFull(DWORD error)
            error == ERROR_NOT_ENOUGH_QUOTA;
 }
 
-// Where a transfer that is too long for a single call continues.
 OVERLAPPED At(std::int64_t offset)
 {
     OVERLAPPED place = {};
     place.Offset = static_cast<DWORD>(offset & 0xFFFFFFFF);
     place.OffsetHigh = static_cast<DWORD>(offset >> 32);
     return place;
-}
-
-DWORD LengthOfCall(size_t rest)
-{
-    return static_cast<DWORD>(std::min<size_t>(rest, std::numeric_limits<int>::max()));
 }
 
 } // namespace
@@ -137,11 +128,11 @@ bool RegularFile::MayReplace(const PinnedDirectory& /*directory*/)
     return false;
 }
 
-bool RegularFile::Close()
+void RegularFile::Close()
 {
-    const bool isDone = !m_handle || CloseHandle(m_handle) != 0;
+    if (m_handle)
+        CloseHandle(m_handle);
     m_handle = nullptr;
-    return isDone;
 }
 
 std::int64_t RegularFile::Length() const
@@ -154,14 +145,14 @@ size_t RegularFile::ReadSome(std::int64_t offset, char* bytes, size_t count) con
 {
     OVERLAPPED place = At(offset);
     DWORD done = 0;
-    return ReadFile(m_handle, bytes, LengthOfCall(count), &done, &place) != 0 ? done : 0;
+    return ReadFile(m_handle, bytes, static_cast<DWORD>(count), &done, &place) != 0 ? done : 0;
 }
 
 size_t RegularFile::WriteSome(std::int64_t offset, const char* bytes, size_t count)
 {
     OVERLAPPED place = At(offset);
     DWORD done = 0;
-    return WriteFile(m_handle, bytes, LengthOfCall(count), &done, &place) != 0 ? done : 0;
+    return WriteFile(m_handle, bytes, static_cast<DWORD>(count), &done, &place) != 0 ? done : 0;
 }
 
 bool RegularFile::Reserve(std::int64_t from, std::int64_t length)
