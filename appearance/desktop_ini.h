@@ -4,8 +4,6 @@
 #include "appearance/attribute_change.h"
 #include "store/hot_folder.h"
 
-#include <wx/string.h>
-
 #include <vector>
 
 constexpr const wchar_t* DesktopIniName = L"Desktop.ini";

@@ -4,8 +4,6 @@
 #include "appearance/desktop_ini.h"
 #include "run/folder_upgrade_app.h"
 
-#include <wx/string.h>
-
 /// Copies the icon for the folder's state over the icon of the same name in its private directory,
 /// and refreshes Desktop.ini, attributes and Explorer. An upgrade takes the icon from the
 /// executable's directory, a downgrade from the bundle icons directory in it. If either icon is

@@ -3,8 +3,6 @@
 
 #include "store/hot_folder.h"
 
-#include <wx/string.h>
-
 /// Gives the file name, without a directory, of the icon for the folder's current state, which
 /// depends on whether its Folder.cfg enables it and whether its private directory holds a file
 /// "Error.er". A folder whose Folder.cfg cannot be read is not enabled; one whose private directory

@@ -3,8 +3,6 @@
 
 #include "store/hot_folder.h"
 
-#include <wx/string.h>
-
 /// The name of the folder beside the executable that holds the previous version's icons.
 constexpr const wchar_t* BundleIconsDirName = L"BundleIcons";
 
