@@ -4,27 +4,22 @@
 
 #include "platform/pinned_directory.h"
 
-#include <wx/string.h>
-
-#include <cstdint>
 #include <string>
 
 /// The last call of the system that failed.
 struct FailedCall
 {
-    enum class Kind
-    {
-        Open,
-        List, // the names in a directory
-        Read,
-        Write
-    };
+    // What the library says.
+    static constexpr const char* Open = "can't open file '%s'";
+    static constexpr const char* List = "Cannot enumerate files in directory '%s'";
+    static constexpr const char* Read = "can't read from file '%s'";
+    static constexpr const char* Write = "can't write to file '%s'";
 
-    Kind kind = Kind::Open;
+    const char* what = Open;
     unsigned long error = 0; // as the system numbers it
 
     /// Of this kind, with the system's last error.
-    static FailedCall Now(Kind kind);
+    static FailedCall Now(const char* what);
 
     /// The words in which wxLogSysError reports it, and the end of them.
     wxString Describe(const wxString& shownPath) const;

@@ -32,7 +32,7 @@ RegularFile::Status RegularFile::Open(const PinnedDirectory* directory, const wx
     m_path = path;
     m_followsLinks = !directory;
     m_descriptor = OpenDescriptor(path, m_followsLinks, forUpdate ? O_RDWR : O_RDONLY);
-    m_failure = FailedCall::Now(FailedCall::Kind::Open);
+    m_failure = FailedCall::Now(FailedCall::Open);
     struct stat status = {};
     if (m_descriptor < 0)
     {
@@ -52,7 +52,7 @@ RegularFile::Status RegularFile::ReopenForUpdate()
     struct stat ours = {};
     struct stat now = {};
     const int descriptor = OpenDescriptor(m_path, m_followsLinks, O_RDWR);
-    m_failure = FailedCall::Now(FailedCall::Kind::Open);
+    m_failure = FailedCall::Now(FailedCall::Open);
     const bool isFound =
         descriptor < 0 ? lstat(m_path.utf8_str(), &now) == 0 : fstat(descriptor, &now) == 0;
     const bool isSame = isFound && fstat(m_descriptor, &ours) == 0 && IsSameFile(ours, now);
@@ -71,7 +71,7 @@ RegularFile::Status RegularFile::CreateNew(const PinnedDirectory& directory, con
     Close();
     m_path = directory.Reach(name);
     m_descriptor = open(m_path.utf8_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, Everybody);
-    m_failure = FailedCall::Now(FailedCall::Kind::Open);
+    m_failure = FailedCall::Now(FailedCall::Open);
     return m_descriptor < 0 ? Status::Refused : Status::Open;
 }
 

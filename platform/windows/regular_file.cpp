@@ -1,6 +1,5 @@
 #include "platform/regular_file.h"
 
-#include "platform/system.h"
 #include "platform/windows/link_handle.h"
 
 namespace
@@ -9,10 +8,11 @@ namespace
 // The same sharing as when the C library opens a file: others may read and write it.
 constexpr DWORD Sharing = FILE_SHARE_READ | FILE_SHARE_WRITE;
 
-HANDLE OpenHandle(const wxString& path, DWORD access, DWORD flags)
+HANDLE OpenHandle(const wxString& path, DWORD access, DWORD flags,
+                  DWORD disposition = OPEN_EXISTING)
 {
     const HANDLE handle =
-        CreateFileW(path.wc_str(), access, Sharing, nullptr, OPEN_EXISTING, flags, nullptr);
+        CreateFileW(path.wc_str(), access, Sharing, nullptr, disposition, flags, nullptr);
     return handle == INVALID_HANDLE_VALUE ? nullptr : handle;
 }
 
@@ -67,7 +67,7 @@ RegularFile::Status RegularFile::Open(const PinnedDirectory* directory, const wx
     const DWORD access = forUpdate ? GENERIC_READ | GENERIC_WRITE : GENERIC_READ;
     const DWORD flags = directory ? FILE_FLAG_OPEN_REPARSE_POINT : 0;
     m_handle = OpenHandle(path, access, flags);
-    m_failure = FailedCall::Now(FailedCall::Kind::Open);
+    m_failure = FailedCall::Now(FailedCall::Open);
     if (!m_handle)
     {
         const DWORD attributes = GetFileAttributesW(path.wc_str());
@@ -84,7 +84,7 @@ RegularFile::Status RegularFile::Open(const PinnedDirectory* directory, const wx
     if (!directory || !IsReparsePoint(m_handle))
         return Status::Open;
     const HANDLE content = OpenAgain(path, access, m_handle);
-    m_failure = FailedCall::Now(FailedCall::Kind::Open);
+    m_failure = FailedCall::Now(FailedCall::Open);
     CloseHandle(m_handle);
     m_handle = content;
     return content ? Status::Open : Status::Refused;
@@ -95,7 +95,7 @@ RegularFile::Status RegularFile::ReopenForUpdate()
     HANDLE handle = ReOpenFile(m_handle, GENERIC_READ | GENERIC_WRITE, Sharing, 0);
     if (handle == INVALID_HANDLE_VALUE) // not every file system supports that
         handle = OpenAgain(m_path, GENERIC_READ | GENERIC_WRITE, m_handle);
-    m_failure = FailedCall::Now(FailedCall::Kind::Open);
+    m_failure = FailedCall::Now(FailedCall::Open);
     if (!handle)
         return Status::Refused;
     CloseHandle(m_handle);
@@ -107,11 +107,9 @@ RegularFile::Status RegularFile::CreateNew(const PinnedDirectory& directory, con
 {
     Close();
     m_path = directory.Reach(name);
-    const HANDLE handle =
-        CreateFileW(m_path.wc_str(), GENERIC_READ | GENERIC_WRITE, Sharing, nullptr, CREATE_NEW,
-                    FILE_ATTRIBUTE_NORMAL | FILE_FLAG_OPEN_REPARSE_POINT, nullptr);
-    m_failure = FailedCall::Now(FailedCall::Kind::Open);
-    m_handle = handle == INVALID_HANDLE_VALUE ? nullptr : handle;
+    m_handle = OpenHandle(m_path, GENERIC_READ | GENERIC_WRITE,
+                          FILE_ATTRIBUTE_NORMAL | FILE_FLAG_OPEN_REPARSE_POINT, CREATE_NEW);
+    m_failure = FailedCall::Now(FailedCall::Open);
     if (m_handle && !directory.Holds(m_handle))
         Close();
     return m_handle ? Status::Open : Status::Refused;
