@@ -138,10 +138,11 @@ class FolderUpgradeRunApp : public wxAppConsole
         if ((!isUpgrade && !isDowngrade) || limit < 1 || limit > LongestLimit || argc > next + 1 ||
             (argc > next && argv[next].StartsWith("-")))
         {
-            WriteStandardError("Usage: FolderUpgradeRun I|U [--limit SECONDS] [FOLDER]\n"
-                               "Runs FolderUpgrade with the same switch, between two checks.\n"
-                               "Exit status: 0 everything is as it should be, 1 changes are left, "
-                               "2 problems, 3 wrong arguments, 4 FolderUpgrade did not run.\n");
+            WriteTo(StandardStream::Error,
+                    "Usage: FolderUpgradeRun I|U [--limit SECONDS] [FOLDER]\n"
+                    "Runs FolderUpgrade with the same switch, between two checks.\n"
+                    "Exit status: 0 everything is as it should be, 1 changes are left, "
+                    "2 problems, 3 wrong arguments, 4 FolderUpgrade did not run.\n");
             return WrongArguments;
         }
         const wxString logFolder = RunLogDirPath();

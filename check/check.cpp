@@ -18,15 +18,15 @@ namespace
 
 void WriteHead(TemplateFolders& folders, Report& report)
 {
-    report.Head(wxString("FolderUpgradeCheck ") + PROGRAM_VERSION + ", " +
-                (folders.isUpgrade ? "upgrade" : "downgrade") + ", " +
-                wxDateTime::Now().Format("%Y-%m-%d %H:%M") + ", " + AccountName() + ", " +
-                (IsElevated() ? "elevated" : "not elevated"));
+    report.Write(wxString("FolderUpgradeCheck ") + PROGRAM_VERSION + ", " +
+                 (folders.isUpgrade ? "upgrade" : "downgrade") + ", " +
+                 wxDateTime::Now().Format("%Y-%m-%d %H:%M") + ", " + AccountName() + ", " +
+                 (IsElevated() ? "elevated" : "not elevated"));
     const auto shown = [](const TemplateFolder& folder)
     {
         return folder.path.empty() ? wxString("(unknown)") : folder.path;
     };
-    report.Head("From " + shown(folders.From()) + " to " + shown(folders.To()));
+    report.Write("From " + shown(folders.From()) + " to " + shown(folders.To()));
 }
 
 // What prevents a run from reaching anything in the private directory.
@@ -86,7 +86,7 @@ void CheckHotFolders(const HotFolderList& list, TemplateCheck& check)
 void CheckRun(TemplateFolders& folders, Report& report)
 {
     WriteHead(folders, report);
-    TemplateCheck check(folders, report);
+    TemplateCheck check{folders, report};
     report.Begin("Workstation");
     CheckAccount(report);
     check.CheckPreviousFolder();

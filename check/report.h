@@ -5,7 +5,6 @@
 #include "platform/regular_file.h"
 
 #include <wx/arrstr.h>
-#include <wx/string.h>
 
 #include <array>
 #include <set>
@@ -36,8 +35,8 @@ class Report
     explicit Report(const wxString& fileName);
     Report(const PinnedDirectory& directory, const wxString& name);
 
-    /// Writes a line of the head, which comes before all blocks.
-    void Head(const wxString& text);
+    /// Writes a line at once. The head comes before all blocks.
+    void Write(const wxString& text);
 
     /// Begins a block about this subject. A block without lines is left out; in others, the
     /// problems are written first and the notes last.
@@ -74,7 +73,6 @@ class Report
     void Add(Kind kind, const wxString& text);
     void AddSome(Kind kind, const wxString& prefix, const std::vector<wxString>& texts);
     void EndBlock();
-    void Write(const wxString& text);
 
     RegularFile m_file;
     const bool m_toFile;

@@ -76,11 +76,6 @@ Place Look(const wxString& path, const wxString& trusted)
 
 } // namespace
 
-TemplateCheck::TemplateCheck(TemplateFolders& itsFolders, Report& itsReport)
-    : folders(itsFolders), report(itsReport)
-{
-}
-
 void TemplateCheck::CheckPreviousFolder()
 {
     const TemplateFolder& previous = folders.Previous();
@@ -134,18 +129,18 @@ void TemplateCheck::Judge(const wxString& path, const wxString& whyItStays, Find
     if (place == Place::NotLookedAt)
         findings.notes.push_back("not looked at: " + Shown(path));
     else if (place == Place::Missing && IsIn(path, to) && !wxDirExists(to))
-        ++m_awaited;
+        ++awaited;
     else if (place == Place::Missing)
         findings.problems.push_back("no template at " + Shown(path));
 }
 
 void TemplateCheck::ReportAwaited()
 {
-    if (m_awaited == 0)
+    if (awaited == 0)
         return;
     const wxString text =
         wxString::Format("there is no folder %s; templates that will be looked for in it: %zu",
-                         folders.To().path, m_awaited);
+                         folders.To().path, awaited);
     // It may not be there yet before an installation, and before a removal has put it back.
     if (folders.isUpgrade && !folders.isRehearsal)
         report.Problem(text);
