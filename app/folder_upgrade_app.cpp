@@ -38,19 +38,6 @@ void UpdateHotFolder(const FolderUpgradeApp& app, const wxString& path, int posi
     RunLog(L"updated Impose path for hf" + path, position);
 }
 
-wxArrayString ListHotFolders()
-{
-    wxArrayString folders;
-    Attempt(L"HotFolderList.cfg", GetHotFolderListPath(),
-            [&]()
-            {
-                wxArrayString read;
-                ReadHotFolderList(read);
-                folders = read;
-            });
-    return folders;
-}
-
 } // namespace
 
 FolderUpgradeApp::FolderUpgradeApp() : m_bundleIconsDir(BundleIconsDirName)
@@ -75,7 +62,8 @@ bool FolderUpgradeApp::OnInit()
     RunLog(m_isUpgrade ? L"Installation : Upgrade call with switch: I"
                        : L"Un-installation : Downgrade call with switch: U");
 
-    const wxArrayString folders = ListHotFolders();
+    wxArrayString folders;
+    Attempt(L"HotFolderList.cfg", GetHotFolderListPath(), [&]() { ReadHotFolderList(folders); });
     if (folders.empty())
         RunLog(L"No Hotfolder listed");
 
