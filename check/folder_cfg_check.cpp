@@ -27,14 +27,6 @@ void CheckMissing(const HotFolder& folder, Report& report)
         report.Note("no Folder.cfg");
 }
 
-void CheckShownState(const wxXmlNode& root, Report& report)
-{
-    const AttributeGap gap = FindAttributeGap(root);
-    if (gap.isDisabled)
-        report.Problem("Folder.cfg: lacks \"" + gap.missing +
-                       "\", so the enabled folder shows as disabled");
-}
-
 // Returns whether the file is rewritten.
 bool CheckMove(HotFolder& folder, const TemplateMove& move, Report& report)
 {
@@ -111,8 +103,11 @@ void CheckFolderCfg(HotFolder& folder, TemplateCheck& check)
                                   "; it stays as it is, and the folder shows as disabled"));
         break;
     case XmlFile::State::Loaded:
-        if (!CheckTemplate(folder, check))
-            CheckShownState(*folder.cfg.Root(), report);
+        if (CheckTemplate(folder, check))
+            break;
+        if (const AttributeGap gap = FindAttributeGap(*folder.cfg.Root()); gap.isDisabled)
+            report.Problem("Folder.cfg: lacks \"" + gap.missing +
+                           "\", so the enabled folder shows as disabled");
         break;
     }
 }

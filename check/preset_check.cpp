@@ -10,7 +10,6 @@
 
 #include <algorithm>
 #include <map>
-#include <set>
 
 namespace
 {
@@ -19,16 +18,16 @@ namespace
 wxString OtherChange(const std::string& before, const std::string& after)
 {
     const wxBOM mark = wxConvAuto::DetectBOM(before.data(), before.length());
-    if (mark == wxBOM_UTF8 && before.substr(3) == after)
-        return "loses its byte-order mark";
     if (mark != wxBOM_None && mark != wxBOM_Unknown && mark != wxBOM_UTF8)
         return "comes out as UTF-8, without byte-order mark";
+    const std::string content = before.substr(mark == wxBOM_UTF8 ? 3 : 0);
+    if (content == after)
+        return "loses its byte-order mark";
     const auto withoutLineEnds = [](std::string text)
     {
         text.erase(std::remove(text.begin(), text.end(), '\r'), text.end());
         return text;
     };
-    const std::string content = mark == wxBOM_UTF8 ? before.substr(3) : before;
     if (withoutLineEnds(content) == withoutLineEnds(after))
         return mark == wxBOM_UTF8 ? "loses its byte-order mark, and its line ends become CR LF"
                                   : "its line ends become CR LF";

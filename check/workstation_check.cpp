@@ -3,7 +3,6 @@
 #include "check/reach.h"
 #include "platform/access_rights.h"
 #include "platform/process_rights.h"
-#include "platform/regular_file.h"
 #include "run/run_log.h"
 
 #include <wx/filename.h>

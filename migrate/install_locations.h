@@ -2,7 +2,6 @@
 #pragma once
 
 #include <wx/filename.h>
-#include <wx/string.h>
 
 /// The registry value that was looked for, for messages.
 struct ValueSource

@@ -5,9 +5,6 @@
 #include "platform/regular_file.h"
 
 #include <wx/arrstr.h>
-#include <wx/string.h>
-
-#include <optional>
 
 /// The directory of the job preset directories: ORX/JPData in the per-user application data folder,
 /// with a final separator.

@@ -10,9 +10,7 @@
 #include <wx/convauto.h>
 #include <wx/textbuf.h>
 
-#include <cstdint>
 #include <new>
-#include <vector>
 
 namespace
 {

@@ -3,8 +3,6 @@
 
 #include "migrate/install_locations.h"
 
-#include <wx/string.h>
-
 #include <optional>
 
 struct TemplateFolder

@@ -4,10 +4,6 @@
 #include "migrate/template_folders.h"
 #include "store/xml_file.h"
 
-#include <wx/string.h>
-
-#include <string>
-
 /// Why a Folder.cfg is not looked at, and stays as it is.
 constexpr const wchar_t* CfgTooLarge = L"too large to read safely";
 

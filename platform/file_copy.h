@@ -3,8 +3,6 @@
 
 #include "platform/regular_file.h"
 
-#include <wx/string.h>
-
 #include <optional>
 
 /// Copies the source's content and attributes over an existing file, as wxCopyFile does, whatever

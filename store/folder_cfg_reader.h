@@ -4,10 +4,6 @@
 #include "store/hot_folder.h"
 #include "store/hot_folder_settings.h"
 
-#include <wx/xml/xml.h>
-
-#include <vector>
-
 /// Loads the hot folder's Folder.cfg, and reads the root attributes and the input formats.
 ///
 /// The attributes are read as a chain: from the first missing one on, all fields stay as they were

@@ -7,7 +7,6 @@
 #include <wx/stream.h>
 
 #include <new>
-#include <utility>
 
 namespace
 {

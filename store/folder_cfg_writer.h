@@ -4,11 +4,6 @@
 #include "store/hot_folder.h"
 #include "store/hot_folder_settings.h"
 
-#include <wx/xml/xml.h>
-
-#include <string>
-#include <vector>
-
 /// The content of a Folder.cfg with the six values, and nothing else. A filter setting whose name
 /// is not "FilterSetting" is left out. It is moved from, and empty afterwards. Empty if the content
 /// would exceed FolderCfgLimits, and so could not be read again.

@@ -4,8 +4,6 @@
 #include "platform/pinned_directory.h"
 #include "store/xml_file.h"
 
-#include <wx/string.h>
-
 /// The directory, directly inside a hot folder, in which the client keeps the folder's settings and
 /// icons.
 constexpr const wchar_t* PrivateDirName = L"[_ORX_HotFolder_]";

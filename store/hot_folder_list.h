@@ -4,7 +4,6 @@
 #include "store/xml_file.h"
 
 #include <wx/arrstr.h>
-#include <wx/string.h>
 
 /// The list's path.
 wxString GetHotFolderListPath();

@@ -9,8 +9,6 @@
 #include <wx/mstream.h>
 
 #include <algorithm>
-#include <bitset>
-#include <cstdint>
 #include <cstring>
 #include <expat.h>
 #include <limits>

@@ -4,10 +4,7 @@
 #include "platform/regular_file.h"
 #include "store/xml_document.h"
 
-#include <wx/string.h>
-
 #include <memory>
-#include <string>
 
 struct XmlFile
 {

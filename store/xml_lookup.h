@@ -2,7 +2,6 @@
 // have to match exactly.
 #pragma once
 
-#include <wx/string.h>
 #include <wx/xml/xml.h>
 
 #include <map>

@@ -1,7 +1,6 @@
 #include "platform/pinned_directory.h"
 
 #include "platform/path_normal_form.h"
-#include "platform/system.h"
 #include "platform/windows/link_handle.h"
 
 #include <wx/filename.h>
