@@ -1,5 +1,4 @@
-// The report of a check: what a run would change, what would prevent a change, and what is worth
-// knowing.
+// The report of a check: what a run would change, what would prevent it, and what is worth knowing.
 #pragma once
 
 #include "platform/regular_file.h"
@@ -30,8 +29,7 @@ struct Findings
 class Report
 {
   public:
-    /// Writes to the file, or to the standard output if the name is empty. A link or a pipe in
-    /// place of the file is not written to.
+    /// Writes to the file, never through a link, or to the standard output if the name is empty.
     explicit Report(const wxString& fileName);
     Report(const PinnedDirectory& directory, const wxString& name);
 

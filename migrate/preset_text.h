@@ -9,10 +9,10 @@
 
 /// Replaces the first folder with the second in every template path of the text that lies in it:
 /// where the search text ORXImposeTemplate">" is directly followed by the folder's text, and that
-/// by a path separator or the closing double quote. Separators at the end of either folder are
-/// ignored. Replaces nothing if either folder is empty, or if XML cannot hold the text of the new
-/// one. Returns the number of replacements; nothing if the text would have more than LongestFile
-/// characters, and so could not be read again. Takes time proportional to the length of the text.
+/// by a path separator or the closing double quote. Separators at the end of a folder are ignored.
+/// Replaces nothing if either is empty, or if XML cannot hold the second. Returns the number of
+/// replacements; nothing if the text would have more than LongestFile characters, and so could not
+/// be read again. Takes time proportional to the length of the text.
 std::optional<size_t> MovePresetPaths(wxString& text, const wxString& oldFolder,
                                       const wxString& newFolder);
 

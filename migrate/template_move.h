@@ -32,10 +32,9 @@ struct TemplateMove
 TemplateMove DecideTemplateMove(const XmlFile& cfg, TemplateFolders& folders);
 
 /// Whether the stored path names something directly in the folder. Only names are compared, as
-/// wxFileName::SameAs does on Windows, and a stored path never causes access to a server: a path on
-/// a server is elsewhere unless both are on the same share, and so are a path on another drive, one
-/// that leads over a shortcut (.lnk), and one that is too long. A folder with a final separator is
-/// not the same as one without.
+/// wxFileName::SameAs does on Windows, and no server is asked. Elsewhere are: a path on a server,
+/// unless both are on the same share; one on another drive; one over a shortcut (.lnk); one that is
+/// too long. A folder with a final separator is not the same as one without.
 bool IsDirectlyIn(const wxString& stored, const wxString& folder);
 
 /// Whether a path is longer than any that Windows has, or holds more variables than the library

@@ -2,10 +2,8 @@
 //
 // An XML 1.0 document in UTF-8. The root element has the attributes of store/root_attributes.h;
 // below it are the sections, in the order of their names here. Inside JobSetting, ImposeSetting and
-// PreflightSettings, attributes are identified by position, not by name.
-//
-// The names are wide, like the library's strings: converting them took half as long as loading a
-// file.
+// PreflightSettings, attributes are identified by position, not by name. The names are wide, like
+// the library's strings: converting them took half as long as loading a file.
 #pragma once
 
 #include "store/hot_folder_settings.h"
@@ -22,8 +20,7 @@ constexpr const wchar_t* ImposeSettingSection = L"ImposeSetting";
 constexpr const wchar_t* FilterSettingSection = L"FilterSetting";
 constexpr const wchar_t* PreflightSection = L"PreflightSettings";
 
-/// The key of the imposition setting whose value is the template's path. Job presets use the same
-/// key.
+/// The key of the imposition setting whose value is the template's path, in job presets too.
 constexpr const wchar_t* ImposeTemplateKey = L"ORXImposeTemplate";
 
 constexpr const wchar_t* ShortName = L"ShortName";

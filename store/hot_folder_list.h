@@ -5,14 +5,11 @@
 
 #include <wx/arrstr.h>
 
-/// The list's path.
 wxString GetHotFolderListPath();
 
-/// The folder of the list: "hotfolder" in the machine-wide application data folder, with a final
-/// separator.
+/// Its folder: "hotfolder" in the machine-wide application data folder, with a final separator.
 wxString GetHotFolderDataDir();
 
-/// The content of the list.
 struct HotFolderList
 {
     XmlFile::State state = XmlFile::State::Missing;
