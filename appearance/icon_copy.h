@@ -6,6 +6,11 @@
 /// The name of the folder beside the executable that holds the previous version's icons.
 constexpr const wchar_t* BundleIconsDirName = L"BundleIcons";
 
+/// Gives the file name, without a directory, of the icon for the folder's state: whether its
+/// Folder.cfg enables it (not if it cannot be read), and whether its private directory holds a file
+/// "Error.er" (not if it is missing or cannot be listed). Changes nothing; returns true.
+bool GetFolderIconName(HotFolder& folder, wxString& iconName);
+
 struct IconCopy
 {
     enum class Outcome
