@@ -16,13 +16,6 @@ HANDLE OpenHandle(const wxString& path, DWORD access, DWORD flags,
     return handle == INVALID_HANDLE_VALUE ? nullptr : handle;
 }
 
-bool IsReparsePoint(HANDLE handle)
-{
-    BY_HANDLE_FILE_INFORMATION information = {};
-    return GetFileInformationByHandle(handle, &information) != 0 &&
-           (information.dwFileAttributes & FILE_ATTRIBUTE_REPARSE_POINT) != 0;
-}
-
 // Opens by its name a file that is already open. Null if the name leads to another one by now.
 HANDLE OpenAgain(const wxString& path, DWORD access, HANDLE file)
 {
@@ -81,7 +74,7 @@ RegularFile::Status RegularFile::Open(const PinnedDirectory* directory, const wx
         Close();
         return Status::NotThere;
     }
-    if (!directory || !IsReparsePoint(m_handle))
+    if (!directory || (AttributesOf(m_handle) & FILE_ATTRIBUTE_REPARSE_POINT) == 0)
         return Status::Open;
     const HANDLE content = OpenAgain(path, access, m_handle);
     m_failure = FailedCall::Now(FailedCall::Open);
