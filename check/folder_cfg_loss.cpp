@@ -7,33 +7,20 @@
 #include <wx/hashmap.h>
 
 #include <algorithm>
-#include <initializer_list>
+#include <set>
 #include <unordered_set>
 
 namespace
 {
 
-bool IsOneOf(std::initializer_list<const wchar_t*> texts, const wxString& text)
-{
-    return std::any_of(texts.begin(), texts.end(),
-                       [&](const wchar_t* each) { return text == each; });
-}
+// The attributes that the writer adds where they are missing.
+const std::set<wxString> AddedAttributes = {
+    FolderCfg::Path,  FolderCfg::ShortName,       FolderCfg::DisplayName,    FolderCfg::Key,
+    FolderCfg::Value, FolderCfg::KeyDisplayValue, FolderCfg::LocDisplayValue};
 
-// The writer adds these attributes where they are missing.
-bool IsAdded(const wxString& name)
-{
-    return IsOneOf({FolderCfg::Path, FolderCfg::ShortName, FolderCfg::DisplayName, FolderCfg::Key,
-                    FolderCfg::Value, FolderCfg::KeyDisplayValue, FolderCfg::LocDisplayValue},
-                   name);
-}
-
-bool IsSection(const wxString& name)
-{
-    return IsOneOf({FolderCfg::InputFormatsSection, FolderCfg::PathsSection,
-                    FolderCfg::JobSettingSection, FolderCfg::ImposeSettingSection,
-                    FolderCfg::FilterSettingSection, FolderCfg::PreflightSection},
-                   name);
-}
+const std::set<wxString> Sections = {
+    FolderCfg::InputFormatsSection,  FolderCfg::PathsSection,         FolderCfg::JobSettingSection,
+    FolderCfg::ImposeSettingSection, FolderCfg::FilterSettingSection, FolderCfg::PreflightSection};
 
 // The path in the template's entry is meant to change.
 bool IsTemplatePath(const wxXmlNode& element, const wxXmlAttribute& attribute)
@@ -50,8 +37,9 @@ wxString DescribeElement(const wxXmlNode& element, bool isInFilter)
     for (const wxXmlAttribute* each = element.GetAttributes(); each; each = each->GetNext())
     {
         const bool isKept =
-            !isInFilter && ((each->GetValue().empty() && IsAdded(each->GetName())) ||
-                            IsTemplatePath(element, *each));
+            !isInFilter &&
+            ((each->GetValue().empty() && AddedAttributes.count(each->GetName()) != 0) ||
+             IsTemplatePath(element, *each));
         if (!isKept)
             attributes.push_back(" " + each->GetName() + "=\"" + each->GetValue() + "\"");
     }
@@ -98,7 +86,7 @@ std::vector<wxString> DescribeContent(const wxXmlNode& root)
         if (node->GetType() == wxXML_TEXT_NODE || node->GetType() == wxXML_CDATA_SECTION_NODE)
             what = "the text \"" + what + "\"";
         const wxXmlNode* parent = node->GetParent();
-        content.push_back(parent == &root || IsSection(node->GetName())
+        content.push_back(parent == &root || Sections.count(node->GetName()) != 0
                               ? what
                               : what + " in <" + parent->GetName() + ">");
     }

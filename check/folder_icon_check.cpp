@@ -46,17 +46,12 @@ bool MayWriteIni(const HotFolder& folder)
     return ini.OpenForUpdate(folder.directory, DesktopIniName) == RegularFile::Status::Open;
 }
 
-void CheckKeys(const HotFolder& folder, const DesktopIniChange& change, Report& report)
+wxString KeyNames(const std::vector<DesktopIniKey>& keys)
 {
-    if (change.keys.empty())
-        return;
     wxString names;
-    for (const DesktopIniKey& each : change.keys)
+    for (const DesktopIniKey& each : keys)
         names += (names.empty() ? wxString() : wxString(", ")) + each.key;
-    if (MayWriteIni(folder))
-        report.Change("Desktop.ini: " + names);
-    else
-        report.Problem("Desktop.ini: cannot be opened for reading and writing");
+    return names;
 }
 
 void CheckDesktopIni(const HotFolder& folder, const wxString& iconName, Report& report)
@@ -64,30 +59,19 @@ void CheckDesktopIni(const HotFolder& folder, const wxString& iconName, Report& 
     using Kind = DesktopIniChange::Kind;
     const DesktopIniChange change = DecideDesktopIni(folder, iconName);
     const wxString path = folder.directory.Reach({});
-    switch (change.kind)
-    {
-    case Kind::Stays:
+    if (change.kind == Kind::Stays)
         report.Problem(wxString("Desktop.ini: left as it is (") + change.reasonToStay + ")");
-        break;
-    case Kind::NotAFile:
+    else if (change.kind == Kind::NotAFile)
         report.Problem("Desktop.ini: is not a file");
-        break;
-    case Kind::NotReadable:
+    else if (change.kind == Kind::Create && !MayCreateIn(path))
+        report.Problem(
+            "Desktop.ini: cannot be created, because the hot folder cannot be written to");
+    else if (change.kind == Kind::Create)
+        report.Change("Desktop.ini: new");
+    else if (change.kind == Kind::NotReadable || (!change.keys.empty() && !MayWriteIni(folder)))
         report.Problem("Desktop.ini: cannot be opened for reading and writing");
-        break;
-    case Kind::Create:
-        if (MayCreateIn(path))
-            report.Change("Desktop.ini: new");
-        else
-            report.Problem(
-                "Desktop.ini: cannot be created, because the hot folder cannot be written to");
-        break;
-    case Kind::Refresh:
-        CheckKeys(folder, change, report);
-        break;
-    case Kind::Nothing:
-        break;
-    }
+    else if (!change.keys.empty())
+        report.Change("Desktop.ini: " + KeyNames(change.keys));
     if (change.kind != Kind::Create)
         CheckAttributes("Desktop.ini", folder.directory.Reach(DesktopIniName), change.ini, report);
     CheckAttributes("hot folder", path, change.folder, report);

@@ -172,22 +172,9 @@ void CheckPreset(JobPresetFile& preset, const wxString& name, TemplateCheck& che
     report.Add(name, findings);
 }
 
-// Why a presets.xml that may exist cannot be seen; empty if it does not exist.
-wxString WhyMissing(const JobPresetFile& preset, const wxString& directory)
-{
-    for (const wxString& each : {directory, wxFileName(preset.path).GetPath()})
-    {
-        const wxString obstacle = WhyOutOfReach(each);
-        if (!obstacle.empty())
-            return each + " " + obstacle;
-    }
-    return {};
-}
-
 // False if there is no preset.
 bool CheckDirectory(const wxString& directory, const wxString& root, TemplateCheck& check)
 {
-    Report& report = check.report;
     JobPresetFile preset(directory);
     const wxString name = preset.path.Mid(root.length()) + ": ";
     if (preset.IsThere())
@@ -195,10 +182,15 @@ bool CheckDirectory(const wxString& directory, const wxString& root, TemplateChe
         CheckPreset(preset, name, check);
         return true;
     }
-    const wxString obstacle = WhyMissing(preset, directory);
-    if (!obstacle.empty())
-        report.Problem(name + obstacle);
-    return !obstacle.empty();
+    for (const wxString& each : {directory, wxFileName(preset.path).GetPath()})
+    {
+        const wxString obstacle = WhyOutOfReach(each); // it may exist and not be seen
+        if (obstacle.empty())
+            continue;
+        check.report.Problem(name + each + " " + obstacle);
+        return true;
+    }
+    return false;
 }
 
 } // namespace
