@@ -31,27 +31,16 @@ void MoveTemplate(HotFolder& folder, const wxString& cfgPath, bool isUpgrade)
     const TemplateMove move = DecideTemplateMove(folder.cfg, folders);
     if (move.outcome != Outcome::NoSection)
         RunLog(L"Imposepath:" + folder.path + L"is: " + move.storedPath);
-    switch (move.outcome)
-    {
-    case Outcome::FromUnknown:
+    if (move.outcome == Outcome::FromUnknown)
         RunLog(isUpgrade ? L"Unable to read: Previous Version  Default Impose Template Path"
                          : L"Unable to read: Default Impose Template Path");
-        break;
-    case Outcome::ToUnknown:
+    else if (move.outcome == Outcome::ToUnknown)
         RunLog(isUpgrade ? L"Unable to read: Default Impose Template Path"
                          : L"unable to read: Previous Version  Default Impose Template Path");
-        break;
-    case Outcome::Stays:
+    else if (move.outcome == Outcome::Stays)
         LogUntouched(cfgPath, move.reasonToStay);
-        break;
-    case Outcome::Moves:
+    else if (move.outcome == Outcome::Moves)
         Save(folder, move.newContent, cfgPath);
-        break;
-    case Outcome::NoSection:
-    case Outcome::NoTemplate:
-    case Outcome::Elsewhere:
-        break;
-    }
 }
 
 } // namespace

@@ -59,11 +59,9 @@ JobPresetDirs ListJobPresetDirs(const wxString& root)
 {
     JobPresetDirs directories;
     directories.isThere = wxFileName::DirExists(root);
-    if (!directories.isThere)
-        return directories;
-    // The library would report it by itself.
-    directories.failure = WhyNotListed(root);
-    if (directories.failure)
+    if (directories.isThere)
+        directories.failure = WhyNotListed(root); // the library would report it by itself
+    if (!directories.isThere || directories.failure)
         return directories;
     const wxDir directory(root);
     wxDirTraverserSimple collector(directories.paths);

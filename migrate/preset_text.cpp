@@ -15,10 +15,7 @@
 namespace
 {
 
-wxString Introduction()
-{
-    return wxString(FolderCfg::ImposeTemplateKey) + "\">\"";
-}
+const wxString Introduction = wxString(FolderCfg::ImposeTemplateKey) + "\">\"";
 
 // A character as it is and in the new text, wide, and twice in the new bytes.
 constexpr std::uint64_t MemoryForEachCharacter = 2 * sizeof(wchar_t) + 2;
@@ -32,12 +29,11 @@ bool EndsFolder(const wxString& text, size_t position)
 // The positions of the folder in the template paths of the text, in ascending order.
 std::vector<size_t> FindFolders(const wxString& text, const wxString& folder)
 {
-    const wxString introduction = Introduction();
-    const wxString searched = introduction + folder;
+    const wxString searched = Introduction + folder;
     std::vector<size_t> folders;
     for (size_t found = text.find(searched); found != wxString::npos;)
     {
-        const size_t begin = found + introduction.length();
+        const size_t begin = found + Introduction.length();
         const size_t end = begin + folder.length();
         const bool isPath = EndsFolder(text, end);
         if (isPath)
@@ -109,23 +105,22 @@ const char* DecodePreset(const std::string& bytes, wxString& text)
 
 wxString MovedPresetPath(const wxString& path, const wxString& from, const wxString& to)
 {
-    wxString text = Introduction() + path + "\"";
+    wxString text = Introduction + path + "\"";
     MovePresetPaths(text, from, to);
-    return text.Mid(Introduction().length()).BeforeLast('"');
+    return text.Mid(Introduction.length()).BeforeLast('"');
 }
 
 std::vector<PresetPath> FindPresetPaths(const wxString& text, const wxString& from,
                                         const wxString& to)
 {
-    const wxString introduction = Introduction();
     std::vector<PresetPath> paths;
-    for (size_t found = text.find(introduction); found != wxString::npos;)
+    for (size_t found = text.find(Introduction); found != wxString::npos;)
     {
-        const size_t begin = found + introduction.length();
+        const size_t begin = found + Introduction.length();
         const size_t end = text.find('"', begin);
         const wxString stored = text.Mid(begin, end - begin);
         paths.push_back({stored, MovedPresetPath(stored, from, to), end == wxString::npos});
-        found = text.find(introduction, begin);
+        found = text.find(Introduction, begin);
     }
     return paths;
 }

@@ -17,14 +17,9 @@
 namespace
 {
 
-bool IsAnySeparator(wxUniChar character)
-{
-    return character == '\\' || character == '/';
-}
-
 bool IsOnServer(const wxString& path)
 {
-    return path.length() > 1 && IsAnySeparator(path[0]) && IsAnySeparator(path[1]);
+    return path.length() > 1 && path.Left(2).find_first_not_of("\\/") == wxString::npos;
 }
 
 // "\\host\share", in lower case and with backslashes; of "\\?\UNC\host\share\x" and the like,
