@@ -27,6 +27,14 @@ void CheckMissing(const HotFolder& folder, Report& report)
         report.Note("no Folder.cfg");
 }
 
+void CheckShownState(const wxXmlNode& root, Report& report)
+{
+    const AttributeGap gap = FindAttributeGap(root);
+    if (gap.isDisabled)
+        report.Problem("Folder.cfg: lacks \"" + gap.missing +
+                       "\", so the enabled folder shows as disabled");
+}
+
 // Returns whether the file is rewritten.
 bool CheckMove(HotFolder& folder, const TemplateMove& move, Report& report)
 {
@@ -87,27 +95,17 @@ bool CheckTemplate(HotFolder& folder, TemplateCheck& check)
 void CheckFolderCfg(HotFolder& folder, TemplateCheck& check)
 {
     Report& report = check.report;
-    switch (folder.LoadCfg())
-    {
-    case XmlFile::State::Missing:
+    const XmlFile::State state = folder.LoadCfg();
+    if (state == XmlFile::State::Missing)
         CheckMissing(folder, report);
-        break;
-    case XmlFile::State::TooLarge:
+    else if (state == XmlFile::State::TooLarge)
         ReportLeft(CfgTooLarge, report);
-        break;
-    case XmlFile::State::NotReadable:
+    else if (state == XmlFile::State::NotReadable)
         report.Problem("Folder.cfg: " +
                        (folder.cfg.error.message.empty()
                             ? folder.cfg.WhyNotReadable(FolderCfgPath(folder.path))
                             : Damage(folder.cfg.error) +
                                   "; it stays as it is, and the folder shows as disabled"));
-        break;
-    case XmlFile::State::Loaded:
-        if (CheckTemplate(folder, check))
-            break;
-        if (const AttributeGap gap = FindAttributeGap(*folder.cfg.Root()); gap.isDisabled)
-            report.Problem("Folder.cfg: lacks \"" + gap.missing +
-                           "\", so the enabled folder shows as disabled");
-        break;
-    }
+    else if (!CheckTemplate(folder, check))
+        CheckShownState(*folder.cfg.Root(), report);
 }

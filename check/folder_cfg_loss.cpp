@@ -54,13 +54,9 @@ wxString DescribeElement(const wxXmlNode& element, bool isInFilter)
 // is, and the root may come out under another name.
 std::vector<wxString> DescribeContent(const wxXmlNode& root)
 {
-    struct Open
-    {
-        const wxXmlNode* next;
-        bool isInFilter;
-    };
     std::vector<wxString> content;
-    std::vector<Open> open = {{root.GetChildren(), false}};
+    // At each level, the next node and whether it is in the filter setting.
+    std::vector<std::pair<const wxXmlNode*, bool>> open = {{root.GetChildren(), false}};
     while (!open.empty())
     {
         const auto [node, isInFilter] = open.back();
@@ -69,7 +65,8 @@ std::vector<wxString> DescribeContent(const wxXmlNode& root)
             open.pop_back();
             continue;
         }
-        open.back().next = node->GetNext();
+        open.back().first = node->GetNext();
+        const wxString text = wxString(node->GetContent()).Trim().Trim(false);
         wxString what;
         if (node->GetType() == wxXML_ELEMENT_NODE)
         {
@@ -79,12 +76,10 @@ std::vector<wxString> DescribeContent(const wxXmlNode& root)
         }
         else if (node->GetType() == wxXML_PI_NODE)
             what = "the instruction <?" + node->GetName() + "?>";
-        else if (node->GetType() != wxXML_COMMENT_NODE)
-            what = wxString(node->GetContent()).Trim().Trim(false);
+        else if (node->GetType() != wxXML_COMMENT_NODE && !text.empty())
+            what = "the text \"" + text + "\"";
         if (what.empty())
             continue;
-        if (node->GetType() == wxXML_TEXT_NODE || node->GetType() == wxXML_CDATA_SECTION_NODE)
-            what = "the text \"" + what + "\"";
         const wxXmlNode* parent = node->GetParent();
         content.push_back(parent == &root || Sections.count(node->GetName()) != 0
                               ? what

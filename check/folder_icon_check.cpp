@@ -83,28 +83,19 @@ void CheckFolderIcon(HotFolder& folder, TemplateCheck& check)
 {
     Report& report = check.report;
     const IconCopy copy = DecideIconCopy(folder, check.folders.isUpgrade, BundleIconsDirName);
-    switch (copy.outcome)
-    {
-    case IconCopy::Outcome::Linked:
+    if (copy.outcome == IconCopy::Outcome::Linked)
         report.Problem(copy.name + ": reached over a link");
-        break;
-    case IconCopy::Outcome::NoCopy:
+    else if (copy.outcome == IconCopy::Outcome::NoCopy)
         report.Note("no copy of the icon to replace: " + copy.name);
-        break;
-    case IconCopy::Outcome::NoSource:
-        if (check.folders.isRehearsal)
-            report.NoteOnce(
-                "the icons being installed are not there, so icons are left out of this check");
-        else
-            report.ProblemOnce("source icon missing: " + copy.source);
-        break;
-    case IconCopy::Outcome::Replaces:
-        if (!MayCopyOver(copy.source, folder.privateDir, copy.name))
-            report.Problem(copy.name +
-                           ": cannot be replaced (read-only, in use, or access denied)");
-        else if (!IsCopy(copy.source, folder.privateDir, copy.name))
-            report.Change(copy.name);
+    else if (copy.outcome == IconCopy::Outcome::NoSource && check.folders.isRehearsal)
+        report.NoteOnce(
+            "the icons being installed are not there, so icons are left out of this check");
+    else if (copy.outcome == IconCopy::Outcome::NoSource)
+        report.ProblemOnce("source icon missing: " + copy.source);
+    else if (!MayCopyOver(copy.source, folder.privateDir, copy.name))
+        report.Problem(copy.name + ": cannot be replaced (read-only, in use, or access denied)");
+    else if (!IsCopy(copy.source, folder.privateDir, copy.name))
+        report.Change(copy.name);
+    if (copy.outcome == IconCopy::Outcome::Replaces)
         CheckDesktopIni(folder, copy.name, report);
-        break;
-    }
 }

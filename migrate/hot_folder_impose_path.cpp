@@ -48,19 +48,13 @@ void MoveTemplate(HotFolder& folder, const wxString& cfgPath, bool isUpgrade)
 void UpdateHotFolderImposePath(const FolderUpgradeApp& app, HotFolder& folder)
 {
     const wxString cfgPath = FolderCfgPath(folder.path);
-    switch (folder.LoadCfg())
-    {
-    case XmlFile::State::Missing:
+    const XmlFile::State state = folder.LoadCfg();
+    if (state == XmlFile::State::Missing)
         RunLog(L"HF cfg file unable to read/exist: " + cfgPath);
-        break;
-    case XmlFile::State::TooLarge:
+    else if (state == XmlFile::State::TooLarge)
         LogUntouched(cfgPath, CfgTooLarge);
-        break;
-    case XmlFile::State::NotReadable:
+    else if (state == XmlFile::State::NotReadable)
         ReportError(folder.cfg.WhyNotReadable(cfgPath));
-        break;
-    case XmlFile::State::Loaded:
+    else
         MoveTemplate(folder, cfgPath, app.m_isUpgrade);
-        break;
-    }
 }
