@@ -10,7 +10,6 @@
 #include "run/attempt.h"
 #include "store/hot_folder_list.h"
 
-#include <wx/arrstr.h>
 #include <wx/debug.h>
 
 #include <optional>

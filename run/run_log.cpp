@@ -79,7 +79,6 @@ void RunLog(const wxString& message, int count)
     }
     catch (const std::exception&)
     {
-        // Without memory for it, the line is left out.
-        return;
+        return; // without memory for it, the line is left out
     }
 }

@@ -55,7 +55,4 @@ constexpr Field<ImposeSettingEntry> ImposeSettingFields[] = {
 constexpr Field<PreflightSetting> PreflightFields[] = {{Key, &PreflightSetting::Key},
                                                        {Value, &PreflightSetting::Value}};
 
-/// The level of the filter setting in the document; the root has level 0.
-constexpr int FilterSettingLevel = 1;
-
 } // namespace FolderCfg

@@ -11,7 +11,6 @@
 #include <algorithm>
 #include <cstring>
 #include <expat.h>
-#include <limits>
 #include <memory>
 
 namespace
@@ -70,7 +69,7 @@ class Look
             parser,
             [](void* look, const char*, const char*, const char*, int)
             { Of(look).m_documentTypeEnd = Of(look).Position() + MaxDocumentType; },
-            [](void* look) { Of(look).m_documentTypeEnd = NoEnd; });
+            [](void* look) { Of(look).m_documentTypeEnd = UINT64_MAX; });
         XML_SetAttlistDeclHandler(
             parser,
             [](void* look, const char*, const char*, const char*, const char*, int)
@@ -193,8 +192,6 @@ class Look
             XML_StopParser(m_parser.get(), XML_FALSE);
     }
 
-    static constexpr std::uint64_t NoEnd = std::numeric_limits<std::uint64_t>::max();
-
     const std::unique_ptr<XML_ParserStruct, void (*)(XML_Parser)> m_parser;
     const XmlLimits& m_limits;
     XmlLook m_look;
@@ -203,7 +200,7 @@ class Look
     std::uint64_t m_textLength = 0;
     std::uint64_t m_steps = 0;
     std::uint64_t m_declaredAttributes = 0;
-    std::uint64_t m_documentTypeEnd = NoEnd; // where one that began must have ended
+    std::uint64_t m_documentTypeEnd = UINT64_MAX; // where one that began must have ended
     std::uint64_t m_lastEnd = 0;
 };
 

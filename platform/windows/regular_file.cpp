@@ -34,12 +34,6 @@ HANDLE OpenAgain(const wxString& path, DWORD access, HANDLE file)
     return nullptr;
 }
 
-bool IsDiskFull(DWORD error)
-{
-    return error == ERROR_DISK_FULL || error == ERROR_HANDLE_DISK_FULL ||
-           error == ERROR_NOT_ENOUGH_QUOTA;
-}
-
 OVERLAPPED At(std::int64_t offset)
 {
     OVERLAPPED place = {};
@@ -152,9 +146,12 @@ bool RegularFile::Reserve(std::int64_t from, std::int64_t length)
         return true; // allocating less than the current size would cut the file
     FILE_ALLOCATION_INFO room = {};
     room.AllocationSize.QuadPart = from + length;
+    if (SetFileInformationByHandle(m_handle, FileAllocationInfo, &room, sizeof room) != 0)
+        return true;
     // If the file system does not support this, only the error of a full disk matters.
-    return SetFileInformationByHandle(m_handle, FileAllocationInfo, &room, sizeof room) != 0 ||
-           !IsDiskFull(GetLastError());
+    const DWORD error = GetLastError();
+    return error != ERROR_DISK_FULL && error != ERROR_HANDLE_DISK_FULL &&
+           error != ERROR_NOT_ENOUGH_QUOTA;
 }
 
 bool RegularFile::SetLength(std::int64_t length)
