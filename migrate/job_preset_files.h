@@ -6,8 +6,7 @@
 
 #include <wx/arrstr.h>
 
-/// The directory of the job preset directories: ORX/JPData in the per-user application data folder,
-/// with a final separator.
+/// ORX/JPData in the per-user application data folder, with a final separator.
 wxString JobPresetRoot();
 
 struct JobPresetDirs
@@ -17,8 +16,7 @@ struct JobPresetDirs
     wxArrayString paths;
 };
 
-/// The full paths of the root's direct sub-directories, hidden ones too, in the order of the
-/// listing.
+/// The full paths of the root's direct sub-directories, hidden ones too, in the listed order.
 JobPresetDirs ListJobPresetDirs(const wxString& root);
 
 /// One job preset's file. The job preset directory and those above it may be links (redirected
@@ -40,7 +38,7 @@ struct JobPresetFile
 
     const wxString path; // for messages
     const PinnedDirectory directory;
-    const PinnedDirectory presetDir;
-    const bool isLinked; // the directory Presets
+    const PinnedDirectory presetDir; // Presets
+    const bool isLinked;             // whether that is a link
     RegularFile file;
 };

@@ -6,8 +6,7 @@
 
 constexpr const wchar_t* RunLogFileName = L"UpgradeDowngrade.log";
 
-/// The log's folder, with a final separator. Does not check that it exists; the tool never creates
-/// it.
+/// The log's folder, with a final separator. It may be missing; RunLog does not create it.
 wxString RunLogDirPath();
 
 /// Whether the run writes its log; true at process start, cleared by the command line.

@@ -19,8 +19,7 @@ struct HotFolder
 {
     explicit HotFolder(const wxString& listedPath);
 
-    /// Opens Folder.cfg by its name and loads it: the client may have replaced it since the last
-    /// time.
+    /// Opens Folder.cfg by its name, as the client may have replaced it, and loads it.
     XmlFile::State LoadCfg();
 
     const wxString path; // as it is listed; for messages and the shell

@@ -43,10 +43,10 @@ struct XmlLook
 };
 
 /// Loads the document with wxXmlDocument::Load (encoding "UTF-8"), text nodes that are only white
-/// space included. It has no root afterwards if it is malformed or not within the limits, to which
-/// 2,048 levels and a million characters of a text or value are added; the caller has compared the
-/// number of bytes. The library reports nothing. Throws std::bad_alloc if there is not enough
-/// memory to work with the document.
+/// space included. It has no root afterwards if it is malformed, has more than 2,048 levels or a
+/// million characters in a text or value, or exceeds the limits; but the caller compares the number
+/// of bytes. The library reports nothing. Throws std::bad_alloc if there is not enough memory to
+/// work with the document.
 XmlLook LoadXml(const std::string& bytes, const XmlLimits& limits, wxXmlDocument& document);
 
 /// Whether LoadXml would load these bytes, unless they are malformed. Takes time proportional to

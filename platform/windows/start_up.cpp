@@ -16,9 +16,9 @@ struct StartUp
         SetDefaultDllDirectories(LOAD_LIBRARY_SEARCH_SYSTEM32);
         if (!IsElevated())
             return;
-        // From now on this process (no other inherits it) refuses to follow junctions and symbolic
-        // links that a process without administrator's rights has made. Before Windows 11 and
-        // Windows 10 22H2 the call fails and nothing changes.
+        // From now on the process refuses to follow junctions and symbolic links that a process
+        // without administrator's rights has made; it does not inherit that from an installer.
+        // Before Windows 11 and Windows 10 22H2 the call fails and nothing changes.
         PROCESS_MITIGATION_REDIRECTION_TRUST_POLICY policy = {};
         policy.EnforceRedirectionTrust = 1;
         SetProcessMitigationPolicy(ProcessRedirectionTrustPolicy, &policy, sizeof policy);
