@@ -10,27 +10,12 @@
 #include "run/attempt.h"
 #include "store/hot_folder_list.h"
 
-#include <wx/arrstr.h>
 #include <wx/debug.h>
 
 #include <optional>
 
 namespace
 {
-
-enum class Switch
-{
-    Upgrade,
-    Downgrade,
-    Invalid
-};
-
-Switch ReadSwitch(const wxString& text)
-{
-    if (text.CmpNoCase("I") == 0)
-        return Switch::Upgrade;
-    return text.CmpNoCase("U") == 0 ? Switch::Downgrade : Switch::Invalid;
-}
 
 void UpdateHotFolder(const FolderUpgradeApp& app, const wxString& path, int position)
 {
@@ -52,19 +37,6 @@ void UpdateHotFolder(const FolderUpgradeApp& app, const wxString& path, int posi
     RunLog(L"updated Impose path for hf" + path, position);
 }
 
-wxArrayString ListHotFolders()
-{
-    wxArrayString folders;
-    Attempt(L"HotFolderList.cfg", GetHotFolderListPath(),
-            [&]()
-            {
-                wxArrayString read;
-                ReadHotFolderList(read);
-                folders = read;
-            });
-    return folders;
-}
-
 } // namespace
 
 FolderUpgradeApp::FolderUpgradeApp() : m_bundleIconsDir(BundleIconsDirName)
@@ -80,22 +52,17 @@ bool FolderUpgradeApp::OnInit()
         return false;
     if (argc == 3 && argv[2].CmpNoCase("V") == 0)
         RunLogEnabled = false;
-    switch (ReadSwitch(argv[1]))
+    m_isUpgrade = argv[1].CmpNoCase("I") == 0;
+    if (!m_isUpgrade && argv[1].CmpNoCase("U") != 0)
     {
-    case Switch::Upgrade:
-        m_isUpgrade = true;
-        RunLog(L"Installation : Upgrade call with switch: I");
-        break;
-    case Switch::Downgrade:
-        m_isUpgrade = false;
-        RunLog(L"Un-installation : Downgrade call with switch: U");
-        break;
-    case Switch::Invalid:
         RunLog(L"Invalid call check calling parameter: exiting....");
         return false;
     }
+    RunLog(m_isUpgrade ? L"Installation : Upgrade call with switch: I"
+                       : L"Un-installation : Downgrade call with switch: U");
 
-    const wxArrayString folders = ListHotFolders();
+    wxArrayString folders;
+    Attempt(L"HotFolderList.cfg", GetHotFolderListPath(), [&]() { ReadHotFolderList(folders); });
     if (folders.empty())
         RunLog(L"No Hotfolder listed");
 

@@ -1,12 +1,8 @@
 #include "appearance/desktop_ini.h"
 
-#include "appearance/shell_version.h"
-#include "platform/system.h"
-
 #include <wx/filename.h>
 
 #include <array>
-#include <cstdint>
 
 namespace
 {
@@ -23,6 +19,24 @@ const wchar_t* const DefaultIconFile = L"00";
 constexpr std::int64_t LongestIni = std::int64_t{4} * 1024 * 1024;
 
 using Kind = DesktopIniChange::Kind;
+
+// Whether the shell takes a folder's settings from Desktop.ini, as it does from version 4.72 on.
+bool IsReadByShell()
+{
+    const HMODULE shell = LoadLibraryW(L"shell32.dll");
+    if (!shell)
+        return false;
+    DLLVERSIONINFO version = {};
+    version.cbSize = sizeof version;
+    // By way of void*, since the two function types are unrelated.
+    const auto getVersion = reinterpret_cast<DLLGETVERSIONPROC>(
+        reinterpret_cast<void*>(GetProcAddress(shell, "DllGetVersion")));
+    const bool isKnown = getVersion && SUCCEEDED(getVersion(&version));
+    FreeLibrary(shell);
+    const DWORD packed =
+        (version.dwMajorVersion & 0xFFFF) << 16 | (version.dwMinorVersion & 0xFFFF);
+    return isKnown && packed >= 0x00040048;
+}
 
 void DecideKind(const HotFolder& folder, DesktopIniChange& change)
 {
@@ -92,7 +106,7 @@ DesktopIniChange DecideDesktopIni(const HotFolder& folder, const wxString& iconN
 {
     const wxString path = folder.directory.Reach(DesktopIniName);
     DesktopIniChange change;
-    change.isCustomised = GetPackedShellVersion() >= CustomFolderVersion;
+    change.isCustomised = IsReadByShell();
     DecideKind(folder, change);
     if (change.isCustomised)
         change.folder = DecideAttributes(folder.directory.Reach({}), FILE_ATTRIBUTE_SYSTEM,

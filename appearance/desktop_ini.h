@@ -4,8 +4,6 @@
 #include "appearance/attribute_change.h"
 #include "store/hot_folder.h"
 
-#include <wx/string.h>
-
 #include <vector>
 
 constexpr const wchar_t* DesktopIniName = L"Desktop.ini";
@@ -45,8 +43,8 @@ DesktopIniChange DecideDesktopIni(const HotFolder& folder, const wxString& iconN
 bool WriteIniString(const wxString& section, const wxString& key, const wxString& value,
                     const wxString& path);
 
-/// Creates a Desktop.ini with these keys. Returns false and writes nothing if the hot folder is not
-/// a directory; failed writes are not reported. Writes nothing if anything of that name exists.
+/// Creates a Desktop.ini with these keys, unless anything of that name exists. Returns false if the
+/// hot folder is not a directory; failed writes are not reported.
 bool CreateDesktopIni(const HotFolder& folder, const std::vector<DesktopIniKey>& keys);
 
 /// Removes read-only and system from a Desktop.ini, writes the keys and has the shell force the

@@ -3,7 +3,6 @@
 #include "appearance/icon_copy.h"
 #include "platform/file_copy.h"
 #include "platform/library_log.h"
-#include "platform/system.h"
 #include "run/attempt.h"
 
 #include <wx/filename.h>

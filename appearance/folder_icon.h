@@ -4,13 +4,10 @@
 #include "appearance/desktop_ini.h"
 #include "run/folder_upgrade_app.h"
 
-#include <wx/string.h>
-
-/// Copies the icon for the folder's state over the icon of the same name in its private directory,
-/// and refreshes Desktop.ini, attributes and Explorer. An upgrade takes the icon from the
-/// executable's directory, a downgrade from the bundle icons directory in it. If either icon is
-/// missing, nothing changes. Reports to the run log; the library reports a Folder.cfg that cannot
-/// be read and a failed copy.
+/// Copies the icon that DecideIconCopy chooses over the one of the same name in the private
+/// directory, and refreshes Desktop.ini, attributes and Explorer. If either icon is missing,
+/// nothing changes. Reports to the run log; the library reports a Folder.cfg that cannot be read
+/// and a failed copy.
 void UpdateFolderIcon(const FolderUpgradeApp& app, HotFolder& folder);
 
 /// Writes or refreshes the folder's Desktop.ini, makes the folder a system folder that is not

@@ -3,10 +3,21 @@
 
 #include "store/hot_folder.h"
 
-#include <wx/string.h>
-
 /// The name of the folder beside the executable that holds the previous version's icons.
 constexpr const wchar_t* BundleIconsDirName = L"BundleIcons";
+
+enum class FolderIconState
+{
+    Active = 1,
+    Inactive = 2,
+    ErrorActive = 3,
+    ErrorInactive = 4
+};
+
+/// Gives the file name, without a directory, of the icon for the folder's state: whether its
+/// Folder.cfg enables it (not if it cannot be read), and whether its private directory holds a file
+/// "Error.er" (not if it is missing or cannot be listed). Changes nothing; returns true.
+bool GetFolderIconName(HotFolder& folder, wxString& iconName);
 
 struct IconCopy
 {

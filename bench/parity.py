@@ -111,7 +111,10 @@ def outcome(station, switch):
     """The files that FolderUpgradeRun leaves, its reports and the run log among them."""
     program = station.root / "tool/FolderUpgradeRun"
     if isinstance(station, lay_out.WineWorkstation):
-        station.wine(station.seen("tool", "FolderUpgradeRun.exe"), switch)
+        for _ in range(3):  # now and then Wine itself ends before the program has begun
+            station.wine(station.seen("tool", "FolderUpgradeRun.exe"), switch)
+            if any(host(station, "user/ORX_Installers").glob("*-after.txt")):
+                break
     else:
         subprocess.run([program, switch], env=station.environment, check=False, stderr=subprocess.DEVNULL)
     found = {}

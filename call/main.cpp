@@ -4,7 +4,7 @@
 #include "platform/path_normal_form.h"
 #include "platform/standard_output.h"
 #include "platform/started_process.h"
-#include "run/run_log_place.h"
+#include "run/run_log.h"
 
 #include <wx/app.h>
 #include <wx/debug.h>
@@ -138,10 +138,11 @@ class FolderUpgradeRunApp : public wxAppConsole
         if ((!isUpgrade && !isDowngrade) || limit < 1 || limit > LongestLimit || argc > next + 1 ||
             (argc > next && argv[next].StartsWith("-")))
         {
-            WriteStandardError("Usage: FolderUpgradeRun I|U [--limit SECONDS] [FOLDER]\n"
-                               "Runs FolderUpgrade with the same switch, between two checks.\n"
-                               "Exit status: 0 everything is as it should be, 1 changes are left, "
-                               "2 problems, 3 wrong arguments, 4 FolderUpgrade did not run.\n");
+            WriteTo(StandardStream::Error,
+                    "Usage: FolderUpgradeRun I|U [--limit SECONDS] [FOLDER]\n"
+                    "Runs FolderUpgrade with the same switch, between two checks.\n"
+                    "Exit status: 0 everything is as it should be, 1 changes are left, "
+                    "2 problems, 3 wrong arguments, 4 FolderUpgrade did not run.\n");
             return WrongArguments;
         }
         const wxString logFolder = RunLogDirPath();

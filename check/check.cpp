@@ -1,11 +1,14 @@
 #include "check/check.h"
 
-#include "check/hot_folder_check.h"
+#include "check/folder_cfg_check.h"
+#include "check/folder_icon_check.h"
 #include "check/preset_check.h"
+#include "check/reach.h"
 #include "check/workstation_check.h"
 #include "platform/process_rights.h"
 
 #include <wx/datetime.h>
+#include <wx/filename.h>
 
 #include <map>
 #include <new>
@@ -15,15 +18,41 @@ namespace
 
 void WriteHead(TemplateFolders& folders, Report& report)
 {
-    report.Head(wxString("FolderUpgradeCheck ") + PROGRAM_VERSION + ", " +
-                (folders.IsUpgrade() ? "upgrade" : "downgrade") + ", " +
-                wxDateTime::Now().Format("%Y-%m-%d %H:%M") + ", " + AccountName() + ", " +
-                (IsElevated() ? "elevated" : "not elevated"));
+    report.Write(wxString("FolderUpgradeCheck ") + PROGRAM_VERSION + ", " +
+                 (folders.isUpgrade ? "upgrade" : "downgrade") + ", " +
+                 wxDateTime::Now().Format("%Y-%m-%d %H:%M") + ", " + AccountName() + ", " +
+                 (IsElevated() ? "elevated" : "not elevated"));
     const auto shown = [](const TemplateFolder& folder)
     {
         return folder.path.empty() ? wxString("(unknown)") : folder.path;
     };
-    report.Head("From " + shown(folders.From()) + " to " + shown(folders.To()));
+    report.Write("From " + shown(folders.From()) + " to " + shown(folders.To()));
+}
+
+// What prevents a run from reaching anything in the private directory.
+wxString FindObstacle(const HotFolder& folder)
+{
+    const wxString obstacle = WhyOutOfReach(folder.path);
+    if (!obstacle.empty())
+        return "the hot folder " + obstacle;
+    const wxString privateDir = folder.directory.Reach(PrivateDirName);
+    if (IsLink(privateDir))
+        return wxString(PrivateDirName) + ": reached over a link";
+    if (wxDirExists(privateDir) && !MayEnter(folder.privateDir))
+        return wxString(PrivateDirName) + ": cannot be entered";
+    return {};
+}
+
+void CheckHotFolder(HotFolder& folder, TemplateCheck& check)
+{
+    const wxString obstacle = FindObstacle(folder);
+    if (!obstacle.empty())
+    {
+        check.report.Problem(obstacle);
+        return;
+    }
+    CheckFolderCfg(folder, check);
+    CheckFolderIcon(folder, check);
 }
 
 // A directory that is listed under two names is checked once.
@@ -57,7 +86,7 @@ void CheckHotFolders(const HotFolderList& list, TemplateCheck& check)
 void CheckRun(TemplateFolders& folders, Report& report)
 {
     WriteHead(folders, report);
-    TemplateCheck check(folders, report);
+    TemplateCheck check{folders, report};
     report.Begin("Workstation");
     CheckAccount(report);
     check.CheckPreviousFolder();

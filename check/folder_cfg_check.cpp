@@ -95,24 +95,17 @@ bool CheckTemplate(HotFolder& folder, TemplateCheck& check)
 void CheckFolderCfg(HotFolder& folder, TemplateCheck& check)
 {
     Report& report = check.report;
-    switch (folder.LoadCfg())
-    {
-    case XmlFile::State::Missing:
+    const XmlFile::State state = folder.LoadCfg();
+    if (state == XmlFile::State::Missing)
         CheckMissing(folder, report);
-        break;
-    case XmlFile::State::TooLarge:
-        ReportLeft(CfgStays::TooLarge, report);
-        break;
-    case XmlFile::State::NotReadable:
+    else if (state == XmlFile::State::TooLarge)
+        ReportLeft(CfgTooLarge, report);
+    else if (state == XmlFile::State::NotReadable)
         report.Problem("Folder.cfg: " +
                        (folder.cfg.error.message.empty()
                             ? folder.cfg.WhyNotReadable(FolderCfgPath(folder.path))
                             : Damage(folder.cfg.error) +
                                   "; it stays as it is, and the folder shows as disabled"));
-        break;
-    case XmlFile::State::Loaded:
-        if (!CheckTemplate(folder, check))
-            CheckShownState(*folder.cfg.Root(), report);
-        break;
-    }
+    else if (!CheckTemplate(folder, check))
+        CheckShownState(*folder.cfg.Root(), report);
 }

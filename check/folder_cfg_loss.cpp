@@ -7,34 +7,20 @@
 #include <wx/hashmap.h>
 
 #include <algorithm>
-#include <initializer_list>
+#include <set>
 #include <unordered_set>
-#include <vector>
 
 namespace
 {
 
-bool IsOneOf(std::initializer_list<const wchar_t*> texts, const wxString& text)
-{
-    return std::any_of(texts.begin(), texts.end(),
-                       [&](const wchar_t* each) { return text == each; });
-}
+// The attributes that the writer adds where they are missing.
+const std::set<wxString> AddedAttributes = {
+    FolderCfg::Path,  FolderCfg::ShortName,       FolderCfg::DisplayName,    FolderCfg::Key,
+    FolderCfg::Value, FolderCfg::KeyDisplayValue, FolderCfg::LocDisplayValue};
 
-// The writer adds these attributes where they are missing.
-bool IsAdded(const wxString& name)
-{
-    return IsOneOf({FolderCfg::Path, FolderCfg::ShortName, FolderCfg::DisplayName, FolderCfg::Key,
-                    FolderCfg::Value, FolderCfg::KeyDisplayValue, FolderCfg::LocDisplayValue},
-                   name);
-}
-
-bool IsSection(const wxString& name)
-{
-    return IsOneOf({FolderCfg::InputFormatsSection, FolderCfg::PathsSection,
-                    FolderCfg::JobSettingSection, FolderCfg::ImposeSettingSection,
-                    FolderCfg::FilterSettingSection, FolderCfg::PreflightSection},
-                   name);
-}
+const std::set<wxString> Sections = {
+    FolderCfg::InputFormatsSection,  FolderCfg::PathsSection,         FolderCfg::JobSettingSection,
+    FolderCfg::ImposeSettingSection, FolderCfg::FilterSettingSection, FolderCfg::PreflightSection};
 
 // The path in the template's entry is meant to change.
 bool IsTemplatePath(const wxXmlNode& element, const wxXmlAttribute& attribute)
@@ -51,8 +37,9 @@ wxString DescribeElement(const wxXmlNode& element, bool isInFilter)
     for (const wxXmlAttribute* each = element.GetAttributes(); each; each = each->GetNext())
     {
         const bool isKept =
-            !isInFilter && ((each->GetValue().empty() && IsAdded(each->GetName())) ||
-                            IsTemplatePath(element, *each));
+            !isInFilter &&
+            ((each->GetValue().empty() && AddedAttributes.count(each->GetName()) != 0) ||
+             IsTemplatePath(element, *each));
         if (!isKept)
             attributes.push_back(" " + each->GetName() + "=\"" + each->GetValue() + "\"");
     }
@@ -67,13 +54,9 @@ wxString DescribeElement(const wxXmlNode& element, bool isInFilter)
 // is, and the root may come out under another name.
 std::vector<wxString> DescribeContent(const wxXmlNode& root)
 {
-    struct Open
-    {
-        const wxXmlNode* next;
-        bool isInFilter;
-    };
     std::vector<wxString> content;
-    std::vector<Open> open = {{root.GetChildren(), false}};
+    // At each level, the next node and whether it is in the filter setting.
+    std::vector<std::pair<const wxXmlNode*, bool>> open = {{root.GetChildren(), false}};
     while (!open.empty())
     {
         const auto [node, isInFilter] = open.back();
@@ -82,7 +65,8 @@ std::vector<wxString> DescribeContent(const wxXmlNode& root)
             open.pop_back();
             continue;
         }
-        open.back().next = node->GetNext();
+        open.back().first = node->GetNext();
+        const wxString text = wxString(node->GetContent()).Trim().Trim(false);
         wxString what;
         if (node->GetType() == wxXML_ELEMENT_NODE)
         {
@@ -92,14 +76,12 @@ std::vector<wxString> DescribeContent(const wxXmlNode& root)
         }
         else if (node->GetType() == wxXML_PI_NODE)
             what = "the instruction <?" + node->GetName() + "?>";
-        else if (node->GetType() != wxXML_COMMENT_NODE)
-            what = wxString(node->GetContent()).Trim().Trim(false);
+        else if (node->GetType() != wxXML_COMMENT_NODE && !text.empty())
+            what = "the text \"" + text + "\"";
         if (what.empty())
             continue;
-        if (node->GetType() == wxXML_TEXT_NODE || node->GetType() == wxXML_CDATA_SECTION_NODE)
-            what = "the text \"" + what + "\"";
         const wxXmlNode* parent = node->GetParent();
-        content.push_back(parent == &root || IsSection(node->GetName())
+        content.push_back(parent == &root || Sections.count(node->GetName()) != 0
                               ? what
                               : what + " in <" + parent->GetName() + ">");
     }

@@ -3,10 +3,7 @@
 
 #include "store/root_attributes.h"
 
-#include <wx/xml/xml.h>
-
 #include <string>
-#include <vector>
 
 /// One phrase for each part of the document that the rewritten bytes lose or change. Both have the
 /// same template path. Comments, white space and order are ignored. The document has to be loaded

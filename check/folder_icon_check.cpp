@@ -46,17 +46,12 @@ bool MayWriteIni(const HotFolder& folder)
     return ini.OpenForUpdate(folder.directory, DesktopIniName) == RegularFile::Status::Open;
 }
 
-void CheckKeys(const HotFolder& folder, const DesktopIniChange& change, Report& report)
+wxString KeyNames(const std::vector<DesktopIniKey>& keys)
 {
-    if (change.keys.empty())
-        return;
     wxString names;
-    for (const DesktopIniKey& each : change.keys)
+    for (const DesktopIniKey& each : keys)
         names += (names.empty() ? wxString() : wxString(", ")) + each.key;
-    if (MayWriteIni(folder))
-        report.Change("Desktop.ini: " + names);
-    else
-        report.Problem("Desktop.ini: cannot be opened for reading and writing");
+    return names;
 }
 
 void CheckDesktopIni(const HotFolder& folder, const wxString& iconName, Report& report)
@@ -64,30 +59,19 @@ void CheckDesktopIni(const HotFolder& folder, const wxString& iconName, Report& 
     using Kind = DesktopIniChange::Kind;
     const DesktopIniChange change = DecideDesktopIni(folder, iconName);
     const wxString path = folder.directory.Reach({});
-    switch (change.kind)
-    {
-    case Kind::Stays:
+    if (change.kind == Kind::Stays)
         report.Problem(wxString("Desktop.ini: left as it is (") + change.reasonToStay + ")");
-        break;
-    case Kind::NotAFile:
+    else if (change.kind == Kind::NotAFile)
         report.Problem("Desktop.ini: is not a file");
-        break;
-    case Kind::NotReadable:
+    else if (change.kind == Kind::Create && !MayCreateIn(path))
+        report.Problem(
+            "Desktop.ini: cannot be created, because the hot folder cannot be written to");
+    else if (change.kind == Kind::Create)
+        report.Change("Desktop.ini: new");
+    else if (change.kind == Kind::NotReadable || (!change.keys.empty() && !MayWriteIni(folder)))
         report.Problem("Desktop.ini: cannot be opened for reading and writing");
-        break;
-    case Kind::Create:
-        if (MayCreateIn(path))
-            report.Change("Desktop.ini: new");
-        else
-            report.Problem(
-                "Desktop.ini: cannot be created, because the hot folder cannot be written to");
-        break;
-    case Kind::Refresh:
-        CheckKeys(folder, change, report);
-        break;
-    case Kind::Nothing:
-        break;
-    }
+    else if (!change.keys.empty())
+        report.Change("Desktop.ini: " + KeyNames(change.keys));
     if (change.kind != Kind::Create)
         CheckAttributes("Desktop.ini", folder.directory.Reach(DesktopIniName), change.ini, report);
     CheckAttributes("hot folder", path, change.folder, report);
@@ -98,29 +82,20 @@ void CheckDesktopIni(const HotFolder& folder, const wxString& iconName, Report& 
 void CheckFolderIcon(HotFolder& folder, TemplateCheck& check)
 {
     Report& report = check.report;
-    const IconCopy copy = DecideIconCopy(folder, check.folders.IsUpgrade(), BundleIconsDirName);
-    switch (copy.outcome)
-    {
-    case IconCopy::Outcome::Linked:
+    const IconCopy copy = DecideIconCopy(folder, check.folders.isUpgrade, BundleIconsDirName);
+    if (copy.outcome == IconCopy::Outcome::Linked)
         report.Problem(copy.name + ": reached over a link");
-        break;
-    case IconCopy::Outcome::NoCopy:
+    else if (copy.outcome == IconCopy::Outcome::NoCopy)
         report.Note("no copy of the icon to replace: " + copy.name);
-        break;
-    case IconCopy::Outcome::NoSource:
-        if (check.folders.IsRehearsal())
-            report.NoteOnce(
-                "the icons being installed are not there, so icons are left out of this check");
-        else
-            report.ProblemOnce("source icon missing: " + copy.source);
-        break;
-    case IconCopy::Outcome::Replaces:
-        if (!MayCopyOver(copy.source, folder.privateDir, copy.name))
-            report.Problem(copy.name +
-                           ": cannot be replaced (read-only, in use, or access denied)");
-        else if (!IsCopy(copy.source, folder.privateDir, copy.name))
-            report.Change(copy.name);
+    else if (copy.outcome == IconCopy::Outcome::NoSource && check.folders.isRehearsal)
+        report.NoteOnce(
+            "the icons being installed are not there, so icons are left out of this check");
+    else if (copy.outcome == IconCopy::Outcome::NoSource)
+        report.ProblemOnce("source icon missing: " + copy.source);
+    else if (!MayCopyOver(copy.source, folder.privateDir, copy.name))
+        report.Problem(copy.name + ": cannot be replaced (read-only, in use, or access denied)");
+    else if (!IsCopy(copy.source, folder.privateDir, copy.name))
+        report.Change(copy.name);
+    if (copy.outcome == IconCopy::Outcome::Replaces)
         CheckDesktopIni(folder, copy.name, report);
-        break;
-    }
 }

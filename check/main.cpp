@@ -51,9 +51,9 @@ int Check(const Options& options)
     CheckRun(folders, report);
     if (report.End())
         return report.ExitStatus();
-    WriteStandardError("FolderUpgradeCheck: the report cannot be written to " +
-                       (options.file.empty() ? wxString("the standard output") : options.file) +
-                       "\n");
+    WriteTo(StandardStream::Error,
+            "FolderUpgradeCheck: the report cannot be written to " +
+                (options.file.empty() ? wxString("the standard output") : options.file) + "\n");
     return HasProblems;
 }
 
@@ -76,13 +76,14 @@ class FolderUpgradeCheckApp : public wxAppConsole
         const wxString first = arguments.empty() ? wxString() : arguments[0];
         Options options;
         if (first == "--help" || first == "-h" || first == "/?")
-            return WriteStandardOutput(Usage) ? NothingToDo : HasProblems;
+            return WriteTo(StandardStream::Output, Usage) ? NothingToDo : HasProblems;
         if (first == "--version")
-            return WriteStandardOutput("FolderUpgradeCheck " PROGRAM_VERSION "\n") ? NothingToDo
-                                                                                   : HasProblems;
+            return WriteTo(StandardStream::Output, "FolderUpgradeCheck " PROGRAM_VERSION "\n")
+                       ? NothingToDo
+                       : HasProblems;
         if (ReadOptions(arguments, options))
             return Check(options);
-        WriteStandardError(Usage);
+        WriteTo(StandardStream::Error, Usage);
         return WrongArguments;
     }
 };

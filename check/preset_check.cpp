@@ -10,7 +10,6 @@
 
 #include <algorithm>
 #include <map>
-#include <set>
 
 namespace
 {
@@ -19,16 +18,16 @@ namespace
 wxString OtherChange(const std::string& before, const std::string& after)
 {
     const wxBOM mark = wxConvAuto::DetectBOM(before.data(), before.length());
-    if (mark == wxBOM_UTF8 && before.substr(3) == after)
-        return "loses its byte-order mark";
     if (mark != wxBOM_None && mark != wxBOM_Unknown && mark != wxBOM_UTF8)
         return "comes out as UTF-8, without byte-order mark";
+    const std::string content = before.substr(mark == wxBOM_UTF8 ? 3 : 0);
+    if (content == after)
+        return "loses its byte-order mark";
     const auto withoutLineEnds = [](std::string text)
     {
         text.erase(std::remove(text.begin(), text.end(), '\r'), text.end());
         return text;
     };
-    const std::string content = mark == wxBOM_UTF8 ? before.substr(3) : before;
     if (withoutLineEnds(content) == withoutLineEnds(after))
         return mark == wxBOM_UTF8 ? "loses its byte-order mark, and its line ends become CR LF"
                                   : "its line ends become CR LF";
@@ -139,18 +138,17 @@ Findings CheckPaths(const wxString& text, bool isRewritten, TemplateCheck& check
 void CheckPreset(JobPresetFile& preset, const wxString& name, TemplateCheck& check)
 {
     Report& report = check.report;
-    const RegularFile& file = preset.GetFile();
     const RegularFile::Status opened = preset.OpenForReading();
     if (opened != RegularFile::Status::Open)
     {
         report.Problem(name + (opened == RegularFile::Status::Refused
                                    ? "cannot be opened for reading (" +
-                                         file.GetFailure().Describe(preset.GetPath()) + ")"
+                                         preset.file.GetFailure().Describe(preset.path) + ")"
                                    : wxString("reached over a link, or not a file")));
         return;
     }
-    const RegularFile::Status reopened = preset.GetFile().ReopenForUpdate();
-    const FailedCall reopening = file.GetFailure();
+    const RegularFile::Status reopened = preset.file.ReopenForUpdate();
+    const FailedCall reopening = preset.file.GetFailure();
     const RewrittenPreset rewritten =
         preset.Decide(check.folders.From().path, check.folders.To().path);
     wxString text;
@@ -164,8 +162,8 @@ void CheckPreset(JobPresetFile& preset, const wxString& name, TemplateCheck& che
     if (rewritten.reasonToStay)
         report.Problem(name + "left as it is (" + rewritten.reasonToStay + ")");
     else if (!isRewritten)
-        report.Problem(name + "cannot be opened for writing (" +
-                       reopening.Describe(preset.GetPath()) + ")");
+        report.Problem(name + "cannot be opened for writing (" + reopening.Describe(preset.path) +
+                       ")");
     else
         CheckContent(name, rewritten, report);
     Findings findings = CheckPaths(text, isRewritten, check);
@@ -174,33 +172,25 @@ void CheckPreset(JobPresetFile& preset, const wxString& name, TemplateCheck& che
     report.Add(name, findings);
 }
 
-// Why a presets.xml that may exist cannot be seen; empty if it does not exist.
-wxString WhyMissing(const JobPresetFile& preset, const wxString& directory)
-{
-    for (const wxString& each : {directory, wxFileName(preset.GetPath()).GetPath()})
-    {
-        const wxString obstacle = WhyOutOfReach(each);
-        if (!obstacle.empty())
-            return each + " " + obstacle;
-    }
-    return {};
-}
-
 // False if there is no preset.
 bool CheckDirectory(const wxString& directory, const wxString& root, TemplateCheck& check)
 {
-    Report& report = check.report;
     JobPresetFile preset(directory);
-    const wxString name = preset.GetPath().Mid(root.length()) + ": ";
+    const wxString name = preset.path.Mid(root.length()) + ": ";
     if (preset.IsThere())
     {
         CheckPreset(preset, name, check);
         return true;
     }
-    const wxString obstacle = WhyMissing(preset, directory);
-    if (!obstacle.empty())
-        report.Problem(name + obstacle);
-    return !obstacle.empty();
+    for (const wxString& each : {directory, wxFileName(preset.path).GetPath()})
+    {
+        const wxString obstacle = WhyOutOfReach(each); // it may exist and not be seen
+        if (obstacle.empty())
+            continue;
+        check.report.Problem(name + each + " " + obstacle);
+        return true;
+    }
+    return false;
 }
 
 } // namespace

@@ -3,8 +3,6 @@
 
 #include "platform/pinned_directory.h"
 
-#include <wx/string.h>
-
 bool MayEnter(const PinnedDirectory& directory);
 
 /// Why a run cannot reach the contents of the directory, as the end of a sentence. Empty if it can,

@@ -40,11 +40,6 @@ Report::Report(const PinnedDirectory& directory, const wxString& name)
 {
 }
 
-void Report::Head(const wxString& text)
-{
-    Write(text);
-}
-
 void Report::Begin(const wxString& title)
 {
     EndBlock();
@@ -157,7 +152,7 @@ void Report::Write(const wxString& text)
 {
     const wxString line = ToOneLine(text) + wxTextBuffer::GetEOL();
     if (!m_toFile)
-        m_isWritten = WriteStandardOutput(line) && m_isWritten;
+        m_isWritten = WriteTo(StandardStream::Output, line) && m_isWritten;
     else if (m_isWritten)
         m_isWritten = m_file.Append(line.utf8_string());
 }

@@ -1,11 +1,9 @@
-// The report of a check: what a run would change, what would prevent a change, and what is worth
-// knowing.
+// The report of a check: what a run would change, what would prevent it, and what is worth knowing.
 #pragma once
 
 #include "platform/regular_file.h"
 
 #include <wx/arrstr.h>
-#include <wx/string.h>
 
 #include <array>
 #include <set>
@@ -31,13 +29,12 @@ struct Findings
 class Report
 {
   public:
-    /// Writes to the file, or to the standard output if the name is empty. A link or a pipe in
-    /// place of the file is not written to.
+    /// Writes to the file, never through a link, or to the standard output if the name is empty.
     explicit Report(const wxString& fileName);
     Report(const PinnedDirectory& directory, const wxString& name);
 
-    /// Writes a line of the head, which comes before all blocks.
-    void Head(const wxString& text);
+    /// Writes a line at once. The head comes before all blocks.
+    void Write(const wxString& text);
 
     /// Begins a block about this subject. A block without lines is left out; in others, the
     /// problems are written first and the notes last.
@@ -74,7 +71,6 @@ class Report
     void Add(Kind kind, const wxString& text);
     void AddSome(Kind kind, const wxString& prefix, const std::vector<wxString>& texts);
     void EndBlock();
-    void Write(const wxString& text);
 
     RegularFile m_file;
     const bool m_toFile;

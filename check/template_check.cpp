@@ -4,7 +4,7 @@
 #include "platform/local_drive.h"
 #include "platform/path_normal_form.h"
 #include "platform/process_rights.h"
-#include "store/xml_text.h"
+#include "store/xml_document.h"
 
 #include <wx/filename.h>
 #include <wx/log.h>
@@ -76,11 +76,6 @@ Place Look(const wxString& path, const wxString& trusted)
 
 } // namespace
 
-TemplateCheck::TemplateCheck(TemplateFolders& itsFolders, Report& itsReport)
-    : folders(itsFolders), report(itsReport)
-{
-}
-
 void TemplateCheck::CheckPreviousFolder()
 {
     const TemplateFolder& previous = folders.Previous();
@@ -88,11 +83,11 @@ void TemplateCheck::CheckPreviousFolder()
         return;
     if (previous.path.empty())
         report.Problem(previous.source.name +
-                       (folders.IsUpgrade() ? ": empty; only templates stored without a folder move"
-                                            : ": empty; templates move to the root of the drive"));
+                       (folders.isUpgrade ? ": empty; only templates stored without a folder move"
+                                          : ": empty; templates move to the root of the drive"));
     else if (wxFileName::IsPathSeparator(previous.path.Last()))
         report.Problem(previous.source.name +
-                       (folders.IsUpgrade()
+                       (folders.isUpgrade
                             ? ": ends in a separator; no template of a hot folder moves"
                             : ": ends in a separator; it is doubled in the paths of hot folders"));
 }
@@ -134,20 +129,20 @@ void TemplateCheck::Judge(const wxString& path, const wxString& whyItStays, Find
     if (place == Place::NotLookedAt)
         findings.notes.push_back("not looked at: " + Shown(path));
     else if (place == Place::Missing && IsIn(path, to) && !wxDirExists(to))
-        ++m_awaited;
+        ++awaited;
     else if (place == Place::Missing)
         findings.problems.push_back("no template at " + Shown(path));
 }
 
 void TemplateCheck::ReportAwaited()
 {
-    if (m_awaited == 0)
+    if (awaited == 0)
         return;
     const wxString text =
         wxString::Format("there is no folder %s; templates that will be looked for in it: %zu",
-                         folders.To().path, m_awaited);
+                         folders.To().path, awaited);
     // It may not be there yet before an installation, and before a removal has put it back.
-    if (folders.IsUpgrade() && !folders.IsRehearsal())
+    if (folders.isUpgrade && !folders.isRehearsal)
         report.Problem(text);
     else
         report.Note(text);

@@ -4,14 +4,9 @@
 #include "check/report.h"
 #include "migrate/template_folders.h"
 
-#include <wx/string.h>
-
 /// The two template folders and the report, for all parts of a check.
-class TemplateCheck
+struct TemplateCheck
 {
-  public:
-    TemplateCheck(TemplateFolders& itsFolders, Report& itsReport);
-
     /// Reports what is wrong with the previous version's folder, whether or not a template moves.
     void CheckPreviousFolder();
     /// Reports once that a folder that is needed is unknown.
@@ -22,12 +17,10 @@ class TemplateCheck
     /// Judges a path as a run leaves it: whether it still leads into the folder being left, and
     /// whether anything is there. No server is asked, and no link followed.
     void Judge(const wxString& path, const wxString& whyItStays, Findings& findings);
-    /// Reports how many templates are in the folder being installed, if it is not there as a whole.
+    /// Reports how many templates the missing folder has to hold.
     void ReportAwaited();
 
     TemplateFolders& folders;
     Report& report;
-
-  private:
-    size_t m_awaited = 0;
+    size_t awaited = 0; // templates in the folder being installed, which is not there
 };

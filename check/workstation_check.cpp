@@ -3,8 +3,7 @@
 #include "check/reach.h"
 #include "platform/access_rights.h"
 #include "platform/process_rights.h"
-#include "platform/regular_file.h"
-#include "run/run_log_place.h"
+#include "run/run_log.h"
 
 #include <wx/filename.h>
 
@@ -64,30 +63,21 @@ void CheckAccount(Report& report)
 void CheckHotFolderList(const HotFolderList& list, Report& report)
 {
     const wxString obstacle = WhyOutOfReach(GetHotFolderDataDir());
-    switch (list.state)
-    {
-    case XmlFile::State::Missing:
-        if (!obstacle.empty())
-            report.Problem("HotFolderList.cfg: its folder " + obstacle);
-        else if (wxFileName::Exists(GetHotFolderListPath(),
-                                    wxFILE_EXISTS_ANY | wxFILE_EXISTS_NO_FOLLOW))
-            report.Problem("HotFolderList.cfg: is not a file");
-        else
-            report.Note("there is no " + GetHotFolderListPath());
-        break;
-    case XmlFile::State::NotReadable:
-        report.Problem((list.error.message.empty()
-                            ? list.whyNotReadable
-                            : GetHotFolderListPath() + ": " + Damage(list.error)) +
-                       "; no hot folder is migrated");
-        break;
-    case XmlFile::State::TooLarge:
-        report.Problem("HotFolderList.cfg: too large to read safely");
-        break;
-    case XmlFile::State::Loaded:
+    const wxString path = GetHotFolderListPath();
+    if (list.state == XmlFile::State::Loaded)
         CheckEntries(list, report);
-        break;
-    }
+    else if (list.state == XmlFile::State::TooLarge)
+        report.Problem("HotFolderList.cfg: too large to read safely");
+    else if (list.state == XmlFile::State::NotReadable)
+        report.Problem(
+            (list.error.message.empty() ? list.whyNotReadable : path + ": " + Damage(list.error)) +
+            "; no hot folder is migrated");
+    else if (!obstacle.empty())
+        report.Problem("HotFolderList.cfg: its folder " + obstacle);
+    else if (wxFileName::Exists(path, wxFILE_EXISTS_ANY | wxFILE_EXISTS_NO_FOLLOW))
+        report.Problem("HotFolderList.cfg: is not a file");
+    else
+        report.Note("there is no " + path);
 }
 
 void CheckRunLog(Report& report)

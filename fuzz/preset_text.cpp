@@ -3,7 +3,7 @@
 #include "migrate/preset_text.h"
 
 #include "fuzz/fuzzing.h"
-#include "store/xml_text.h"
+#include "store/xml_document.h"
 
 namespace
 {

@@ -15,20 +15,13 @@ void LogUntouched(const wxString& cfgPath, const wxString& reason)
 
 void Save(HotFolder& folder, const std::string& content, const wxString& cfgPath)
 {
-    switch (SaveHotFolderSettings(folder, content))
-    {
-    case XmlFile::Saved::Refused:
+    const XmlFile::Saved saved = SaveHotFolderSettings(folder, content);
+    if (saved == XmlFile::Saved::Refused)
         ReportError(folder.cfg.file.GetFailure().Describe(cfgPath));
-        break;
-    case XmlFile::Saved::NotReadAgain:
-        LogUntouched(cfgPath, CfgStays::NotLoadedAgain);
-        break;
-    case XmlFile::Saved::Changed:
-        LogUntouched(cfgPath, CfgStays::Changed);
-        break;
-    case XmlFile::Saved::Done:
-        break;
-    }
+    else if (saved == XmlFile::Saved::NotReadAgain)
+        LogUntouched(cfgPath, L"cannot be loaded again");
+    else if (saved == XmlFile::Saved::Changed)
+        LogUntouched(cfgPath, L"changed meanwhile");
 }
 
 void MoveTemplate(HotFolder& folder, const wxString& cfgPath, bool isUpgrade)
@@ -38,27 +31,16 @@ void MoveTemplate(HotFolder& folder, const wxString& cfgPath, bool isUpgrade)
     const TemplateMove move = DecideTemplateMove(folder.cfg, folders);
     if (move.outcome != Outcome::NoSection)
         RunLog(L"Imposepath:" + folder.path + L"is: " + move.storedPath);
-    switch (move.outcome)
-    {
-    case Outcome::FromUnknown:
+    if (move.outcome == Outcome::FromUnknown)
         RunLog(isUpgrade ? L"Unable to read: Previous Version  Default Impose Template Path"
                          : L"Unable to read: Default Impose Template Path");
-        break;
-    case Outcome::ToUnknown:
+    else if (move.outcome == Outcome::ToUnknown)
         RunLog(isUpgrade ? L"Unable to read: Default Impose Template Path"
                          : L"unable to read: Previous Version  Default Impose Template Path");
-        break;
-    case Outcome::Stays:
+    else if (move.outcome == Outcome::Stays)
         LogUntouched(cfgPath, move.reasonToStay);
-        break;
-    case Outcome::Moves:
+    else if (move.outcome == Outcome::Moves)
         Save(folder, move.newContent, cfgPath);
-        break;
-    case Outcome::NoSection:
-    case Outcome::NoTemplate:
-    case Outcome::Elsewhere:
-        break;
-    }
 }
 
 } // namespace
@@ -66,19 +48,13 @@ void MoveTemplate(HotFolder& folder, const wxString& cfgPath, bool isUpgrade)
 void UpdateHotFolderImposePath(const FolderUpgradeApp& app, HotFolder& folder)
 {
     const wxString cfgPath = FolderCfgPath(folder.path);
-    switch (folder.LoadCfg())
-    {
-    case XmlFile::State::Missing:
+    const XmlFile::State state = folder.LoadCfg();
+    if (state == XmlFile::State::Missing)
         RunLog(L"HF cfg file unable to read/exist: " + cfgPath);
-        break;
-    case XmlFile::State::TooLarge:
-        LogUntouched(cfgPath, CfgStays::TooLarge);
-        break;
-    case XmlFile::State::NotReadable:
+    else if (state == XmlFile::State::TooLarge)
+        LogUntouched(cfgPath, CfgTooLarge);
+    else if (state == XmlFile::State::NotReadable)
         ReportError(folder.cfg.WhyNotReadable(cfgPath));
-        break;
-    case XmlFile::State::Loaded:
+    else
         MoveTemplate(folder, cfgPath, app.m_isUpgrade);
-        break;
-    }
 }

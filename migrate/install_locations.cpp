@@ -7,7 +7,6 @@
 
 #include <algorithm>
 #include <array>
-#include <vector>
 
 namespace
 {
@@ -21,37 +20,28 @@ struct Location
 {
     HKEY hive;
     const char* hiveName;
-    std::vector<const wchar_t*> keys;
+    std::array<const wchar_t*, 2> keys;
     const wchar_t* value;
 };
 
-const Location& DefaultFolder()
-{
-    static const Location location = {
-        HKEY_LOCAL_MACHINE,
-        "HKEY_LOCAL_MACHINE",
-        {L"SOFTWARE\\Wow6432Node\\Vantorix\\QZA", L"SOFTWARE\\Vantorix\\QZA"},
-        L"InstallPath"};
-    return location;
-}
+const Location DefaultFolder = {
+    HKEY_LOCAL_MACHINE,
+    "HKEY_LOCAL_MACHINE",
+    {L"SOFTWARE\\Wow6432Node\\Vantorix\\QZA", L"SOFTWARE\\Vantorix\\QZA"},
+    L"InstallPath"};
 
-const Location& PreviousFolder()
-{
-    static const Location location = {HKEY_CURRENT_USER,
-                                      "HKEY_CURRENT_USER",
-                                      {L"SOFTWARE\\Wow6432Node\\HF", L"SOFTWARE\\HF"},
-                                      L"Path"};
-    return location;
-}
+const Location PreviousFolder = {HKEY_CURRENT_USER,
+                                 "HKEY_CURRENT_USER",
+                                 {L"SOFTWARE\\Wow6432Node\\HF", L"SOFTWARE\\HF"},
+                                 L"Path"};
 
 const char* const TemplateDirName = "template";
 
 LSTATUS QueryText(HKEY key, const wchar_t* name, wxString& text)
 {
     std::array<BYTE, ValueCapacity> data{};
-    DWORD type = 0;
     DWORD size = ValueCapacity;
-    const LSTATUS status = RegQueryValueExW(key, name, nullptr, &type, data.data(), &size);
+    const LSTATUS status = RegQueryValueExW(key, name, nullptr, nullptr, data.data(), &size);
     if (status == ERROR_SUCCESS)
         text = FromUtf16Bytes(data.data(), std::min(size, ValueCapacity));
     return status;
@@ -105,18 +95,16 @@ bool ReadText(const Location& location, wxString& text, ValueSource& source)
 bool GetDefaultImposeTemplatePath(wxFileName& folder, ValueSource& source)
 {
     wxString path;
-    if (!ReadText(DefaultFolder(), path, source))
+    if (!ReadText(DefaultFolder, path, source))
         return false;
-    path += wxFileName::GetPathSeparator();
-    path += TemplateDirName;
-    folder.Assign(path, wxPATH_NATIVE);
+    folder.Assign(path + wxFileName::GetPathSeparator() + TemplateDirName, wxPATH_NATIVE);
     return true;
 }
 
 bool GetPreviousImposeTemplatePath(wxFileName& folder, ValueSource& source)
 {
     wxString path;
-    const bool found = ReadText(PreviousFolder(), path, source);
+    const bool found = ReadText(PreviousFolder, path, source);
     folder.Assign(path, wxPATH_NATIVE);
     return found;
 }

@@ -2,7 +2,6 @@
 #pragma once
 
 #include <wx/filename.h>
-#include <wx/string.h>
 
 /// The registry value that was looked for, for messages.
 struct ValueSource
@@ -16,8 +15,7 @@ struct ValueSource
 ///
 /// Both lookups follow RegOpenKeyExW and RegQueryValueExW: the 32-bit key comes first, the other is
 /// tried only if the first cannot be opened; at most 517 bytes are read, as UTF-16 up to the first
-/// NUL whatever the value's type; every call reads the registry, and none checks that the folder
-/// exists. The folder's last component becomes the file name.
+/// NUL whatever the value's type. The folder may be missing; its last part becomes the file name.
 bool GetDefaultImposeTemplatePath(wxFileName& folder, ValueSource& source);
 
 /// The default template folder of the previous version: the Path of the current user's key. Returns

@@ -59,11 +59,9 @@ JobPresetDirs ListJobPresetDirs(const wxString& root)
 {
     JobPresetDirs directories;
     directories.isThere = wxFileName::DirExists(root);
-    if (!directories.isThere)
-        return directories;
-    // The library would report it by itself.
-    directories.failure = WhyNotListed(root);
-    if (directories.failure)
+    if (directories.isThere)
+        directories.failure = WhyNotListed(root); // the library would report it by itself
+    if (!directories.isThere || directories.failure)
         return directories;
     const wxDir directory(root);
     wxDirTraverserSimple collector(directories.paths);
@@ -72,27 +70,22 @@ JobPresetDirs ListJobPresetDirs(const wxString& root)
     return directories;
 }
 
-JobPresetFile::JobPresetFile(const wxString& directory)
-    : m_path(PathIn(directory)), m_directory(directory, Links::Follow),
-      m_presets(m_directory.Reach(PresetDirName), Links::Refuse),
-      m_isLinked(IsLink(m_directory.Reach(PresetDirName)))
+JobPresetFile::JobPresetFile(const wxString& itsDirectory)
+    : path(PathIn(itsDirectory)), directory(itsDirectory, Links::Follow),
+      presetDir(directory.Reach(PresetDirName), Links::Refuse),
+      isLinked(IsLink(directory.Reach(PresetDirName)))
 {
-}
-
-const wxString& JobPresetFile::GetPath() const
-{
-    return m_path;
 }
 
 bool JobPresetFile::IsThere() const
 {
-    return m_isLinked || wxFileName::Exists(m_presets.Reach(PresetFileName),
-                                            wxFILE_EXISTS_ANY | wxFILE_EXISTS_NO_FOLLOW);
+    return isLinked || wxFileName::Exists(presetDir.Reach(PresetFileName),
+                                          wxFILE_EXISTS_ANY | wxFILE_EXISTS_NO_FOLLOW);
 }
 
 RegularFile::Status JobPresetFile::OpenForReading()
 {
-    return m_file.OpenForReading(m_presets, PresetFileName);
+    return file.OpenForReading(presetDir, PresetFileName);
 }
 
 RewrittenPreset JobPresetFile::Decide(const wxString& from, const wxString& to)
@@ -101,18 +94,13 @@ RewrittenPreset JobPresetFile::Decide(const wxString& from, const wxString& to)
     constexpr std::uint64_t MemoryForEachByte = 10;
     std::string before;
     RewrittenPreset preset;
-    const std::int64_t length = m_file.Length();
+    const std::int64_t length = file.Length();
     if (length > 0 && length <= LongestFile)
         RequireMemory(static_cast<std::uint64_t>(length) * MemoryForEachByte);
-    if (m_file.Read(before))
+    if (file.Read(before))
         preset = RewritePreset(before, from, to);
     else
-        preset.reasonToStay = PresetStays::NotRead;
+        preset.reasonToStay = "cannot be read";
     preset.before.swap(before);
     return preset;
-}
-
-RegularFile& JobPresetFile::GetFile()
-{
-    return m_file;
 }

@@ -5,12 +5,8 @@
 #include "platform/regular_file.h"
 
 #include <wx/arrstr.h>
-#include <wx/string.h>
 
-#include <optional>
-
-/// The directory of the job preset directories: ORX/JPData in the per-user application data folder,
-/// with a final separator.
+/// ORX/JPData in the per-user application data folder, with a final separator.
 wxString JobPresetRoot();
 
 struct JobPresetDirs
@@ -20,19 +16,14 @@ struct JobPresetDirs
     wxArrayString paths;
 };
 
-/// The full paths of the root's direct sub-directories, hidden ones too, in the order of the
-/// listing.
+/// The full paths of the root's direct sub-directories, hidden ones too, in the listed order.
 JobPresetDirs ListJobPresetDirs(const wxString& root);
 
 /// One job preset's file. The job preset directory and those above it may be links (redirected
 /// profiles); the directory Presets in it and the file itself may not.
-class JobPresetFile
+struct JobPresetFile
 {
-  public:
-    explicit JobPresetFile(const wxString& directory);
-
-    /// For messages.
-    const wxString& GetPath() const;
+    explicit JobPresetFile(const wxString& itsDirectory);
 
     /// Whether anything of that name exists, even a link or a directory. True if the directory
     /// Presets is a link: its target is not accessed.
@@ -45,12 +36,9 @@ class JobPresetFile
     /// to be written.
     RewrittenPreset Decide(const wxString& from, const wxString& to);
 
-    RegularFile& GetFile();
-
-  private:
-    const wxString m_path;
-    const PinnedDirectory m_directory;
-    const PinnedDirectory m_presets;
-    const bool m_isLinked;
-    RegularFile m_file;
+    const wxString path; // for messages
+    const PinnedDirectory directory;
+    const PinnedDirectory presetDir; // Presets
+    const bool isLinked;             // whether that is a link
+    RegularFile file;
 };

@@ -8,22 +8,17 @@
 namespace
 {
 
-void LogFailure(const RegularFile& file, const wxString& path)
-{
-    ReportError(file.GetFailure().Describe(path));
-}
-
 // Opened for update before it is read, so that one handle serves both. If both fail, only the fault
 // in the content is logged.
 void UpdatePreset(JobPresetFile& preset, const wxString& from, const wxString& to)
 {
-    const wxString& path = preset.GetPath();
-    RegularFile& file = preset.GetFile();
+    const wxString& path = preset.path;
+    RegularFile& file = preset.file;
     const RegularFile::Status opened = preset.OpenForReading();
     if (opened != RegularFile::Status::Open)
     {
         if (opened == RegularFile::Status::Refused)
-            LogFailure(file, path);
+            ReportError(file.GetFailure().Describe(path));
         RunLog("Unable to open preset.xml for read : " + path);
         return;
     }
@@ -41,7 +36,7 @@ void UpdatePreset(JobPresetFile& preset, const wxString& from, const wxString& t
     else
     {
         if (!file.Rewrite(rewritten.before, rewritten.bytes))
-            LogFailure(file, path);
+            ReportError(file.GetFailure().Describe(path));
         RunLog("Updated preset.xml  : " + path);
     }
 }
@@ -83,7 +78,7 @@ void UpdateJobPresetImposePath(const FolderUpgradeApp& app)
     {
         JobPresetFile preset(directory);
         if (preset.IsThere())
-            Attempt(L"preset.xml", preset.GetPath(),
+            Attempt(L"preset.xml", preset.path,
                     [&]() { UpdatePreset(preset, folders.From().path, folders.To().path); });
     }
 }

@@ -5,22 +5,17 @@
 #include "platform/regular_file.h"
 #include "platform/unicode_text.h"
 #include "store/folder_cfg_format.h"
-#include "store/xml_text.h"
+#include "store/xml_document.h"
 
 #include <wx/convauto.h>
 #include <wx/textbuf.h>
 
-#include <cstdint>
 #include <new>
-#include <vector>
 
 namespace
 {
 
-wxString Introduction()
-{
-    return wxString(FolderCfg::ImposeTemplateKey) + "\">\"";
-}
+const wxString Introduction = wxString(FolderCfg::ImposeTemplateKey) + "\">\"";
 
 // A character as it is and in the new text, wide, and twice in the new bytes.
 constexpr std::uint64_t MemoryForEachCharacter = 2 * sizeof(wchar_t) + 2;
@@ -34,12 +29,11 @@ bool EndsFolder(const wxString& text, size_t position)
 // The positions of the folder in the template paths of the text, in ascending order.
 std::vector<size_t> FindFolders(const wxString& text, const wxString& folder)
 {
-    const wxString introduction = Introduction();
-    const wxString searched = introduction + folder;
+    const wxString searched = Introduction + folder;
     std::vector<size_t> folders;
     for (size_t found = text.find(searched); found != wxString::npos;)
     {
-        const size_t begin = found + introduction.length();
+        const size_t begin = found + Introduction.length();
         const size_t end = begin + folder.length();
         const bool isPath = EndsFolder(text, end);
         if (isPath)
@@ -103,31 +97,30 @@ const char* DecodePreset(const std::string& bytes, wxString& text)
         return nullptr;
     wxString(bytes.data(), wxConvAuto(), bytes.length()).swap(text); // assigning would copy it
     if (text.empty())
-        return PresetStays::NotDecoded;
+        return "cannot be decoded";
     if (wxTextBuffer::typeDefault == wxTextFileType_Dos)
         text.Replace("\r\n", "\n");
-    return IsUnicodeText(text) ? nullptr : PresetStays::NotEncodedAgain;
+    return IsUnicodeText(text) ? nullptr : "cannot be encoded again";
 }
 
 wxString MovedPresetPath(const wxString& path, const wxString& from, const wxString& to)
 {
-    wxString text = Introduction() + path + "\"";
+    wxString text = Introduction + path + "\"";
     MovePresetPaths(text, from, to);
-    return text.Mid(Introduction().length()).BeforeLast('"');
+    return text.Mid(Introduction.length()).BeforeLast('"');
 }
 
 std::vector<PresetPath> FindPresetPaths(const wxString& text, const wxString& from,
                                         const wxString& to)
 {
-    const wxString introduction = Introduction();
     std::vector<PresetPath> paths;
-    for (size_t found = text.find(introduction); found != wxString::npos;)
+    for (size_t found = text.find(Introduction); found != wxString::npos;)
     {
-        const size_t begin = found + introduction.length();
+        const size_t begin = found + Introduction.length();
         const size_t end = text.find('"', begin);
         const wxString stored = text.Mid(begin, end - begin);
         paths.push_back({stored, MovedPresetPath(stored, from, to), end == wxString::npos});
-        found = text.find(introduction, begin);
+        found = text.find(Introduction, begin);
     }
     return paths;
 }
@@ -140,13 +133,12 @@ RewrittenPreset RewritePreset(const std::string& before, const wxString& from, c
     if (preset.reasonToStay)
         return preset;
     const std::optional<size_t> moved = MovePresetPaths(text, from, to);
-    preset.movedPaths = moved.value_or(0);
     if (wxTextBuffer::typeDefault == wxTextFileType_Dos)
         text.Replace("\n", "\r\n");
     preset.bytes = text.utf8_string();
     if (preset.bytes.empty() && !text.empty())
         throw std::bad_alloc(); // the library gives an empty text then
     if (!moved || preset.bytes.size() > static_cast<size_t>(LongestFile))
-        preset.reasonToStay = PresetStays::NewTooLarge;
+        preset.reasonToStay = "the new content would be too large";
     return preset;
 }

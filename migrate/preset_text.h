@@ -9,10 +9,10 @@
 
 /// Replaces the first folder with the second in every template path of the text that lies in it:
 /// where the search text ORXImposeTemplate">" is directly followed by the folder's text, and that
-/// by a path separator or the closing double quote. Separators at the end of either folder are
-/// ignored. Replaces nothing if either folder is empty, or if XML cannot hold the text of the new
-/// one. Returns the number of replacements; nothing if the text would have more than LongestFile
-/// characters, and so could not be read again. Takes time proportional to the length of the text.
+/// by a path separator or the closing double quote. Separators at the end of a folder are ignored.
+/// Replaces nothing if either is empty, or if XML cannot hold the second. Returns the number of
+/// replacements; nothing if the text would have more than LongestFile characters, and so could not
+/// be read again. Takes time proportional to the length of the text.
 std::optional<size_t> MovePresetPaths(wxString& text, const wxString& oldFolder,
                                       const wxString& newFolder);
 
@@ -33,22 +33,10 @@ wxString MovedPresetPath(const wxString& path, const wxString& from, const wxStr
 /// Decodes a preset file's bytes. Returns why it stays as it is, or null.
 const char* DecodePreset(const std::string& bytes, wxString& text);
 
-/// Why a preset file stays as it is.
-namespace PresetStays
-{
-
-constexpr const char* NotRead = "cannot be read";
-constexpr const char* NotDecoded = "cannot be decoded";
-constexpr const char* NotEncodedAgain = "cannot be encoded again";
-constexpr const char* NewTooLarge = "the new content would be too large";
-
-} // namespace PresetStays
-
 /// A preset file's new content, or why the file has to stay as it is.
 struct RewrittenPreset
 {
     const char* reasonToStay = nullptr;
-    size_t movedPaths = 0;
     std::string before;
     std::string bytes;
 };

@@ -23,12 +23,8 @@ TemplateFolder Given(const wxString& path, const wxString& option)
 
 } // namespace
 
-TemplateFolders::TemplateFolders(bool isUpgrade) : m_isUpgrade(isUpgrade)
-{
-}
-
-TemplateFolders::TemplateFolders(bool isUpgrade, const wxString& from, const wxString& to)
-    : m_isUpgrade(isUpgrade), m_isRehearsal(!from.empty() || !to.empty())
+TemplateFolders::TemplateFolders(bool itIsUpgrade, const wxString& from, const wxString& to)
+    : isUpgrade(itIsUpgrade), isRehearsal(!from.empty() || !to.empty())
 {
     if (!from.empty())
         (isUpgrade ? m_previous : m_default) = Given(from, "--from");
@@ -36,24 +32,14 @@ TemplateFolders::TemplateFolders(bool isUpgrade, const wxString& from, const wxS
         (isUpgrade ? m_default : m_previous) = Given(to, "--to");
 }
 
-bool TemplateFolders::IsRehearsal() const
-{
-    return m_isRehearsal;
-}
-
-bool TemplateFolders::IsUpgrade() const
-{
-    return m_isUpgrade;
-}
-
 const TemplateFolder& TemplateFolders::From()
 {
-    return m_isUpgrade ? Previous() : Default();
+    return isUpgrade ? Previous() : Default();
 }
 
 const TemplateFolder& TemplateFolders::To()
 {
-    return m_isUpgrade ? Default() : Previous();
+    return isUpgrade ? Default() : Previous();
 }
 
 const TemplateFolder& TemplateFolders::Previous()

@@ -3,8 +3,6 @@
 
 #include "migrate/install_locations.h"
 
-#include <wx/string.h>
-
 #include <optional>
 
 struct TemplateFolder
@@ -18,13 +16,9 @@ struct TemplateFolder
 class TemplateFolders
 {
   public:
-    explicit TemplateFolders(bool isUpgrade);
     /// With these folders in place of what the registry leads to, unless they are empty.
-    TemplateFolders(bool isUpgrade, const wxString& from, const wxString& to);
+    explicit TemplateFolders(bool itIsUpgrade, const wxString& from = {}, const wxString& to = {});
 
-    bool IsUpgrade() const;
-    /// Whether either folder was given.
-    bool IsRehearsal() const;
     /// The folders of the version being left and of the version being installed.
     const TemplateFolder& From();
     const TemplateFolder& To();
@@ -32,9 +26,10 @@ class TemplateFolders
     const TemplateFolder& Previous();
     const TemplateFolder& Default();
 
+    const bool isUpgrade;
+    const bool isRehearsal; // whether either folder was given
+
   private:
-    const bool m_isUpgrade;
-    bool m_isRehearsal = false;
     std::optional<TemplateFolder> m_previous;
     std::optional<TemplateFolder> m_default;
 };

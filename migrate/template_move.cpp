@@ -4,8 +4,8 @@
 #include "store/folder_cfg_format.h"
 #include "store/folder_cfg_reader.h"
 #include "store/folder_cfg_writer.h"
+#include "store/xml_document.h"
 #include "store/xml_lookup.h"
-#include "store/xml_text.h"
 
 #include <wx/confbase.h>
 #include <wx/filename.h>
@@ -17,14 +17,9 @@
 namespace
 {
 
-bool IsAnySeparator(wxUniChar character)
-{
-    return character == '\\' || character == '/';
-}
-
 bool IsOnServer(const wxString& path)
 {
-    return path.length() > 1 && IsAnySeparator(path[0]) && IsAnySeparator(path[1]);
+    return path.length() > 1 && path.Left(2).find_first_not_of("\\/") == wxString::npos;
 }
 
 // "\\host\share", in lower case and with backslashes; of "\\?\UNC\host\share\x" and the like,
@@ -75,7 +70,7 @@ void DecideFolder(const XmlFile& cfg, TemplateFolders& folders, TemplateMove& mo
     move.outcome = TemplateMove::Outcome::Elsewhere;
     // In an unknown encoding, only ASCII is read correctly.
     if (!cfg.isFaithful && (isInFolder || !move.storedPath.IsAscii()))
-        Stay(move, CfgStays::UnknownEncoding);
+        Stay(move, L"unknown encoding");
     else if (isInFolder)
         move.outcome =
             folders.To().isKnown ? TemplateMove::Outcome::Moves : TemplateMove::Outcome::ToUnknown;
@@ -84,7 +79,7 @@ void DecideFolder(const XmlFile& cfg, TemplateFolders& folders, TemplateMove& mo
     move.newPath = folders.To().path + wxFileName::GetPathSeparator(wxPATH_NATIVE) +
                    wxFileName(move.storedPath, wxPATH_NATIVE).GetFullName();
     if (!IsXmlText(move.newPath))
-        Stay(move, CfgStays::NotStorable);
+        Stay(move, L"new path holds a character that XML cannot store");
 }
 
 // The content of Folder.cfg with the root's settings and this imposition table.
@@ -104,7 +99,7 @@ void MakeContent(const wxXmlNode& root, const ImposeSettingTable& imposeSettings
     move.newContent = FolderCfgBytes(settings, jobSettings, paths, filterSetting, imposeSettings,
                                      preflightSettings);
     if (move.newContent.empty())
-        Stay(move, CfgStays::NewTooLarge);
+        Stay(move, L"the new content would be too large");
 }
 
 } // namespace

@@ -4,22 +4,8 @@
 #include "migrate/template_folders.h"
 #include "store/xml_file.h"
 
-#include <wx/string.h>
-
-#include <string>
-
-/// Why a Folder.cfg stays as it is although its template could move, or is not looked at.
-namespace CfgStays
-{
-
-constexpr const wchar_t* TooLarge = L"too large to read safely";
-constexpr const wchar_t* UnknownEncoding = L"unknown encoding";
-constexpr const wchar_t* NotStorable = L"new path holds a character that XML cannot store";
-constexpr const wchar_t* NewTooLarge = L"the new content would be too large";
-constexpr const wchar_t* NotLoadedAgain = L"cannot be loaded again";
-constexpr const wchar_t* Changed = L"changed meanwhile";
-
-} // namespace CfgStays
+/// Why a Folder.cfg is not looked at, and stays as it is.
+constexpr const wchar_t* CfgTooLarge = L"too large to read safely";
 
 struct TemplateMove
 {
@@ -46,10 +32,9 @@ struct TemplateMove
 TemplateMove DecideTemplateMove(const XmlFile& cfg, TemplateFolders& folders);
 
 /// Whether the stored path names something directly in the folder. Only names are compared, as
-/// wxFileName::SameAs does on Windows, and a stored path never causes access to a server: a path on
-/// a server is elsewhere unless both are on the same share, and so are a path on another drive, one
-/// that leads over a shortcut (.lnk), and one that is too long. A folder with a final separator is
-/// not the same as one without.
+/// wxFileName::SameAs does on Windows, and no server is asked. Elsewhere are: a path on a server,
+/// unless both are on the same share; one on another drive; one over a shortcut (.lnk); one that is
+/// too long. A folder with a final separator is not the same as one without.
 bool IsDirectlyIn(const wxString& stored, const wxString& folder);
 
 /// Whether a path is longer than any that Windows has, or holds more variables than the library

@@ -3,8 +3,6 @@
 
 #include "platform/regular_file.h"
 
-#include <wx/string.h>
-
 #include <optional>
 
 /// Whether SetFileAttributesW would be permitted. Changes nothing and does not follow a link.

@@ -1,7 +1,5 @@
 #include "platform/file_copy.h"
 
-#include "platform/regular_file.h"
-
 std::optional<FailedCall> CopyOver(const wxString& source, const PinnedDirectory& directory,
                                    const wxString& name)
 {

@@ -3,16 +3,13 @@
 
 #include "platform/regular_file.h"
 
-#include <wx/string.h>
-
 #include <optional>
 
 /// Copies the source's content and attributes over an existing file, as wxCopyFile does, whatever
-/// its length. Writes in place. Elsewhere than on Windows, a file that cannot be written is
-/// replaced by a new one: its own permissions do not prevent that. Never writes through a link in
-/// place of the destination. If there is no room for it on the disk, the destination stays as it
-/// was; if another call fails, the destination may hold a part of the copy. Does not wait for the
-/// disk.
+/// its length. Writes in place; but elsewhere than on Windows, where its own permissions do not
+/// prevent that, a file that cannot be written is replaced by a new one. Never writes through a
+/// link. If the disk has no room, the destination stays as it was; if another call fails, it may
+/// hold a part of the copy. Does not wait for the disk.
 std::optional<FailedCall> CopyOver(const wxString& source, const PinnedDirectory& directory,
                                    const wxString& name);
 

@@ -3,6 +3,6 @@
 
 #include <wx/string.h>
 
-/// Whether a path is complete and on a drive of this machine. Windows: GetDriveTypeW of its drive
-/// letter. Elsewhere: the type of the file system that is mounted there.
+/// Whether a path is complete and on a drive of this machine, by GetDriveTypeW of its drive letter,
+/// elsewhere by the type of the file system that is mounted there.
 bool IsOnLocalDrive(const wxString& path);

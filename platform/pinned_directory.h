@@ -7,8 +7,7 @@
 #include <utility>
 
 /// Whether the last part of a path may be a link: a symbolic link, on Windows any reparse point
-/// whose tag says that it names another file or directory. A cloud file's placeholder is not a
-/// link.
+/// whose tag is a name surrogate. A cloud file's placeholder is not a link.
 enum class Links
 {
     Follow,
@@ -30,17 +29,14 @@ class PinnedDirectory
     PinnedDirectory(const PinnedDirectory&) = delete;
     PinnedDirectory& operator=(const PinnedDirectory&) = delete;
 
-    /// Returns false if there is no such directory, if it cannot be opened, or if it is a refused
-    /// link.
+    /// False if there is no such directory, if it cannot be opened, or if it is a refused link.
     bool IsOpen() const;
 
-    /// The path of an entry, or of the directory itself if the name is empty, for calls to the
-    /// system and the library. Not for messages: on Linux it names the descriptor. If the directory
-    /// is not open, the path leads nowhere.
+    /// The path of an entry, or of the directory itself if the name is empty, for calls but not for
+    /// messages: on Linux it names the descriptor. It leads nowhere if the directory is not open.
     wxString Reach(const wxString& name) const;
 
-    /// Identifies the directory among all that are open: volume and file index, or device and
-    /// inode. Two zeros if it is not open.
+    /// Volume and file index, or device and inode. Two zeros if it is not open.
     std::pair<std::uint64_t, std::uint64_t> Identity() const;
 
 #ifdef _WIN32

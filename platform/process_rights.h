@@ -3,14 +3,13 @@
 
 #include <wx/string.h>
 
-/// Whether the process has an administrator's rights. Windows: its token is elevated, as is that of
-/// SYSTEM. Elsewhere: its effective user is root. Can be called before static objects are
-/// constructed.
+/// Whether the process has an administrator's rights: an elevated token, as SYSTEM also has, or the
+/// effective user root. Can be called before static objects are constructed.
 bool IsElevated();
 
-/// The account that the process runs as: the domain or the computer, a backslash, the user, for
-/// example "DESK7\anna" or "NT AUTHORITY\SYSTEM". Elsewhere: the host and the effective user, or
-/// the user ID if there is no name. Empty if the system does not say.
+/// The account that the process runs as, for example "DESK7\anna" or "NT AUTHORITY\SYSTEM".
+/// Elsewhere: the host and the effective user, or the user ID if there is no name. Empty if the
+/// system does not say.
 wxString AccountName();
 
 /// Whether the process refuses to follow links made by processes without administrator's rights: an

@@ -11,32 +11,16 @@ namespace
 
 constexpr size_t PieceBytes = size_t{64} * 1024; // of a file that is too long for the memory
 
-wxString Words(FailedCall::Kind kind)
-{
-    switch (kind)
-    {
-    case FailedCall::Kind::Open:
-        return _("can't open file '%s'");
-    case FailedCall::Kind::List:
-        return _("Cannot enumerate files in directory '%s'");
-    case FailedCall::Kind::Read:
-        return _("can't read from file '%s'");
-    case FailedCall::Kind::Write:
-        break;
-    }
-    return _("can't write to file '%s'");
-}
-
 } // namespace
 
-FailedCall FailedCall::Now(Kind kind)
+FailedCall FailedCall::Now(const char* what)
 {
-    return {kind, wxSysErrorCode()};
+    return {what, wxSysErrorCode()};
 }
 
 wxString FailedCall::Describe(const wxString& shownPath) const
 {
-    return wxString::Format(Words(kind), shownPath) + Reason();
+    return wxString::Format(wxGetTranslation(what), shownPath) + Reason();
 }
 
 wxString FailedCall::Reason() const
@@ -96,7 +80,7 @@ bool RegularFile::Read(std::string& bytes, std::int64_t most) const
     bytes.resize(isShort ? static_cast<size_t>(length) : 0);
     if (isShort && ReadAt(0, bytes.data(), bytes.size()) == bytes.size())
         return true;
-    m_failure = FailedCall::Now(FailedCall::Kind::Read);
+    m_failure = FailedCall::Now(FailedCall::Read);
     return false;
 }
 
@@ -115,7 +99,7 @@ bool RegularFile::TakeContent(const RegularFile& source)
     }
     isDone = isDone && SetLength(newLength);
     if (!isDone)
-        m_failure = FailedCall::Now(FailedCall::Kind::Write);
+        m_failure = FailedCall::Now(FailedCall::Write);
     return isDone;
 }
 
@@ -144,7 +128,7 @@ bool RegularFile::Rewrite(const std::string& before, const std::string& after)
     const std::string& written = isShorter ? filled : after;
     if (newLength > oldLength && !Reserve(oldLength, newLength - oldLength))
     {
-        m_failure = FailedCall::Now(FailedCall::Kind::Write);
+        m_failure = FailedCall::Now(FailedCall::Write);
         return false;
     }
     // Another program may have made it longer a moment ago.
@@ -153,7 +137,7 @@ bool RegularFile::Rewrite(const std::string& before, const std::string& after)
         WaitForDisk();
         return true;
     }
-    m_failure = FailedCall::Now(FailedCall::Kind::Write);
+    m_failure = FailedCall::Now(FailedCall::Write);
     Write(0, before.data(), before.size());
     SetLength(oldLength);
     return false;
@@ -164,7 +148,7 @@ bool RegularFile::Append(const std::string& bytes)
     const std::int64_t length = Length();
     if (length >= 0 && Write(length, bytes.data(), bytes.size()))
         return true;
-    m_failure = FailedCall::Now(FailedCall::Kind::Write);
+    m_failure = FailedCall::Now(FailedCall::Write);
     if (length >= 0)
         SetLength(length);
     return false;

@@ -4,27 +4,22 @@
 
 #include "platform/pinned_directory.h"
 
-#include <wx/string.h>
-
-#include <cstdint>
 #include <string>
 
 /// The last call of the system that failed.
 struct FailedCall
 {
-    enum class Kind
-    {
-        Open,
-        List, // the names in a directory
-        Read,
-        Write
-    };
+    // What the library says.
+    static constexpr const char* Open = "can't open file '%s'";
+    static constexpr const char* List = "Cannot enumerate files in directory '%s'";
+    static constexpr const char* Read = "can't read from file '%s'";
+    static constexpr const char* Write = "can't write to file '%s'";
 
-    Kind kind = Kind::Open;
+    const char* what = Open;
     unsigned long error = 0; // as the system numbers it
 
     /// Of this kind, with the system's last error.
-    static FailedCall Now(Kind kind);
+    static FailedCall Now(const char* what);
 
     /// The words in which wxLogSysError reports it, and the end of them.
     wxString Describe(const wxString& shownPath) const;
@@ -34,20 +29,17 @@ struct FailedCall
 /// Bytes. A longer file is not read into memory: a planted file of terabytes must not crash a run.
 constexpr std::int64_t LongestFile = std::int64_t{64} * 1024 * 1024;
 
-/// A file that is opened without waiting (a pipe in its place would block). In a pinned directory
-/// it is not opened through a link. No call reports an error by itself; after one that failed,
-/// GetFailure says why.
-///
-/// As long as it is open, it is the same file, whatever happens to its name; on Windows no program
-/// can rename or remove it meanwhile (it is opened without FILE_SHARE_DELETE).
+/// A file that is opened without waiting (a pipe in its place would block), in a pinned directory
+/// not through a link. While it is open, it stays the same file, whatever happens to its name; on
+/// Windows nobody can rename or remove it (no FILE_SHARE_DELETE). No call reports an error by
+/// itself; after one that failed, GetFailure says why.
 class RegularFile
 {
   public:
     enum class Status
     {
-        NotThere, // no such file, not a regular file, or a refused link
+        NotThere, // no such file, not a regular file, a refused link, or another file by now
         Refused,  // it exists, but access is denied or another program blocks it
-        Gone,     // the name no longer leads to the same file
         Open
     };
 
@@ -69,13 +61,10 @@ class RegularFile
     Status CreateNew(const PinnedDirectory& directory, const wxString& name);
     /// Opens for update and empties it, or creates it. Returns false if that fails.
     bool OpenEmpty(const PinnedDirectory& directory, const wxString& name);
-    /// Puts a new, empty file in place of one that cannot be written. Not on Windows, where a
-    /// file's own permissions prevent that.
+    /// Puts a new, empty file in place of one that cannot be written; never on Windows.
     Status Replace(const PinnedDirectory& directory, const wxString& name);
     static bool MayReplace(const PinnedDirectory& directory);
-    /// Returns false if the system reports an error, which does not matter: all bytes have already
-    /// been written.
-    bool Close();
+    void Close();
 
     /// In bytes; -1 if it cannot be determined.
     std::int64_t Length() const;
@@ -83,15 +72,12 @@ class RegularFile
     /// read to its end.
     bool Read(std::string& bytes, std::int64_t most = LongestFile) const;
 
-    /// Replaces the whole content. The first text must be the current content, the second is the
-    /// new one.
-    ///
-    /// If the system supports it, reserves space for a longer content before a byte changes (so a
-    /// full disk leaves the file as it was). Writes once; a shorter content is written with line
-    /// feeds up to the old length, and the file is then cut. If any of that fails, restores the old
-    /// bytes and returns false. Finally waits for the disk; if that fails, the new
-    /// content stays. If the process is ended meanwhile, the file has the old content, the new one,
-    /// or the new one followed by line feeds, provided that the system does not interrupt a write.
+    /// Replaces the whole content, which has to be `before`. First reserves space for a longer one,
+    /// if the system can, so that a full disk leaves the file as it was. Writes once, a shorter
+    /// content with line feeds up to the old length, and then cuts the file. If any of that fails,
+    /// restores the old bytes and returns false. Finally waits for the disk, whatever comes of it.
+    /// If the process is ended meanwhile, the file has the old content, the new one, or the new one
+    /// followed by line feeds, provided that the system does not interrupt a write.
     bool Rewrite(const std::string& before, const std::string& after);
 
     /// Copies the content of the other file in pieces, after reserving space for it.
@@ -109,8 +95,7 @@ class RegularFile
     /// Cuts the file, or extends it with zeros.
     bool SetLength(std::int64_t length);
 
-    /// Appends the bytes; if that fails, appends nothing and returns false. Does not wait for the
-    /// disk.
+    /// Appends all the bytes or, if that fails, none. Does not wait for the disk.
     bool Append(const std::string& bytes);
 
   private:
@@ -121,8 +106,7 @@ class RegularFile
     // Until the count is reached or the file ends; less if a call fails.
     size_t ReadAt(std::int64_t offset, char* bytes, size_t count) const;
     bool Write(std::int64_t offset, const char* bytes, size_t count);
-    // The number of bytes that were read or written, at least one; 0 if there are none or the call
-    // fails.
+    // At least one byte; 0 if there are none or the call fails.
     size_t ReadSome(std::int64_t offset, char* bytes, size_t count) const;
     size_t WriteSome(std::int64_t offset, const char* bytes, size_t count);
     wxString m_path;

@@ -4,7 +4,12 @@
 
 #include <wx/string.h>
 
+enum class StandardStream
+{
+    Output,
+    Error
+};
+
 /// Writes the text in UTF-8, or to a Windows console as Unicode, whatever its code page. Returns
 /// false if it could not be written completely.
-bool WriteStandardOutput(const wxString& text);
-void WriteStandardError(const wxString& text);
+bool WriteTo(StandardStream stream, const wxString& text);

@@ -2,7 +2,8 @@
 //
 // On Windows this header only includes the system's own. Elsewhere it declares the same names with
 // the same contracts, and platform/linux/ implements them: the hives are text files, attributes
-// live in file modes and extended attributes, a profile file is a file, and there is no shell.
+// live in file modes and extended attributes, a profile file is a file, and there is no shell. Of
+// the shell's structures only the fields that the tool knows are there.
 #pragma once
 
 #ifdef _WIN32
@@ -21,7 +22,6 @@
 #include <cstdint>
 
 using BYTE = std::uint8_t;
-using WORD = std::uint16_t;
 using DWORD = std::uint32_t;
 using UINT = std::uint32_t;
 using LONG = std::int32_t;
@@ -99,30 +99,16 @@ using DLLGETVERSIONPROC = HRESULT (*)(DLLVERSIONINFO*);
 
 struct SHFILEINFOW
 {
-    void* hIcon;
     int iIcon;
-    DWORD dwAttributes;
-    wchar_t szDisplayName[MAX_PATH];
-    wchar_t szTypeName[80];
 };
 
 struct SHFOLDERCUSTOMSETTINGS
 {
     DWORD dwSize;
     DWORD dwMask;
-    void* pvid;
-    LPWSTR pszWebViewTemplate;
-    DWORD cchWebViewTemplate;
-    LPWSTR pszWebViewTemplateVersion;
-    LPWSTR pszInfoTip;
-    DWORD cchInfoTip;
-    void* pclsid;
-    DWORD dwFlags;
     LPWSTR pszIconFile;
     DWORD cchIconFile;
     int iIconIndex;
-    LPWSTR pszLogo;
-    DWORD cchLogo;
 };
 
 constexpr LONG SHCNE_MKDIR = 0x00000008;

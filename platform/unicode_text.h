@@ -3,8 +3,6 @@
 
 #include <wx/string.h>
 
-#include <cstddef>
-
 /// Whether the text is Unicode: no surrogate without its partner, nothing above U+10FFFF. Only such
 /// text survives encoding as UTF-8 and decoding.
 bool IsUnicodeText(const wxString& text);

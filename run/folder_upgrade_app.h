@@ -3,7 +3,6 @@
 #pragma once
 
 #include <wx/app.h>
-#include <wx/string.h>
 
 class FolderUpgradeApp : public wxApp
 {

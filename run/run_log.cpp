@@ -1,9 +1,10 @@
 #include "run/run_log.h"
 
 #include "platform/library_log.h"
+#include "platform/path_normal_form.h"
 #include "platform/regular_file.h"
+#include "platform/standard_folders.h"
 #include "platform/unicode_text.h"
-#include "run/run_log_place.h"
 
 #include <exception>
 #include <new>
@@ -59,6 +60,14 @@ class LogFile
 
 } // namespace
 
+wxString RunLogDirPath()
+{
+    wxFileName directory(GetUserDataFolder() + wxFileName::GetPathSeparator());
+    directory.AppendDir(L"ORX_Installers");
+    directory.Normalize(NormalizeAll, wxString(), wxPATH_NATIVE);
+    return directory.GetPath(wxPATH_GET_VOLUME) + wxFileName::GetPathSeparator();
+}
+
 void RunLog(const wxString& message, int count)
 {
     if (!RunLogEnabled)
@@ -70,7 +79,6 @@ void RunLog(const wxString& message, int count)
     }
     catch (const std::exception&)
     {
-        // Without memory for it, the line is left out.
-        return;
+        return; // without memory for it, the line is left out
     }
 }

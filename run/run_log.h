@@ -4,17 +4,20 @@
 
 #include <wx/string.h>
 
+constexpr const wchar_t* RunLogFileName = L"UpgradeDowngrade.log";
+
+/// The log's folder, with a final separator. It may be missing; RunLog does not create it.
+wxString RunLogDirPath();
+
 /// Whether the run writes its log; true at process start, cleared by the command line.
 extern bool RunLogEnabled;
 
 /// The count to pass for a line without one.
 constexpr int NoCount = -1;
 
-/// Appends one line: the message, then the count unless it is NoCount. Line separators, control
-/// characters except tab, and what is not Unicode are logged as U+FFFD. The first line of a run
-/// empties the file, and creates it if its folder exists. The file is closed between lines; if it
-/// is removed meanwhile, it is not created again. If the folder or the file is a link, or the file
-/// is not a regular file, there is no log. A line that cannot be written completely is left out.
-/// Nothing is reported to the caller; the library reports the first such failure. Does nothing
-/// while RunLogEnabled is false.
+/// Appends one line: the message, then the count unless it is NoCount; see ToOneLine. The first
+/// line of a run empties the file, and creates it if its folder exists. The file is closed between
+/// lines; if it is removed meanwhile, it is not created again. If the folder or the file is a link,
+/// or the file is not a regular file, there is no log. A line that cannot be written completely is
+/// left out; the library reports the first. Does nothing while RunLogEnabled is false.
 void RunLog(const wxString& message, int count = NoCount);

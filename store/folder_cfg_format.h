@@ -2,10 +2,8 @@
 //
 // An XML 1.0 document in UTF-8. The root element has the attributes of store/root_attributes.h;
 // below it are the sections, in the order of their names here. Inside JobSetting, ImposeSetting and
-// PreflightSettings, attributes are identified by position, not by name.
-//
-// The names are wide, like the library's strings: converting them took half as long as loading a
-// file.
+// PreflightSettings, attributes are identified by position, not by name. The names are wide, like
+// the library's strings: converting them took half as long as loading a file.
 #pragma once
 
 #include "store/hot_folder_settings.h"
@@ -22,14 +20,8 @@ constexpr const wchar_t* ImposeSettingSection = L"ImposeSetting";
 constexpr const wchar_t* FilterSettingSection = L"FilterSetting";
 constexpr const wchar_t* PreflightSection = L"PreflightSettings";
 
-/// The key of the imposition setting whose value is the template's path. Job presets use the same
-/// key.
+/// The key of the imposition setting whose value is the template's path, in job presets too.
 constexpr const wchar_t* ImposeTemplateKey = L"ORXImposeTemplate";
-
-constexpr const wchar_t* Failfolder = L"Failfolder";
-constexpr const wchar_t* Workfolder = L"Workfolder";
-constexpr const wchar_t* Movefolder = L"Movefolder";
-constexpr const wchar_t* Hotfolder = L"Hotfolder";
 
 constexpr const wchar_t* ShortName = L"ShortName";
 constexpr const wchar_t* DisplayName = L"DisplayName";
@@ -50,10 +42,10 @@ struct Field
 /// In the order in which they are written.
 constexpr Field<InputFormat> InputFormatFields[] = {{ShortName, &InputFormat::ShortName},
                                                     {DisplayName, &InputFormat::DisplayName}};
-constexpr Field<HotFolderPaths> PathFields[] = {{Failfolder, &HotFolderPaths::Failfolder},
-                                                {Workfolder, &HotFolderPaths::Workfolder},
-                                                {Movefolder, &HotFolderPaths::Movefolder},
-                                                {Hotfolder, &HotFolderPaths::Hotfolder}};
+constexpr Field<HotFolderPaths> PathFields[] = {{L"Failfolder", &HotFolderPaths::Failfolder},
+                                                {L"Workfolder", &HotFolderPaths::Workfolder},
+                                                {L"Movefolder", &HotFolderPaths::Movefolder},
+                                                {L"Hotfolder", &HotFolderPaths::Hotfolder}};
 constexpr Field<JobSettingEntry> JobSettingFields[] = {
     {Value, &JobSettingEntry::Value},
     {KeyDisplayValue, &JobSettingEntry::KeyDisplayValue},
@@ -62,8 +54,5 @@ constexpr Field<ImposeSettingEntry> ImposeSettingFields[] = {
     {Value, &ImposeSettingEntry::Value}, {KeyDisplayValue, &ImposeSettingEntry::KeyDisplayValue}};
 constexpr Field<PreflightSetting> PreflightFields[] = {{Key, &PreflightSetting::Key},
                                                        {Value, &PreflightSetting::Value}};
-
-/// The level of the filter setting in the document; the root has level 0.
-constexpr int FilterSettingLevel = 1;
 
 } // namespace FolderCfg

@@ -68,7 +68,7 @@ void ReadFilterSetting(const wxXmlNode* root, wxXmlNode& node)
     if (!section)
         return;
     node = wxXmlNode();
-    CopyTree(*section, node, FolderCfg::FilterSettingLevel);
+    CopyTree(*section, node, 1); // directly below the root, as it is written
 }
 
 int ReadPaths(const wxXmlNode* root, HotFolderPaths& paths)

@@ -4,10 +4,6 @@
 #include "store/hot_folder.h"
 #include "store/hot_folder_settings.h"
 
-#include <wx/xml/xml.h>
-
-#include <vector>
-
 /// Loads the hot folder's Folder.cfg, and reads the root attributes and the input formats.
 ///
 /// The attributes are read as a chain: from the first missing one on, all fields stay as they were
@@ -21,8 +17,7 @@ int LoadHotFolderSettings(HotFolder& folder, HotFolderSettings& settings);
 
 /// Like LoadHotFolderSettings; returns -1 without a root.
 int ReadHotFolderSettings(const wxXmlNode* root, HotFolderSettings& settings);
-/// Copies the whole "FilterSetting" element, without the indentation that saving adds. The document
-/// has to be loaded with wxXMLDOC_KEEP_WHITESPACE_NODES.
+/// Copies the whole "FilterSetting" element, as CopyTree does.
 void ReadFilterSetting(const wxXmlNode* root, wxXmlNode& node);
 /// Returns 1 if there is no root or no "Paths" element, 0 otherwise.
 int ReadPaths(const wxXmlNode* root, HotFolderPaths& paths);

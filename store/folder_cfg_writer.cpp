@@ -7,7 +7,6 @@
 #include <wx/stream.h>
 
 #include <new>
-#include <utility>
 
 namespace
 {
@@ -25,7 +24,7 @@ class StringOutputStream : public wxOutputStream
   protected:
     size_t OnSysWrite(const void* data, size_t size) override
     {
-        isFull = isFull || bytes.size() + size > FolderCfgLimits.bytes;
+        isFull = isFull || bytes.size() + size > size_t{FolderCfgLimits.bytes};
         if (isFull)
             m_lasterror = wxSTREAM_WRITE_ERROR;
         else
@@ -136,9 +135,7 @@ std::string FolderCfgBytes(const HotFolderSettings& settings, const JobSettingTa
     StringOutputStream stream;
     if (!document.Save(stream, IndentationStep) && !stream.isFull)
         throw std::bad_alloc(); // the library could not convert a text
-    const bool isReadable =
-        !stream.isFull &&
-        (IsHarmlessXml(stream.bytes) || LookAtXml(stream.bytes, FolderCfgLimits).isWithinLimits);
+    const bool isReadable = !stream.isFull && IsWithinLimits(stream.bytes, FolderCfgLimits);
     return isReadable ? std::move(stream.bytes) : std::string();
 }
 

@@ -4,14 +4,9 @@
 #include "store/hot_folder.h"
 #include "store/hot_folder_settings.h"
 
-#include <wx/xml/xml.h>
-
-#include <string>
-#include <vector>
-
-/// The content of a Folder.cfg with the six values, and nothing else. A filter setting whose name
-/// is not "FilterSetting" is left out. It is moved from, and empty afterwards. Empty if the content
-/// would exceed FolderCfgLimits, and so could not be read again.
+/// The content of a Folder.cfg with the six values, and nothing else. A filter setting is moved
+/// from; one whose name is not "FilterSetting" is left out. Empty if the content would exceed
+/// FolderCfgLimits, and so could not be read again.
 std::string FolderCfgBytes(const HotFolderSettings& settings, const JobSettingTable& jobSettings,
                            const HotFolderPaths& paths, wxXmlNode& filterSetting,
                            const ImposeSettingTable& imposeSettings,

@@ -21,15 +21,6 @@ const char* const PathAttribute = "path";
 // proportional to the square of the list's length.
 using PathSet = std::unordered_set<wxString, wxStringHash>;
 
-wxString ReadPath(const wxXmlNode& element)
-{
-    AttributeMap attributes;
-    CollectAttributes(element, attributes);
-    wxString path;
-    GetAttribute(attributes, PathAttribute, path);
-    return path.Trim();
-}
-
 } // namespace
 
 wxString GetHotFolderListPath()
@@ -60,7 +51,7 @@ HotFolderList LoadHotFolderList()
     const wxXmlNode* element = FirstNamed(file.Root()->GetChildren(), FolderElement);
     for (; element; element = FirstNamed(element->GetNext(), FolderElement))
     {
-        const wxString folder = ReadPath(*element);
+        const wxString folder = element->GetAttribute(PathAttribute).Trim();
         if (folder.empty())
             continue;
         if (!wxDirExists(folder))

@@ -4,16 +4,12 @@
 #include "store/xml_file.h"
 
 #include <wx/arrstr.h>
-#include <wx/string.h>
 
-/// The list's path.
 wxString GetHotFolderListPath();
 
-/// The folder of the list: "hotfolder" in the machine-wide application data folder, with a final
-/// separator.
+/// Its folder: "hotfolder" in the machine-wide application data folder, with a final separator.
 wxString GetHotFolderDataDir();
 
-/// The content of the list.
 struct HotFolderList
 {
     XmlFile::State state = XmlFile::State::Missing;

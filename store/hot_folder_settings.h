@@ -1,7 +1,7 @@
 // The settings of one hot folder in memory: six plain values, one for each part of Folder.cfg.
 //
-// All of them own their content and are copied deeply. FilterSetting, the sixth, is a wxXmlNode
-// with the name "FilterSetting", or a default-constructed one for a file without that element.
+// FilterSetting, the sixth, is a wxXmlNode with the name "FilterSetting", or a default-constructed
+// one for a file without that element.
 #pragma once
 
 #include <wx/string.h>
@@ -82,7 +82,7 @@ struct PreflightSetting
 /// In the order of the file, repeated keys included.
 using PreflightSettingList = std::vector<PreflightSetting>;
 
-/// Sets both fields of the key's entry, and adds the entry if the table has none.
+/// Sets both fields of the key's entry, which is added if it is missing.
 void SetImposeSetting(ImposeSettingTable& table, const wxString& key, const wxString& value,
                       const wxString& keyDisplayValue);
 

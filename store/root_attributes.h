@@ -4,10 +4,7 @@
 #include "store/hot_folder_settings.h"
 #include "store/xml_lookup.h"
 
-#include <wx/string.h>
-
 #include <variant>
-#include <vector>
 
 /// How an attribute's text becomes its field's value.
 enum class AttributeForm

@@ -14,9 +14,9 @@ XmlFile::State XmlFile::Load(RegularFile::Status opened)
     state = State::Loaded;
     if (opened != RegularFile::Status::Open)
         state = opened == RegularFile::Status::Refused ? State::NotReadable : State::Missing;
-    else if (file.Length() > Longest())
+    else if (file.Length() > limits.bytes)
         state = State::TooLarge;
-    else if (!file.Read(bytes))
+    else if (!file.Read(bytes, limits.bytes))
         state = State::NotReadable;
     if (state == State::Loaded && documentBefore && bytes == bytesBefore)
     {
@@ -46,16 +46,11 @@ XmlFile::Saved XmlFile::Save(const std::string& newBytes)
     if (reopened == RegularFile::Status::Refused)
         return Saved::Refused;
     std::string now;
-    if (reopened != RegularFile::Status::Open || !file.Read(now, Longest()))
+    if (reopened != RegularFile::Status::Open || !file.Read(now, limits.bytes))
         return Saved::NotReadAgain;
     if (now != bytes)
         return Saved::Changed;
     return file.Rewrite(bytes, newBytes) ? Saved::Done : Saved::Refused;
-}
-
-std::int64_t XmlFile::Longest() const
-{
-    return static_cast<std::int64_t>(limits.bytes);
 }
 
 wxString XmlFile::WhyNotReadable(const wxString& shownPath) const

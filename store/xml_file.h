@@ -4,10 +4,7 @@
 #include "platform/regular_file.h"
 #include "store/xml_document.h"
 
-#include <wx/string.h>
-
 #include <memory>
-#include <string>
 
 struct XmlFile
 {
@@ -15,7 +12,7 @@ struct XmlFile
     {
         Missing,     // no regular file of that name, or a refused link
         NotReadable, // refused by the system, or malformed; see WhyNotReadable
-        TooLarge,    // see store/xml_limits.h
+        TooLarge,    // see XmlLimits
         Loaded
     };
 
@@ -51,7 +48,4 @@ struct XmlFile
     std::unique_ptr<const wxXmlDocument> document;
     bool isFaithful = false; // whether the document is what its author meant: see XmlLook
     XmlSyntaxError error;
-
-  private:
-    std::int64_t Longest() const;
 };

@@ -1,19 +1,16 @@
-// Lookups on the tree of a loaded XML document. They do not load, change or write a document. Names
-// have to match exactly.
+// Lookups on the tree of a loaded XML document. Names have to match exactly.
 #pragma once
 
-#include <wx/string.h>
 #include <wx/xml/xml.h>
 
 #include <map>
 
-/// One element's attributes by name, in code unit order; a copy that does not refer to the
-/// document.
+/// One element's attributes by name, in code unit order; a copy.
 using AttributeMap = std::map<wxString, wxString>;
 
-/// The first element of that name below the node, or null. The node's direct children come before
-/// any subtree; with recursive set, the subtrees are then searched one after another in document
-/// order. The node itself never matches, and null has no elements.
+/// The first element of that name below the node, or null: among its direct children, and then,
+/// with recursive set, in one subtree after another. The node itself never matches, and null has no
+/// elements.
 const wxXmlNode* FindElement(const wxXmlNode* node, const wxString& name, bool recursive);
 
 /// The first element of that name among the node and the siblings after it, or null.

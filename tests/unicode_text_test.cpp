@@ -1,6 +1,6 @@
 // What counts as text, in UTF-16 as the registry has it.
 #include "platform/unicode_text.h"
-#include "store/xml_text.h"
+#include "store/xml_document.h"
 
 #include <gtest/gtest.h>
 

@@ -1,17 +1,9 @@
 #!/usr/bin/env bash
 # Renders the SVG drawings beside this script and packs each into an .ico. Size 16 comes from <name>.16.svg, all other
-# sizes from <name>.svg. It also makes the README's picture of all four.
+# sizes from <name>.svg. It also makes the README's picture of all four. Needs librsvg2-bin and icoutils.
 set -euo pipefail
 
 cd -- "$(dirname -- "${BASH_SOURCE[0]}")"
-
-need() {
-  command -v "$1" >/dev/null || { echo "make_icons.sh: $1 not found, install package $2" >&2; missing=1; }
-}
-missing=0
-need rsvg-convert librsvg2-bin
-need icotool icoutils
-[ "$missing" -eq 0 ] || exit 1
 
 tmp=$(mktemp -d)
 trap 'rm -rf -- "$tmp"' EXIT

@@ -23,5 +23,5 @@ std::optional<FailedCall> WhyNotListed(const wxString& directory)
 {
     if (access(directory.utf8_str(), R_OK) == 0)
         return {};
-    return FailedCall::Now(FailedCall::Kind::List);
+    return FailedCall::Now(FailedCall::List);
 }

@@ -5,7 +5,6 @@
 #include "platform/system.h"
 
 #include <cerrno>
-#include <cstdio>
 #include <cstdlib>
 #include <fcntl.h>
 #include <string>
@@ -66,9 +65,8 @@ class Node
         if (attributes == 0)
             return removexattr(m_path.c_str(), AttributeName) == 0 || errno == ENODATA ||
                    errno == ENOTSUP;
-        char text[16] = {};
-        const int length = std::snprintf(text, sizeof text, "0x%x", attributes);
-        return setxattr(m_path.c_str(), AttributeName, text, static_cast<size_t>(length), 0) == 0;
+        const std::string text = wxString::Format("0x%x", attributes).utf8_string();
+        return setxattr(m_path.c_str(), AttributeName, text.data(), text.size(), 0) == 0;
     }
 
   private:

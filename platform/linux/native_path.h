@@ -4,4 +4,8 @@
 #include <wx/string.h>
 
 /// The path with every backslash turned into a slash.
-wxString NativePath(const wxString& path);
+inline wxString NativePath(wxString path)
+{
+    path.Replace("\\", "/");
+    return path;
+}

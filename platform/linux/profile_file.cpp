@@ -5,8 +5,6 @@
 #include "platform/regular_file.h"
 #include "platform/system.h"
 
-#include <string>
-
 namespace
 {
 

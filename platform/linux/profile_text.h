@@ -4,7 +4,6 @@
 
 #include <wx/string.h>
 
-#include <cstddef>
 #include <string>
 
 /// The text in characters of one byte, or of two after a UTF-16LE byte-order mark. So a text in any

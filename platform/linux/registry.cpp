@@ -10,7 +10,6 @@
 
 #include <algorithm>
 #include <memory>
-#include <string>
 
 struct RegistryKey
 {
@@ -55,15 +54,14 @@ std::string NumberData(const wxString& text)
 
 } // namespace
 
-LSTATUS RegOpenKeyExW(HKEY hive, LPCWSTR path, DWORD options, REGSAM /*access*/, HKEY* key)
+LSTATUS RegOpenKeyExW(HKEY hive, LPCWSTR path, DWORD /*options*/, REGSAM /*access*/, HKEY* key)
 {
     const bool isMachine = hive == HKEY_LOCAL_MACHINE;
     const wxString name = isMachine ? "HKEY_LOCAL_MACHINE" : "HKEY_CURRENT_USER";
     const wxString folder = isMachine ? GetMachineDataFolder() : GetUserDataFolder();
     RegularFile file;
     std::string bytes;
-    if (options != 0 || // none is supported
-        file.OpenForReading(folder + "/registry/" + name + ".reg") != RegularFile::Status::Open ||
+    if (file.OpenForReading(folder + "/registry/" + name + ".reg") != RegularFile::Status::Open ||
         !file.Read(bytes))
         return ERROR_FILE_NOT_FOUND;
     auto opened =

@@ -10,11 +10,6 @@
 namespace
 {
 
-bool IsRegular(int descriptor, struct stat& status)
-{
-    return fstat(descriptor, &status) == 0 && S_ISREG(status.st_mode);
-}
-
 // Opened so that a pipe in place of the file does not block the tool.
 int OpenDescriptor(const wxString& path, bool followsLinks, int flags)
 {
@@ -37,7 +32,7 @@ RegularFile::Status RegularFile::Open(const PinnedDirectory* directory, const wx
     m_path = path;
     m_followsLinks = !directory;
     m_descriptor = OpenDescriptor(path, m_followsLinks, forUpdate ? O_RDWR : O_RDONLY);
-    m_failure = FailedCall::Now(FailedCall::Kind::Open);
+    m_failure = FailedCall::Now(FailedCall::Open);
     struct stat status = {};
     if (m_descriptor < 0)
     {
@@ -46,7 +41,7 @@ RegularFile::Status RegularFile::Open(const PinnedDirectory* directory, const wx
                    ? Status::Refused
                    : Status::NotThere;
     }
-    if (IsRegular(m_descriptor, status))
+    if (fstat(m_descriptor, &status) == 0 && S_ISREG(status.st_mode))
         return Status::Open;
     Close();
     return Status::NotThere;
@@ -56,17 +51,16 @@ RegularFile::Status RegularFile::ReopenForUpdate()
 {
     struct stat ours = {};
     struct stat now = {};
-    const bool isKnown = fstat(m_descriptor, &ours) == 0;
     const int descriptor = OpenDescriptor(m_path, m_followsLinks, O_RDWR);
-    m_failure = FailedCall::Now(FailedCall::Kind::Open);
+    m_failure = FailedCall::Now(FailedCall::Open);
     const bool isFound =
         descriptor < 0 ? lstat(m_path.utf8_str(), &now) == 0 : fstat(descriptor, &now) == 0;
-    const bool isSame = isKnown && isFound && IsSameFile(ours, now);
+    const bool isSame = isFound && fstat(m_descriptor, &ours) == 0 && IsSameFile(ours, now);
     if (descriptor < 0)
-        return isSame ? Status::Refused : Status::Gone;
+        return isSame ? Status::Refused : Status::NotThere;
     close(isSame ? m_descriptor : descriptor);
     if (!isSame)
-        return Status::Gone;
+        return Status::NotThere;
     m_descriptor = descriptor;
     return Status::Open;
 }
@@ -77,7 +71,7 @@ RegularFile::Status RegularFile::CreateNew(const PinnedDirectory& directory, con
     Close();
     m_path = directory.Reach(name);
     m_descriptor = open(m_path.utf8_str(), O_RDWR | O_CREAT | O_EXCL | O_CLOEXEC, Everybody);
-    m_failure = FailedCall::Now(FailedCall::Kind::Open);
+    m_failure = FailedCall::Now(FailedCall::Open);
     return m_descriptor < 0 ? Status::Refused : Status::Open;
 }
 
@@ -92,11 +86,11 @@ bool RegularFile::MayReplace(const PinnedDirectory& directory)
     return MayCreateIn(directory.Reach({}));
 }
 
-bool RegularFile::Close()
+void RegularFile::Close()
 {
-    const bool isDone = m_descriptor < 0 || close(m_descriptor) == 0;
+    if (m_descriptor >= 0)
+        close(m_descriptor);
     m_descriptor = -1;
-    return isDone;
 }
 
 std::int64_t RegularFile::Length() const
@@ -107,19 +101,13 @@ std::int64_t RegularFile::Length() const
 
 size_t RegularFile::ReadSome(std::int64_t offset, char* bytes, size_t count) const
 {
-    ssize_t done = -1;
-    do
-        done = pread(m_descriptor, bytes, count, static_cast<off_t>(offset));
-    while (done < 0 && errno == EINTR);
+    const auto done = TEMP_FAILURE_RETRY(pread(m_descriptor, bytes, count, offset));
     return done > 0 ? static_cast<size_t>(done) : 0;
 }
 
 size_t RegularFile::WriteSome(std::int64_t offset, const char* bytes, size_t count)
 {
-    ssize_t done = -1;
-    do
-        done = pwrite(m_descriptor, bytes, count, static_cast<off_t>(offset));
-    while (done < 0 && errno == EINTR);
+    const auto done = TEMP_FAILURE_RETRY(pwrite(m_descriptor, bytes, count, offset));
     return done > 0 ? static_cast<size_t>(done) : 0;
 }
 

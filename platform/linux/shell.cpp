@@ -1,10 +1,6 @@
 // The shell of a machine without one: every call is accepted, and nothing happens.
 #include "platform/system.h"
 
-#include <wx/string.h>
-
-#include <cstring>
-
 struct Module
 {
 };
@@ -23,15 +19,13 @@ HRESULT GetShellVersion(DLLVERSIONINFO* version)
 
 } // namespace
 
-HMODULE LoadLibraryW(LPCWSTR name)
+HMODULE LoadLibraryW(LPCWSTR /*name*/)
 {
-    return wxString(name).CmpNoCase("shell32.dll") == 0 ? &shell32 : nullptr;
+    return &shell32;
 }
 
-FARPROC GetProcAddress(HMODULE /*module*/, const char* name)
+FARPROC GetProcAddress(HMODULE /*module*/, const char* /*name*/)
 {
-    if (std::strcmp(name, "DllGetVersion") != 0)
-        return nullptr;
     return reinterpret_cast<FARPROC>(reinterpret_cast<void*>(GetShellVersion));
 }
 

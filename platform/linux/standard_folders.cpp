@@ -1,6 +1,5 @@
 #include "platform/standard_folders.h"
 
-#include "platform/linux/start_up.h"
 #include "platform/path_normal_form.h"
 
 #include <wx/utils.h>
@@ -9,10 +8,6 @@
 
 namespace
 {
-
-// Constructed before main() runs. It is here because the linker takes this file from the library
-// for the functions below; it takes no file for a static object alone.
-const StartUp startUp;
 
 wxString FromEnvironment(const char* name)
 {

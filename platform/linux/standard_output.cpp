@@ -1,26 +1,11 @@
 #include "platform/standard_output.h"
 
 #include <cstdio>
-#include <string>
 
-namespace
+bool WriteTo(StandardStream stream, const wxString& text)
 {
-
-bool Write(std::FILE* stream, const wxString& text)
-{
+    std::FILE* const file = stream == StandardStream::Output ? stdout : stderr;
     const std::string bytes = text.utf8_string();
-    return std::fwrite(bytes.data(), 1, bytes.size(), stream) == bytes.size() &&
-           std::fflush(stream) == 0;
-}
-
-} // namespace
-
-bool WriteStandardOutput(const wxString& text)
-{
-    return Write(stdout, text);
-}
-
-void WriteStandardError(const wxString& text)
-{
-    Write(stderr, text);
+    return std::fwrite(bytes.data(), 1, bytes.size(), file) == bytes.size() &&
+           std::fflush(file) == 0;
 }

@@ -35,7 +35,7 @@ ProgramRun RunProgram(const wxString& path, const wxString& argument,
     pid_t child = 0;
     errno = Start(path, argument, child);
     if (errno != 0)
-        return {FailedCall::Now(FailedCall::Kind::Open)};
+        return {FailedCall::Now(FailedCall::Open)};
     int status = 0;
     while (waitpid(child, &status, WNOHANG) == 0)
     {

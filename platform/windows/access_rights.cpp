@@ -32,5 +32,5 @@ std::optional<FailedCall> WhyNotListed(const wxString& directory)
 {
     if (MayOpen(directory, FILE_LIST_DIRECTORY, 0))
         return {};
-    return FailedCall::Now(FailedCall::Kind::List);
+    return FailedCall::Now(FailedCall::List);
 }

@@ -1,7 +1,14 @@
-// Whether an open handle is that of a link.
+// What an open handle is that of.
 #pragma once
 
 #include "platform/system.h"
+
+/// 0 if the system does not say.
+inline DWORD AttributesOf(HANDLE handle)
+{
+    BY_HANDLE_FILE_INFORMATION information = {};
+    return GetFileInformationByHandle(handle, &information) != 0 ? information.dwFileAttributes : 0;
+}
 
 /// For a handle that was opened with FILE_FLAG_OPEN_REPARSE_POINT: whether it is that of a reparse
 /// point whose tag is a name surrogate. True if the system does not say.

@@ -1,7 +1,6 @@
 #include "platform/pinned_directory.h"
 
 #include "platform/path_normal_form.h"
-#include "platform/system.h"
 #include "platform/windows/link_handle.h"
 
 #include <wx/filename.h>
@@ -21,13 +20,6 @@ HANDLE Open(const wxString& path, DWORD access, Links links)
                        OPEN_EXISTING, flags, nullptr);
 }
 
-bool IsDirectory(HANDLE handle)
-{
-    BY_HANDLE_FILE_INFORMATION information = {};
-    return GetFileInformationByHandle(handle, &information) != 0 &&
-           (information.dwFileAttributes & FILE_ATTRIBUTE_DIRECTORY) != 0;
-}
-
 // Only a handle with the right to list or traverse the directory prevents others from renaming it.
 // While the handle is open, the name leads to the same directory or link. The name is checked too,
 // because under Wine only that reveals a link of the underlying system.
@@ -37,7 +29,7 @@ HANDLE Pin(const wxString& path, Links links)
     if (handle == INVALID_HANDLE_VALUE)
         handle = Open(path, FILE_TRAVERSE | FILE_READ_ATTRIBUTES, links);
     if (handle == INVALID_HANDLE_VALUE ||
-        (IsDirectory(handle) &&
+        ((AttributesOf(handle) & FILE_ATTRIBUTE_DIRECTORY) != 0 &&
          !(links == Links::Refuse && (IsLinkHandle(handle) || IsLink(path)))))
         return handle;
     CloseHandle(handle);

@@ -1,10 +1,6 @@
 #include "platform/regular_file.h"
 
-#include "platform/system.h"
 #include "platform/windows/link_handle.h"
-
-#include <algorithm>
-#include <limits>
 
 namespace
 {
@@ -12,18 +8,12 @@ namespace
 // The same sharing as when the C library opens a file: others may read and write it.
 constexpr DWORD Sharing = FILE_SHARE_READ | FILE_SHARE_WRITE;
 
-HANDLE OpenHandle(const wxString& path, DWORD access, DWORD flags)
+HANDLE OpenHandle(const wxString& path, DWORD access, DWORD flags,
+                  DWORD disposition = OPEN_EXISTING)
 {
     const HANDLE handle =
-        CreateFileW(path.wc_str(), access, Sharing, nullptr, OPEN_EXISTING, flags, nullptr);
+        CreateFileW(path.wc_str(), access, Sharing, nullptr, disposition, flags, nullptr);
     return handle == INVALID_HANDLE_VALUE ? nullptr : handle;
-}
-
-bool IsReparsePoint(HANDLE handle)
-{
-    BY_HANDLE_FILE_INFORMATION information = {};
-    return GetFileInformationByHandle(handle, &information) != 0 &&
-           (information.dwFileAttributes & FILE_ATTRIBUTE_REPARSE_POINT) != 0;
 }
 
 // Opens by its name a file that is already open. Null if the name leads to another one by now.
@@ -44,24 +34,12 @@ HANDLE OpenAgain(const wxString& path, DWORD access, HANDLE file)
     return nullptr;
 }
 
-bool IsDiskFull(DWORD error)
-{
-    return error == ERROR_DISK_FULL || error == ERROR_HANDLE_DISK_FULL ||
-           error == ERROR_NOT_ENOUGH_QUOTA;
-}
-
-// Where a transfer that is too long for a single call continues.
 OVERLAPPED At(std::int64_t offset)
 {
     OVERLAPPED place = {};
     place.Offset = static_cast<DWORD>(offset & 0xFFFFFFFF);
     place.OffsetHigh = static_cast<DWORD>(offset >> 32);
     return place;
-}
-
-DWORD LengthOfCall(size_t rest)
-{
-    return static_cast<DWORD>(std::min<size_t>(rest, std::numeric_limits<int>::max()));
 }
 
 } // namespace
@@ -76,7 +54,7 @@ RegularFile::Status RegularFile::Open(const PinnedDirectory* directory, const wx
     const DWORD access = forUpdate ? GENERIC_READ | GENERIC_WRITE : GENERIC_READ;
     const DWORD flags = directory ? FILE_FLAG_OPEN_REPARSE_POINT : 0;
     m_handle = OpenHandle(path, access, flags);
-    m_failure = FailedCall::Now(FailedCall::Kind::Open);
+    m_failure = FailedCall::Now(FailedCall::Open);
     if (!m_handle)
     {
         const DWORD attributes = GetFileAttributesW(path.wc_str());
@@ -90,10 +68,10 @@ RegularFile::Status RegularFile::Open(const PinnedDirectory* directory, const wx
         Close();
         return Status::NotThere;
     }
-    if (!directory || !IsReparsePoint(m_handle))
+    if (!directory || (AttributesOf(m_handle) & FILE_ATTRIBUTE_REPARSE_POINT) == 0)
         return Status::Open;
     const HANDLE content = OpenAgain(path, access, m_handle);
-    m_failure = FailedCall::Now(FailedCall::Kind::Open);
+    m_failure = FailedCall::Now(FailedCall::Open);
     CloseHandle(m_handle);
     m_handle = content;
     return content ? Status::Open : Status::Refused;
@@ -104,7 +82,7 @@ RegularFile::Status RegularFile::ReopenForUpdate()
     HANDLE handle = ReOpenFile(m_handle, GENERIC_READ | GENERIC_WRITE, Sharing, 0);
     if (handle == INVALID_HANDLE_VALUE) // not every file system supports that
         handle = OpenAgain(m_path, GENERIC_READ | GENERIC_WRITE, m_handle);
-    m_failure = FailedCall::Now(FailedCall::Kind::Open);
+    m_failure = FailedCall::Now(FailedCall::Open);
     if (!handle)
         return Status::Refused;
     CloseHandle(m_handle);
@@ -116,11 +94,9 @@ RegularFile::Status RegularFile::CreateNew(const PinnedDirectory& directory, con
 {
     Close();
     m_path = directory.Reach(name);
-    const HANDLE handle =
-        CreateFileW(m_path.wc_str(), GENERIC_READ | GENERIC_WRITE, Sharing, nullptr, CREATE_NEW,
-                    FILE_ATTRIBUTE_NORMAL | FILE_FLAG_OPEN_REPARSE_POINT, nullptr);
-    m_failure = FailedCall::Now(FailedCall::Kind::Open);
-    m_handle = handle == INVALID_HANDLE_VALUE ? nullptr : handle;
+    m_handle = OpenHandle(m_path, GENERIC_READ | GENERIC_WRITE,
+                          FILE_ATTRIBUTE_NORMAL | FILE_FLAG_OPEN_REPARSE_POINT, CREATE_NEW);
+    m_failure = FailedCall::Now(FailedCall::Open);
     if (m_handle && !directory.Holds(m_handle))
         Close();
     return m_handle ? Status::Open : Status::Refused;
@@ -137,11 +113,11 @@ bool RegularFile::MayReplace(const PinnedDirectory& /*directory*/)
     return false;
 }
 
-bool RegularFile::Close()
+void RegularFile::Close()
 {
-    const bool isDone = !m_handle || CloseHandle(m_handle) != 0;
+    if (m_handle)
+        CloseHandle(m_handle);
     m_handle = nullptr;
-    return isDone;
 }
 
 std::int64_t RegularFile::Length() const
@@ -154,14 +130,14 @@ size_t RegularFile::ReadSome(std::int64_t offset, char* bytes, size_t count) con
 {
     OVERLAPPED place = At(offset);
     DWORD done = 0;
-    return ReadFile(m_handle, bytes, LengthOfCall(count), &done, &place) != 0 ? done : 0;
+    return ReadFile(m_handle, bytes, static_cast<DWORD>(count), &done, &place) != 0 ? done : 0;
 }
 
 size_t RegularFile::WriteSome(std::int64_t offset, const char* bytes, size_t count)
 {
     OVERLAPPED place = At(offset);
     DWORD done = 0;
-    return WriteFile(m_handle, bytes, LengthOfCall(count), &done, &place) != 0 ? done : 0;
+    return WriteFile(m_handle, bytes, static_cast<DWORD>(count), &done, &place) != 0 ? done : 0;
 }
 
 bool RegularFile::Reserve(std::int64_t from, std::int64_t length)
@@ -170,9 +146,12 @@ bool RegularFile::Reserve(std::int64_t from, std::int64_t length)
         return true; // allocating less than the current size would cut the file
     FILE_ALLOCATION_INFO room = {};
     room.AllocationSize.QuadPart = from + length;
+    if (SetFileInformationByHandle(m_handle, FileAllocationInfo, &room, sizeof room) != 0)
+        return true;
     // If the file system does not support this, only the error of a full disk matters.
-    return SetFileInformationByHandle(m_handle, FileAllocationInfo, &room, sizeof room) != 0 ||
-           !IsDiskFull(GetLastError());
+    const DWORD error = GetLastError();
+    return error != ERROR_DISK_FULL && error != ERROR_HANDLE_DISK_FULL &&
+           error != ERROR_NOT_ENOUGH_QUOTA;
 }
 
 bool RegularFile::SetLength(std::int64_t length)

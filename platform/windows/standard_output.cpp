@@ -2,14 +2,10 @@
 
 #include "platform/system.h"
 
-#include <string>
-
-namespace
+bool WriteTo(StandardStream stream, const wxString& text)
 {
-
-bool Write(DWORD which, const wxString& text)
-{
-    const HANDLE handle = GetStdHandle(which);
+    const HANDLE handle =
+        GetStdHandle(stream == StandardStream::Output ? STD_OUTPUT_HANDLE : STD_ERROR_HANDLE);
     DWORD mode = 0;
     DWORD count = 0;
     if (GetConsoleMode(handle, &mode) != 0)
@@ -21,16 +17,4 @@ bool Write(DWORD which, const wxString& text)
     const std::string bytes = text.utf8_string();
     const auto size = static_cast<DWORD>(bytes.size());
     return WriteFile(handle, bytes.data(), size, &count, nullptr) != 0 && count == size;
-}
-
-} // namespace
-
-bool WriteStandardOutput(const wxString& text)
-{
-    return Write(STD_OUTPUT_HANDLE, text);
-}
-
-void WriteStandardError(const wxString& text)
-{
-    Write(STD_ERROR_HANDLE, text);
 }

@@ -6,32 +6,22 @@
 namespace
 {
 
-// Libraries that are loaded by name or on first use come from the system's directory: not from the
-// current one, nor from that of the executable, which may be a download folder where anybody could
-// have put anything.
-void LoadSystemLibrariesOnly()
-{
-    SetDefaultDllDirectories(LOAD_LIBRARY_SEARCH_SYSTEM32);
-}
-
-// From now on the process refuses to follow junctions and symbolic links that a process without
-// administrator's rights has made. Windows 11 and Windows 10 22H2 have this policy; on an older
-// system the call fails and nothing changes. The policy holds for this process alone: a program
-// does not inherit it from the installer that starts it.
-void RefuseLinksOfOthers()
-{
-    PROCESS_MITIGATION_REDIRECTION_TRUST_POLICY policy = {};
-    policy.EnforceRedirectionTrust = 1;
-    SetProcessMitigationPolicy(ProcessRedirectionTrustPolicy, &policy, sizeof policy);
-}
-
 struct StartUp
 {
     StartUp()
     {
-        LoadSystemLibrariesOnly(); // first, in case the next call loads one
-        if (IsElevated())
-            RefuseLinksOfOthers();
+        // Libraries that are loaded by name or on first use come from the system's directory: not
+        // from the current one, nor from that of the executable, which may be a download folder
+        // where anybody could have put anything. First, in case the next call loads one.
+        SetDefaultDllDirectories(LOAD_LIBRARY_SEARCH_SYSTEM32);
+        if (!IsElevated())
+            return;
+        // From now on the process refuses to follow junctions and symbolic links that a process
+        // without administrator's rights has made; it does not inherit that from an installer.
+        // Before Windows 11 and Windows 10 22H2 the call fails and nothing changes.
+        PROCESS_MITIGATION_REDIRECTION_TRUST_POLICY policy = {};
+        policy.EnforceRedirectionTrust = 1;
+        SetProcessMitigationPolicy(ProcessRedirectionTrustPolicy, &policy, sizeof policy);
     }
 };
 
@@ -47,8 +37,7 @@ struct StartUp
 #define MADE_FIRST [[gnu::init_priority(101)]] // 0 to 100 are reserved for the compiler
 #endif
 
-// Nothing refers to this object. platform/CMakeLists.txt makes the linker include it by this name,
-// which is why it is a C name.
+// See platform/CMakeLists.txt.
 extern "C"
 {
     extern const StartUp StartUpOfProgram;

@@ -27,7 +27,7 @@ ProgramRun RunProgram(const wxString& path, const wxString& argument,
     PROCESS_INFORMATION process = {};
     if (!CreateProcessW(path.wc_str(), commandLine.data(), nullptr, nullptr, FALSE, 0, nullptr,
                         nullptr, &startUp, &process))
-        return {FailedCall::Now(FailedCall::Kind::Open)};
+        return {FailedCall::Now(FailedCall::Open)};
     while (WaitForSingleObject(process.hProcess, 100 /* ms */) == WAIT_TIMEOUT)
     {
         EnumWindows(CloseIfOf, static_cast<LPARAM>(process.dwProcessId));
