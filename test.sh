@@ -80,7 +80,7 @@ native() {
 }
 
 windows() {
-    cmake/install_packages.sh build test mingw windows
+    cmake/install_packages.sh build test bench mingw windows
     say "Building wxWidgets for Windows, unless it is there"
     cmake/windows/build_wxwidgets.sh
     build windows

@@ -38,17 +38,16 @@ void TellShell(const wxString& iniPath)
 
 bool ApplyFolderIcon(const HotFolder& folder, const wxString& iconName)
 {
-    using Kind = DesktopIniChange::Kind;
     const wxString iniPath = IniPath(folder.path);
     const wxString reachedIni = folder.directory.Reach(DesktopIniName);
     const wxString reachedFolder = folder.directory.Reach({});
     const DesktopIniChange change = DecideDesktopIni(folder, iconName);
-    if (change.kind == Kind::Stays)
+    if (change.kind == DesktopIniChange::Kind::Stays)
         RunLog(
             wxString::Format(L"Desktop.ini left as it is (%s): %s", change.reasonToStay, iniPath));
-    else if (change.kind == Kind::Create)
+    else if (change.kind == DesktopIniChange::Kind::Create)
         CreateDesktopIni(folder, change.keys);
-    else if (change.kind == Kind::Refresh)
+    else if (change.kind == DesktopIniChange::Kind::Refresh)
         RefreshDesktopIni(folder, change.keys);
     if (change.isCustomised)
     {
@@ -56,7 +55,8 @@ bool ApplyFolderIcon(const HotFolder& folder, const wxString& iconName)
         TellShell(iniPath);
         ChangeAttributes(reachedFolder, 0, FILE_ATTRIBUTE_READONLY);
     }
-    return change.kind != Kind::Stays && ChangeAttributes(reachedIni, ReadOnlyAndSystem, 0);
+    return change.kind != DesktopIniChange::Kind::Stays &&
+           ChangeAttributes(reachedIni, ReadOnlyAndSystem, 0);
 }
 
 void UpdateFolderIcon(const FolderUpgradeApp& app, HotFolder& folder)

@@ -51,9 +51,9 @@ cmake/install_packages.sh build bench
 
 if [ "$what" = windows ]; then
     cmake/install_packages.sh mingw windows
-    quietly cmake --preset bench-windows
-    quietly cmake --build --preset bench-windows
-    { machine && bench/measure.py windows build/bench-windows '' '' "$@"; } | tee "$build/windows.md"
+    quietly cmake --preset windows
+    quietly cmake --build --preset windows
+    { machine && bench/measure.py windows build/windows '' '' "$@"; } | tee "$build/windows.md"
     exit
 fi
 

@@ -14,7 +14,7 @@ packages() {
         sample) echo attr python3 ;;
         test) echo libgtest-dev ;;
         fuzz) echo clang libclang-rt-dev python3 ;;
-        checks) echo clang-format clang-tidy cppcheck shellcheck python3 ;;
+        checks) echo clang-format clang-tidy cppcheck shellcheck pyflakes3 python3 ;;
         coverage) echo gcovr ;;
         bench) echo libbenchmark-dev python3 python3-lxml ;;
         mingw) echo g++-mingw-w64-x86-64-posix dpkg-dev make ;;

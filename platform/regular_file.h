@@ -84,10 +84,10 @@ class RegularFile
     bool TakeContent(const RegularFile& source);
     bool HasContentOf(const RegularFile& other) const;
 
-    /// Copies what wxCopyFile copies in addition to the content. Windows: the attributes and the
-    /// time of the last change. Elsewhere: the mode.
+    /// Copies what wxCopyFile copies in addition to the content, but read-only, which would keep the
+    /// next copy away. Windows: the attributes and the time of the last change; elsewhere: the mode.
     void TakeAttributes(const RegularFile& source);
-    /// Whether both have the same read-only, hidden and system attributes, or mode.
+    /// Whether hidden, system and read-only, or the mode, are as TakeAttributes leaves them.
     bool HasAttributesOf(const RegularFile& source) const;
 
     const FailedCall& GetFailure() const;

@@ -23,6 +23,11 @@ bool IsSameFile(const struct stat& left, const struct stat& right)
            left.st_ino == right.st_ino;
 }
 
+mode_t ModeOfCopy(const struct stat& source)
+{
+    return (source.st_mode & 07777) | S_IWUSR;
+}
+
 } // namespace
 
 RegularFile::Status RegularFile::Open(const PinnedDirectory* directory, const wxString& path,
@@ -132,7 +137,7 @@ void RegularFile::TakeAttributes(const RegularFile& source)
 {
     struct stat status = {};
     if (fstat(source.m_descriptor, &status) == 0)
-        fchmod(m_descriptor, status.st_mode & 07777);
+        fchmod(m_descriptor, ModeOfCopy(status));
 }
 
 bool RegularFile::HasAttributesOf(const RegularFile& source) const
@@ -140,5 +145,5 @@ bool RegularFile::HasAttributesOf(const RegularFile& source) const
     struct stat ours = {};
     struct stat theirs = {};
     return fstat(m_descriptor, &ours) == 0 && fstat(source.m_descriptor, &theirs) == 0 &&
-           (ours.st_mode & 07777) == (theirs.st_mode & 07777);
+           (ours.st_mode & 07777) == ModeOfCopy(theirs);
 }

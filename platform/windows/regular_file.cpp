@@ -176,16 +176,20 @@ void RegularFile::TakeAttributes(const RegularFile& source)
     information.CreationTime.QuadPart = 0;
     information.LastAccessTime.QuadPart = 0;
     information.ChangeTime.QuadPart = 0;
+    // So do attributes of 0.
+    information.FileAttributes &= ~DWORD{FILE_ATTRIBUTE_READONLY};
+    if (information.FileAttributes == 0)
+        information.FileAttributes = FILE_ATTRIBUTE_NORMAL;
     SetFileInformationByHandle(m_handle, FileBasicInfo, &information, sizeof information);
 }
 
 bool RegularFile::HasAttributesOf(const RegularFile& source) const
 {
-    constexpr DWORD Compared =
-        FILE_ATTRIBUTE_READONLY | FILE_ATTRIBUTE_HIDDEN | FILE_ATTRIBUTE_SYSTEM;
+    constexpr DWORD Copied = FILE_ATTRIBUTE_HIDDEN | FILE_ATTRIBUTE_SYSTEM;
     BY_HANDLE_FILE_INFORMATION ours = {};
     BY_HANDLE_FILE_INFORMATION theirs = {};
     return GetFileInformationByHandle(m_handle, &ours) != 0 &&
            GetFileInformationByHandle(source.m_handle, &theirs) != 0 &&
-           (ours.dwFileAttributes & Compared) == (theirs.dwFileAttributes & Compared);
+           (ours.dwFileAttributes & (Copied | FILE_ATTRIBUTE_READONLY)) ==
+               (theirs.dwFileAttributes & Copied);
 }

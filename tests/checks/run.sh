@@ -20,12 +20,13 @@ mapfile -t native < <(find_files -name '*.cpp' -not -path './platform/windows/*'
 
 case $check in
     clang-format) clang-format --dry-run --Werror "${sources[@]}" ;;
-    clang-tidy) printf '%s\n' "${native[@]}" | xargs -P "$(nproc)" -n 2 clang-tidy -p "$build" --quiet ;;
+    clang-tidy) find "$build" -name 'unity_*.cxx' -print0 | xargs -0 -P "$(nproc)" -n 1 clang-tidy -p "$build" --quiet ;;
     cppcheck)
         cppcheck --quiet --std=c++17 --enable=warning,performance,portability -I . --inline-suppr \
             --suppress=missingIncludeSystem --error-exitcode=1 "${native[@]}"
         ;;
     shellcheck) shellcheck "${scripts[@]}" ;;
+    pyflakes) find_files -name '*.py' | tr '\n' '\0' | xargs -0 pyflakes3 ;;
     directions) tests/checks/directions.py ;;
     *) echo "No such check: $check" >&2; exit 2 ;;
 esac
