@@ -26,20 +26,17 @@ struct Fault
 Files FilesBefore()
 {
     const Text lost = "<HotFolder lost=\"" + Text(2000, 'x') + "\"";
-    Files files =
-        Scenario("")
-            .FolderCfg(Written(MovedFrom))
-            .Before({{"hot/A/[P]/hf_folder.ico", "old"},
-                     {"hot/B/[P]/hf_error_inactive.ico", "old"},
-                     {"hot/B/[P]/Error.er", ""},
-                     {"hot/B/[P]/Folder.cfg", Replaced(Minimal(MovedFrom), "<HotFolder", lost)},
-                     {"hot/B/Desktop.ini", "[.ShellClassInfo]\nIconFile=mine.ico\n[ViewState]\n"},
-                     {"hot/B/Desktop.ini#", "RS"},
-                     {"user/ORX/JPData/P/Presets/presets.xml", Stored(MovedFrom)},
-                     {"user/ORX/JPData/Q/Presets/presets.xml",
-                      "\xEF\xBB\xBF" + Stored(MovedFrom) + Text(4000, 'x')},
-                     {LogPlace, "an earlier run's\r\n"}})
-            .before;
+    Files files = {{CfgPlace, Written(MovedFrom)},
+                   {"hot/A/[P]/hf_folder.ico", "old"},
+                   {"hot/B/[P]/hf_error_inactive.ico", "old"},
+                   {"hot/B/[P]/Error.er", ""},
+                   {"hot/B/[P]/Folder.cfg", Replaced(Minimal(MovedFrom), "<HotFolder", lost)},
+                   {"hot/B/Desktop.ini", "[.ShellClassInfo]\nIconFile=mine.ico\n[ViewState]\n"},
+                   {"hot/B/Desktop.ini#", "RS"},
+                   {"user/ORX/JPData/P/Presets/presets.xml", Stored(MovedFrom)},
+                   {"user/ORX/JPData/Q/Presets/presets.xml",
+                    "\xEF\xBB\xBF" + Stored(MovedFrom) + Text(4000, 'x')},
+                   {LogPlace, "an earlier run's\r\n"}};
     for (const auto& [place, text] : Files(files))
         files["elsewhere/" + place] = text;
     files["elsewhere/hot/B/Desktop.ini#"] = "";
@@ -105,29 +102,19 @@ class Faults : public testing::TestWithParam<Fault>
         return hit;
     }
 
-    // The places that should be as after a run without a fault, but are not.
+    // The parts that should be as after a run without a fault, but are not.
     std::set<Text> Wrong(const Text& hit, const Files& now) const
     {
         std::set<Text> parts;
-        std::set<Text> halfDone; // neither as before nor as after the run
-        const auto changed = Differences(m_before, now);
         for (const auto& [place, texts] : Differences(m_after, now))
-        {
-            if (place != LogPlace)
-                parts.insert(Part(place));
-            if (place != LogPlace && changed.count(place) > 0 && place.find(".ico") == Text::npos)
-                halfDone.insert(place);
-        }
-        if (Part(hit) != hit || parts.count(hit) > 0 || StartsWith(hit, LogDir))
-        {
-            parts.erase(Part(hit));
-            return parts;
-        }
-        // A call for several parts: one hot folder or all presets, without the list everything, may
-        // be skipped; at a source icon, its copy may differ.
-        const bool mayBeSeveral = StartsWith(hit, "machine/hotfolder") ||
-                                  (!parts.empty() && StartsWith(*parts.begin(), "user/ORX/JPData"));
-        return parts.size() > 1 && !mayBeSeveral ? parts : halfDone;
+            parts.insert(Part(place));
+        parts.erase(LogPlace);
+        const bool isForSeveral = parts.erase(Part(hit)) == 0 && Part(hit) == hit;
+        // One hot folder or all presets, without the list everything, may then be skipped.
+        if (isForSeveral && (parts.size() <= 1 || StartsWith(hit, "machine/hotfolder") ||
+                             StartsWith(*parts.begin(), "user/ORX/JPData")))
+            return {};
+        return parts;
     }
 
     // Each stored file is the old or the new one, and the log has whole lines. At the end of a

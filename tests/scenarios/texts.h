@@ -114,3 +114,30 @@ inline const Text NoDefault = "Unable to read: Default Impose Template Path\n";
 inline const Text NoPrevious = "Unable to read: Previous Version  Default Impose Template Path\n";
 inline const Text NoPreviousTo = "unable to read: Previous Version  Default Impose Template Path\n";
 inline const Text Updated = "Updated preset.xml  : ";
+
+/// A hot folder with this Folder.cfg, before and after; without the second, it stays. The lines
+/// about its template are as if its name were A.
+struct HotFolder
+{
+    Text cfg;
+    Text becomes;
+    Text impose;
+    Text icon = "hf_folder_disabled";
+};
+
+inline Scenario HotFolders(const Text& whatHappens, const std::map<Text, HotFolder>& folders)
+{
+    Scenario scenario(whatHappens);
+    Text log;
+    int position = 0;
+    for (const auto& [name, folder] : folders)
+    {
+        const Text place = Replaced(CfgPlace, "A", name);
+        scenario.Before({{place, folder.cfg}});
+        if (!folder.becomes.empty())
+            scenario.After({{place, folder.becomes}});
+        log += FolderLines(name, ++position, NoIcon(folder.icon),
+                           Replaced(folder.impose, "{hot}{/}A", "{hot}{/}" + name));
+    }
+    return scenario.Log(log);
+}
