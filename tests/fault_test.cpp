@@ -9,8 +9,6 @@
 namespace
 {
 
-const Text LogDir = "user/ORX_Installers";
-
 // What happens at each call in turn: see failing_calls.cpp.
 struct Fault
 {
@@ -47,7 +45,7 @@ Files FilesBefore()
 // The hot folder or job preset directory to which the place belongs; else the place itself.
 Text Part(const Text& place)
 {
-    for (const Text top : {"hot/", "user/ORX/JPData/"})
+    for (const Text& top : {Text("hot/"), JobPresets + "/"})
     {
         if (StartsWith(place, top))
             return place.substr(0, place.find_first_of("/#", top.size()));
@@ -112,7 +110,7 @@ class Faults : public testing::TestWithParam<Fault>
         const bool isForSeveral = parts.erase(Part(hit)) == 0 && Part(hit) == hit;
         // One hot folder or all presets, without the list everything, may then be skipped.
         if (isForSeveral && (parts.size() <= 1 || StartsWith(hit, "machine/hotfolder") ||
-                             StartsWith(*parts.begin(), "user/ORX/JPData")))
+                             StartsWith(*parts.begin(), JobPresets)))
             return {};
         return parts;
     }
@@ -172,7 +170,7 @@ std::vector<Fault> AllFaults()
 TEST_P(Faults, AreSurvived)
 {
     const Fault& fault = GetParam();
-    const Text part = StartsWith(fault.victim, LogDir) ? LogDir : Part(fault.victim);
+    const Text part = StartsWith(fault.victim, LogFolder) ? LogFolder : Part(fault.victim);
     const Text root = part.empty() ? Path("tool").substr(0, Path("tool").rfind('/')) : Path(part);
     int number = 0;
     for (Text hit = "first"; !hit.empty() && !HasFailure();)

@@ -6,8 +6,7 @@ namespace
 
 const char* const WineFollowsLinks = "Wine shows neither links to files nor dangling ones as links";
 
-const Text LogDir = "user/ORX_Installers";
-const Text PresetDir = "user/ORX/JPData/.P/Presets";
+const Text PresetDir = JobPresets + "/.P/Presets";
 const Text Icon = "hot/A/[P]/hf_folder_disabled.ico";
 const Text Ini = "hot/A/Desktop.ini";
 const Text CannotOpenPreset = "Unable to open preset.xml for read : ";
@@ -23,16 +22,14 @@ Scenario WithIcon(const Text& name)
     return Scenario(name)
         .Before({{Icon, "old"}})
         .After({{Icon, "{icon:hf_folder_disabled.ico}"}, {"hot/A#", "S"}})
-        .Log(FolderLines("A", 1, Copied("hf_folder_disabled"), NoCfg()));
+        .Log(CopiedToA());
 }
 
 std::vector<Scenario> PlantedLinks()
 {
     const Text cfg = Written(MovedFrom);
     const Text preset = Stored(MovedFrom);
-    const Text ini = "[.ShellClassInfo]\r\nIconFile=.\\[_ORX_HotFolder_]\\hf_folder_disabled."
-                     "ico\r\nIconIndex=00\r\n"
-                     "InfoTip=This folder has been configured as an ORX hot folder.\r\n";
+    const Text ini = IniHeader + IconFile("hf_folder_disabled") + "IconIndex=00\r\n" + InfoTip;
     const Text iniStays =
         "Desktop.ini left as it is (reached over a link): {hot}{/}A{/}Desktop.ini\n";
     std::vector<Scenario> scenarios = {
@@ -47,7 +44,7 @@ std::vector<Scenario> PlantedLinks()
         Scenario("ALinkedLogFolderGetsNoLog")
             .Before({{LogPlace, Removed},
                      {"elsewhere/L/UpgradeDowngrade.log", "-"},
-                     {LogDir + "/", LinkTo("elsewhere/L")}})
+                     {LogFolder + "/", LinkTo("elsewhere/L")}})
             .FolderCfg(cfg, Written(MovedTo)),
         Scenario("AHotFolderMayBeReachedOverALink")
             .Before({{"elsewhere/A/[P]/Folder.cfg", cfg}, {"hot/A/", LinkTo("elsewhere/A")}})
@@ -55,11 +52,11 @@ std::vector<Scenario> PlantedLinks()
             .LogOfA(Found(MovedFrom)),
         Scenario("AJobPresetDirectoryMayBeALink")
             .Before({{"elsewhere/P/Presets/presets.xml", preset},
-                     {"user/ORX/JPData/.P/", LinkTo("elsewhere/P")}})
+                     {JobPresets + "/.P/", LinkTo("elsewhere/P")}})
             .After({{"elsewhere/P/Presets/presets.xml", Stored(MovedTo)}})
             .LogOfPreset(Updated),
         Scenario("TheFoldersAboveThePresetsMayBeLinks")
-            .Before({{"user/ORX/JPData/", Removed},
+            .Before({{JobPresets + "/", Removed},
                      {"elsewhere/ORX/other", ""},
                      {"elsewhere/JPData/.P/Presets/presets.xml", preset},
                      {"user/ORX/", LinkTo("elsewhere/ORX")},
@@ -91,10 +88,9 @@ std::vector<Scenario> PlantedLinks()
     add(WithIcon("AFolderCfg").After({{Ini, ini}, {Ini + "#", "RS"}}), CfgPlace,
         "elsewhere/Folder.cfg", cfg);
     add(Scenario("AnIcon").LogOfDisabledA(NoCfg()), Icon, "elsewhere/icon.ico", "old");
-    add(WithIcon("DesktopIni")
-            .Log(FolderLines("A", 1, iniStays + Copied("hf_folder_disabled"), NoCfg())),
-        Ini, "elsewhere/Desktop.ini", "[.ShellClassInfo]\r\n");
-    scenarios.back().Log(FolderLines("A", 1, Copied("hf_folder_disabled"), NoCfg()));
+    add(WithIcon("DesktopIni").Log(CopiedToA(iniStays)), Ini, "elsewhere/Desktop.ini",
+        "[.ShellClassInfo]\r\n");
+    scenarios.back().Log(CopiedToA());
     add(Scenario("APreset").LogOfPreset(CannotOpenPreset), PresetDir + "/presets.xml",
         "elsewhere/presets.xml", preset);
     add(Scenario("TheLog").FolderCfg(cfg, Written(MovedTo)), LogPlace, "elsewhere/log", "-");

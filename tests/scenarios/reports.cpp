@@ -7,8 +7,7 @@
 namespace
 {
 
-const Text Jobs = "user/ORX/JPData";
-const Text LogFolder = "user/ORX_Installers";
+const Text Disabled = "hf_folder_disabled";
 const char* const NoLinks = "Wine does not show links to files as links";
 const char* const NoRefusal = "Wine lets every user open or list a directory";
 
@@ -23,17 +22,14 @@ Text PresetOf(char name)
 }
 
 // A hot folder in which a run changes nothing but its template.
-Files DoneFolder(char name, const Text& cfg = Written(MovedTo))
+Files DoneFolder(char name, const Text& cfg = Written(MovedTo), const Text& icon = "hf_folder")
 {
     const Text folder = Text("hot/") + name;
-    return {
-        {folder + "#", "S"},
-        {folder + "/Desktop.ini#", "RS"},
-        {folder + "/Desktop.ini",
-         "[.ShellClassInfo]\r\nInfoTip=This folder has been configured as an ORX hot folder.\r\n"
-         "IconFile=.\\[_ORX_HotFolder_]\\hf_folder.ico\r\n"},
-        {folder + "/[P]/hf_folder.ico", "{icon:hf_folder.ico}"},
-        {Cfg(name), cfg}};
+    return {{folder + "#", "S"},
+            {folder + "/Desktop.ini#", "RS"},
+            {folder + "/Desktop.ini", IniHeader + InfoTip + IconFile(icon)},
+            {folder + "/[P]/" + icon + ".ico", "{icon:" + icon + ".ico}"},
+            {Cfg(name), cfg}};
 }
 
 // A run would change nothing here, and there is nothing to report.
@@ -54,7 +50,7 @@ std::vector<Scenario> Machines()
     };
     return {
         Scenario("AnEmptyMachine")
-            .Before({{ListPlace, Removed}, {LogPlace, Removed}, {Jobs + "/", Removed}})
+            .Before({{ListPlace, Removed}, {LogPlace, Removed}, {JobPresets + "/", Removed}})
             .IsReported(R"(
 Workstation
   note     there is no {list}
@@ -75,7 +71,7 @@ Workstation
   problem  HotFolderList.cfg: is not a file
   problem  there will be no run log: it is reached over a link: {log})"),
         listed("AListIsEmptyAndJPDataCannotBeListed", "")
-            .Before({{Jobs + "#", "L"}})
+            .Before({{JobPresets + "#", "L"}})
             .AsOtherUser()
             .NotUnderWine(NoRefusal)
             .IsReported(R"(
@@ -109,7 +105,7 @@ Workstation
   problem  can't open file*
   problem  there will be no run log: its folder cannot be written to: {user}{/}ORX_Installers{/})"),
         Done("NoFolderCanBeEntered")
-            .Before({{"machine/hotfolder#", "0"}, {LogFolder + "#", "0"}, {Jobs + "#", "0"}})
+            .Before({{"machine/hotfolder#", "0"}, {LogFolder + "#", "0"}, {JobPresets + "#", "0"}})
             .AsOtherUser()
             .IsReported(R"(
 Workstation
@@ -258,7 +254,8 @@ std::vector<Scenario> Contents()
         Done("Losses")
             .FolderCfg(Rich())
             .Before(DoneFolder('B', Replaced(Written(MovedFrom), " TimeInterval=\"010\"", "")))
-            .Before({{Cfg('C'), Replaced(Written(MovedFrom), "Enable=\"1\"", "Enable=\"true\"")}})
+            .Before(DoneFolder('C', Replaced(Written(MovedFrom), "Enable=\"1\"", "Enable=\"true\""),
+                               Disabled))
             .IsReported(R"(
 {hot}{/}A
   problem  Folder.cfg: loses its document type, and with it the entities in its texts
@@ -283,20 +280,19 @@ std::vector<Scenario> Contents()
 {moves}
 {hot}{/}C
   problem  Folder.cfg: Enable="true" comes out as "0"
-{moves}
-{nodisabled})"),
+{moves})"),
         Done("FolderCfgs")
+            .Before(DoneFolder('B', Removed, Disabled))
+            .Before(DoneFolder('C', "<a><b></a>", Disabled))
             .Before(DoneFolder('G', "{utf16}" + utf16))
+            .Before(DoneFolder('H', hidden, Disabled))
+            .Before(DoneFolder('I', Replaced(hidden, "Enable=\"1\"", "Enable=\"0\""), Disabled))
             .Before({{"hot/A/Desktop.ini", "[.ShellClassInfo]\r\nIconFile=x\r\n"},
                      {"hot/A/Desktop.ini#", "H"},
                      {"hot/A#", "H"},
-                     {"hot/B/[P]/", ""},
-                     {Cfg('C'), "<a><b></a>"},
                      {Cfg('D') + "/", ""},
                      {"hot/E/[P]/", "{link:elsewhere/d}"},
-                     {"elsewhere/d/Folder.cfg", Written(MovedFrom)},
-                     {Cfg('H'), hidden},
-                     {Cfg('I'), Replaced(hidden, "Enable=\"1\"", "Enable=\"0\"")}})
+                     {"elsewhere/d/Folder.cfg", Written(MovedFrom)}})
             .IsReported(R"(
 {hot}{/}A
   change   Desktop.ini: InfoTip, IconFile
@@ -304,11 +300,9 @@ std::vector<Scenario> Contents()
   change   hot folder: attributes HIDDEN -> HIDDEN SYSTEM
 {hot}{/}B
   note     no Folder.cfg
-{nodisabled}
 {hot}{/}C
   problem  Folder.cfg: damaged (line 1: mismatched tag); it stays as it is, and the folder shows )"
                         R"(as disabled
-{nodisabled}
 {hot}{/}D
   problem  Folder.cfg: is not a file
 {nodisabled}
@@ -318,13 +312,10 @@ std::vector<Scenario> Contents()
 {moves}
   note     Folder.cfg: comes out as UTF-8
 {hot}{/}H
-  problem  Folder.cfg: lacks "description", so the enabled folder shows as disabled
-{nodisabled}
-{hot}{/}I
-{nodisabled})"),
+  problem  Folder.cfg: lacks "description", so the enabled folder shows as disabled)"),
         Done("Presets")
             .Before({{PresetOf('B') + "/", ""},
-                     {Jobs + "/C/Presets/", "{link:elsewhere/d}"},
+                     {JobPresets + "/C/Presets/", "{link:elsewhere/d}"},
                      {"elsewhere/d/", ""},
                      {PresetOf('D'), Text("\xFF\xFE\0", 3)},
                      {PresetOf('E'), "<p>\xC3\xA4 \xE4</p>"},
@@ -389,7 +380,7 @@ Job presets
                      {LogPlace + "#", "R"},
                      {PresetPlace + "#", "0"},
                      {PresetOf('Q'), ""},
-                     {Jobs + "/Q#", "0"},
+                     {JobPresets + "/Q#", "0"},
                      {PresetOf('R'), ""},
                      {PresetOf('R') + "#", "R"}})
             .AsOtherUser()

@@ -9,6 +9,9 @@ inline Text Times(int count, const Text& text)
     return "{times:" + std::to_string(count) + ":" + text + "}";
 }
 
+inline const Text LogFolder = "user/ORX_Installers";
+inline const Text JobPresets = "user/ORX/JPData";
+
 inline const Text MovedFrom = "{previous}{/}Booklet.tpl";
 inline const Text MovedTo = "{default}{/}Booklet.tpl";
 
@@ -70,6 +73,16 @@ inline Text Stored(const Text& path)
     return "<K n=\"ORXImposeTemplate\">\"" + path + "\"</K>\r\n";
 }
 
+// Desktop.ini.
+
+inline const Text IniHeader = "[.ShellClassInfo]\r\n";
+inline const Text InfoTip = "InfoTip=This folder has been configured as an ORX hot folder.\r\n";
+
+inline Text IconFile(const Text& name)
+{
+    return "IconFile=.\\[_ORX_HotFolder_]\\" + name + ".ico\r\n";
+}
+
 // Log lines; {icons} is where the icons of the run's direction come from.
 
 /// One folder's lines: those of its icon and those of its template.
@@ -96,6 +109,11 @@ inline Text CfgOf(const Text& name)
 inline Text NoCfg(const Text& name = "A")
 {
     return "HF cfg file unable to read/exist: " + CfgOf(name);
+}
+/// The lines of A if its icon is replaced and it has no Folder.cfg.
+inline Text CopiedToA(const Text& other = "")
+{
+    return FolderLines("A", 1, other + Copied("hf_folder_disabled"), NoCfg());
 }
 inline Text Untouched(const Text& reason)
 {
