@@ -5,62 +5,65 @@ namespace
 {
 
 const Text Ini = "hot/A/Desktop.ini";
+const Text Icon = "hot/A/[P]/hf_folder_disabled.ico";
 const char* const WineLosesSystem =
     "Wine loses SYSTEM on a read-only file of a user who is not root";
-
-Text Icon(const Text& name)
-{
-    return "hot/A/[P]/" + name + ".ico";
-}
 
 Text Cfg(const Text& enabled)
 {
     return "<H name='' description='' server_ip='' server_name='' Enable='" + enabled + "'/>";
 }
 
+// A hot folder for each state, with the name of its icon.
+Scenario States(const Text& name, const Text& letter)
+{
+    struct State
+    {
+        Text enabled;
+        Text error; // a directory of the file's name does not count
+    };
+    const bool isUpgrade = letter == "I";
+    Scenario scenario(name);
+    Text log;
+    int position = 0;
+    for (const auto& [icon, state] :
+         std::map<Text, State>{{"hf_error_active", {"1", "Error.er"}},
+                               {"hf_error_inactive", {"", "Error.er"}},
+                               {"hf_folder", {"1", "Error.er/"}},
+                               {"hf_folder_disabled", {"01", "Error.er/"}}})
+    {
+        const Text folder = "hot/" + icon;
+        const Text copy = folder + "/[P]/" + icon + ".ico";
+        scenario
+            .Before({{folder + "/[P]/Folder.cfg", Cfg(state.enabled)},
+                     {folder + "/[P]/" + state.error, ""},
+                     {folder + "/[P]/other.ico", "stays"},
+                     {folder + "/Error.er", ""},
+                     {copy, "old"},
+                     {"tool/" + icon + ".ico#", "R"},
+                     {"tool/BundleIcons/" + icon + ".ico", "of the previous version"}})
+            .After({{folder + "#", "S"},
+                    {folder + "/Desktop.ini#", "RS"},
+                    {folder + "/Desktop.ini",
+                     IniHeader + IconFile(icon) + "IconIndex=00\r\n" + InfoTip},
+                    {copy, isUpgrade ? "{icon:" + icon + ".ico}" : "of the previous version"},
+                    {copy + "#", isUpgrade ? "R" : Removed}});
+        log += FolderLines(icon, ++position, Copied(icon, icon), "");
+    }
+    return scenario.Run({letter}).Log(log);
+}
+
 std::vector<Scenario> Icons()
 {
-    struct Row
-    {
-        Text name;
-        Text icon;
-        Text enabled;
-        Text error; // a place; a directory of the file's name does not count
+    return {
+        States("AnUpgradeShowsEachState", "I"),
+        States("ADowngradeShowsEachState", "U"),
+        Scenario("WithoutItsIconAFolderStays")
+            .Before(
+                {{Icon, "old"}, {"tool/BundleIcons/hf_folder_disabled.ico", ""}, {Ini, "; mine\n"}})
+            .FolderCfg(Cfg("1"))
+            .LogOfA(""),
     };
-    std::vector<Scenario> scenarios = {Scenario("WithoutItsIconAFolderStays")
-                                           .Before({{Icon("hf_folder_disabled"), "old"},
-                                                    {"tool/BundleIcons/hf_folder_disabled.ico", ""},
-                                                    {Ini, "; mine\n"}})
-                                           .FolderCfg(Cfg("1"))
-                                           .LogOfA("")};
-    for (const auto& [name, icon, enabled, error] :
-         {Row{"Active", "hf_folder", "1", "hot/A/[P]/Error.er/"},
-          {"Disabled", "hf_folder_disabled", "01", "hot/A/[P]/Error.er/"},
-          {"ErrorActive", "hf_error_active", "1", "hot/A/[P]/Error.er"},
-          {"ErrorInactive", "hf_error_inactive", "", "hot/A/[P]/Error.er"}})
-    {
-        const Scenario shown =
-            Scenario("AnUpgradeShows" + name)
-                .FolderCfg(Cfg(enabled))
-                .Before({{Icon(icon), "old"},
-                         {Icon("other"), "stays"},
-                         {"hot/A/Error.er", ""},
-                         {error, ""},
-                         {"tool/" + icon + ".ico#", "R"},
-                         {"tool/BundleIcons/" + icon + ".ico", "of the previous version"}})
-                .After({{"hot/A#", "S"},
-                        {Ini + "#", "RS"},
-                        {Icon(icon), "{icon:" + icon + ".ico}"},
-                        {Icon(icon) + "#", "R"},
-                        {Ini, IniHeader + IconFile(icon) + "IconIndex=00\r\n" + InfoTip}})
-                .Log(FolderLines("A", 1, Copied(icon), ""));
-        scenarios.push_back(shown);
-        scenarios.push_back(shown);
-        scenarios.back().name = "ADowngradeShows" + name;
-        scenarios.back().Run({"U"}).After(
-            {{Icon(icon), "of the previous version"}, {Icon(icon) + "#", Removed}});
-    }
-    return scenarios;
 }
 
 // A folder that already has a user's Desktop.ini.
@@ -78,11 +81,11 @@ std::vector<Scenario> DesktopInis()
     const auto refresh = [](const Text& name, const Text& before, const Text& after)
     {
         return Scenario(name)
-            .Before({{Icon("hf_folder_disabled"), "old"}, {Ini, before}})
+            .Before({{Icon, "old"}, {Ini, before}})
             .After({{"hot/A#", "S"},
                     {Ini + "#", "RS"},
                     {Ini, after},
-                    {Icon("hf_folder_disabled"), "{icon:hf_folder_disabled.ico}"}})
+                    {Icon, "{icon:hf_folder_disabled.ico}"}})
             .Log(CopiedToA());
     };
     return {
@@ -106,8 +109,8 @@ std::vector<Scenario> DesktopInis()
             .Before({{Ini + "#", "RS"}}),
         refresh("AReadOnlyDesktopIniAndIconOfTheUsersAreWritten", "",
                 IniHeader + InfoTip + disabled)
-            .Before({{Ini + "#", "RS"}, {Icon("hf_folder_disabled") + "#", "R"}})
-            .After({{Icon("hf_folder_disabled") + "#", Removed}})
+            .Before({{Ini + "#", "RS"}, {Icon + "#", "R"}})
+            .After({{Icon + "#", Removed}})
             .AsOtherUser()
             .NotUnderWine(WineLosesSystem),
         refresh("ADesktopIniOfAnotherUserStays", "[x]\r\n", "[x]\r\n")
@@ -116,10 +119,7 @@ std::vector<Scenario> DesktopInis()
             .AsOtherUser()
             .NotUnderWine(WineLosesSystem),
         Scenario("AFolderOfAnotherUserStays")
-            .Before({{Icon("hf_folder_disabled"), "old"},
-                     {Icon("hf_folder_disabled") + "#", "X"},
-                     {"hot/A#", "X"},
-                     {"hot/A/[P]#", "X"}})
+            .Before({{Icon, "old"}, {Icon + "#", "X"}, {"hot/A#", "X"}, {"hot/A/[P]#", "X"}})
             .AsOtherUser()
             .Log(CopiedToA())
             .LibraryReports(),
@@ -139,7 +139,7 @@ std::vector<Scenario> ShellCalls()
     const auto told = [&](const Text& name, const Text& shell, const Text& calls, const Text& ini)
     {
         return Scenario(name)
-            .Before({{Icon("hf_folder_disabled"), "{icon:hf_folder_disabled.ico}"}, {Ini, ""}})
+            .Before({{Icon, "{icon:hf_folder_disabled.ico}"}, {Ini, ""}})
             .After({{Ini + "#", "RS"}, {"hot/A#", ini.empty() ? Removed : "S"}, {Ini, ini}})
             .Log(CopiedToA())
             .Shell(shell, version + calls);

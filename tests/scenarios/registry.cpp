@@ -53,9 +53,6 @@ std::vector<Scenario> Registry()
             .LogOfA(found, updated),
         WithInstalled("ANumberAsTheNewFolderMovesNothing", "\"InstallPath\"=dword:00000001")
             .LogOfA(unstorable, updated),
-        WithInstalled("ALoneSurrogateInTheNewFolderMovesNothing",
-                      "\"InstallPath\"=hex:43,00,00,d8,3a,00,00,00")
-            .LogOfA(unstorable, updated),
         WithPrevious("AnUnterminatedOddValueIsReadToItsLastWholeUnit",
                      "\"Path\"=hex(2):78,00,79,00,7a")
             .LogOfA(found, updated),

@@ -70,22 +70,15 @@ Workstation
 Workstation
   problem  HotFolderList.cfg: is not a file
   problem  there will be no run log: it is reached over a link: {log})"),
-        listed("AListIsEmptyAndJPDataCannotBeListed", "")
-            .Before({{JobPresets + "#", "L"}})
-            .AsOtherUser()
-            .NotUnderWine(NoRefusal)
-            .IsReported(R"(
+        listed("AListIsEmpty", "").IsReported(R"(
 Workstation
-  note     HotFolderList.cfg lists no hot folder
-Job presets
-  problem  {user}{/}ORX{/}JPData{/} cannot be listed)"),
+  note     HotFolderList.cfg lists no hot folder)"),
         listed("NoListedFolderIsThere", "<HotFolder path='{hot}{/}B'/>").IsReported(R"(
 Workstation
   problem  none of the listed hot folders exists (another account? mapped drives?)
   note     listed hot folder does not exist: {hot}{/}B)"),
         listed("ListedFoldersAreMissingOrListedTwiceOrHaveTwoNames",
-               "<HotFolder path='{hot}{/}A'/><HotFolder path='{hot}{/}A'/>"
-               "<HotFolder path='{hot}{/}C'/>" +
+               Times(2, "<HotFolder path='{hot}{/}A'/>") + "<HotFolder path='{hot}{/}C'/>" +
                    missing)
             .Before({{"hot/C/", "{link:hot/A}"}})
             .IsReported("\nWorkstation" +
@@ -411,19 +404,22 @@ Job presets
   problem  .P{/}Presets{/}presets.xml: cannot be opened for reading (can't open file*
   problem  Q{/}Presets{/}presets.xml: {user}{/}ORX{/}JPData{/}Q cannot be entered
   problem  R{/}Presets{/}presets.xml: cannot be opened for writing (can't open file*)"),
-        Done("FoldersOfAnotherUser")
+        Done("FoldersOfAnotherUserAndPresetsThatCannotBeListed")
             .Before(DoneFolder('B'))
             .Before({{"hot/A/Desktop.ini", Removed},
                      {"hot/A/Desktop.ini#", Removed},
                      {"hot/A#", "SX"},
-                     {"hot/B#", "X"}})
+                     {"hot/B#", "X"},
+                     {JobPresets + "#", "L"}})
             .AsOtherUser()
             .NotUnderWine(NoRefusal)
             .IsReported(R"(
 {hot}{/}A
   problem  Desktop.ini: cannot be created, because the hot folder cannot be written to
 {hot}{/}B
-  problem  hot folder: its attributes cannot be changed)"),
+  problem  hot folder: its attributes cannot be changed
+Job presets
+  problem  {user}{/}ORX{/}JPData{/} cannot be listed)"),
         Done("SourceIconsAreMissing")
             .Before(DoneFolder('A', Written("{hot}{/}A")))
             .Before(DoneFolder('B', Written("{hot}{/}A")))

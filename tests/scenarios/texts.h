@@ -97,10 +97,10 @@ inline Text NoIcon(const Text& name)
 {
     return "Icon path  not exist: {tool}{/}{icons}" + name + ".ico\n";
 }
-inline Text Copied(const Text& icon)
+inline Text Copied(const Text& icon, const Text& folder = "A")
 {
-    return "Icon  copied from : {tool}{/}{icons}" + icon +
-           ".ico To {hot}{/}A{/}[_ORX_HotFolder_]{/}" + icon + ".ico \n";
+    return "Icon  copied from : {tool}{/}{icons}" + icon + ".ico To {hot}{/}" + folder +
+           "{/}[_ORX_HotFolder_]{/}" + icon + ".ico \n";
 }
 inline Text CfgOf(const Text& name)
 {
