@@ -11,11 +11,6 @@ const Text Icon = "hot/A/[P]/hf_folder_disabled.ico";
 const Text Ini = "hot/A/Desktop.ini";
 const Text CannotOpenPreset = "Unable to open preset.xml for read : ";
 
-Text LinkTo(const Text& place)
-{
-    return "{link:" + place + "}";
-}
-
 // What a run without a Folder.cfg does to A, whose icon exists.
 Scenario WithIcon(const Text& name)
 {
@@ -36,64 +31,60 @@ std::vector<Scenario> PlantedLinks()
         Scenario("ALinkedPrivateDirectoryIsIgnored")
             .Before({{"elsewhere/P/Folder.cfg", cfg},
                      {"elsewhere/P/hf_folder_disabled.ico", "old"},
-                     {"hot/A/[P]/", LinkTo("elsewhere/P")}})
+                     {"hot/A/[P]/", "{link:elsewhere/P}"}})
             .LogOfDisabledA(NoCfg()),
         Scenario("ALinkedPresetDirectoryIsNotOpened")
-            .Before({{"elsewhere/P/presets.xml", preset}, {PresetDir + "/", LinkTo("elsewhere/P")}})
+            .Before({{"elsewhere/P/presets.xml", preset}, {PresetDir + "/", "{link:elsewhere/P}"}})
             .LogOfPreset(CannotOpenPreset),
         Scenario("ALinkedLogFolderGetsNoLog")
             .Before({{LogPlace, Removed},
                      {"elsewhere/L/UpgradeDowngrade.log", "-"},
-                     {LogFolder + "/", LinkTo("elsewhere/L")}})
+                     {LogFolder + "/", "{link:elsewhere/L}"}})
             .FolderCfg(cfg, Written(MovedTo)),
         Scenario("AHotFolderMayBeReachedOverALink")
-            .Before({{"elsewhere/A/[P]/Folder.cfg", cfg}, {"hot/A/", LinkTo("elsewhere/A")}})
+            .Before({{"elsewhere/A/[P]/Folder.cfg", cfg}, {"hot/A/", "{link:elsewhere/A}"}})
             .After({{"elsewhere/A/[P]/Folder.cfg", Written(MovedTo)}})
             .LogOfA(Found(MovedFrom)),
         Scenario("AJobPresetDirectoryMayBeALink")
             .Before({{"elsewhere/P/Presets/presets.xml", preset},
-                     {JobPresets + "/.P/", LinkTo("elsewhere/P")}})
+                     {JobPresets + "/.P/", "{link:elsewhere/P}"}})
             .After({{"elsewhere/P/Presets/presets.xml", Stored(MovedTo)}})
             .LogOfPreset(Updated),
         Scenario("TheFoldersAboveThePresetsMayBeLinks")
             .Before({{JobPresets + "/", Removed},
                      {"elsewhere/ORX/other", ""},
                      {"elsewhere/JPData/.P/Presets/presets.xml", preset},
-                     {"user/ORX/", LinkTo("elsewhere/ORX")},
-                     {"elsewhere/ORX/JPData/", LinkTo("elsewhere/JPData")}})
+                     {"user/ORX/", "{link:elsewhere/ORX}"},
+                     {"elsewhere/ORX/JPData/", "{link:elsewhere/JPData}"}})
             .After({{"elsewhere/JPData/.P/Presets/presets.xml", Stored(MovedTo)}})
             .LogOfPreset(Updated),
         Scenario("ALinkedErrorFileCountsByItsName")
-            .Before({{"elsewhere/other", ""}, {"hot/A/[P]/Error.er", LinkTo("elsewhere/missing")}})
+            .Before({{"elsewhere/other", ""}, {"hot/A/[P]/Error.er", "{link:elsewhere/missing}"}})
             .FolderCfg(cfg, Written(MovedTo))
             .LogOfA(Found(MovedFrom), "", "hf_error_active")
             .NotUnderWine(WineFollowsLinks),
     };
-    // In that place: a link to a file, a dangling link, and a pipe.
-    const auto add =
-        [&](const Scenario& scenario, const Text& place, const Text& target, const Text& text)
+    // In that place: a link to a file with this text, a dangling link, and a pipe.
+    const auto add = [&](const Scenario& scenario, const Text& place, const Text& text)
     {
-        const std::pair<Text, Text> kinds[] = {{"IsALink", LinkTo(target)},
-                                               {"IsADanglingLink", LinkTo("elsewhere/missing")},
+        const std::pair<Text, Text> kinds[] = {{"IsALink", "{link:elsewhere/file}"},
+                                               {"IsADanglingLink", "{link:elsewhere/missing}"},
                                                {"IsAPipe", "{fifo}"}};
         for (const auto& [name, planted] : kinds)
         {
             scenarios.push_back(scenario);
             scenarios.back().name += name;
             scenarios.back()
-                .Before({{target, text}, {place, planted}})
+                .Before({{"elsewhere/file", text}, {place, planted}})
                 .NotUnderWine("Wine shows none of these links as a link, and Windows has no pipes");
         }
     };
-    add(WithIcon("AFolderCfg").After({{Ini, ini}, {Ini + "#", "RS"}}), CfgPlace,
-        "elsewhere/Folder.cfg", cfg);
-    add(Scenario("AnIcon").LogOfDisabledA(NoCfg()), Icon, "elsewhere/icon.ico", "old");
-    add(WithIcon("DesktopIni").Log(CopiedToA(iniStays)), Ini, "elsewhere/Desktop.ini",
-        "[.ShellClassInfo]\r\n");
+    add(WithIcon("AFolderCfg").After({{Ini, ini}, {Ini + "#", "RS"}}), CfgPlace, cfg);
+    add(Scenario("AnIcon").LogOfDisabledA(NoCfg()), Icon, "old");
+    add(WithIcon("DesktopIni").Log(CopiedToA(iniStays)), Ini, "[.ShellClassInfo]\r\n");
     scenarios.back().Log(CopiedToA());
-    add(Scenario("APreset").LogOfPreset(CannotOpenPreset), PresetDir + "/presets.xml",
-        "elsewhere/presets.xml", preset);
-    add(Scenario("TheLog").FolderCfg(cfg, Written(MovedTo)), LogPlace, "elsewhere/log", "-");
+    add(Scenario("APreset").LogOfPreset(CannotOpenPreset), PresetDir + "/presets.xml", preset);
+    add(Scenario("TheLog").FolderCfg(cfg, Written(MovedTo)), LogPlace, "-");
     scenarios.push_back(Scenario("TheListIsAPipe")
                             .Before({{ListPlace, "{fifo}"}, {"hot/A/", ""}})
                             .Log("")
