@@ -95,8 +95,7 @@ Scenario Encodings()
                 {"Windows1252", moves(declared("='windows-1252'", "\x80\xE4"), "€ä")},
                 {"Utf8OfAnotherName", stays(declared("='UTF8'", "\xC3\xA4"))},
                 {"Windows1253", stays(declared("='windows-1253'", "\xE1\xD2"))},
-                {"ShiftJis", stays(declared("='Shift_JIS'", "\x93\xFA\x96\x7B"))},
-                {"Spaces", stays(declared(" = 'Shift_JIS'", "\x93\xFA"))},
+                {"ShiftJisAfterSpaces", stays(declared(" = 'Shift_JIS'", "\x93\xFA"))},
                 {"Unknown", stays(declared("='x-own'", "x"))},
                 {"UnknownAfterAByteOrderMark", stays("\xEF\xBB\xBF" + declared("='x-own'", "n"))}})
         .Before({{MachineHive, MachineValue("\"InstallPath\"=\"{HOT}\"")},

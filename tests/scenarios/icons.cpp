@@ -93,14 +93,12 @@ std::vector<Scenario> DesktopInis()
                 IniHeader + IconFile("hf_folder") + "IconIndex=00\r\nInfoTip=old\r\n",
                 IniHeader + disabled + "IconIndex=00\r\n" + InfoTip)
             .Before({{Ini + "#", "RS"}, {"hot/A#", "R"}}),
-        refresh("AUsersDesktopIniKeepsEverythingElse", users, usersAfter)
-            .Before({{"hot/A#", "RS"}}),
-        refresh("HiddenStaysOnTheFolderAlone", users, usersAfter)
+        refresh("AUsersDesktopIniKeepsEverythingElseButIsNotHidden", users, usersAfter)
             .Before({{Ini + "#", "HRS"}, {"hot/A#", "HR"}})
             .After({{"hot/A#", "HS"}}),
         refresh("AMissingSectionIsAddedAfterTheLastLine", "[x]\r\na=b",
                 "[x]\r\na=b\r\n" + IniHeader + InfoTip + disabled)
-            .Before({{Ini + "#", "R"}}),
+            .Before({{Ini + "#", "R"}, {"hot/A#", "RS"}}),
         refresh("AUtf16DesktopIniStaysUtf16",
                 "{utf16}" + IniHeader + "IconFile=ü.ico\r\nInfoTip=old\r\n",
                 "{utf16}" + IniHeader + disabled + InfoTip)
