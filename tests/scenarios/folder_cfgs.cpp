@@ -1,36 +1,11 @@
 // Folder.cfg: what is read, what moves, and the form in which it is written again.
 #include "tests/scenarios/texts.h"
 
-#include <algorithm>
 #include <iterator>
 #include <sstream>
 
 namespace
 {
-
-Text Filter(const Text& content)
-{
-    return "<FilterSetting>" + content + "</FilterSetting>";
-}
-
-// A chain of nested elements.
-Text Chain(int levels)
-{
-    return Times(levels, "<e>") + Times(levels, "</e>");
-}
-
-// The same as the library writes it.
-Text Nested(int levels)
-{
-    Text text;
-    for (int i = 1; i < 2 * levels; ++i)
-    {
-        const int level = std::min(i, 2 * levels - i);
-        text += "\n" + Text(static_cast<size_t>(2 * level + 2), ' ');
-        text += i < levels ? "<e>" : i > levels ? "</e>" : "<e/>";
-    }
-    return text + "\n  ";
-}
 
 // Hot folders that each lack one attribute of the root, and one that has all.
 Scenario Gaps()
@@ -106,42 +81,34 @@ std::vector<Scenario> FolderCfgs()
 {
     const Text found = Found(MovedFrom);
     const Text written = MinimalWritten(MovedTo);
-    const Text mixed =
-        Filter("t\n    <x>u\n      <y/>v</x>\n    <![CDATA[<w>]]>z\n    <!--c-->\n  ");
+    const Text mixed = "<FilterSetting>t\n    <x>u\n      <y/>v</x>\n    <![CDATA[<w>]]>z\n    "
+                       "<!--c-->\n  </FilterSetting>";
     const auto path = [](const Text& stored, const Text& becomes = "")
     {
         return HotFolder{Minimal(stored), becomes.empty() ? "" : MinimalWritten(becomes),
                          Found(stored)};
     };
-    const auto filter = [&](const Text& before, const Text& after)
-    {
-        return HotFolder{Written(MovedFrom, Filter(before)), Written(MovedTo, after), found,
-                         "hf_folder"};
-    };
     return {
         Gaps(),
         Encodings(),
-        HotFolders("AFolderCfgIsRewrittenInTheToolsForm",
-                   {{"Foreign", {Foreign(MovedFrom), Written(MovedTo), found, "hf_folder"}},
-                    {"Incomplete", {Minimal(MovedFrom), written, found}},
-                    {"DocumentType",
-                     {Minimal(MovedFrom, "<!DOCTYPE h [<!ENTITY e 'x'>]>", "&e;"),
-                      MinimalWritten(MovedTo, "x"), found}},
-                    {"ByteOrderMark",
-                     {"\xEF\xBB\xBF" + Minimal(MovedFrom, "<?xml version='1.0' encoding='utf-8'?>"),
-                      written, found}},
-                    {"Utf16", {"{utf16}" + Minimal(MovedFrom), written, found}},
-                    {"MixedContentIsIndented",
-                     filter("\n \nt<x>u<y/>v</x><![CDATA[<w>]]>z<!--c-->", mixed)},
-                    {"IndentedOnceOnly",
-                     {Written(MovedFrom, mixed), Written(MovedTo, mixed), found, "hf_folder"}},
-                    {"AFilterOf1000Levels", filter(Chain(1000), Filter(Nested(1000)))},
-                    {"AFilterThatWouldBeTooBigToRead",
-                     {Written(MovedFrom, Filter(Chain(1025))), "",
-                      found + Untouched("the new content would be too large"), "hf_folder"}},
-                    {"AFilterThatIsTooDeep",
-                     {Written(MovedFrom, Filter(Chain(2048))), "",
-                      Untouched("too large to read safely")}}}),
+        HotFolders(
+            "AFolderCfgIsRewrittenInTheToolsForm",
+            {{"Foreign", {Foreign(MovedFrom), Written(MovedTo), found, "hf_folder"}},
+             {"Incomplete", {Minimal(MovedFrom), written, found}},
+             {"DocumentType",
+              {Minimal(MovedFrom, "<!DOCTYPE h [<!ENTITY e 'x'>]>", "&e;"),
+               MinimalWritten(MovedTo, "x"), found}},
+             {"ByteOrderMark",
+              {"\xEF\xBB\xBF" + Minimal(MovedFrom, "<?xml version='1.0' encoding='utf-8'?>"),
+               written, found}},
+             {"Utf16", {"{utf16}" + Minimal(MovedFrom), written, found}},
+             {"MixedContentIsIndented",
+              {Written(
+                   MovedFrom,
+                   "<FilterSetting>\n \nt<x>u<y/>v</x><![CDATA[<w>]]>z<!--c--></FilterSetting>"),
+               Written(MovedTo, mixed), found, "hf_folder"}},
+             {"IndentedOnceOnly",
+              {Written(MovedFrom, mixed), Written(MovedTo, mixed), found, "hf_folder"}}}),
         HotFolders("OnlyATemplateInTheFolderBeingLeftMoves",
                    {{"ATemplateInASubfolder", path("{previous}{/}Sub{/}x")},
                     {"ATemplateElsewhere", path("{previous}2{/}x")},

@@ -146,9 +146,8 @@ std::vector<Scenario> ShellCalls()
         told("ANewDesktopIniIsAnnounced", "6.0", notices,
              IniHeader + iconFile + "IconIndex=00\r\n" + InfoTip)
             .Before({{Ini, Removed}}),
-        told("AnExistingDesktopIniIsForced", "4.72", force + notices,
-             IniHeader + InfoTip + iconFile),
-        told("OnlyTheLowerHalfOfAVersionCounts", "65540.72", force + notices,
+        // Only the lower half of the version counts.
+        told("AnExistingDesktopIniIsForced", "65540.72", force + notices,
              IniHeader + InfoTip + iconFile),
         told("AnOldShellIsNotTold", "4.71", "", ""),
         told("AnUnknownShellIsNotTold", "unknown", "", ""),

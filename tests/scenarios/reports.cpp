@@ -242,7 +242,10 @@ std::vector<Scenario> Contents()
 {
     const Text hidden = Replaced(Written(MovedTo), " description=\"\"", "");
     const Text utf16 = Replaced(Replaced(Written(MovedFrom), "UTF-8", "UTF-16"), "𝄞", "");
-    const Text crLf = IsWindowsProgram() ? ", and its line ends become CR LF" : "";
+    const Text lineEnds = IsWindowsProgram()
+                              ? ", and its line ends become CR LF\n  change   "
+                                "K{/}Presets{/}presets.xml: its line ends become CR LF"
+                              : "";
     return {
         Done("Losses")
             .FolderCfg(Rich())
@@ -274,7 +277,7 @@ std::vector<Scenario> Contents()
 {hot}{/}C
   problem  Folder.cfg: Enable="true" comes out as "0"
 {moves})"),
-        Done("FolderCfgs")
+        Done("FolderCfgsAndPresets")
             .Before(DoneFolder('B', Removed, Disabled))
             .Before(DoneFolder('C', "<a><b></a>", Disabled))
             .Before(DoneFolder('G', "{utf16}" + utf16))
@@ -285,7 +288,17 @@ std::vector<Scenario> Contents()
                      {"hot/A#", "H"},
                      {Cfg('D') + "/", ""},
                      {"hot/E/[P]/", "{link:elsewhere/d}"},
-                     {"elsewhere/d/Folder.cfg", Written(MovedFrom)}})
+                     {"elsewhere/d/Folder.cfg", Written(MovedFrom)},
+                     {PresetOf('B') + "/", ""},
+                     {JobPresets + "/C/Presets/", "{link:elsewhere/d}"},
+                     {PresetOf('D'), Text("\xFF\xFE\0", 3)},
+                     {PresetOf('E'), "<p>\xC3\xA4 \xE4</p>"},
+                     {PresetOf('F'), "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?><p>\xE4</p>"},
+                     {PresetOf('G'), Stored(MovedFrom)},
+                     {PresetOf('H'), "\xEF\xBB\xBF<p/>"},
+                     {PresetOf('I'), "{utf16}<p>ä</p>"},
+                     {PresetOf('J'), "\xEF\xBB\xBF<p>\n</p>"},
+                     {PresetOf('K'), "<p>\n</p>"}})
             .IsReported(R"(
 {hot}{/}A
   change   Desktop.ini: InfoTip, IconFile
@@ -305,21 +318,7 @@ std::vector<Scenario> Contents()
 {moves}
   note     Folder.cfg: comes out as UTF-8
 {hot}{/}H
-  problem  Folder.cfg: lacks "description", so the enabled folder shows as disabled)"),
-        Done("Presets")
-            .Before({{PresetOf('B') + "/", ""},
-                     {JobPresets + "/C/Presets/", "{link:elsewhere/d}"},
-                     {"elsewhere/d/", ""},
-                     {PresetOf('D'), Text("\xFF\xFE\0", 3)},
-                     {PresetOf('E'), "<p>\xC3\xA4 \xE4</p>"},
-                     {PresetOf('F'), "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?><p>\xE4</p>"},
-                     {PresetOf('G'), Stored(MovedFrom)},
-                     {PresetOf('H'), "\xEF\xBB\xBF<p/>"},
-                     {PresetOf('I'), "{utf16}<p>ä</p>"},
-                     {PresetOf('J'), "\xEF\xBB\xBF<p>\n</p>"},
-                     {PresetOf('K'), "<p>\n</p>"}})
-            .IsReported(
-                R"(
+  problem  Folder.cfg: lacks "description", so the enabled folder shows as disabled
 Job presets
   change   E{/}Presets{/}presets.xml: comes out as UTF-8
   change   F{/}Presets{/}presets.xml: comes out as UTF-8
@@ -327,16 +326,13 @@ Job presets
   change   H{/}Presets{/}presets.xml: loses its byte-order mark
   change   I{/}Presets{/}presets.xml: comes out as UTF-8, without byte-order mark
   change   J{/}Presets{/}presets.xml: loses its byte-order mark)" +
-                crLf +
-                (crLf.empty()
-                     ? ""
-                     : "\n  change   K{/}Presets{/}presets.xml: its line ends become CR LF") +
-                R"(
+                        lineEnds +
+                        R"(
   problem  B{/}Presets{/}presets.xml: reached over a link, or not a file
   problem  C{/}Presets{/}presets.xml: reached over a link, or not a file
   problem  D{/}Presets{/}presets.xml: left as it is (cannot be decoded)
   problem  E{/}Presets{/}presets.xml: is not UTF-8, so the whole file is read as Latin-1; )"
-                R"(accented characters come out wrong
+                        R"(accented characters come out wrong
   problem  F{/}Presets{/}presets.xml: declares the encoding ISO-8859-1, but comes out as UTF-8)"),
         Done("Links")
             .Before(DoneFolder('B'))

@@ -59,8 +59,8 @@ std::vector<Scenario> Sizes()
     const Text listedA = "<HotFolder path='{hot}{/}A'/>";
     const Text lines = Times(3000, "123456789\n");
     const Text oneMillion = Times(1000001, "x");
-    const Text entries = Times(10000, "    <KEYVALUE Key=\"K#\" Value=\"1\" KeyDisplayValue=\"\" "
-                                      "LocDisplayValue=\"\"/>\n");
+    const Text entries = Times(10000, "    <KEYVALUE Key=\"K#\" Value=\"" + Text(90, 'v') +
+                                          "\" KeyDisplayValue=\"\" LocDisplayValue=\"\"/>\n");
     const Text filter = "<FilterSetting>\n" + Times(10000, "    <x/>\n") + "  </FilterSetting>\n";
     const Text written =
         Replaced(Replaced(MinimalWritten(MovedTo), "<JobSetting/>\n",
