@@ -1,6 +1,8 @@
 // The icon of a hot folder: which one, Desktop.ini, and the attributes.
 #include "tests/scenarios/texts.h"
 
+#include <array>
+
 namespace
 {
 
@@ -17,26 +19,22 @@ Text Cfg(const Text& enabled)
 // A hot folder for each state, with the name of its icon.
 Scenario States(const Text& name, const Text& letter)
 {
-    struct State
-    {
-        Text enabled;
-        Text error; // a directory of the file's name does not count
-    };
+    // Its icon, Enable, and a place; a directory of the file's name does not count.
+    using State = std::array<Text, 3>;
     const bool isUpgrade = letter == "I";
     Scenario scenario(name);
     Text log;
     int position = 0;
-    for (const auto& [icon, state] :
-         std::map<Text, State>{{"hf_error_active", {"1", "Error.er"}},
-                               {"hf_error_inactive", {"", "Error.er"}},
-                               {"hf_folder", {"1", "Error.er/"}},
-                               {"hf_folder_disabled", {"01", "Error.er/"}}})
+    for (const auto& [icon, enabled, error] : {State{"hf_error_active", "1", "Error.er"},
+                                               {"hf_error_inactive", "", "Error.er"},
+                                               {"hf_folder", "1", "Error.er/"},
+                                               {"hf_folder_disabled", "01", "Error.er/"}})
     {
         const Text folder = "hot/" + icon;
         const Text copy = folder + "/[P]/" + icon + ".ico";
         scenario
-            .Before({{folder + "/[P]/Folder.cfg", Cfg(state.enabled)},
-                     {folder + "/[P]/" + state.error, ""},
+            .Before({{folder + "/[P]/Folder.cfg", Cfg(enabled)},
+                     {folder + "/[P]/" + error, ""},
                      {folder + "/[P]/other.ico", "stays"},
                      {folder + "/Error.er", ""},
                      {copy, "old"},
