@@ -186,8 +186,10 @@ Job presets
             .FolderCfg(Written("{default}{/}none"))
             .Before(DoneFolder('B', Written("{previous}{/}Sub{/}T")))
             .Before(DoneFolder('C', Written("{hot}{/}C{/}D{/}T")))
-            .Before({{"hot/C/D/", "{link:elsewhere/d}"}, {"elsewhere/d/T", ""}})
-            .Preset(Stored("{hot}{/}..{/}Vorige 版{/}T") +
+            .Before({{"hot/C/D/", "{link:elsewhere/d}"},
+                     {"default/D/", "{link:elsewhere/d}"},
+                     {"elsewhere/d/T", ""}})
+            .Preset(Stored("{default}{/}D{/}T") + Stored("{hot}{/}..{/}Vorige 版{/}T") +
                     Stored("{hot}{/}..{/}Vorige &#x7248;{/}&amp;") +
                     Stored("{default}{/}&lt;&#65;&none;") + "ORXImposeTemplate\">\"{previous}")
             .IsReported(R"(
@@ -199,6 +201,7 @@ Job presets
   note     not looked at: {hot}{/}C{/}D{/}T
 Job presets
   note     .P{/}Presets{/}presets.xml: a template path has no end
+  note     .P{/}Presets{/}presets.xml: not looked at: {default}{/}D{/}T
   problem  .P{/}Presets{/}presets.xml: no template at {default}{/}<A&none;
   problem  .P{/}Presets{/}presets.xml: stays in the folder being left (other separators): )"
                         R"({hot}{/}..{/}Vorige 版{/}T

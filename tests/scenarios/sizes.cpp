@@ -84,6 +84,7 @@ std::vector<Scenario> Sizes()
                     {"Many defaults", TooLarge(Cfg("<a/>", declared))},
                     {"Entities", TooLarge(Cfg(Times(300, "<a/>"), million))},
                     {"Quotes", Outgrown("<a b='" + Times(350000, "\"") + "'/>")},
+                    {"Filter levels", Outgrown(Times(1025, "<e>") + Times(1025, "</e>"))},
                     {"Indentation",
                      Outgrown(Times(1020, "<e>") + Times(2000, "<a/>") + Times(1020, "</e>"))},
                     {"Z last", Moving(Cfg(""))}}),
