@@ -3,37 +3,14 @@
 #include "fuzz/fuzzing.h"
 #include "migrate/template_move.h"
 #include "store/folder_cfg_writer.h"
-
-#include <filesystem>
-#include <fstream>
-#include <iterator>
-
-namespace
-{
-
-namespace fs = std::filesystem;
-
-fs::path MakeHotFolder()
-{
-    std::string pattern = (fs::temp_directory_path() / "hot_folder_XXXXXX").string();
-    const fs::path folder = mkdtemp(pattern.data());
-    fs::create_directory(folder / fs::path(PrivateDirName));
-    return folder;
-}
-
-std::string Read(const fs::path& file)
-{
-    std::ifstream stream(file, std::ios::binary);
-    return {std::istreambuf_iterator<char>(stream), {}};
-}
-
-} // namespace
+#include "tests/text_files.h"
 
 void Try(const std::string& input)
 {
-    static const fs::path path = MakeHotFolder();
-    const fs::path cfg = path / fs::path(PrivateDirName) / fs::path(FolderCfgName);
-    std::ofstream(cfg, std::ios::binary) << input;
+    static std::string pattern = std::filesystem::temp_directory_path() / "hot_folder_XXXXXX";
+    static const std::filesystem::path path = mkdtemp(pattern.data());
+    const std::filesystem::path cfg = path / PrivateDirName / FolderCfgName;
+    WriteFile(cfg, input);
     TemplateFolders folders(true, "/old", "/new/template");
     HotFolder folder(path.string());
     folder.LoadCfg();
@@ -41,7 +18,7 @@ void Try(const std::string& input)
     if (move.outcome != TemplateMove::Outcome::Moves)
         return;
     Check(SaveHotFolderSettings(folder, move.newContent) == XmlFile::Saved::Done, "it is written");
-    Check(Read(cfg) == move.newContent, "the new content is in the file");
+    Check(ReadFile(cfg) == move.newContent, "the new content is in the file");
     Check(folder.LoadCfg() == XmlFile::State::Loaded, "what is written can be read");
     const TemplateMove next = DecideTemplateMove(folder.cfg, folders);
     Check(next.storedPath == move.newPath, "the new path is stored");

@@ -9,8 +9,6 @@
 namespace
 {
 
-const Text LogDir = "user/ORX_Installers";
-
 // What happens at each call in turn: see failing_calls.cpp.
 struct Fault
 {
@@ -26,20 +24,17 @@ struct Fault
 Files FilesBefore()
 {
     const Text lost = "<HotFolder lost=\"" + Text(2000, 'x') + "\"";
-    Files files =
-        Scenario("")
-            .FolderCfg(Written(MovedFrom))
-            .Before({{"hot/A/[P]/hf_folder.ico", "old"},
-                     {"hot/B/[P]/hf_error_inactive.ico", "old"},
-                     {"hot/B/[P]/Error.er", ""},
-                     {"hot/B/[P]/Folder.cfg", Replaced(Minimal(MovedFrom), "<HotFolder", lost)},
-                     {"hot/B/Desktop.ini", "[.ShellClassInfo]\nIconFile=mine.ico\n[ViewState]\n"},
-                     {"hot/B/Desktop.ini#", "RS"},
-                     {"user/ORX/JPData/P/Presets/presets.xml", Stored(MovedFrom)},
-                     {"user/ORX/JPData/Q/Presets/presets.xml",
-                      "\xEF\xBB\xBF" + Stored(MovedFrom) + Text(4000, 'x')},
-                     {LogPlace, "an earlier run's\r\n"}})
-            .before;
+    Files files = {{CfgPlace, Written(MovedFrom)},
+                   {"hot/A/[P]/hf_folder.ico", "old"},
+                   {"hot/B/[P]/hf_error_inactive.ico", "old"},
+                   {"hot/B/[P]/Error.er", ""},
+                   {"hot/B/[P]/Folder.cfg", Replaced(Minimal(MovedFrom), "<HotFolder", lost)},
+                   {"hot/B/Desktop.ini", "[.ShellClassInfo]\nIconFile=mine.ico\n[ViewState]\n"},
+                   {"hot/B/Desktop.ini#", "RS"},
+                   {"user/ORX/JPData/P/Presets/presets.xml", Stored(MovedFrom)},
+                   {"user/ORX/JPData/Q/Presets/presets.xml",
+                    "\xEF\xBB\xBF" + Stored(MovedFrom) + Text(4000, 'x')},
+                   {LogPlace, "an earlier run's\r\n"}};
     for (const auto& [place, text] : Files(files))
         files["elsewhere/" + place] = text;
     files["elsewhere/hot/B/Desktop.ini#"] = "";
@@ -50,7 +45,7 @@ Files FilesBefore()
 // The hot folder or job preset directory to which the place belongs; else the place itself.
 Text Part(const Text& place)
 {
-    for (const Text top : {"hot/", "user/ORX/JPData/"})
+    for (const Text& top : {Text("hot/"), JobPresets + "/"})
     {
         if (StartsWith(place, top))
             return place.substr(0, place.find_first_of("/#", top.size()));
@@ -63,7 +58,7 @@ class Faults : public testing::TestWithParam<Fault>
   protected:
     void SetUp() override
     {
-        Run(0, "f", {});
+        Run(0, {});
         m_after = m_workstation.Snapshot();
         m_workstation.LayOut(m_files);
         m_before = m_workstation.Snapshot();
@@ -75,7 +70,7 @@ class Faults : public testing::TestWithParam<Fault>
     }
 
     // Runs the tool; returns the place that the call concerned, empty if there was no such call.
-    Text Run(int number, const Text& events, const Fault& fault, const Text& root = "")
+    Text Run(int number, const Fault& fault, const Text& root = "")
     {
         m_workstation.LayOut(m_files);
         const Text report = Path("elsewhere") + " report";
@@ -87,7 +82,7 @@ class Faults : public testing::TestWithParam<Fault>
                                {"ASAN_OPTIONS", "verify_asan_link_order=0:detect_leaks=0"},
                                {"FAULT_ROOT", root},
                                {"FAULT_NUMBER", std::to_string(number)},
-                               {"FAULT_EVENTS", events},
+                               {"FAULT_EVENTS", fault.events},
                                {"FAULT_ERROR", std::to_string(fault.error)},
                                {"FAULT_CALLS", fault.calls},
                                {"FAULT_VICTIM", Path(fault.victim)},
@@ -103,29 +98,20 @@ class Faults : public testing::TestWithParam<Fault>
         return hit;
     }
 
-    // The places that should be as after a run without a fault, but are not.
+    // The parts that should be as after a run without a fault, but are not.
     std::set<Text> Wrong(const Text& hit, const Files& now) const
     {
         std::set<Text> parts;
-        std::set<Text> halfDone; // neither as before nor as after the run
-        const auto changed = Differences(m_before, now);
         for (const auto& [place, texts] : Differences(m_after, now))
-        {
-            if (place != LogPlace)
-                parts.insert(Part(place));
-            if (place != LogPlace && changed.count(place) > 0 && place.find(".ico") == Text::npos)
-                halfDone.insert(place);
-        }
-        if (Part(hit) != hit || parts.count(hit) > 0 || StartsWith(hit, LogDir))
-        {
-            parts.erase(Part(hit));
-            return parts;
-        }
-        // A call for several parts: one hot folder or all presets, without the list everything, may
-        // be skipped; at a source icon, its copy may differ.
-        const bool mayBeSeveral = StartsWith(hit, "machine/hotfolder") ||
-                                  (!parts.empty() && StartsWith(*parts.begin(), "user/ORX/JPData"));
-        return parts.size() > 1 && !mayBeSeveral ? parts : halfDone;
+            parts.insert(Part(place));
+        parts.erase(LogPlace);
+        const bool isForSeveral = parts.erase(Part(hit)) == 0 && Part(hit) == hit;
+        // One hot folder or all presets, without the list everything, may then be skipped.
+        if (isForSeveral && !StartsWith(hit, LogFolder) &&
+            (parts.size() <= 1 || StartsWith(hit, "machine/hotfolder") ||
+             StartsWith(*parts.begin(), JobPresets)))
+            return {};
+        return parts;
     }
 
     // Each stored file is the old or the new one, and the log has whole lines. At the end of a
@@ -183,12 +169,12 @@ std::vector<Fault> AllFaults()
 TEST_P(Faults, AreSurvived)
 {
     const Fault& fault = GetParam();
-    const Text part = StartsWith(fault.victim, LogDir) ? LogDir : Part(fault.victim);
+    const Text part = StartsWith(fault.victim, LogFolder) ? LogFolder : Part(fault.victim);
     const Text root = part.empty() ? Path("tool").substr(0, Path("tool").rfind('/')) : Path(part);
     int number = 0;
     for (Text hit = "first"; !hit.empty() && !HasFailure();)
     {
-        hit = Run(++number, fault.events, fault, root);
+        hit = Run(++number, fault, root);
         SCOPED_TRACE(fault.victim + " call number " + std::to_string(number) + ", " + hit);
         EXPECT_EQ(fault.events == "e" && !hit.empty() ? 137 : 255, m_status);
         const Files now = m_workstation.Snapshot();

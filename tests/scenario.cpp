@@ -62,15 +62,10 @@ Scenario& Scenario::IsReported(const Text& lines)
 {
     isOnlyChecked = true;
     report = lines;
-    Text more;
-    for (char folder = 'F'; folder <= 'W'; ++folder)
-        more += Text("\n  note     listed hot folder does not exist: {hot}{/}") + folder;
     for (const auto& [token, text] : Files{
              {"{moves}",
               "  change   Folder.cfg: {previous}{/}Booklet.tpl -> {default}{/}Booklet.tpl"},
-             {"{noicon}", "  note     no copy of the icon to replace: hf_folder.ico"},
              {"{nodisabled}", "  note     no copy of the icon to replace: hf_folder_disabled.ico"},
-             {"\n{more}", more},
              {"{key}", "there is no such key"},
              {"{nothing}", ", for the account ACCOUNT; nothing moves. Run as the client's user, "
                            "after its installation"},

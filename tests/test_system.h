@@ -61,7 +61,7 @@ void RemoveTree(const std::filesystem::path& path);
 /// Makes everything in the folders another user's. Not on Windows.
 void GiveAway(const std::vector<std::filesystem::path>& folders);
 /// X: it cannot be written to; 0: a directory, not on Windows also a file, cannot be accessed; L: a
-/// directory cannot be listed, not on Windows.
+/// directory cannot be listed. Under Wine, X and 0 are what the owner's permissions refuse.
 void Refuse(const std::filesystem::path& path, char letter);
 /// As of a program that has a file open and lets nobody else open it, until the result is
 /// destroyed; only on Windows.

@@ -1,62 +1,21 @@
 // Folder.cfg: what is read, what moves, and the form in which it is written again.
 #include "tests/scenarios/texts.h"
 
+#include <iterator>
+#include <sstream>
+
 namespace
 {
-
-Text Filter(const Text& content)
-{
-    return "<FilterSetting>" + content + "</FilterSetting>";
-}
-
-// A chain of nested elements, as the library writes it; levels are counted from 1.
-Text Nested(int levels)
-{
-    const auto indentation = [](int level)
-    {
-        return "\n" + Text(static_cast<size_t>(2 * level + 2), ' ');
-    };
-    Text text;
-    for (int level = 1; level < levels; ++level)
-        text += indentation(level) + "<e>";
-    text += indentation(levels) + "<e/>";
-    for (int level = levels - 1; level > 0; --level)
-        text += indentation(level) + "</e>";
-    return text + "\n  ";
-}
-
-// The same on one line.
-Text Chain(int levels)
-{
-    Text text;
-    for (int level = 0; level < 2 * levels; ++level)
-        text += level < levels ? "<e>" : "</e>";
-    return text;
-}
 
 // Hot folders that each lack one attribute of the root, and one that has all.
 Scenario Gaps()
 {
-    const std::vector<Text> chain = {"description",
-                                     "server_ip",
-                                     "server_name",
-                                     "Enable",
-                                     "BaseVirtualPrinter",
-                                     "BaseVirtualPrinterName",
-                                     "BaseVirtualPrinterDisplayName",
-                                     "HFPresetName",
-                                     "Centralized",
-                                     "Isjobpresetattached",
-                                     "IsCustomInterval",
-                                     "TimeInterval",
-                                     "PPDVersion",
-                                     "ServerTypeAndJPDefaultKeyInfo",
-                                     "server_textversion",
-                                     "server_type",
-                                     "Quickset",
-                                     "Quickset_Supported",
-                                     "Quickset_Enabled",
-                                     "IsWidthBased"};
+    std::istringstream words(
+        "description server_ip server_name Enable BaseVirtualPrinter BaseVirtualPrinterName "
+        "BaseVirtualPrinterDisplayName HFPresetName Centralized Isjobpresetattached "
+        "IsCustomInterval TimeInterval PPDVersion ServerTypeAndJPDefaultKeyInfo "
+        "server_textversion server_type Quickset Quickset_Supported Quickset_Enabled IsWidthBased");
+    const std::vector<Text> chain(std::istream_iterator<Text>(words), {});
     // server_version is read after 14 of them, and is no gap itself.
     const std::vector<std::pair<Text, Text>> numbers = {{"2147483647", "2147483647"},
                                                         {"-2147483648", "-2147483648"},
@@ -65,8 +24,7 @@ Scenario Gaps()
                                                         {" 01", "1"},
                                                         {"", "0"},
                                                         {"9x", "9"}};
-    Scenario scenario("AttributesAfterAGapComeOutAsDefaults");
-    Text log;
+    std::map<Text, HotFolder> folders;
     for (size_t gap = 0; gap <= chain.size(); ++gap)
     {
         const auto& [number, read] = numbers[gap < 14 ? 0 : gap - 14];
@@ -80,71 +38,94 @@ Scenario Gaps()
                 written = Replaced(written, " " + chain[i] + "=" + unset,
                                    i < gap ? value : " " + chain[i] + "=" + unset);
         }
-        const Text name = "gap " + std::to_string(10 + gap);
-        scenario
-            .Before({{"hot/" + name + "/[P]/Folder.cfg",
-                      Replaced(Minimal(MovedFrom), "<HotFolder", attributes)}})
-            .After({{"hot/" + name + "/[P]/Folder.cfg",
-                     Replaced(written, "\"-1\"", "\"" + (gap < 14 ? "-1" : read) + "\"")}});
-        log += FolderLines(name, static_cast<int>(gap) + 1,
-                           NoIcon(gap > 3 ? "hf_folder" : "hf_folder_disabled"),
-                           Found(MovedFrom, name));
+        folders["gap " + std::to_string(10 + gap)] = {
+            Replaced(Minimal(MovedFrom), "<HotFolder", attributes),
+            Replaced(written, "\"-1\"", "\"" + (gap < 14 ? "-1" : read) + "\""), Found(MovedFrom),
+            gap > 3 ? "hf_folder" : "hf_folder_disabled"};
     }
-    return scenario.Log(log);
+    return HotFolders("AttributesAfterAGapComeOutAsDefaults", folders);
+}
+
+// The paths are ASCII, because nothing else can be compared in these encodings.
+Scenario Encodings()
+{
+    const auto declared = [](const Text& encoding, const Text& name)
+    {
+        return Minimal("{hot}{/}x", "<?xml version='1.0' encoding" + encoding + "?>", name);
+    };
+    const auto moves = [](const Text& cfg, const Text& name)
+    {
+        return HotFolder{cfg, MinimalWritten("{hot}{/}template{/}x", name), Found("{hot}{/}x")};
+    };
+    const auto stays = [](const Text& cfg)
+    {
+        return HotFolder{cfg, "", Found("{hot}{/}x") + Untouched("unknown encoding")};
+    };
+    return HotFolders(
+               "EncodingsThatTheLibraryReadsWronglyStay",
+               {{"Ascii", moves(declared("='ASCII'", "x"), "x")},
+                {"AsciiInUtf8OfAnotherName", moves(declared("='UTF8'", "x"), "x")},
+                {"AsciiInLatin1", moves(declared("='latin1'", "x"), "x")},
+                {"AsciiInShiftJis", moves(declared("='Shift_JIS'", "x"), "x")},
+                {"Windows1252", moves(declared("='windows-1252'", "\x80\xE4"), "€ä")},
+                {"Utf8OfAnotherName", stays(declared("='UTF8'", "\xC3\xA4"))},
+                {"Windows1253", stays(declared("='windows-1253'", "\xE1\xD2"))},
+                {"ShiftJisAfterSpaces", stays(declared(" = 'Shift_JIS'", "\x93\xFA"))},
+                {"Unknown", stays(declared("='x-own'", "x"))},
+                {"UnknownAfterAByteOrderMark", stays("\xEF\xBB\xBF" + declared("='x-own'", "n"))}})
+        .Before({{MachineHive, MachineValue("\"InstallPath\"=\"{HOT}\"")},
+                 {UserHive, UserValue("\"Path\"=\"{HOT}\"")}});
 }
 
 std::vector<Scenario> FolderCfgs()
 {
     const Text found = Found(MovedFrom);
     const Text written = MinimalWritten(MovedTo);
-    const Text mixed =
-        Filter("t\n    <x>u\n      <y/>v</x>\n    <![CDATA[<w>]]>z\n    <!--c-->\n  ");
-    const auto elsewhere = [](const Text& name, const Text& path)
+    const Text mixed = "<FilterSetting>t\n    <x>u\n      <y/>v</x>\n    <![CDATA[<w>]]>z\n    "
+                       "<!--c-->\n  </FilterSetting>";
+    const auto path = [](const Text& stored, const Text& becomes = "")
     {
-        return Scenario(name).FolderCfg(Written(path)).LogOfA(Found(path));
-    };
-    const Text onServer = "{/}{/}host{/}share{/}old{/}x";
-    const auto onShare = [&](const Text& name, const Text& share)
-    {
-        return Scenario(name)
-            .Before({{UserHive, UserValue("\"Path\"=\"{/2}{/2}host{/2}" + share + "{/2}old\"")}})
-            .LogOfA(Found(onServer));
-    };
-    const auto nested = [&](const Text& name, int levels)
-    {
-        return Scenario(name).FolderCfg(Written(MovedFrom, Filter(Chain(levels))));
+        return HotFolder{Minimal(stored), becomes.empty() ? "" : MinimalWritten(becomes),
+                         Found(stored)};
     };
     return {
         Gaps(),
-        Scenario("AForeignFolderCfgIsRewrittenInTheToolsForm")
-            .FolderCfg(Foreign(MovedFrom), Written(MovedTo))
-            .LogOfA(found),
-        Scenario("AnIncompleteChainIsRewrittenWithDefaults")
-            .FolderCfg(Minimal(MovedFrom), written)
-            .LogOfDisabledA(found),
-        Scenario("ADocumentTypeIsNotCarriedOver")
-            .FolderCfg(Minimal(MovedFrom, "<!DOCTYPE h [<!ENTITY e 'x'>]>", "&e;"),
-                       MinimalWritten(MovedTo, "x"))
-            .LogOfDisabledA(found),
-        Scenario("FolderCfgLosesItsByteOrderMark")
-            .FolderCfg("\xEF\xBB\xBF" +
-                           Minimal(MovedFrom, "<?xml version='1.0' encoding='utf-8'?>"),
-                       written)
-            .LogOfDisabledA(found),
-        Scenario("AUtf16FolderCfgComesOutInUtf8")
-            .FolderCfg("{utf16}" + Minimal(MovedFrom), written)
-            .LogOfDisabledA(found),
-        elsewhere("ATemplateInASubfolderStays", "{previous}{/}Sub{/}x"),
-        elsewhere("ATemplateElsewhereStays", "{previous}2{/}x"),
-        elsewhere("ATemplateOnAServerStays", "\\\\host\\share\\x\\B"),
-        elsewhere("ATemplateOnAServerStaysWithSlashes", "//host/share/B"),
-        onShare("ATemplateOnTheShareBeingLeftMoves", "share")
-            .FolderCfg(Written(onServer), Written("{default}{/}x")),
-        onShare("ATemplateOnAnotherShareStays", "other").FolderCfg(Written(onServer)),
-        Scenario("ATemplateInARelativeFolderMoves")
-            .Before({{UserHive, UserValue("\"Path\"=\"x{/2}y\"")}})
-            .FolderCfg(Written("x{/}y{/}B"), Written("{default}{/}B"))
-            .LogOfA(Found("x{/}y{/}B")),
+        Encodings(),
+        HotFolders(
+            "AFolderCfgIsRewrittenInTheToolsForm",
+            {{"Foreign", {Foreign(MovedFrom), Written(MovedTo), found, "hf_folder"}},
+             {"Incomplete", {Minimal(MovedFrom), written, found}},
+             {"DocumentType",
+              {Minimal(MovedFrom, "<!DOCTYPE h [<!ENTITY e 'x'>]>", "&e;"),
+               MinimalWritten(MovedTo, "x"), found}},
+             {"ByteOrderMark",
+              {"\xEF\xBB\xBF" + Minimal(MovedFrom, "<?xml version='1.0' encoding='utf-8'?>"),
+               written, found}},
+             {"Utf16", {"{utf16}" + Minimal(MovedFrom), written, found}},
+             {"MixedContentIsIndented",
+              {Written(
+                   MovedFrom,
+                   "<FilterSetting>\n \nt<x>u<y/>v</x><![CDATA[<w>]]>z<!--c--></FilterSetting>"),
+               Written(MovedTo, mixed), found, "hf_folder"}},
+             {"IndentedOnceOnly",
+              {Written(MovedFrom, mixed), Written(MovedTo, mixed), found, "hf_folder"}}}),
+        HotFolders("OnlyATemplateInTheFolderBeingLeftMoves",
+                   {{"ATemplateInASubfolder", path("{previous}{/}Sub{/}x")},
+                    {"ATemplateElsewhere", path("{previous}2{/}x")},
+                    {"ATemplateOnAServerStays", path("\\\\host\\share\\x\\B")},
+                    {"ATemplateOnAServerStaysWithSlashes", path("//host/share/B")},
+                    {"Dots", path("{app}{/}.{/}..{/}Vorige 版{/}x", "{default}{/}x")},
+                    {"WithoutImposeSettingNothingIsLogged", {"<HotFolder/>", "", ""}},
+                    {"WithoutTheTemplateKey",
+                     {"<H><ImposeSetting><K k='orximposetemplate' v='" + MovedFrom +
+                          "'/></ImposeSetting></H>",
+                      "", Found("")}}}),
+        HotFolders("ATemplateOnTheShareBeingLeftMoves",
+                   {{"ThisShare", path("{/}{/}host{/}share{/}old{/}x", "{default}{/}x")},
+                    {"ATemplateOnAnotherShareStays", path("{/}{/}host{/}other{/}old{/}x")}})
+            .Before({{UserHive, UserValue("\"Path\"=\"{/2}{/2}host{/2}share{/2}old\"")}}),
+        HotFolders("ATemplateInARelativeFolderMoves", {{"A", path("x{/}y{/}B", "{default}{/}B")}})
+            .Before({{UserHive, UserValue("\"Path\"=\"x{/2}y\"")}}),
         Scenario("HiddenAndSystemFilesAreWrittenAndKeepTheirAttributes")
             .Before({{CfgPlace + "#", "HS"}, {PresetPlace + "#", "HS"}})
             .FolderCfg(Written(MovedFrom), Written(MovedTo))
@@ -155,74 +136,9 @@ std::vector<Scenario> FolderCfgs()
             .FolderCfg(Foreign(MovedFrom).substr(0, 700))
             .LogOfDisabledA("")
             .LibraryReports(),
-        Scenario("WithoutImposeSettingNothingIsLogged")
-            .FolderCfg("<HotFolder/>")
-            .LogOfDisabledA(""),
-        Scenario("WithoutTheTemplateKeyNothingMoves")
-            .FolderCfg("<H><ImposeSetting><K k='orximposetemplate' v='" + MovedFrom +
-                       "'/></ImposeSetting></H>")
-            .LogOfDisabledA(Found("")),
-        Scenario("MixedContentIsIndented")
-            .FolderCfg(Written(MovedFrom, Filter("\n \nt<x>u<y/>v</x><![CDATA[<w>]]>z<!--c-->")),
-                       Written(MovedTo, mixed))
-            .LogOfA(found),
-        Scenario("MixedContentIsIndentedOnceOnly")
-            .FolderCfg(Written(MovedFrom, mixed), Written(MovedTo, mixed))
-            .LogOfA(found),
-        nested("AFilterOf1000LevelsIsSaved", 1000)
-            .After({{CfgPlace, Written(MovedTo, Filter(Nested(1000)))}})
-            .LogOfA(found),
-        nested("AFilterThatWouldBeTooBigToReadStays", 1025)
-            .LogOfA(found + Untouched("the new content would be too large")),
-        nested("AFilterThatIsTooDeepIsNotRead", 2048)
-            .LogOfDisabledA(Untouched("too large to read safely")),
-        Scenario("ADotInTheStoredPathDoesNotMatter")
-            .FolderCfg(Written("{app}{/}.{/}template{/}x"), Written("{previous}{/}x"))
-            .Run({"U"})
-            .LogOfA(Found("{app}{/}.{/}template{/}x")),
-        Scenario("AMissingFolderCfgIsLogged").Before({{"hot/A/[P]/", ""}}).LogOfDisabledA(NoCfg()),
-    };
-}
-
-// The paths are ASCII, because nothing else can be compared in these encodings.
-std::vector<Scenario> Encodings()
-{
-    const auto declared = [](const Text& name, const Text& encoding, const Text& folder)
-    {
-        return Scenario(name)
-            .Before({{MachineHive, MachineValue("\"InstallPath\"=\"{HOT}\"")},
-                     {UserHive, UserValue("\"Path\"=\"{HOT}\"")}})
-            .FolderCfg(
-                Minimal("{hot}{/}x", "<?xml version='1.0' encoding" + encoding + "?>", folder))
-            .LogOfDisabledA(Found("{hot}{/}x") + Untouched("unknown encoding"));
-    };
-    const auto ascii = [&](const Text& name, const Text& encoding)
-    {
-        return declared(name, "='" + encoding + "'", "x")
-            .After({{CfgPlace, MinimalWritten("{hot}{/}template{/}x", "x")}})
-            .LogOfDisabledA(Found("{hot}{/}x"));
-    };
-    return {
-        ascii("AsciiInUtf8OfAnotherNameIsRead", "UTF8"),
-        ascii("AsciiInLatin1IsRead", "latin1"),
-        ascii("AsciiIsRead", "ASCII"),
-        ascii("AsciiInWindows1252IsRead", "windows-1252"),
-        ascii("AsciiInShiftJisIsRead", "Shift_JIS"),
-        declared("Utf8OfAnotherNameStays", "='UTF8'", "\xC3\xA4"),
-        declared("AWindows1252FolderCfgComesOutInUtf8", "='windows-1252'", "\x80\xE4")
-            .After({{CfgPlace, MinimalWritten("{hot}{/}template{/}x", "€ä")}})
-            .LogOfDisabledA(Found("{hot}{/}x")),
-        declared("AFolderCfgInWindows1253Stays", "='windows-1253'", "\xE1\xD2"),
-        declared("AFolderCfgInShiftJisStays", "='Shift_JIS'", "\x93\xFA\x96\x7B"),
-        declared("ShiftJisStaysWithSpacesInItsDeclaration", " = 'Shift_JIS'", "\x93\xFA"),
-        declared("AFolderCfgInAnUnknownEncodingStays", "='x-own'", "x"),
-        declared("AnUnknownEncodingIsSeenAfterAByteOrderMark", "", "")
-            .FolderCfg("\xEF\xBB\xBF" +
-                       Minimal("{hot}{/}x", "<?xml version='1.0' encoding='x-own'?>")),
     };
 }
 
 TEST_SCENARIOS(FolderCfgs);
-TEST_SCENARIOS(Encodings);
 
 } // namespace

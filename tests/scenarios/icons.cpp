@@ -1,73 +1,67 @@
 // The icon of a hot folder: which one, Desktop.ini, and the attributes.
 #include "tests/scenarios/texts.h"
 
+#include <array>
+
 namespace
 {
 
 const Text Ini = "hot/A/Desktop.ini";
-const Text Header = "[.ShellClassInfo]\r\n";
+const Text Icon = "hot/A/[P]/hf_folder_disabled.ico";
 const char* const WineLosesSystem =
     "Wine loses SYSTEM on a read-only file of a user who is not root";
-const Text InfoTip = "InfoTip=This folder has been configured as an ORX hot folder.\r\n";
-
-Text Icon(const Text& name)
-{
-    return "hot/A/[P]/" + name + ".ico";
-}
-
-Text IconFile(const Text& name)
-{
-    return "IconFile=.\\[_ORX_HotFolder_]\\" + name + ".ico\r\n";
-}
 
 Text Cfg(const Text& enabled)
 {
     return "<H name='' description='' server_ip='' server_name='' Enable='" + enabled + "'/>";
 }
 
+// A hot folder for each state, with the name of its icon.
+Scenario States(const Text& name, const Text& letter)
+{
+    // Its icon, Enable, and a place; a directory of the file's name does not count.
+    using State = std::array<Text, 3>;
+    const bool isUpgrade = letter == "I";
+    Scenario scenario(name);
+    Text log;
+    int position = 0;
+    for (const auto& [icon, enabled, error] : {State{"hf_error_active", "1", "Error.er"},
+                                               {"hf_error_inactive", "", "Error.er"},
+                                               {"hf_folder", "1", "Error.er/"},
+                                               {"hf_folder_disabled", "01", "Error.er/"}})
+    {
+        const Text folder = "hot/" + icon;
+        const Text copy = folder + "/[P]/" + icon + ".ico";
+        scenario
+            .Before({{folder + "/[P]/Folder.cfg", Cfg(enabled)},
+                     {folder + "/[P]/" + error, ""},
+                     {folder + "/[P]/other.ico", "stays"},
+                     {folder + "/Error.er", ""},
+                     {copy, "old"},
+                     {"tool/" + icon + ".ico#", "R"},
+                     {"tool/BundleIcons/" + icon + ".ico", "of the previous version"}})
+            .After({{folder + "#", "S"},
+                    {folder + "/Desktop.ini#", "RS"},
+                    {folder + "/Desktop.ini",
+                     IniHeader + IconFile(icon) + "IconIndex=00\r\n" + InfoTip},
+                    {copy, isUpgrade ? "{icon:" + icon + ".ico}" : "of the previous version"},
+                    {copy + "#", Removed}});
+        log += FolderLines(icon, ++position, Copied(icon, icon), "");
+    }
+    return scenario.Run({letter}).Log(log);
+}
+
 std::vector<Scenario> Icons()
 {
-    struct Row
-    {
-        Text name;
-        Text icon;
-        Text enabled;
-        Text error; // a place; a directory of the file's name does not count
+    return {
+        States("AnUpgradeShowsEachState", "I"),
+        States("ADowngradeShowsEachState", "U"),
+        Scenario("WithoutItsIconAFolderStays")
+            .Before(
+                {{Icon, "old"}, {"tool/BundleIcons/hf_folder_disabled.ico", ""}, {Ini, "; mine\n"}})
+            .FolderCfg(Cfg("1"))
+            .LogOfA(""),
     };
-    std::vector<Scenario> scenarios = {Scenario("WithoutItsIconAFolderStays")
-                                           .Before({{Icon("hf_folder_disabled"), "old"},
-                                                    {"tool/BundleIcons/hf_folder_disabled.ico", ""},
-                                                    {Ini, "; mine\n"}})
-                                           .FolderCfg(Cfg("1"))
-                                           .LogOfA("")};
-    for (const auto& [name, icon, enabled, error] :
-         {Row{"Active", "hf_folder", "1", "hot/A/[P]/Error.er/"},
-          {"Disabled", "hf_folder_disabled", "01", "hot/A/[P]/Error.er/"},
-          {"ErrorActive", "hf_error_active", "1", "hot/A/[P]/Error.er"},
-          {"ErrorInactive", "hf_error_inactive", "", "hot/A/[P]/Error.er"}})
-    {
-        const Scenario shown =
-            Scenario("AnUpgradeShows" + name)
-                .FolderCfg(Cfg(enabled))
-                .Before({{Icon(icon), "old"},
-                         {Icon("other"), "stays"},
-                         {"hot/A/Error.er", ""},
-                         {error, ""},
-                         {"tool/" + icon + ".ico#", "R"},
-                         {"tool/BundleIcons/" + icon + ".ico", "of the previous version"}})
-                .After({{"hot/A#", "S"},
-                        {Ini + "#", "RS"},
-                        {Icon(icon), "{icon:" + icon + ".ico}"},
-                        {Icon(icon) + "#", "R"},
-                        {Ini, Header + IconFile(icon) + "IconIndex=00\r\n" + InfoTip}})
-                .Log(FolderLines("A", 1, Copied(icon), ""));
-        scenarios.push_back(shown);
-        scenarios.push_back(shown);
-        scenarios.back().name = "ADowngradeShows" + name;
-        scenarios.back().Run({"U"}).After(
-            {{Icon(icon), "of the previous version"}, {Icon(icon) + "#", Removed}});
-    }
-    return scenarios;
 }
 
 // A folder that already has a user's Desktop.ini.
@@ -85,54 +79,45 @@ std::vector<Scenario> DesktopInis()
     const auto refresh = [](const Text& name, const Text& before, const Text& after)
     {
         return Scenario(name)
-            .Before({{Icon("hf_folder_disabled"), "old"}, {Ini, before}})
+            .Before({{Icon, "old"}, {Ini, before}})
             .After({{"hot/A#", "S"},
                     {Ini + "#", "RS"},
                     {Ini, after},
-                    {Icon("hf_folder_disabled"), "{icon:hf_folder_disabled.ico}"}})
-            .Log(FolderLines("A", 1, Copied("hf_folder_disabled"), NoCfg()));
+                    {Icon, "{icon:hf_folder_disabled.ico}"}})
+            .Log(CopiedToA());
     };
     return {
         refresh("OurDesktopIniIsRefreshed",
-                Header + IconFile("hf_folder") + "IconIndex=00\r\nInfoTip=old\r\n",
-                Header + disabled + "IconIndex=00\r\n" + InfoTip)
+                IniHeader + IconFile("hf_folder") + "IconIndex=00\r\nInfoTip=old\r\n",
+                IniHeader + disabled + "IconIndex=00\r\n" + InfoTip)
             .Before({{Ini + "#", "RS"}, {"hot/A#", "R"}}),
-        refresh("AUsersDesktopIniKeepsEverythingElse", users, usersAfter)
-            .Before({{"hot/A#", "RS"}}),
-        refresh("HiddenStaysOnTheFolderAlone", users, usersAfter)
+        refresh("AUsersDesktopIniKeepsEverythingElseButIsNotHidden", users, usersAfter)
             .Before({{Ini + "#", "HRS"}, {"hot/A#", "HR"}})
             .After({{"hot/A#", "HS"}}),
-        refresh("AReadOnlyDesktopIniIsWritten", users, usersAfter).Before({{Ini + "#", "R"}}),
-        refresh("ASystemDesktopIniIsWritten", users, usersAfter).Before({{Ini + "#", "S"}}),
         refresh("AMissingSectionIsAddedAfterTheLastLine", "[x]\r\na=b",
-                "[x]\r\na=b\r\n" + Header + InfoTip + disabled),
+                "[x]\r\na=b\r\n" + IniHeader + InfoTip + disabled)
+            .Before({{Ini + "#", "R"}, {"hot/A#", "RS"}}),
         refresh("AUtf16DesktopIniStaysUtf16",
-                "{utf16}" + Header + "IconFile=ü.ico\r\nInfoTip=old\r\n",
-                "{utf16}" + Header + disabled + InfoTip)
+                "{utf16}" + IniHeader + "IconFile=ü.ico\r\nInfoTip=old\r\n",
+                "{utf16}" + IniHeader + disabled + InfoTip)
+            .Before({{Ini + "#", "S"}}),
+        refresh("AnEmptyDesktopIniIsFilled", "", IniHeader + InfoTip + disabled)
             .Before({{Ini + "#", "RS"}}),
-        refresh("AnEmptyDesktopIniIsFilled", "", Header + InfoTip + disabled)
-            .Before({{Ini + "#", "RS"}}),
-        refresh("AReadOnlyDesktopIniOfTheUsersIsWritten", "", Header + InfoTip + disabled)
-            .Before({{Ini + "#", "RS"}})
+        refresh("AReadOnlyDesktopIniAndIconOfTheUsersAreWritten", "",
+                IniHeader + InfoTip + disabled)
+            .Before({{Ini + "#", "RS"}, {Icon + "#", "R"}})
+            .After({{Icon + "#", Removed}})
             .AsOtherUser()
-            .NotUnderWine(WineLosesSystem),
+            .NotOnWindows("a copy onto a read-only file is refused"),
         refresh("ADesktopIniOfAnotherUserStays", "[x]\r\n", "[x]\r\n")
             .Before({{Ini + "#", "X"}})
             .After({{Ini + "#", Removed}})
             .AsOtherUser()
             .NotUnderWine(WineLosesSystem),
-        refresh("AReadOnlyIconIsReplaced", Header + InfoTip + disabled, Header + InfoTip + disabled)
-            .Before({{Icon("hf_folder_disabled") + "#", "R"}})
-            .After({{Icon("hf_folder_disabled") + "#", Removed}})
-            .AsOtherUser()
-            .NotOnWindows("a copy onto a read-only file is refused"),
         Scenario("AFolderOfAnotherUserStays")
-            .Before({{Icon("hf_folder_disabled"), "old"},
-                     {Icon("hf_folder_disabled") + "#", "X"},
-                     {"hot/A#", "X"},
-                     {"hot/A/[P]#", "X"}})
+            .Before({{Icon, "old"}, {Icon + "#", "X"}, {"hot/A#", "X"}, {"hot/A/[P]#", "X"}})
             .AsOtherUser()
-            .Log(FolderLines("A", 1, Copied("hf_folder_disabled"), NoCfg()))
+            .Log(CopiedToA())
             .LibraryReports(),
     };
 }
@@ -150,18 +135,18 @@ std::vector<Scenario> ShellCalls()
     const auto told = [&](const Text& name, const Text& shell, const Text& calls, const Text& ini)
     {
         return Scenario(name)
-            .Before({{Icon("hf_folder_disabled"), "{icon:hf_folder_disabled.ico}"}, {Ini, ""}})
+            .Before({{Icon, "{icon:hf_folder_disabled.ico}"}, {Ini, ""}})
             .After({{Ini + "#", "RS"}, {"hot/A#", ini.empty() ? Removed : "S"}, {Ini, ini}})
-            .Log(FolderLines("A", 1, Copied("hf_folder_disabled"), NoCfg()))
+            .Log(CopiedToA())
             .Shell(shell, version + calls);
     };
     return {
         told("ANewDesktopIniIsAnnounced", "6.0", notices,
-             Header + iconFile + "IconIndex=00\r\n" + InfoTip)
+             IniHeader + iconFile + "IconIndex=00\r\n" + InfoTip)
             .Before({{Ini, Removed}}),
-        told("AnExistingDesktopIniIsForced", "4.72", force + notices, Header + InfoTip + iconFile),
-        told("OnlyTheLowerHalfOfAVersionCounts", "65540.72", force + notices,
-             Header + InfoTip + iconFile),
+        // Only the lower half of the version counts.
+        told("AnExistingDesktopIniIsForced", "65540.72", force + notices,
+             IniHeader + InfoTip + iconFile),
         told("AnOldShellIsNotTold", "4.71", "", ""),
         told("AnUnknownShellIsNotTold", "unknown", "", ""),
     };

@@ -7,16 +7,10 @@ namespace
 const char* const NoPipes = "Windows has no pipes among files";
 const char* const WineFollowsLinks = "Wine shows neither links to files nor dangling ones as links";
 
-const Text LogDir = "user/ORX_Installers";
-const Text PresetDir = "user/ORX/JPData/.P/Presets";
+const Text PresetDir = JobPresets + "/.P/Presets";
 const Text Icon = "hot/A/[P]/hf_folder_disabled.ico";
 const Text Ini = "hot/A/Desktop.ini";
 const Text CannotOpenPreset = "Unable to open preset.xml for read : ";
-
-Text LinkTo(const Text& place)
-{
-    return "{link:" + place + "}";
-}
 
 // What a run without a Folder.cfg does to A, whose icon exists.
 Scenario WithIcon(const Text& name)
@@ -24,82 +18,75 @@ Scenario WithIcon(const Text& name)
     return Scenario(name)
         .Before({{Icon, "old"}})
         .After({{Icon, "{icon:hf_folder_disabled.ico}"}, {"hot/A#", "S"}})
-        .Log(FolderLines("A", 1, Copied("hf_folder_disabled"), NoCfg()));
+        .Log(CopiedToA());
 }
 
 std::vector<Scenario> PlantedLinks()
 {
     const Text cfg = Written(MovedFrom);
     const Text preset = Stored(MovedFrom);
-    const Text ini = "[.ShellClassInfo]\r\nIconFile=.\\[_ORX_HotFolder_]\\hf_folder_disabled."
-                     "ico\r\nIconIndex=00\r\n"
-                     "InfoTip=This folder has been configured as an ORX hot folder.\r\n";
+    const Text ini = IniHeader + IconFile("hf_folder_disabled") + "IconIndex=00\r\n" + InfoTip;
     const Text iniStays =
         "Desktop.ini left as it is (reached over a link): {hot}{/}A{/}Desktop.ini\n";
     std::vector<Scenario> scenarios = {
         Scenario("ALinkedPrivateDirectoryIsIgnored")
             .Before({{"elsewhere/P/Folder.cfg", cfg},
                      {"elsewhere/P/hf_folder_disabled.ico", "old"},
-                     {"hot/A/[P]/", LinkTo("elsewhere/P")}})
+                     {"hot/A/[P]/", "{link:elsewhere/P}"}})
             .LogOfDisabledA(NoCfg()),
         Scenario("ALinkedPresetDirectoryIsNotOpened")
-            .Before({{"elsewhere/P/presets.xml", preset}, {PresetDir + "/", LinkTo("elsewhere/P")}})
+            .Before({{"elsewhere/P/presets.xml", preset}, {PresetDir + "/", "{link:elsewhere/P}"}})
             .LogOfPreset(CannotOpenPreset),
         Scenario("ALinkedLogFolderGetsNoLog")
             .Before({{LogPlace, Removed},
                      {"elsewhere/L/UpgradeDowngrade.log", "-"},
-                     {LogDir + "/", LinkTo("elsewhere/L")}})
+                     {LogFolder + "/", "{link:elsewhere/L}"}})
             .FolderCfg(cfg, Written(MovedTo)),
         Scenario("AHotFolderMayBeReachedOverALink")
-            .Before({{"elsewhere/A/[P]/Folder.cfg", cfg}, {"hot/A/", LinkTo("elsewhere/A")}})
+            .Before({{"elsewhere/A/[P]/Folder.cfg", cfg}, {"hot/A/", "{link:elsewhere/A}"}})
             .After({{"elsewhere/A/[P]/Folder.cfg", Written(MovedTo)}})
             .LogOfA(Found(MovedFrom)),
         Scenario("AJobPresetDirectoryMayBeALink")
             .Before({{"elsewhere/P/Presets/presets.xml", preset},
-                     {"user/ORX/JPData/.P/", LinkTo("elsewhere/P")}})
+                     {JobPresets + "/.P/", "{link:elsewhere/P}"}})
             .After({{"elsewhere/P/Presets/presets.xml", Stored(MovedTo)}})
             .LogOfPreset(Updated),
         Scenario("TheFoldersAboveThePresetsMayBeLinks")
-            .Before({{"user/ORX/JPData/", Removed},
+            .Before({{JobPresets + "/", Removed},
                      {"elsewhere/ORX/other", ""},
                      {"elsewhere/JPData/.P/Presets/presets.xml", preset},
-                     {"user/ORX/", LinkTo("elsewhere/ORX")},
-                     {"elsewhere/ORX/JPData/", LinkTo("elsewhere/JPData")}})
+                     {"user/ORX/", "{link:elsewhere/ORX}"},
+                     {"elsewhere/ORX/JPData/", "{link:elsewhere/JPData}"}})
             .After({{"elsewhere/JPData/.P/Presets/presets.xml", Stored(MovedTo)}})
             .LogOfPreset(Updated),
         Scenario("ALinkedErrorFileCountsByItsName")
-            .Before({{"elsewhere/other", ""}, {"hot/A/[P]/Error.er", LinkTo("elsewhere/missing")}})
+            .Before({{"elsewhere/other", ""}, {"hot/A/[P]/Error.er", "{link:elsewhere/missing}"}})
             .FolderCfg(cfg, Written(MovedTo))
             .LogOfA(Found(MovedFrom), "", "hf_error_active")
             .NotUnderWine(WineFollowsLinks),
     };
-    // In that place: a link to a file, a dangling link, and a pipe.
-    const auto add =
-        [&](const Scenario& scenario, const Text& place, const Text& target, const Text& text)
+    // In that place: a link to a file with this text, a dangling link, and a pipe.
+    const auto add = [&](const Scenario& scenario, const Text& place, const Text& text)
     {
-        const std::pair<Text, Text> kinds[] = {{"IsALink", LinkTo(target)},
-                                               {"IsADanglingLink", LinkTo("elsewhere/missing")},
+        const std::pair<Text, Text> kinds[] = {{"IsALink", "{link:elsewhere/file}"},
+                                               {"IsADanglingLink", "{link:elsewhere/missing}"},
                                                {"IsAPipe", "{fifo}"}};
         for (const auto& [name, planted] : kinds)
         {
             scenarios.push_back(scenario);
             scenarios.back().name += name;
             scenarios.back()
-                .Before({{target, text}, {place, planted}})
+                .Before({{"elsewhere/file", text}, {place, planted}})
                 .NotOnWindows(planted == "{fifo}" ? NoPipes : "")
                 .NotUnderWine(WineFollowsLinks);
         }
     };
-    add(WithIcon("AFolderCfg").After({{Ini, ini}, {Ini + "#", "RS"}}), CfgPlace,
-        "elsewhere/Folder.cfg", cfg);
-    add(Scenario("AnIcon").LogOfDisabledA(NoCfg()), Icon, "elsewhere/icon.ico", "old");
-    add(WithIcon("DesktopIni")
-            .Log(FolderLines("A", 1, iniStays + Copied("hf_folder_disabled"), NoCfg())),
-        Ini, "elsewhere/Desktop.ini", "[.ShellClassInfo]\r\n");
-    scenarios.back().Log(FolderLines("A", 1, Copied("hf_folder_disabled"), NoCfg()));
-    add(Scenario("APreset").LogOfPreset(CannotOpenPreset), PresetDir + "/presets.xml",
-        "elsewhere/presets.xml", preset);
-    add(Scenario("TheLog").FolderCfg(cfg, Written(MovedTo)), LogPlace, "elsewhere/log", "-");
+    add(WithIcon("AFolderCfg").After({{Ini, ini}, {Ini + "#", "RS"}}), CfgPlace, cfg);
+    add(Scenario("AnIcon").LogOfDisabledA(NoCfg()), Icon, "old");
+    add(WithIcon("DesktopIni").Log(CopiedToA(iniStays)), Ini, "[.ShellClassInfo]\r\n");
+    scenarios.back().Log(CopiedToA());
+    add(Scenario("APreset").LogOfPreset(CannotOpenPreset), PresetDir + "/presets.xml", preset);
+    add(Scenario("TheLog").FolderCfg(cfg, Written(MovedTo)), LogPlace, "-");
     scenarios.push_back(Scenario("TheListIsAPipe")
                             .Before({{ListPlace, "{fifo}"}, {"hot/A/", ""}})
                             .Log("")

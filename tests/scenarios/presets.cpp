@@ -26,7 +26,6 @@ std::vector<Scenario> Presets()
                     Stored("{previous}") + near,
                 "\r\n" + to + near + "\r\n" + Stored("{default}{/}Sub{/}x") + Stored("{default}") +
                     near),
-        updated("APresetWithoutAPathIsStillUpdated", near, near),
         updated("AnEmptyPresetIsUpdated", "", ""),
         updated("AByteOrderMarkAloneGoes", "\xEF\xBB\xBF", ""),
         updated("AByteOrderMarkGoes", "\xEF\xBB\xBF" + from, to),
@@ -35,7 +34,6 @@ std::vector<Scenario> Presets()
         updated("NulAndCtrlZEndNothing", Text("a\0b\x1A\r\n", 6) + from + "end",
                 Text("a\0b\x1A\r\n", 6) + to + "end"),
         updated("BytesThatAreNotUtf8AreTakenAsLatin1", "\xE4\r\n", "ä\r\n"),
-        updated("PresetsMoveBack", to, from).Run({"U"}),
         left("HalfAUtf16UnitStays", Text("\xFF\xFE") + Text("a\0b", 3), "cannot be decoded"),
         left("ALoneSurrogateStays", Text("\xFF\xFE\0\0\0\xD8\0\0a\0\0\0", 12),
              "cannot be encoded again"),

@@ -7,8 +7,7 @@
 namespace
 {
 
-const Text Jobs = "user/ORX/JPData";
-const Text LogFolder = "user/ORX_Installers";
+const Text Disabled = "hf_folder_disabled";
 const char* const NoLinks = "Wine does not show links to files as links";
 const char* const NoRefusal = "Wine lets every user open or list a directory";
 
@@ -22,18 +21,15 @@ Text PresetOf(char name)
     return Replaced(PresetPlace, ".P", Text(1, name));
 }
 
-// A hot folder in which a run changes nothing.
-Files DoneFolder(char name)
+// A hot folder in which a run changes nothing but its template.
+Files DoneFolder(char name, const Text& cfg = Written(MovedTo), const Text& icon = "hf_folder")
 {
     const Text folder = Text("hot/") + name;
-    return {
-        {folder + "#", "S"},
-        {folder + "/Desktop.ini#", "RS"},
-        {folder + "/Desktop.ini",
-         "[.ShellClassInfo]\r\nInfoTip=This folder has been configured as an ORX hot folder.\r\n"
-         "IconFile=.\\[_ORX_HotFolder_]\\hf_folder.ico\r\n"},
-        {folder + "/[P]/hf_folder.ico", "{icon:hf_folder.ico}"},
-        {Cfg(name), Written(MovedTo)}};
+    return {{folder + "#", "S"},
+            {folder + "/Desktop.ini#", "RS"},
+            {folder + "/Desktop.ini", IniHeader + InfoTip + IconFile(icon)},
+            {folder + "/[P]/" + icon + ".ico", "{icon:" + icon + ".ico}"},
+            {Cfg(name), cfg}};
 }
 
 // A run would change nothing here, and there is nothing to report.
@@ -47,17 +43,14 @@ Scenario Done(const Text& name)
 
 std::vector<Scenario> Machines()
 {
+    const Text missing = Times(23, "<HotFolder path='{hot}{/}#'/>");
     const auto listed = [](const Text& name, const Text& folders)
     {
-        Text list = "<HotFolders>";
-        for (const char folder : folders)
-            list += Text("<HotFolder path=\"{hot}{/}") + folder + "\"/>";
-        return Done(name).Before({{ListPlace, list + "</HotFolders>"}});
+        return Done(name).Before({{ListPlace, "<l>" + folders + "</l>"}});
     };
     return {
-        Done("WhatIsDoneIsNotReported").IsReported(""),
         Scenario("AnEmptyMachine")
-            .Before({{ListPlace, Removed}, {LogPlace, Removed}, {Jobs + "/", Removed}})
+            .Before({{ListPlace, Removed}, {LogPlace, Removed}, {JobPresets + "/", Removed}})
             .IsReported(R"(
 Workstation
   note     there is no {list}
@@ -77,31 +70,21 @@ Workstation
 Workstation
   problem  HotFolderList.cfg: is not a file
   problem  there will be no run log: it is reached over a link: {log})"),
-        listed("AListIsEmptyAndJPDataCannotBeListed", "")
-            .Before({{Jobs + "#", "L"}})
-            .AsOtherUser()
-            .NotOnWindows("the scenario has no way to refuse it")
-            .IsReported(R"(
+        listed("AListIsEmpty", "").IsReported(R"(
 Workstation
-  note     HotFolderList.cfg lists no hot folder
-Job presets
-  problem  {user}{/}ORX{/}JPData{/} cannot be listed)"),
-        listed("NoListedFolderIsThere", "BC").IsReported(R"(
+  note     HotFolderList.cfg lists no hot folder)"),
+        listed("NoListedFolderIsThere", "<HotFolder path='{hot}{/}B'/>").IsReported(R"(
 Workstation
   problem  none of the listed hot folders exists (another account? mapped drives?)
-  note     listed hot folder does not exist: {hot}{/}B
-  note     listed hot folder does not exist: {hot}{/}C)"),
-        listed("AListedFolderIsMissingTwiceOrHasTwoNames", "AABCDEFGHIJKLMNOPQRSTUVWXYZ")
-            .Before({{"hot/C/", "{link:hot/A}"}, {"hot/D/", "{link:hot/A}"}})
-            .IsReported(R"(
-Workstation
-  note     listed hot folder does not exist: {hot}{/}B
-  note     listed hot folder does not exist: {hot}{/}E
-{more}
+  note     listed hot folder does not exist: {hot}{/}B)"),
+        listed("ListedFoldersAreMissingOrListedTwiceOrHaveTwoNames",
+               Times(2, "<HotFolder path='{hot}{/}A'/>") + "<HotFolder path='{hot}{/}C'/>" +
+                   missing)
+            .Before({{"hot/C/", "{link:hot/A}"}})
+            .IsReported("\nWorkstation" +
+                        Times(20, "\n  note     listed hot folder does not exist: {hot}{/}#") + R"(
   note     listed hot folder and 4 more
 {hot}{/}C
-  note     the same directory as {hot}{/}A
-{hot}{/}D
   note     the same directory as {hot}{/}A)"),
         Done("TheListCannotBeReadNorTheLogCreated")
             .Before({{ListPlace + "#", "0"},
@@ -115,7 +98,7 @@ Workstation
   problem  can't open file*
   problem  there will be no run log: its folder cannot be written to: {user}{/}ORX_Installers{/})"),
         Done("NoFolderCanBeEntered")
-            .Before({{"machine/hotfolder#", "0"}, {LogFolder + "#", "0"}, {Jobs + "#", "0"}})
+            .Before({{"machine/hotfolder#", "0"}, {LogFolder + "#", "0"}, {JobPresets + "#", "0"}})
             .AsOtherUser()
             .IsReported(R"(
 Workstation
@@ -129,37 +112,28 @@ Job presets
 // The template folders: what is in the registry, and whether the templates are there.
 std::vector<Scenario> Templates()
 {
-    const Text missing = R"(
-{hot}{/}A
-  problem  no template at {previous}{/}Booklet.tpl)";
     const auto with = [](const Text& name, const Files& hives)
     {
-        return Done(name).FolderCfg(Written(MovedFrom)).Before(hives);
+        return Done(name)
+            .Preset(Stored("{hot}{/}A"))
+            .Before({{CfgPlace, Written(MovedFrom)}, {"previous/Booklet.tpl", ""}})
+            .Before(hives);
     };
     const auto withPath = [&](const Text& name, const Text& path)
     {
         return with(name, {{UserHive, UserValue("\"Path\"=\"" + path + "\"")}});
     };
     return {
-        with("PathIsMissing", {{UserHive, UserValue("")}})
-            .Before({{Cfg('B'), Written(MovedFrom)}})
+        with("PathIsMissing", {{UserHive, UserValue("")}}).IsReported(R"(
+{hot}{/}A
+  problem  {Path}: missing{nothing})"),
+        with("OnlyAPresetAsksForPath", {{UserHive, Removed}, {CfgPlace, Written("")}})
             .IsReported(R"(
-{hot}{/}A
-  problem  {Path}: missing{nothing}
-  problem  no template at {previous}{/}Booklet.tpl
-{hot}{/}B
-  problem  no template at {previous}{/}Booklet.tpl
-{noicon})"),
-        with("OnlyAPresetAsksForPath", {{UserHive, Removed}, {CfgPlace, Removed}}).IsReported(R"(
-{hot}{/}A
-  note     no Folder.cfg
-{nodisabled}
 Job presets
   problem  registry value Path in HKEY_CURRENT_USER\SOFTWARE\Wow6432Node\HF or \SOFTWARE\HF: {key}{nothing})"),
         withPath("PathIsTooLong", Text(258, 'x')).IsReported(R"(
 {hot}{/}A
-  problem  {Path}: longer than 257 characters{nothing}
-  problem  no template at {previous}{/}Booklet.tpl)"),
+  problem  {Path}: longer than 257 characters{nothing})"),
         with("InstallPathIsInTheOtherKey",
              {{MachineHive, Replaced(MachineValue(""), "SOFTWARE", "SOFTWARE\\Wow6432Node")}})
             .IsReported(R"(
@@ -167,8 +141,8 @@ Job presets
   problem  registry value InstallPath in HKEY_LOCAL_MACHINE\SOFTWARE\Wow6432Node\Vantorix\QZA: )"
                         R"(missing, and no other key is looked at{nothing}
   problem  stays in the folder being left (the folder being installed is unknown): {previous}{/}Booklet.tpl)"),
-        with("NothingAsksForInstallPath", {{MachineHive, Removed}, {PresetPlace, Removed}})
-            .FolderCfg(Written("{hot}{/}A"))
+        with("NothingAsksForInstallPath",
+             {{MachineHive, Removed}, {PresetPlace, Removed}, {CfgPlace, Written("{hot}{/}A")}})
             .IsReported(R"(
 Job presets
   note     there are no presets in {user}{/}ORX{/}JPData{/})"),
@@ -177,39 +151,30 @@ Workstation
   problem  {Path}: ends in a separator; no template of a hot folder moves
 {hot}{/}A
   problem  stays in the folder being left (the registry value ends in a separator): {previous}{/}Booklet.tpl)"),
-        withPath("PathEndsInASeparatorOnTheWayBack", "{PREVIOUS}{/2}")
-            .FolderCfg(Written("{hot}{/}A"))
-            .Preset("")
-            .Run({"U"})
-            .IsReported(R"(
+        withPath("PathEndsInASeparatorOnTheWayBack", "{PREVIOUS}{/2}").Run({"U"}).IsReported(R"(
 Workstation
   problem  {Path}: ends in a separator; it is doubled in the paths of hot folders)"),
-        withPath("PathIsEmpty", "")
-            .IsReported(R"(
+        withPath("PathIsEmpty", "").IsReported(R"(
 Workstation
-  problem  {Path}: empty; only templates stored without a folder move)" +
-                        missing),
-        withPath("PathIsEmptyOnTheWayBack", "").Preset("").Run({"U"}).IsReported(R"(
+  problem  {Path}: empty; only templates stored without a folder move)"),
+        withPath("PathIsEmptyOnTheWayBack", "").Run({"U"}).IsReported(R"(
 Workstation
-  problem  {Path}: empty; templates move to the root of the drive)" + missing),
-        withPath("PathHoldsAnAmpersand", "{hot}&")
-            .Preset(Stored("{hot}{/}A"))
-            .Run({"U"})
-            .IsReported(missing + R"(
+  problem  {Path}: empty; templates move to the root of the drive)"),
+        withPath("PathHoldsAnAmpersand", "{hot}&").Run({"U"}).IsReported(R"(
 Job presets
   problem  {Path}: holds & or <, which is inserted into presets as it is)"),
         withPath("TheNewFolderIsBelowTheOld", "{APP}")
+            .Preset(Stored(MovedTo))
             .Before({{"default/template/Booklet.tpl", ""}})
-            .IsReported(missing + R"(
+            .IsReported(R"(
 Job presets
   change   .P{/}Presets{/}presets.xml: {default}{/}Booklet.tpl -> {default}{/}template{/}Booklet.tpl
   problem  one template folder is below the other: another run would move paths of presets once more)"),
-        withPath("BothFoldersAreTheSame", "{APP}{/2}template")
-            .FolderCfg(Written(MovedTo))
+        Done("BothFoldersAreTheSame")
+            .Before({{UserHive, UserValue("\"Path\"=\"{APP}{/2}template\"")}})
             .IsReported(""),
         with("InstallPathIsANumber",
              {{MachineHive, MachineValue("\"InstallPath\"=dword:00000001")}})
-            .Preset(Stored("{hot}{/}A"))
             .IsReported(R"(
 {hot}{/}A
   problem  Folder.cfg: left as it is (new path holds a character that XML cannot store)
@@ -219,11 +184,12 @@ Job presets
                         R"(preset moves)"),
         Done("TemplatesAreMissing")
             .FolderCfg(Written("{default}{/}none"))
-            .Before({{Cfg('B'), Written("{previous}{/}Sub{/}T")},
-                     {Cfg('C'), Written("{hot}{/}D{/}T")},
-                     {"hot/D/", "{link:elsewhere/d}"},
+            .Before(DoneFolder('B', Written("{previous}{/}Sub{/}T")))
+            .Before(DoneFolder('C', Written("{hot}{/}C{/}D{/}T")))
+            .Before({{"hot/C/D/", "{link:elsewhere/d}"},
+                     {"default/D/", "{link:elsewhere/d}"},
                      {"elsewhere/d/T", ""}})
-            .Preset(Stored("{hot}{/}..{/}Vorige 版{/}T") +
+            .Preset(Stored("{default}{/}D{/}T") + Stored("{hot}{/}..{/}Vorige 版{/}T") +
                     Stored("{hot}{/}..{/}Vorige &#x7248;{/}&amp;") +
                     Stored("{default}{/}&lt;&#65;&none;") + "ORXImposeTemplate\">\"{previous}")
             .IsReported(R"(
@@ -231,15 +197,11 @@ Job presets
   problem  no template at {default}{/}none
 {hot}{/}B
   problem  stays in the folder being left (in a sub-folder): {previous}{/}Sub{/}T
-{noicon}
 {hot}{/}C
-  note     not looked at: {hot}{/}D{/}T
-{noicon}
-{hot}{/}D
-  note     no Folder.cfg
-{nodisabled}
+  note     not looked at: {hot}{/}C{/}D{/}T
 Job presets
   note     .P{/}Presets{/}presets.xml: a template path has no end
+  note     .P{/}Presets{/}presets.xml: not looked at: {default}{/}D{/}T
   problem  .P{/}Presets{/}presets.xml: no template at {default}{/}<A&none;
   problem  .P{/}Presets{/}presets.xml: stays in the folder being left (other separators): )"
                         R"({hot}{/}..{/}Vorige 版{/}T
@@ -248,7 +210,7 @@ Job presets
         Done("ARehearsal")
             .FolderCfg(Written("{hot}{/}old{/}T"))
             .Preset(Stored("{hot}{/}old{/}T") + Stored("{hot}{/}old{/}T"))
-            .Before({{MachineHive, Removed}, {UserHive, Removed}, {"tool/hf_folder.ico", Removed}})
+            .Before({{MachineHive, Removed}, {UserHive, Removed}})
             .Run({"I", "--from", "{hot}{/}old", "--to", "{hot}{/}new"})
             .IsReported(R"(
 {hot}{/}A
@@ -260,31 +222,39 @@ Templates
     };
 }
 
-// What is lost when a template moves.
-Scenario Losses()
+// A Folder.cfg that loses much when its template moves.
+Text Rich()
 {
     const Text root = "<HotFolder ";
     const Text end = "<PreflightSettings>\n";
     const Text entry = "<KEYVALUE Key=\"B\"";
     Text cfg = Written(MovedFrom);
-    Text alike;
-    for (int i = 0; i < 2000; ++i)
-        alike += "<r kind=\"alike\" number=\"" + std::to_string(i) + "\" empty=\"\"/>";
     for (const auto& [from, to] :
          Files{{" Quickset=\"q\"", ""},
                {"\"-5\"", "\"5b\""},
                {"Centralized=\"1\"", "Centralized=\"1 \""}, // no loss
                {root, "<!DOCTYPE H [<!ENTITY e \"t\">]>\n<?top?>" + root + "mine=\"7\" "},
-               {"<a/>", alike}, // no loss
+               {"<a/>", Times(2000, "<r kind=\"alike\" number=\"#\" empty=\"\"/>")}, // no loss
                {entry, entry + " Mine=\"\" Value=\"1\"/>" + entry},
                {end, "<Mine><b/></Mine><Paths/>Note <?mine?><!-- no loss -->" + end}})
         cfg = Replaced(cfg, from, to);
-    return Done("Losses")
-        .Before({{Cfg('A'), Replaced(cfg, "HotFolder", "Old")},
-                 {Cfg('B'), Replaced(Written(MovedFrom), " TimeInterval=\"010\"", "")},
-                 {Cfg('C'), Replaced(Written(MovedFrom), "Enable=\"1\"", "Enable=\"true\"")}})
-        .IsReported(
-            R"(
+    return Replaced(cfg, "HotFolder", "Old");
+}
+
+std::vector<Scenario> Contents()
+{
+    const Text hidden = Replaced(Written(MovedTo), " description=\"\"", "");
+    const Text utf16 = Replaced(Replaced(Written(MovedFrom), "UTF-8", "UTF-16"), "𝄞", "");
+    const Text lineEnds = IsWindows ? ", and its line ends become CR LF\n  change   "
+                                      "K{/}Presets{/}presets.xml: its line ends become CR LF"
+                                    : "";
+    return {
+        Done("Losses")
+            .FolderCfg(Rich())
+            .Before(DoneFolder('B', Replaced(Written(MovedFrom), " TimeInterval=\"010\"", "")))
+            .Before(DoneFolder('C', Replaced(Written(MovedFrom), "Enable=\"1\"", "Enable=\"true\""),
+                               Disabled))
+            .IsReported(R"(
 {hot}{/}A
   problem  Folder.cfg: loses its document type, and with it the entities in its texts
   problem  Folder.cfg: loses the instruction <?top?>
@@ -294,7 +264,7 @@ Scenario Losses()
   problem  Folder.cfg: loses the attribute mine="7"
   problem  Folder.cfg: loses <KEYVALUE Key="B" Mine="" Value="1"> in <JobSetting>
   problem  Folder.cfg: loses <KEYVALUE Key="B" KeyDisplayValue="two" LocDisplayValue="zwei" )"
-            R"(Value="2"> in <JobSetting>
+                        R"(Value="2"> in <JobSetting>
   problem  Folder.cfg: loses <Mine>
   problem  Folder.cfg: loses <b> in <Mine>
   problem  Folder.cfg: loses <Paths>
@@ -303,39 +273,44 @@ Scenario Losses()
 {moves}
 {hot}{/}B
   problem  Folder.cfg: lacks "TimeInterval", so the rewrite resets: PPDVersion, )"
-            R"(ServerTypeAndJPDefaultKeyInfo, server_version, server_textversion, server_type, Quickset, )"
-            R"(Quickset_Supported, IsWidthBased
+                        R"(ServerTypeAndJPDefaultKeyInfo, server_version, server_textversion, )"
+                        R"(server_type, Quickset, Quickset_Supported, IsWidthBased
 {moves}
-{noicon}
 {hot}{/}C
   problem  Folder.cfg: Enable="true" comes out as "0"
-{moves}
-{nodisabled})");
-}
-
-std::vector<Scenario> Contents()
-{
-    const Text hidden = Replaced(Written(MovedTo), " description=\"\"", "");
-    const Text utf16 = Replaced(Replaced(Written(MovedFrom), "UTF-8", "UTF-16"), "𝄞", "");
-    return {
-        Losses(),
-        Done("FolderCfgs")
-            .Before({{"hot/B/[P]/", ""},
-                     {Cfg('C'), "<a><b></a>"},
+{moves})"),
+        Done("FolderCfgsAndPresets")
+            .Before(DoneFolder('B', Removed, Disabled))
+            .Before(DoneFolder('C', "<a><b></a>", Disabled))
+            .Before(DoneFolder('G', "{utf16}" + utf16))
+            .Before(DoneFolder('H', hidden, Disabled))
+            .Before(DoneFolder('I', Replaced(hidden, "Enable=\"1\"", "Enable=\"0\""), Disabled))
+            .Before({{"hot/A/Desktop.ini", "[.ShellClassInfo]\r\nIconFile=x\r\n"},
+                     {"hot/A/Desktop.ini#", "H"},
+                     {"hot/A#", "H"},
                      {Cfg('D') + "/", ""},
                      {"hot/E/[P]/", "{link:elsewhere/d}"},
                      {"elsewhere/d/Folder.cfg", Written(MovedFrom)},
-                     {Cfg('G'), "{utf16}" + utf16},
-                     {Cfg('H'), hidden},
-                     {Cfg('I'), Replaced(hidden, "Enable=\"1\"", "Enable=\"0\"")}})
+                     {PresetOf('B') + "/", ""},
+                     {JobPresets + "/C/Presets/", "{link:elsewhere/d}"},
+                     {PresetOf('D'), Text("\xFF\xFE\0", 3)},
+                     {PresetOf('E'), "<p>\xC3\xA4 \xE4</p>"},
+                     {PresetOf('F'), "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?><p>\xE4</p>"},
+                     {PresetOf('G'), Stored(MovedFrom)},
+                     {PresetOf('H'), "\xEF\xBB\xBF<p/>"},
+                     {PresetOf('I'), "{utf16}<p>ä</p>"},
+                     {PresetOf('J'), "\xEF\xBB\xBF<p>\n</p>"},
+                     {PresetOf('K'), "<p>\n</p>"}})
             .IsReported(R"(
+{hot}{/}A
+  change   Desktop.ini: InfoTip, IconFile
+  change   Desktop.ini: attributes HIDDEN -> READONLY SYSTEM
+  change   hot folder: attributes HIDDEN -> HIDDEN SYSTEM
 {hot}{/}B
   note     no Folder.cfg
-{nodisabled}
 {hot}{/}C
   problem  Folder.cfg: damaged (line 1: mismatched tag); it stays as it is, and the folder shows )"
                         R"(as disabled
-{nodisabled}
 {hot}{/}D
   problem  Folder.cfg: is not a file
 {nodisabled}
@@ -344,45 +319,23 @@ std::vector<Scenario> Contents()
 {hot}{/}G
 {moves}
   note     Folder.cfg: comes out as UTF-8
-{noicon}
 {hot}{/}H
   problem  Folder.cfg: lacks "description", so the enabled folder shows as disabled
-{nodisabled}
-{hot}{/}I
-{nodisabled})"),
-        Done("Presets")
-            .Before({{PresetOf('B') + "/", ""},
-                     {Jobs + "/C/Presets/", "{link:elsewhere/d}"},
-                     {"elsewhere/d/", ""},
-                     {PresetOf('D'), Text("\xFF\xFE\0", 3)},
-                     {PresetOf('E'), "<p>\xC3\xA4 \xE4</p>"},
-                     {PresetOf('F'), "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?><p>\xE4</p>"},
-                     {PresetOf('G'), Stored(MovedFrom)},
-                     {PresetOf('H'), "\xEF\xBB\xBF<p/>"},
-                     {PresetOf('I'), "{utf16}<p>ä</p>"}})
-            .IsReported(R"(
 Job presets
   change   E{/}Presets{/}presets.xml: comes out as UTF-8
   change   F{/}Presets{/}presets.xml: comes out as UTF-8
   change   G{/}Presets{/}presets.xml: {previous}{/}Booklet.tpl -> {default}{/}Booklet.tpl
   change   H{/}Presets{/}presets.xml: loses its byte-order mark
   change   I{/}Presets{/}presets.xml: comes out as UTF-8, without byte-order mark
+  change   J{/}Presets{/}presets.xml: loses its byte-order mark)" +
+                        lineEnds +
+                        R"(
   problem  B{/}Presets{/}presets.xml: reached over a link, or not a file
   problem  C{/}Presets{/}presets.xml: reached over a link, or not a file
   problem  D{/}Presets{/}presets.xml: left as it is (cannot be decoded)
   problem  E{/}Presets{/}presets.xml: is not UTF-8, so the whole file is read as Latin-1; )"
                         R"(accented characters come out wrong
   problem  F{/}Presets{/}presets.xml: declares the encoding ISO-8859-1, but comes out as UTF-8)"),
-        Done("LineEndsOfPresets")
-            .Preset("<p>\n</p>")
-            .Before({{PresetOf('B'), "\xEF\xBB\xBF<p>\n</p>"}})
-            .IsReported(IsWindows ? R"(
-Job presets
-  change   .P{/}Presets{/}presets.xml: its line ends become CR LF
-  change   B{/}Presets{/}presets.xml: loses its byte-order mark, and its line ends become CR LF)"
-                                  : R"(
-Job presets
-  change   B{/}Presets{/}presets.xml: loses its byte-order mark)"),
         Done("Links")
             .Before(DoneFolder('B'))
             .Before(DoneFolder('C'))
@@ -399,40 +352,32 @@ Job presets
   problem  hf_folder.ico: reached over a link
 {hot}{/}C
   problem  Desktop.ini: left as it is (reached over a link))"),
-        Done("ReadOnlyFiles")
-            .FolderCfg(Written(MovedFrom))
-            .Before(DoneFolder('B'))
-            .Before({{PresetPlace + "#", "R"},
-                     {CfgPlace + "#", "R"},
-                     {Cfg('B') + "#", "R"}, // it stays
-                     {LogPlace + "#", "R"}})
-            .AsOtherUser()
-            .IsReported(R"(
-Workstation
-  problem  there will be no run log: can't open file*
-{hot}{/}A
-  problem  Folder.cfg: cannot be opened for writing (can't open file*
-  problem  stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl
-Job presets
-  problem  .P{/}Presets{/}presets.xml: cannot be opened for writing (can't open file*)"),
         Done("NothingCanBeReadOrReplaced")
             .Before(DoneFolder('B'))
             .Before(DoneFolder('C'))
             .Before(DoneFolder('D'))
-            .Before({{"hot/D/Desktop.ini", "[.ShellClassInfo]"},
+            .Before(DoneFolder('F', Written(MovedFrom)))
+            .Before({{CfgPlace + "#", "0"},
+                     {"hot/B/[P]#", "0"},
+                     {"hot/C#", "0"},
+                     {"hot/D/Desktop.ini", "[.ShellClassInfo]"},
                      {"hot/D/Desktop.ini#", "X"},
+                     {Cfg('D') + "#", "R"}, // it stays
                      {"hot/E/[P]/hf_folder_disabled.ico", "old"},
                      {"hot/E/[P]/hf_folder_disabled.ico#", "R"},
                      {"hot/E/[P]#", "X"},
-                     {CfgPlace + "#", "0"},
-                     {"hot/B/[P]#", "0"},
-                     {"hot/C#", "0"},
+                     {Cfg('F') + "#", "R"},
                      {"tool/hf_folder.ico#", "0"},
+                     {LogPlace + "#", "R"},
                      {PresetPlace + "#", "0"},
                      {PresetOf('Q'), ""},
-                     {Jobs + "/Q#", "0"}})
+                     {JobPresets + "/Q#", "0"},
+                     {PresetOf('R'), ""},
+                     {PresetOf('R') + "#", "R"}})
             .AsOtherUser()
             .IsReported(R"(
+Workstation
+  problem  there will be no run log: can't open file*
 {hot}{/}A
   problem  Folder.cfg: can't open file*
 {nodisabled}
@@ -449,47 +394,39 @@ Job presets
   change   Desktop.ini: new
   change   hot folder: attributes none -> SYSTEM
   note     no Folder.cfg
+{hot}{/}F
+  problem  Folder.cfg: cannot be opened for writing (can't open file*
+  problem  stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl
+  problem  hf_folder.ico: cannot be replaced (read-only, in use, or access denied)
 Job presets
   problem  .P{/}Presets{/}presets.xml: cannot be opened for reading (can't open file*
-  problem  Q{/}Presets{/}presets.xml: {user}{/}ORX{/}JPData{/}Q cannot be entered)"),
-        Done("FoldersOfAnotherUser")
+  problem  Q{/}Presets{/}presets.xml: {user}{/}ORX{/}JPData{/}Q cannot be entered
+  problem  R{/}Presets{/}presets.xml: cannot be opened for writing (can't open file*)"),
+        Done("FoldersOfAnotherUserAndPresetsThatCannotBeListed")
             .Before(DoneFolder('B'))
             .Before({{"hot/A/Desktop.ini", Removed},
                      {"hot/A/Desktop.ini#", Removed},
                      {"hot/A#", "SX"},
-                     {"hot/B#", "X"}})
+                     {"hot/B#", "X"},
+                     {JobPresets + "#", "L"}})
             .AsOtherUser()
             .NotUnderWine(NoRefusal)
             .IsReported(R"(
 {hot}{/}A
   problem  Desktop.ini: cannot be created, because the hot folder cannot be written to
 {hot}{/}B
-  problem  hot folder: its attributes cannot be changed)"),
+  problem  hot folder: its attributes cannot be changed
+Job presets
+  problem  {user}{/}ORX{/}JPData{/} cannot be listed)"),
         Done("SourceIconsAreMissing")
-            .Before({{"tool/BundleIcons#", "0"},
-                     {"hot/B/[P]/hf_folder_disabled.ico", ""},
-                     {"hot/C/[P]/hf_folder_disabled.ico", ""}})
-            .FolderCfg(Written("{hot}{/}A"))
-            .Preset("")
+            .Before(DoneFolder('A', Written("{hot}{/}A")))
+            .Before(DoneFolder('B', Written("{hot}{/}A")))
+            .Before({{"tool/BundleIcons#", "0"}, {PresetPlace, ""}})
             .Run({"U"})
             .AsOtherUser()
             .IsReported(R"(
 {hot}{/}A
-  problem  source icon missing: {tool}{/}BundleIcons{/}hf_folder.ico
-{hot}{/}B
-  problem  source icon missing: {tool}{/}BundleIcons{/}hf_folder_disabled.ico
-  note     no Folder.cfg
-{hot}{/}C
-  note     no Folder.cfg)"),
-        Done("KeysAndAttributes")
-            .Before({{"hot/A/Desktop.ini", "[.ShellClassInfo]\r\nIconFile=x\r\n"},
-                     {"hot/A/Desktop.ini#", "H"},
-                     {"hot/A#", "H"}})
-            .IsReported(R"(
-{hot}{/}A
-  change   Desktop.ini: InfoTip, IconFile
-  change   Desktop.ini: attributes HIDDEN -> READONLY SYSTEM
-  change   hot folder: attributes HIDDEN -> HIDDEN SYSTEM)"),
+  problem  source icon missing: {tool}{/}BundleIcons{/}hf_folder.ico)"),
     };
 }
 

@@ -11,6 +11,10 @@ std::vector<Scenario> Runs()
     const Text found = Found(MovedFrom);
     const Text forged = "x&#13;&#10;End: Updating Impose path for JP "
                         "Presets&#13;&#10;&#x2028;&#x2029;&#x85;&#x7F;&#9;y";
+    const auto moving = [&](const Text& name)
+    {
+        return Scenario(name).FolderCfg(from, to);
+    };
     return {
         Scenario("WithoutASwitchNothingChanges").FolderCfg(from).Run({}),
         Scenario("ADashedSwitchIsInvalid")
@@ -18,34 +22,23 @@ std::vector<Scenario> Runs()
             .Run({"-I"})
             .WholeLog("Invalid call check calling parameter: exiting....\n"),
         Scenario("AnInvalidSwitchIsNotLoggedWithV").FolderCfg(from).Run({"X", "V"}),
-        Scenario("VLeavesTheLogAlone").FolderCfg(from, to).Run({"I", "v"}),
-        Scenario("AnUpgradeMovesTheTemplate").FolderCfg(from, to).Run({"i"}).LogOfA(found),
-        Scenario("VIsIgnoredBeforeAnotherArgument")
-            .FolderCfg(from, to)
-            .Run({"I", "V", "x"})
-            .LogOfA(found),
-        Scenario("AnotherSecondArgumentIsIgnored")
-            .FolderCfg(from, to)
-            .Run({"I", "W"})
-            .LogOfA(found),
+        moving("VLeavesTheLogAlone").Run({"I", "v"}),
+        moving("AnUpgradeMovesTheTemplate").Run({"i"}).LogOfA(found),
+        moving("VIsIgnoredBeforeAnotherArgument").Run({"I", "V", "x"}).LogOfA(found),
+        moving("AnotherSecondArgumentIsIgnored").Run({"I", "W"}).LogOfA(found),
         Scenario("ADowngradeMovesTheTemplateBack")
             .FolderCfg(to, from)
             .Run({"u"})
             .LogOfA(Found(MovedTo)),
-        Scenario("WithoutALogFolderTheRestIsDone")
-            .Before({{LogPlace, Removed}})
-            .FolderCfg(from, to),
-        Scenario("AMissingLogIsCreated")
-            .Before({{LogPlace, Removed}, {"user/ORX_Installers/", ""}})
-            .FolderCfg(from, to)
+        moving("WithoutALogFolderTheRestIsDone").Before({{LogPlace, Removed}}),
+        moving("AMissingLogIsCreated")
+            .Before({{LogPlace, Removed}, {LogFolder + "/", ""}})
             .LogOfA(found),
-        Scenario("ALogWithAByteOrderMarkLosesIt")
+        moving("ALogWithAByteOrderMarkLosesIt")
             .Before({{LogPlace, "{utf16}old\r\n"}})
-            .FolderCfg(from, to)
             .LogOfA(found),
-        Scenario("AFolderInPlaceOfTheLogStopsNothing")
-            .Before({{LogPlace, Removed}, {Text(LogPlace) + "/", ""}})
-            .FolderCfg(from, to),
+        moving("AFolderInPlaceOfTheLogStopsNothing")
+            .Before({{LogPlace, Removed}, {LogPlace + "/", ""}}),
         Scenario("APercentSignIsLoggedAsItIs")
             .Before({{"hot/%d %s/", ""}})
             .Log(FolderLines("%d %s", 1, NoIcon("hf_folder_disabled"), NoCfg("%d %s"))),

@@ -9,6 +9,9 @@ inline Text Times(int count, const Text& text)
     return "{times:" + std::to_string(count) + ":" + text + "}";
 }
 
+inline const Text LogFolder = "user/ORX_Installers";
+inline const Text JobPresets = "user/ORX/JPData";
+
 inline const Text MovedFrom = "{previous}{/}Booklet.tpl";
 inline const Text MovedTo = "{default}{/}Booklet.tpl";
 
@@ -70,6 +73,16 @@ inline Text Stored(const Text& path)
     return "<K n=\"ORXImposeTemplate\">\"" + path + "\"</K>\r\n";
 }
 
+// Desktop.ini.
+
+inline const Text IniHeader = "[.ShellClassInfo]\r\n";
+inline const Text InfoTip = "InfoTip=This folder has been configured as an ORX hot folder.\r\n";
+
+inline Text IconFile(const Text& name)
+{
+    return "IconFile=.\\[_ORX_HotFolder_]\\" + name + ".ico\r\n";
+}
+
 // Log lines; {icons} is where the icons of the run's direction come from.
 
 /// One folder's lines: those of its icon and those of its template.
@@ -84,10 +97,10 @@ inline Text NoIcon(const Text& name)
 {
     return "Icon path  not exist: {tool}{/}{icons}" + name + ".ico\n";
 }
-inline Text Copied(const Text& icon)
+inline Text Copied(const Text& icon, const Text& folder = "A")
 {
-    return "Icon  copied from : {tool}{/}{icons}" + icon +
-           ".ico To {hot}{/}A{/}[_ORX_HotFolder_]{/}" + icon + ".ico \n";
+    return "Icon  copied from : {tool}{/}{icons}" + icon + ".ico To {hot}{/}" + folder +
+           "{/}[_ORX_HotFolder_]{/}" + icon + ".ico \n";
 }
 inline Text CfgOf(const Text& name)
 {
@@ -96,6 +109,11 @@ inline Text CfgOf(const Text& name)
 inline Text NoCfg(const Text& name = "A")
 {
     return "HF cfg file unable to read/exist: " + CfgOf(name);
+}
+/// The lines of A if its icon is replaced and it has no Folder.cfg.
+inline Text CopiedToA(const Text& other = "")
+{
+    return FolderLines("A", 1, other + Copied("hf_folder_disabled"), NoCfg());
 }
 inline Text Untouched(const Text& reason)
 {
@@ -114,3 +132,30 @@ inline const Text NoDefault = "Unable to read: Default Impose Template Path\n";
 inline const Text NoPrevious = "Unable to read: Previous Version  Default Impose Template Path\n";
 inline const Text NoPreviousTo = "unable to read: Previous Version  Default Impose Template Path\n";
 inline const Text Updated = "Updated preset.xml  : ";
+
+/// A hot folder with this Folder.cfg, before and after; without the second, it stays. The lines
+/// about its template are as if its name were A.
+struct HotFolder
+{
+    Text cfg;
+    Text becomes;
+    Text impose;
+    Text icon = "hf_folder_disabled";
+};
+
+inline Scenario HotFolders(const Text& whatHappens, const std::map<Text, HotFolder>& folders)
+{
+    Scenario scenario(whatHappens);
+    Text log;
+    int position = 0;
+    for (const auto& [name, folder] : folders)
+    {
+        const Text place = Replaced(CfgPlace, "A", name);
+        scenario.Before({{place, folder.cfg}});
+        if (!folder.becomes.empty())
+            scenario.After({{place, folder.becomes}});
+        log += FolderLines(name, ++position, NoIcon(folder.icon),
+                           Replaced(folder.impose, "{hot}{/}A", "{hot}{/}" + name));
+    }
+    return scenario.Log(log);
+}

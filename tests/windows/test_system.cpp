@@ -317,12 +317,14 @@ void GiveAway(const std::vector<fs::path>& /*folders*/)
 
 void Refuse(const fs::path& path, char letter)
 {
-    const Text rights =
-        letter == 'X' ? "(WD,AD,WEA,WA,DC,DE)" : "(OI)(CI)(RD,REA,RA,X,WD,AD,WEA,WA,DC,DE)";
+    static const Files rights = {{"X", "(WD,AD,WEA,WA,DC,DE)"},
+                                 {"L", "(RD)"},
+                                 {"0", "(OI)(CI)(RD,REA,RA,X,WD,AD,WEA,WA,DC,DE)"}};
     if (IsWine()) // where an access control list refuses nobody
         RunUnix((letter == 'X' ? "chmod a-w" : "chmod 0") + UnixPath(path));
     else
-        RunSystem("icacls \"" + path.u8string() + "\" /deny *S-1-1-0:" + rights);
+        RunSystem("icacls \"" + path.u8string() +
+                  "\" /deny *S-1-1-0:" + rights.at(Text(1, letter)));
     RefusedPaths().push_back(path);
 }
 
