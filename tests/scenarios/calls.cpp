@@ -151,7 +151,6 @@ TEST(CallOfAnInstaller, PrintsItsUsage)
         const RunResult run = workstation.Start("FolderUpgradeRun", arguments);
         EXPECT_EQ(3, run.status);
         EXPECT_TRUE(
-            IsWindows ||
             StartsWith(run.libraryLog, "Usage: FolderUpgradeRun I|U [--limit SECONDS] [FOLDER]\n"));
     }
 }

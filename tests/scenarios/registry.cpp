@@ -50,7 +50,7 @@ std::vector<Scenario> Registry()
              {{MachineHive, MachineValue("\"InstallPath\"=dword:00000001")}})
             .LogOfA(found + Untouched("new path holds a character that XML cannot store"), updated),
         WithPrevious("AnUnterminatedOddValueIsReadToItsLastWholeUnit",
-                     "\"Path\"=hex(2):78,00,79,00,7a")
+                     "\"Path\"=hex:78,00,79,00,7a")
             .LogOfA(found, updated),
         WithPrevious("AFinalSeparatorMovesPresetsOnly", "\"Path\"=\"{PREVIOUS}{/2}\"")
             .After({{PresetPlace, Stored(MovedTo)}})

@@ -3,15 +3,25 @@
 #include "platform/system.h"
 #include "tests/test_system.h"
 
+#include <wx/arrstr.h>
+#include <wx/buffer.h>
+#include <wx/msw/registry.h>
+
 namespace fs = std::filesystem;
 
 namespace
 {
 
-const auto Hives = {std::pair("HKEY_LOCAL_MACHINE\\", HKEY_LOCAL_MACHINE),
-                    {"HKEY_CURRENT_USER\\", HKEY_CURRENT_USER}};
-const auto Keys = {"SOFTWARE\\Vantorix", "SOFTWARE\\HF", "SOFTWARE\\Wow6432Node\\Vantorix",
-                   "SOFTWARE\\Wow6432Node\\HF"};
+wxArrayString Keys()
+{
+    wxArrayString keys;
+    for (const char* hive : {"HKEY_LOCAL_MACHINE", "HKEY_CURRENT_USER"})
+    {
+        for (const char* key : {"Vantorix", "HF", "Wow6432Node\\Vantorix", "Wow6432Node\\HF"})
+            keys.Add(wxString(hive) + "\\SOFTWARE\\" + key);
+    }
+    return keys;
+}
 
 std::vector<fs::path> Folders()
 {
@@ -29,15 +39,10 @@ fs::path TrialDir()
 std::vector<Text> FindInstallation()
 {
     std::vector<Text> found;
-    for (const auto& [name, hive] : Hives)
+    for (const wxString& key : Keys())
     {
-        for (const char* key : Keys)
-        {
-            HKEY opened = nullptr;
-            if (RegOpenKeyExA(hive, key, 0, KEY_READ, &opened) != ERROR_FILE_NOT_FOUND)
-                found.push_back(Text(name) + key);
-            RegCloseKey(opened);
-        }
+        if (wxRegKey(key).Exists())
+            found.push_back(key.utf8_string());
     }
     for (const fs::path& folder : Folders())
     {
@@ -49,10 +54,10 @@ std::vector<Text> FindInstallation()
 
 void RemoveKeys()
 {
-    for (const auto& [name, hive] : Hives)
+    for (const wxString& key : Keys())
     {
-        for (const char* key : Keys)
-            RegDeleteTreeA(hive, key);
+        if (wxRegKey(key).Exists())
+            wxRegKey(key).DeleteSelf();
     }
 }
 
