@@ -1,7 +1,7 @@
 ; A setup that ships FolderUpgrade, as a sample and for testing. It takes the place of the client's own setup, without
 ; the client's files, and has no dialog except the progress.
 ;
-;     makensis -DPACKAGE=<folder of the unpacked zip> -DVERSION=1.1.0 -DOUTPUT=<setup>.exe samples/installer.nsi
+;     makensis -DPACKAGE=<folder of the unpacked zip> -DVERSION=<version> -DOUTPUT=<setup>.exe samples/installer.nsi
 ;     <setup>.exe [/S] [/D=<folder>]     upgrades
 ;     <folder>\uninstall.exe [/S]        downgrades
 ;
