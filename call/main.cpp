@@ -142,7 +142,8 @@ class FolderUpgradeRunApp : public wxAppConsole
                     "Usage: FolderUpgradeRun I|U [--limit SECONDS] [FOLDER]\n"
                     "Runs FolderUpgrade with the same switch, between two checks.\n"
                     "Exit status: 0 everything is as it should be, 1 changes are left, "
-                    "2 problems, 3 wrong arguments, 4 FolderUpgrade did not run.\n");
+                    "2 problems, 3 wrong arguments, 4 FolderUpgrade did not start, crashed or "
+                    "was ended.\n");
             return WrongArguments;
         }
         const wxString logFolder = RunLogDirPath();

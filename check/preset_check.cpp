@@ -110,7 +110,7 @@ Findings CheckPaths(const wxString& text, bool isRewritten, TemplateCheck& check
     for (const PresetPath& path : FindPresetPaths(text, from, to))
     {
         if (path.isCutOff)
-            findings.notes.push_back("a template path has no end");
+            findings.notes.push_back("a template path has no closing quote");
         else
             ++paths[{path.stored, isRewritten ? path.moved : path.stored}];
     }
@@ -130,7 +130,7 @@ Findings CheckPaths(const wxString& text, bool isRewritten, TemplateCheck& check
             (count == 1 ? wxString() : wxString::Format(" (%zu times)", count)));
         if (MovedPresetPath(left, from, to) != left)
             check.report.ProblemOnce("one template folder is below the other: another run would "
-                                     "move paths of presets once more");
+                                     "move paths of presets again");
     }
     return findings;
 }

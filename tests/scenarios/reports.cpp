@@ -169,7 +169,7 @@ Job presets
             .IsReported(R"(
 Job presets
   change   .P{/}Presets{/}presets.xml: {default}{/}Booklet.tpl -> {default}{/}template{/}Booklet.tpl
-  problem  one template folder is below the other: another run would move paths of presets once more)"),
+  problem  one template folder is below the other: another run would move paths of presets again)"),
         Done("BothFoldersAreTheSame")
             .Before({{UserHive, UserValue("\"Path\"=\"{APP}{/2}template\"")}})
             .IsReported(""),
@@ -200,7 +200,7 @@ Job presets
 {hot}{/}C
   note     not looked at: {hot}{/}C{/}D{/}T
 Job presets
-  note     .P{/}Presets{/}presets.xml: a template path has no end
+  note     .P{/}Presets{/}presets.xml: a template path has no closing quote
   note     .P{/}Presets{/}presets.xml: not looked at: {default}{/}D{/}T
   problem  .P{/}Presets{/}presets.xml: no template at {default}{/}<A&none;
   problem  .P{/}Presets{/}presets.xml: stays in the folder being left (other separators): )"
