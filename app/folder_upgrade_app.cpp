@@ -62,7 +62,13 @@ bool FolderUpgradeApp::OnInit()
                        : L"Un-installation : Downgrade call with switch: U");
 
     wxArrayString folders;
-    Attempt(L"HotFolderList.cfg", GetHotFolderListPath(), [&]() { ReadHotFolderList(folders); });
+    Attempt(L"HotFolderList.cfg", GetHotFolderListPath(),
+            [&]()
+            {
+                wxArrayString listed;
+                ReadHotFolderList(listed);
+                folders = listed;
+            });
     if (folders.empty())
         RunLog(L"No Hotfolder listed");
 

@@ -38,9 +38,10 @@ const wchar_t* IconBaseName(FolderIconState state)
         return L"hf_folder_disabled";
     case FolderIconState::ErrorActive:
         return L"hf_error_active";
-    default:
-        return L"hf_error_inactive";
+    case FolderIconState::ErrorInactive:
+        break;
     }
+    return L"hf_error_inactive";
 }
 
 wxString SourceIconPath(const wxString& iconName, bool isUpgrade, const wxString& bundleIconsDir)

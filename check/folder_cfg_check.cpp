@@ -99,7 +99,7 @@ void CheckFolderCfg(HotFolder& folder, TemplateCheck& check)
     if (state == XmlFile::State::Missing)
         CheckMissing(folder, report);
     else if (state == XmlFile::State::TooLarge)
-        ReportLeft(CfgTooLarge, report);
+        ReportLeft(TooLargeToRead, report);
     else if (state == XmlFile::State::NotReadable)
         report.Problem("Folder.cfg: " +
                        (folder.cfg.error.message.empty()

@@ -67,7 +67,7 @@ void CheckHotFolderList(const HotFolderList& list, Report& report)
     if (list.state == XmlFile::State::Loaded)
         CheckEntries(list, report);
     else if (list.state == XmlFile::State::TooLarge)
-        report.Problem("HotFolderList.cfg: too large to read safely");
+        report.Problem(wxString("HotFolderList.cfg: ") + TooLargeToRead);
     else if (list.state == XmlFile::State::NotReadable)
         report.Problem(
             (list.error.message.empty() ? list.whyNotReadable : path + ": " + Damage(list.error)) +

@@ -52,7 +52,7 @@ void UpdateHotFolderImposePath(const FolderUpgradeApp& app, HotFolder& folder)
     if (state == XmlFile::State::Missing)
         RunLog(L"HF cfg file unable to read/exist: " + cfgPath);
     else if (state == XmlFile::State::TooLarge)
-        LogUntouched(cfgPath, CfgTooLarge);
+        LogUntouched(cfgPath, TooLargeToRead);
     else if (state == XmlFile::State::NotReadable)
         ReportError(folder.cfg.WhyNotReadable(cfgPath));
     else

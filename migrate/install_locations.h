@@ -13,9 +13,10 @@ struct ValueSource
 /// The default template folder of the installed software: "template" below the InstallPath of the
 /// machine's key. Returns false and leaves the folder as it was if that cannot be read.
 ///
-/// Both lookups follow RegOpenKeyExW and RegQueryValueExW: the 32-bit key comes first, the other is
-/// tried only if the first cannot be opened; at most 517 bytes are read, as UTF-16 up to the first
-/// NUL whatever the value's type. The folder may be missing; its last part becomes the file name.
+/// Every call reads the registry. Both lookups follow RegOpenKeyExW and RegQueryValueExW: the
+/// 32-bit key comes first, the other is tried only if the first cannot be opened; at most 517 bytes
+/// are read, as UTF-16 up to the first NUL whatever the value's type. The folder may be missing;
+/// its last part becomes the file name.
 bool GetDefaultImposeTemplatePath(wxFileName& folder, ValueSource& source);
 
 /// The default template folder of the previous version: the Path of the current user's key. Returns

@@ -100,7 +100,7 @@ RewrittenPreset JobPresetFile::Decide(const wxString& from, const wxString& to)
     if (file.Read(before))
         preset = RewritePreset(before, from, to);
     else
-        preset.reasonToStay = "cannot be read";
+        preset.reasonToStay = L"cannot be read";
     preset.before.swap(before);
     return preset;
 }

@@ -91,16 +91,16 @@ std::optional<size_t> MovePresetPaths(wxString& text, const wxString& oldFolder,
 // Decodes the bytes unchanged, then converts line ends as the system's text mode would, if it has
 // one. Text mode itself would end the file at the first Ctrl-Z, and find line ends inside UTF-16
 // characters.
-const char* DecodePreset(const std::string& bytes, wxString& text)
+const wchar_t* DecodePreset(const std::string& bytes, wxString& text)
 {
     if (IsEmptyText(bytes))
         return nullptr;
     wxString(bytes.data(), wxConvAuto(), bytes.length()).swap(text); // assigning would copy it
     if (text.empty())
-        return "cannot be decoded";
+        return L"cannot be decoded";
     if (wxTextBuffer::typeDefault == wxTextFileType_Dos)
         text.Replace("\r\n", "\n");
-    return IsUnicodeText(text) ? nullptr : "cannot be encoded again";
+    return IsUnicodeText(text) ? nullptr : L"cannot be encoded again";
 }
 
 wxString MovedPresetPath(const wxString& path, const wxString& from, const wxString& to)
@@ -139,6 +139,6 @@ RewrittenPreset RewritePreset(const std::string& before, const wxString& from, c
     if (preset.bytes.empty() && !text.empty())
         throw std::bad_alloc(); // the library gives an empty text then
     if (!moved || preset.bytes.size() > static_cast<size_t>(LongestFile))
-        preset.reasonToStay = "the new content would be too large";
+        preset.reasonToStay = NewContentTooLarge;
     return preset;
 }

@@ -31,12 +31,12 @@ std::vector<PresetPath> FindPresetPaths(const wxString& text, const wxString& fr
 wxString MovedPresetPath(const wxString& path, const wxString& from, const wxString& to);
 
 /// Decodes a preset file's bytes. Returns why it stays as it is, or null.
-const char* DecodePreset(const std::string& bytes, wxString& text);
+const wchar_t* DecodePreset(const std::string& bytes, wxString& text);
 
 /// A preset file's new content, or why the file has to stay as it is.
 struct RewrittenPreset
 {
-    const char* reasonToStay = nullptr;
+    const wchar_t* reasonToStay = nullptr;
     std::string before;
     std::string bytes;
 };

@@ -99,7 +99,7 @@ void MakeContent(const wxXmlNode& root, const ImposeSettingTable& imposeSettings
     move.newContent = FolderCfgBytes(settings, jobSettings, paths, filterSetting, imposeSettings,
                                      preflightSettings);
     if (move.newContent.empty())
-        Stay(move, L"the new content would be too large");
+        Stay(move, NewContentTooLarge);
 }
 
 } // namespace

@@ -4,9 +4,6 @@
 #include "migrate/template_folders.h"
 #include "store/xml_file.h"
 
-/// Why a Folder.cfg is not looked at, and stays as it is.
-constexpr const wchar_t* CfgTooLarge = L"too large to read safely";
-
 struct TemplateMove
 {
     enum class Outcome

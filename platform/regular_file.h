@@ -18,7 +18,7 @@ struct FailedCall
     const char* what = Open;
     unsigned long error = 0; // as the system numbers it
 
-    /// Of this kind, with the system's last error.
+    /// One of the four, with the system's last error.
     static FailedCall Now(const char* what);
 
     /// The words in which wxLogSysError reports it, and the end of them.
@@ -38,7 +38,7 @@ class RegularFile
   public:
     enum class Status
     {
-        NotThere, // no such file, not a regular file, a refused link, or another file by now
+        NotThere, // no such file, not a regular file, or a refused link
         Refused,  // it exists, but access is denied or another program blocks it
         Open
     };
@@ -84,8 +84,9 @@ class RegularFile
     bool TakeContent(const RegularFile& source);
     bool HasContentOf(const RegularFile& other) const;
 
-    /// Copies what wxCopyFile copies in addition to the content, but read-only, which would keep the
-    /// next copy away. Windows: the attributes and the time of the last change; elsewhere: the mode.
+    /// Copies what wxCopyFile copies in addition to the content, except read-only, which would keep
+    /// the next copy away. Windows: the attributes and the time of the last change; elsewhere: the
+    /// mode.
     void TakeAttributes(const RegularFile& source);
     /// Whether hidden, system and read-only, or the mode, are as TakeAttributes leaves them.
     bool HasAttributesOf(const RegularFile& source) const;

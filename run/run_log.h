@@ -15,7 +15,8 @@ extern bool RunLogEnabled;
 /// The count to pass for a line without one.
 constexpr int NoCount = -1;
 
-/// Appends one line: the message, then the count unless it is NoCount; see ToOneLine. The first
+/// Appends one line: the message, then the count unless it is NoCount; on one line, as ToOneLine
+/// (platform/unicode_text.h) makes it. The first
 /// line of a run empties the file, and creates it if its folder exists. The file is closed between
 /// lines; if it is removed meanwhile, it is not created again. If the folder or the file is a link,
 /// or the file is not a regular file, there is no log. A line that cannot be written completely is

@@ -5,6 +5,7 @@
 
 #include <wx/arrstr.h>
 
+/// The list's path.
 wxString GetHotFolderListPath();
 
 /// Its folder: "hotfolder" in the machine-wide application data folder, with a final separator.

@@ -6,6 +6,10 @@
 #include <cstdint>
 #include <string>
 
+/// Reasons why a file stays as it is, for the log and for reports.
+constexpr const wchar_t* TooLargeToRead = L"too large to read safely";
+constexpr const wchar_t* NewContentTooLarge = L"the new content would be too large";
+
 struct XmlLimits
 {
     std::int64_t bytes;   // of the document

@@ -16,8 +16,8 @@ XmlFile::State XmlFile::Load(RegularFile::Status opened)
         state = opened == RegularFile::Status::Refused ? State::NotReadable : State::Missing;
     else if (file.Length() > limits.bytes)
         state = State::TooLarge;
-    else if (!file.Read(bytes, limits.bytes))
-        state = State::NotReadable;
+    else if (!file.Read(bytes, limits.bytes)) // it may have grown meanwhile
+        state = file.Length() > limits.bytes ? State::TooLarge : State::NotReadable;
     if (state == State::Loaded && documentBefore && bytes == bytesBefore)
     {
         document = std::move(documentBefore);

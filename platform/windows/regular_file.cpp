@@ -176,7 +176,7 @@ void RegularFile::TakeAttributes(const RegularFile& source)
     information.CreationTime.QuadPart = 0;
     information.LastAccessTime.QuadPart = 0;
     information.ChangeTime.QuadPart = 0;
-    // So do attributes of 0.
+    // Attributes of 0 would also stay as they are.
     information.FileAttributes &= ~DWORD{FILE_ATTRIBUTE_READONLY};
     if (information.FileAttributes == 0)
         information.FileAttributes = FILE_ATTRIBUTE_NORMAL;
