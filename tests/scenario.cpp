@@ -18,14 +18,22 @@ Scenario& Scenario::After(const Files& files)
     return *this;
 }
 
+Scenario& Scenario::Change(const Text& place, const Text& text, const Text& becomes)
+{
+    before[place] = text;
+    if (!becomes.empty())
+        after[place] = becomes;
+    return *this;
+}
+
 Scenario& Scenario::FolderCfg(const Text& text, const Text& becomes)
 {
-    return Before({{CfgPlace, text}}).After({{CfgPlace, becomes.empty() ? text : becomes}});
+    return Change(CfgPlace, text, becomes);
 }
 
 Scenario& Scenario::Preset(const Text& text, const Text& becomes)
 {
-    return Before({{PresetPlace, text}}).After({{PresetPlace, becomes.empty() ? text : becomes}});
+    return Change(PresetPlace, text, becomes);
 }
 
 Scenario& Scenario::Log(const Text& folders, const Text& presets)
@@ -39,11 +47,6 @@ Scenario& Scenario::Log(const Text& folders, const Text& presets)
 Scenario& Scenario::LogOfA(const Text& impose, const Text& presets, const Text& icon)
 {
     return Log(FolderLines("A", 1, NoIcon(icon), impose), presets);
-}
-
-Scenario& Scenario::LogOfDisabledA(const Text& impose, const Text& presets)
-{
-    return LogOfA(impose, presets, "hf_folder_disabled");
 }
 
 Scenario& Scenario::LogOfPreset(const Text& line)
@@ -60,19 +63,17 @@ Scenario& Scenario::Shell(const Text& version, const Text& calls)
 
 Scenario& Scenario::IsReported(const Text& lines)
 {
-    isOnlyChecked = true;
     report = lines;
     for (const auto& [token, text] : Files{
              {"{moves}",
               "  change   Folder.cfg: {previous}{/}Booklet.tpl -> {default}{/}Booklet.tpl"},
              {"{nodisabled}", "  note     no copy of the icon to replace: hf_folder_disabled.ico"},
-             {"{key}", "there is no such key"},
-             {"{nothing}", ", for the account ACCOUNT; nothing moves. Run as the client's user, "
+             {"{nothing}", ", for the account *; nothing moves. Run as the client's user, "
                            "after its installation"},
              {"{log}", "{user}{/}ORX_Installers{/}UpgradeDowngrade.log"},
              {"{list}", "{machine}{/}hotfolder{/}HotFolderList.cfg"},
              {"{Path}", "registry value Path in HKEY_CURRENT_USER\\SOFTWARE\\HF"}})
-        report = Replaced(report, token, text);
+        report = Replaced(*report, token, text);
     return *this;
 }
 
@@ -92,8 +93,8 @@ Files WorkstationBefore(const Scenario& scenario)
                   {LogPlace, "The log of an earlier run\r\n"},
                   {"user/ORX/JPData/", ""},
                   {"previous/", ""},
-                  {MachineHive, MachineValue("\"InstallPath\"=\"{APP}\"")},
-                  {UserHive, UserValue("\"Path\"=\"{PREVIOUS}\"")}});
+                  {MachineHive, MachineValue("\"InstallPath\"=\"{app}\"")},
+                  {UserHive, UserValue("\"Path\"=\"{previous}\"")}});
     for (auto file = files.begin(); file != files.end();)
         file = file->second == Removed ? files.erase(file) : std::next(file);
     return files;

@@ -7,6 +7,7 @@
 
 #include <gtest/gtest.h>
 
+#include <optional>
 #include <ostream>
 #include <vector>
 
@@ -38,8 +39,7 @@ struct Scenario
     Text notUnderWine;
     Text shellVersion;
     Text shellCalls;
-    bool isOnlyChecked = false;
-    Text report;
+    std::optional<Text> report; // FolderUpgrade is not started
 
     explicit Scenario(const Text& whatHappens) : name(whatHappens)
     {
@@ -51,7 +51,9 @@ struct Scenario
     Scenario& Before(const Files& files);
     /// Files that change. Every other file and attribute has to stay as it is.
     Scenario& After(const Files& files);
-    /// The Folder.cfg of the hot folder A, before and after; without the second, it stays.
+    /// The file before and after; without the second text, it stays.
+    Scenario& Change(const Text& place, const Text& text, const Text& becomes = "");
+    /// The Folder.cfg of the hot folder A, before and after.
     Scenario& FolderCfg(const Text& text, const Text& becomes = "");
     /// The same for presets.xml of the one directory with presets.
     Scenario& Preset(const Text& text, const Text& becomes = "");
@@ -70,7 +72,6 @@ struct Scenario
     /// The same if A is the only hot folder, has no icon to replace, and has these lines about its
     /// template.
     Scenario& LogOfA(const Text& impose, const Text& presets = "", const Text& icon = "hf_folder");
-    Scenario& LogOfDisabledA(const Text& impose, const Text& presets = "");
     /// The same if there are no hot folders and one preset, with this line.
     Scenario& LogOfPreset(const Text& line);
     /// The library itself reports an error, on Windows in a message box.
@@ -78,8 +79,8 @@ struct Scenario
     /// The calls to a shell of this version; only on this machine.
     Scenario& Shell(const Text& version, const Text& calls);
 
-    /// FolderUpgrade is not started, and FolderUpgradeCheck reports this, without the head, the sum
-    /// and empty lines. A line that ends in * continues in the system's own words.
+    /// Only FolderUpgradeCheck is started, and reports this, without the head, the sum and empty
+    /// lines; with an * for the account and the system's own words.
     Scenario& IsReported(const Text& lines);
 };
 

@@ -29,11 +29,3 @@ bool StartsWith(const Text& text, const Text& start)
 {
     return text.compare(0, start.size(), start) == 0;
 }
-
-Text ToUtf16(const Text& text)
-{
-    Text result = "\xFF\xFE";
-    for (const char16_t unit : std::filesystem::u8path(text).u16string())
-        result += {static_cast<char>(unit & 0xFF), static_cast<char>(unit >> 8)};
-    return result;
-}

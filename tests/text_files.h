@@ -14,5 +14,3 @@ Text ReadFile(const std::filesystem::path& path);
 void WriteFile(const std::filesystem::path& path, const Text& text);
 Text Replaced(Text text, const Text& from, const Text& to);
 bool StartsWith(const Text& text, const Text& start);
-/// Converts UTF-8 to UTF-16LE with a byte-order mark.
-Text ToUtf16(const Text& text);

@@ -1,11 +1,12 @@
 #include "tests/workstation.h"
 
+#include "platform/pinned_directory.h"
 #include "platform/system.h"
 
 #include <wx/string.h>
 
 #include <algorithm>
-#include <cctype>
+#include <cstdlib>
 #include <functional>
 #include <stdexcept>
 
@@ -34,28 +35,15 @@ std::vector<Text> Tops()
     return tops;
 }
 
-const auto Attributes = {std::pair('R', FILE_ATTRIBUTE_READONLY),
+// In the order in which Wine can set them.
+const auto Attributes = {std::pair('S', FILE_ATTRIBUTE_SYSTEM),
                          {'H', FILE_ATTRIBUTE_HIDDEN},
-                         {'S', FILE_ATTRIBUTE_SYSTEM}};
+                         {'R', FILE_ATTRIBUTE_READONLY}};
 
 // path::wstring depends on the locale.
 wxString WideName(const fs::path& path)
 {
     return wxString::FromUTF8(path.u8string());
-}
-
-Text Repeated(int count, const Text& text)
-{
-    Text result;
-    for (int i = 0; i < count; ++i)
-    {
-        result += text;
-        const size_t number = text.find('#');
-        if (number != Text::npos)
-            result.replace(result.size() - text.size() + number, 1,
-                           std::to_string(1000000 + i).substr(1));
-    }
-    return result;
 }
 
 } // namespace
@@ -66,25 +54,12 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser), m_root(
               {"user", UserDataDir(m_root)},
               {"machine", MachineDataDir(m_root)},
               {"tool", m_root / fs::u8path("Tool Größe")},
+              {"app", m_root / fs::u8path("Apps ä")},
               {"default", m_root / fs::u8path("Apps ä") / "template"},
               {"previous", m_root / fs::u8path("Vorige 版")},
               {"elsewhere", m_root / "elsewhere"}};
-    for (const auto& [name, folder] : m_dirs)
-        m_tokens["{" + name + "}"] = folder.u8string();
-    m_tokens["{app}"] = m_dirs["default"].parent_path().u8string();
-    m_tokens["{/}"] = Separator;
-    for (const auto& [token, value] : Files(m_tokens))
-    {
-        Text capitals = token == "{/}" ? "{/2}" : token;
-        std::transform(capitals.begin(), capitals.end(), capitals.begin(), ::toupper);
-        m_tokens[capitals] = Replaced(value, "\\", "\\\\");
-    }
-    fs::create_directories(m_dirs["tool"] / "BundleIcons");
-    for (const auto& icon : fs::directory_iterator(ProgramDir() / "BundleIcons"))
-    {
-        for (const char* folder : {"", "BundleIcons"})
-            fs::copy_file(icon.path(), m_dirs["tool"] / folder / icon.path().filename());
-    }
+    for (const char* folder : {"", "BundleIcons"})
+        fs::copy(ProgramDir() / "BundleIcons", m_dirs["tool"] / folder);
     for (const Text name :
          {"FolderUpgrade", "FolderUpgradeCheck", "FolderUpgradeRun", "FolderUpgradeRecorded"})
     {
@@ -112,46 +87,32 @@ fs::path Workstation::HostPath(const Text& place) const
 
 Text Workstation::Expand(Text text) const
 {
-    for (const auto& [token, value] : m_tokens)
-        text = Replaced(text, token, value);
-    const Text times = "{times:";
-    for (size_t at = text.find(times); at != Text::npos; at = text.find(times, at))
-    {
-        const size_t colon = text.find(':', at + times.size());
-        const size_t end = text.find('}', colon);
-        const int count = std::stoi(text.substr(at + times.size(), colon));
-        text.replace(at, end + 1 - at, Repeated(count, text.substr(colon + 1, end - colon - 1)));
-    }
+    for (const auto& [name, folder] : m_dirs)
+        text = Replaced(text, "{" + name + "}", folder.u8string());
+    text = Replaced(text, "{/}", Separator);
     if (StartsWith(text, "{utf16}"))
-        return ToUtf16(text.substr(7));
+    {
+        const std::u16string units = u"\uFEFF" + fs::u8path(text.substr(7)).u16string();
+        return Text(reinterpret_cast<const char*>(units.data()), 2 * units.size());
+    }
     if (StartsWith(text, "{icon:"))
         return ReadFile(ProgramDir() / "BundleIcons" / text.substr(6, text.size() - 7));
     return text;
 }
 
-void Workstation::SetAttributes(const Text& place, const Text& letters)
+void Workstation::SetAttributes(const Text& place, const Text& letters) const
 {
     const fs::path path = HostPath(place);
-    const auto has = [&](char letter)
-    {
-        return letters.find(letter) != Text::npos;
-    };
     DWORD attributes = 0;
     for (const auto& [letter, attribute] : Attributes)
-        attributes |= has(letter) ? attribute : 0;
-    // Wine cannot set the others on a file that is read-only already.
-    for (const DWORD each : {attributes & ~FILE_ATTRIBUTE_READONLY, attributes})
     {
-        if (each != 0 && SetFileAttributesW(WideName(path).wc_str(), each) == 0)
+        if (letters.find(letter) != Text::npos &&
+            SetFileAttributesW(WideName(path).wc_str(), attributes |= attribute) == 0)
             throw std::runtime_error("cannot set " + letters + " of " + place);
     }
-    for (const char letter : {'X', '0', 'L'})
-    {
-        if (has(letter) && IsWindows && letter == '0' && fs::is_regular_file(path))
-            m_inUse.push_back(path);
-        else if (has(letter))
-            Refuse(path, letter);
-    }
+    const size_t refused = letters.find_first_of("X0L");
+    if (refused != Text::npos)
+        Refuse(path, letters[refused]);
 }
 
 void Workstation::Put(const Text& place, const Text& text) const
@@ -168,20 +129,20 @@ void Workstation::Put(const Text& place, const Text& text) const
     else if (place.back() == '/')
         fs::create_directories(path);
     else if (text == Fifo)
-        MakeFifo(path);
+    {
+        if (std::system(("mkfifo '" + path.string() + "'").c_str()) != 0)
+            throw std::runtime_error("no FIFO at " + place);
+    }
     else
         WriteFile(path, Expand(text));
 }
 
 void Workstation::LayOut(const Files& files)
 {
-    m_inUse.clear();
-    std::vector<fs::path> folders = {m_root};
     for (const Text& top : Tops())
     {
-        folders.push_back(HostPath(top));
         if (top != "tool")
-            RemoveTree(folders.back());
+            RemoveTree(HostPath(top));
     }
     std::vector<Text> hives;
     for (const auto& [place, text] : files)
@@ -193,7 +154,7 @@ void Workstation::LayOut(const Files& files)
             Put(place, text);
     }
     if (m_asOtherUser)
-        GiveAway(folders);
+        GiveAway(m_root);
     SetRegistry(hives);
     // In this order, files come before their directory, which may not be accessible afterwards.
     for (auto file = files.rbegin(); file != files.rend(); ++file)
@@ -201,17 +162,6 @@ void Workstation::LayOut(const Files& files)
         if (file->first.back() == '#')
             SetAttributes(file->first.substr(0, file->first.size() - 1), file->second);
     }
-}
-
-RunResult Workstation::Start(const Text& program, const std::vector<Text>& arguments,
-                             const Files& environment, int killAfter) const
-{
-    std::vector<std::shared_ptr<void>> inUse;
-    for (const fs::path& path : m_inUse)
-        inUse.push_back(UseAlone(path));
-    return RunToEnd({m_dirs.at("tool") / (program + ProgramSuffix), arguments, environment,
-                     m_asOtherUser, killAfter},
-                    m_root, HostPath(LogPlace));
 }
 
 Files Workstation::Snapshot() const
@@ -222,7 +172,7 @@ Files Workstation::Snapshot() const
     {
         const bool isDirectory = fs::is_directory(path);
         Text& text = files[place + (isDirectory ? "/" : "")];
-        if (IsSymbolicLink(path))
+        if (IsLink(WideName(path)))
         {
             text = Link;
             return;
@@ -233,7 +183,7 @@ Files Workstation::Snapshot() const
         for (const auto& [letter, attribute] : Attributes)
         {
             if ((attributes & attribute) != 0)
-                files[place + "#"] += letter;
+                files[place + "#"].insert(0, 1, letter);
         }
         if (!isDirectory)
             text = fs::is_fifo(path) ? Fifo : ReadFile(path);

@@ -12,9 +12,7 @@
 // ("hot/A/Desktop.ini#" -> "RS").
 //
 // In texts, {hot}, {user}, {machine}, {tool}, {app}, {previous} and {default} are replaced with
-// paths and {/} with the path separator; in capitals ({HOT}, {/2}) in the form of the registry
-// editor's text. {times:COUNT:TEXT} is TEXT COUNT times, with the repetition's six-digit number in
-// place of '#'. A whole text can also be
+// paths and {/} with the path separator. A whole text can also be
 //   {utf16}TEXT     the text in UTF-16 with a byte-order mark
 //   {icon:NAME}     the bytes of a shipped icon
 //   {link:PLACE}    a symbolic link to another place; to a directory if its own place ends in a
@@ -23,6 +21,15 @@
 #pragma once
 
 #include "tests/test_system.h"
+
+#include <vector>
+
+struct RunResult
+{
+    int status;      // as a shell reports it
+    Text output;     // its standard output
+    Text libraryLog; // what the library reported, on Windows in message boxes
+};
 
 inline const Text LogPlace = "user/ORX_Installers/UpgradeDowngrade.log";
 inline const Text MachineHive = "machine/registry/HKEY_LOCAL_MACHINE.reg";
@@ -40,9 +47,11 @@ class Workstation
 
     /// Makes the files, and removes those of an earlier call.
     void LayOut(const Files& files);
-    /// Runs a program in the tool's folder until it ends, with limits of time and memory.
+    /// Runs a program in the tool's folder until it ends, with limits of time and memory; one
+    /// source for each system. The variables are set only on Linux; it is ended after so many
+    /// milliseconds only on Windows, and not at all if they are 0.
     RunResult Start(const Text& program, const std::vector<Text>& arguments,
-                    const Files& environment = {}, int killAfter = 0) const;
+                    const Files& variables = {}, int killAfter = 0) const;
     /// Every file but the programs with its text, every link, every directory and every attribute
     /// that is set. Links are not followed.
     Files Snapshot() const;
@@ -52,11 +61,9 @@ class Workstation
 
   private:
     void Put(const Text& place, const Text& text) const;
-    void SetAttributes(const Text& place, const Text& letters);
+    void SetAttributes(const Text& place, const Text& letters) const;
 
     bool m_asOtherUser;
     std::filesystem::path m_root;
     std::map<Text, std::filesystem::path> m_dirs; // first part of a place -> directory
-    Files m_tokens;
-    std::vector<std::filesystem::path> m_inUse; // while a program runs
 };

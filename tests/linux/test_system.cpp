@@ -1,8 +1,7 @@
-#include "tests/test_system.h"
+#include "tests/workstation.h"
 
 #include <cstdlib>
 #include <stdexcept>
-#include <sys/stat.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -43,9 +42,7 @@ fs::path ProgramDir()
 fs::path NewRoot()
 {
     Text pattern = (fs::temp_directory_path() / "work station XXXXXX").string();
-    if (!mkdtemp(pattern.data()))
-        throw std::runtime_error("no temporary folder");
-    fs::permissions(pattern, fs::perms(0755));
+    fs::permissions(mkdtemp(pattern.data()), fs::perms(0755)); // another user has to enter it
     return pattern;
 }
 
@@ -63,40 +60,30 @@ void SetRegistry(const std::vector<Text>& /*hives*/)
 {
 }
 
-RunResult RunToEnd(const Command& command, const fs::path& root, const fs::path& /*log*/)
+RunResult Workstation::Start(const Text& program, const std::vector<Text>& arguments,
+                             const Files& variables, int /*killAfter*/) const
 {
     Text line = Limits();
-    line += command.asOtherUser && geteuid() == 0
+    line += m_asOtherUser && geteuid() == 0
                 ? "setpriv --reuid=nobody --regid=nogroup --clear-groups env "
                 : "env ";
-    for (const auto& [name, value] : command.environment)
+    for (const auto& [name, value] : variables)
         line += name + "=" + Quoted(value);
-    line += "LC_ALL=C XDG_CONFIG_HOME=" + Quoted(UserDataDir(root)) +
-            "XDG_CONFIG_DIRS=" + Quoted(MachineDataDir(root).string() + ":/nowhere") +
-            Quoted(command.program);
-    for (const Text& argument : command.arguments)
-        line += Quoted(argument);
-    const fs::path output = root / "output";
-    const fs::path errors = root / "errors";
+    line += "LC_ALL=C XDG_CONFIG_HOME=" + Quoted(HostPath("user")) +
+            "XDG_CONFIG_DIRS=" + Quoted(HostPath("machine").string() + ":/nowhere") +
+            Quoted(HostPath("tool/" + program));
+    for (const Text& argument : arguments)
+        line += Quoted(Expand(argument));
+    const fs::path output = m_root / "output";
+    const fs::path errors = m_root / "errors";
     const int status = std::system((line + ">" + Quoted(output) + "2>" + Quoted(errors)).c_str());
     return {WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status), ReadFile(output),
             ReadFile(errors)};
 }
 
-bool IsSymbolicLink(const fs::path& path)
-{
-    return fs::is_symlink(path);
-}
-
 void MakeLink(const fs::path& target, const fs::path& link)
 {
     fs::create_symlink(target, link);
-}
-
-void MakeFifo(const fs::path& path)
-{
-    if (mkfifo(path.c_str(), 0644) != 0)
-        throw std::runtime_error("no FIFO at " + path.string());
 }
 
 void RemoveTree(const fs::path& path)
@@ -105,12 +92,9 @@ void RemoveTree(const fs::path& path)
     fs::remove_all(path, ignored);
 }
 
-void GiveAway(const std::vector<fs::path>& folders)
+void GiveAway(const fs::path& folder)
 {
-    Text command = "chown -Rh nobody:nogroup ";
-    for (const fs::path& folder : folders)
-        command += fs::exists(folder) ? Quoted(folder) : "";
-    if (geteuid() == 0 && std::system(command.c_str()) != 0)
+    if (geteuid() == 0 && std::system(("chown -Rh nobody:nogroup " + Quoted(folder)).c_str()) != 0)
         throw std::runtime_error("cannot give files away");
 }
 
@@ -120,9 +104,4 @@ void Refuse(const fs::path& path, char letter)
         fs::permissions(path, letter == '0' ? fs::perms::none : fs::perms::owner_exec);
     else if (chown(path.c_str(), 0, 0) != 0)
         throw std::runtime_error("cannot give away " + path.string());
-}
-
-std::shared_ptr<void> UseAlone(const fs::path& /*path*/)
-{
-    throw std::logic_error("here, files are not locked");
 }

@@ -41,7 +41,7 @@ Scenario Gaps()
         folders["gap " + std::to_string(10 + gap)] = {
             Replaced(Minimal(MovedFrom), "<HotFolder", attributes),
             Replaced(written, "\"-1\"", "\"" + (gap < 14 ? "-1" : read) + "\""), Found(MovedFrom),
-            gap > 3 ? "hf_folder" : "hf_folder_disabled"};
+            gap > 3 ? "hf_folder" : Disabled};
     }
     return HotFolders("AttributesAfterAGapComeOutAsDefaults", folders);
 }
@@ -73,8 +73,8 @@ Scenario Encodings()
                 {"ShiftJisAfterSpaces", stays(declared(" = 'Shift_JIS'", "\x93\xFA"))},
                 {"Unknown", stays(declared("='x-own'", "x"))},
                 {"UnknownAfterAByteOrderMark", stays("\xEF\xBB\xBF" + declared("='x-own'", "n"))}})
-        .Before({{MachineHive, MachineValue("\"InstallPath\"=\"{HOT}\"")},
-                 {UserHive, UserValue("\"Path\"=\"{HOT}\"")}});
+        .Before({{MachineHive, MachineValue("\"InstallPath\"=\"{hot}\"")},
+                 {UserHive, UserValue("\"Path\"=\"{hot}\"")}});
 }
 
 std::vector<Scenario> FolderCfgs()
@@ -123,18 +123,18 @@ std::vector<Scenario> FolderCfgs()
         HotFolders("ATemplateOnTheShareBeingLeftMoves",
                    {{"ThisShare", path("{/}{/}host{/}share{/}old{/}x", "{default}{/}x")},
                     {"ATemplateOnAnotherShareStays", path("{/}{/}host{/}other{/}old{/}x")}})
-            .Before({{UserHive, UserValue("\"Path\"=\"{/2}{/2}host{/2}share{/2}old\"")}}),
+            .Before({{UserHive, UserValue("\"Path\"=\"{/}{/}host{/}share{/}old\"")}}),
         HotFolders("ATemplateInARelativeFolderMoves", {{"A", path("x{/}y{/}B", "{default}{/}B")}})
-            .Before({{UserHive, UserValue("\"Path\"=\"x{/2}y\"")}}),
+            .Before({{UserHive, UserValue("\"Path\"=\"x{/}y\"")}}),
         Scenario("HiddenAndSystemFilesAreWrittenAndKeepTheirAttributes")
             .Before({{CfgPlace + "#", "HS"}, {PresetPlace + "#", "HS"}})
             .FolderCfg(Written(MovedFrom), Written(MovedTo))
             .Preset(Stored(MovedFrom), Stored(MovedTo))
             .LogOfA(found, PresetLine(Updated)),
-        Scenario("AnEmptyFolderCfgStays").FolderCfg("").LogOfDisabledA("").LibraryReports(),
+        Scenario("AnEmptyFolderCfgStays").FolderCfg("").LogOfA("", "", Disabled).LibraryReports(),
         Scenario("ATruncatedFolderCfgStays")
             .FolderCfg(Foreign(MovedFrom).substr(0, 700))
-            .LogOfDisabledA("")
+            .LogOfA("", "", Disabled)
             .LibraryReports(),
     };
 }

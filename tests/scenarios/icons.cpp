@@ -28,7 +28,7 @@ Scenario States(const Text& name, const Text& letter)
     for (const auto& [icon, enabled, error] : {State{"hf_error_active", "1", "Error.er"},
                                                {"hf_error_inactive", "", "Error.er"},
                                                {"hf_folder", "1", "Error.er/"},
-                                               {"hf_folder_disabled", "01", "Error.er/"}})
+                                               {Disabled, "01", "Error.er/"}})
     {
         const Text folder = "hot/" + icon;
         const Text copy = folder + "/[P]/" + icon + ".ico";
@@ -67,7 +67,7 @@ std::vector<Scenario> Icons()
 // A folder that already has a user's Desktop.ini.
 std::vector<Scenario> DesktopInis()
 {
-    const Text disabled = IconFile("hf_folder_disabled");
+    const Text disabled = IconFile(Disabled);
     const Text users =
         "; "
         "mine\n[ViewState]\nMode=\n[.shellclassinfo]\n\n;IconFile=no\nICONFILE=x.ico\nIconIndex=3\n"
@@ -131,7 +131,7 @@ std::vector<Scenario> ShellCalls()
                                   "notify 8000 1003  -7\nnotify 8 1005 {ini} 0\n"
                                   "notify 8000000 1000  0\n",
                                   "{ini}", "{hot}{/}A{/}Desktop.ini");
-    const Text iconFile = IconFile("hf_folder_disabled");
+    const Text iconFile = IconFile(Disabled);
     const auto told = [&](const Text& name, const Text& shell, const Text& calls, const Text& ini)
     {
         return Scenario(name)

@@ -25,7 +25,7 @@ std::vector<Scenario> PlantedLinks()
 {
     const Text cfg = Written(MovedFrom);
     const Text preset = Stored(MovedFrom);
-    const Text ini = IniHeader + IconFile("hf_folder_disabled") + "IconIndex=00\r\n" + InfoTip;
+    const Text ini = IniHeader + IconFile(Disabled) + "IconIndex=00\r\n" + InfoTip;
     const Text iniStays =
         "Desktop.ini left as it is (reached over a link): {hot}{/}A{/}Desktop.ini\n";
     std::vector<Scenario> scenarios = {
@@ -33,7 +33,7 @@ std::vector<Scenario> PlantedLinks()
             .Before({{"elsewhere/P/Folder.cfg", cfg},
                      {"elsewhere/P/hf_folder_disabled.ico", "old"},
                      {"hot/A/[P]/", "{link:elsewhere/P}"}})
-            .LogOfDisabledA(NoCfg()),
+            .LogOfA(NoCfg(), "", Disabled),
         Scenario("ALinkedPresetDirectoryIsNotOpened")
             .Before({{"elsewhere/P/presets.xml", preset}, {PresetDir + "/", "{link:elsewhere/P}"}})
             .LogOfPreset(CannotOpenPreset),
@@ -82,7 +82,7 @@ std::vector<Scenario> PlantedLinks()
         }
     };
     add(WithIcon("AFolderCfg").After({{Ini, ini}, {Ini + "#", "RS"}}), CfgPlace, cfg);
-    add(Scenario("AnIcon").LogOfDisabledA(NoCfg()), Icon, "old");
+    add(Scenario("AnIcon").LogOfA(NoCfg(), "", Disabled), Icon, "old");
     add(WithIcon("DesktopIni").Log(CopiedToA(iniStays)), Ini, "[.ShellClassInfo]\r\n");
     scenarios.back().Log(CopiedToA());
     add(Scenario("APreset").LogOfPreset(CannotOpenPreset), PresetDir + "/presets.xml", preset);

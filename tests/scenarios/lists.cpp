@@ -6,7 +6,7 @@ namespace
 
 Text Lines(const Text& name, int position)
 {
-    return FolderLines(name, position, NoIcon("hf_folder_disabled"), NoCfg(name));
+    return FolderLines(name, position, NoIcon(Disabled), NoCfg(name));
 }
 
 std::vector<Scenario> Lists()

@@ -14,7 +14,9 @@ std::vector<Scenario> Refusals()
     };
     return {
         refused("AReadOnlyFolderCfgStays", CfgPlace, "R").FolderCfg(cfg).LogOfA(found),
-        refused("AnUnreadableFolderCfgStays", CfgPlace, "0").FolderCfg(cfg).LogOfDisabledA(""),
+        refused("AnUnreadableFolderCfgStays", CfgPlace, "0")
+            .FolderCfg(cfg)
+            .LogOfA("", "", Disabled),
         refused("AnUnreadablePresetStays", PresetPlace, "0")
             .Preset(Stored(MovedFrom))
             .LogOfPreset("Unable to open preset.xml for read : "),

@@ -32,14 +32,14 @@ std::vector<Scenario> Registry()
             .LogOfA(foundNew + NoPreviousTo, NoPrevious),
         WithPrevious(
             "A32BitKeyHidesTheOtherEvenWithoutAValue",
-            "\"Path\"=\"{PREVIOUS}\"\r\n\r\n[HKEY_CURRENT_USER\\software\\wow6432node\\hf]")
+            "\"Path\"=\"{previous}\"\r\n\r\n[HKEY_CURRENT_USER\\software\\wow6432node\\hf]")
             .LogOfA(found + NoPrevious, NoPrevious),
         WithPrevious("A32BitKeyComesFirst",
                      "\"Path\"=\"x\"\r\n[HKEY_CURRENT_USER\\SOFTWARE\\Wow6432Node\\HF]\r\n\"PATH\"="
-                     "\"{PREVIOUS}\"")
+                     "\"{previous}\"")
             .Before({{MachineHive, MachineValue("\"InstallPath\"=\"x\"\r\n[HKEY_LOCAL_"
                                                 "MACHINE\\SOFTWARE\\Wow6432Node\\Vantorix\\QZA]\r\n"
-                                                "\"InstallPath\"=\"{APP}\"")}})
+                                                "\"InstallPath\"=\"{app}\"")}})
             .After({{CfgPlace, Written(MovedTo)}, {PresetPlace, Stored(MovedTo)}})
             .LogOfA(found, updated),
         WithPrevious("ATextOf258CharactersIsTooLong", "\"Path\"=\"" + Text(258, 'x') + "\"")
@@ -52,11 +52,11 @@ std::vector<Scenario> Registry()
         WithPrevious("AnUnterminatedOddValueIsReadToItsLastWholeUnit",
                      "\"Path\"=hex:78,00,79,00,7a")
             .LogOfA(found, updated),
-        WithPrevious("AFinalSeparatorMovesPresetsOnly", "\"Path\"=\"{PREVIOUS}{/2}\"")
+        WithPrevious("AFinalSeparatorMovesPresetsOnly", "\"Path\"=\"{previous}{/}\"")
             .After({{PresetPlace, Stored(MovedTo)}})
             .LogOfA(found, updated),
         Both("AFinalSeparatorIsDoubledInFolderCfgOnly", "U",
-             {{UserHive, UserValue("\"Path\"=\"{PREVIOUS}{/2}\"")}})
+             {{UserHive, UserValue("\"Path\"=\"{previous}{/}\"")}})
             .After({{CfgPlace, Written("{previous}{/}{/}Booklet.tpl")},
                     {PresetPlace, Stored(MovedFrom)}})
             .LogOfA(foundNew, updated),
@@ -65,7 +65,7 @@ std::vector<Scenario> Registry()
         Scenario("WithoutATemplateNoFolderIsLookedUp")
             .Before({{MachineHive, Removed}, {UserHive, "garbage"}})
             .FolderCfg("<H><ImposeSetting/></H>")
-            .LogOfDisabledA(Found(""), NoDefault + NoPrevious),
+            .LogOfA(Found(""), NoDefault + NoPrevious, Disabled),
     };
 }
 

@@ -7,7 +7,6 @@
 namespace
 {
 
-const Text Disabled = "hf_folder_disabled";
 const char* const NoLinks = "Wine does not show links to files as links";
 const char* const NoRefusal = "Wine lets every user open or list a directory";
 
@@ -95,7 +94,7 @@ Workstation
             .NotUnderWine(NoRefusal)
             .IsReported(R"(
 Workstation
-  problem  can't open file*
+  problem  can't open file*; no hot folder is migrated
   problem  there will be no run log: its folder cannot be written to: {user}{/}ORX_Installers{/})"),
         Done("NoFolderCanBeEntered")
             .Before({{"machine/hotfolder#", "0"}, {LogFolder + "#", "0"}, {JobPresets + "#", "0"}})
@@ -130,7 +129,7 @@ std::vector<Scenario> Templates()
         with("OnlyAPresetAsksForPath", {{UserHive, Removed}, {CfgPlace, Written("")}})
             .IsReported(R"(
 Job presets
-  problem  registry value Path in HKEY_CURRENT_USER\SOFTWARE\Wow6432Node\HF or \SOFTWARE\HF: {key}{nothing})"),
+  problem  registry value Path in HKEY_CURRENT_USER\SOFTWARE\Wow6432Node\HF or \SOFTWARE\HF: there is no such key{nothing})"),
         withPath("PathIsTooLong", Text(258, 'x')).IsReported(R"(
 {hot}{/}A
   problem  {Path}: longer than 257 characters{nothing})"),
@@ -146,12 +145,12 @@ Job presets
             .IsReported(R"(
 Job presets
   note     there are no presets in {user}{/}ORX{/}JPData{/})"),
-        withPath("PathEndsInASeparator", "{PREVIOUS}{/2}").IsReported(R"(
+        withPath("PathEndsInASeparator", "{previous}{/}").IsReported(R"(
 Workstation
   problem  {Path}: ends in a separator; no template of a hot folder moves
 {hot}{/}A
   problem  stays in the folder being left (the registry value ends in a separator): {previous}{/}Booklet.tpl)"),
-        withPath("PathEndsInASeparatorOnTheWayBack", "{PREVIOUS}{/2}").Run({"U"}).IsReported(R"(
+        withPath("PathEndsInASeparatorOnTheWayBack", "{previous}{/}").Run({"U"}).IsReported(R"(
 Workstation
   problem  {Path}: ends in a separator; it is doubled in the paths of hot folders)"),
         withPath("PathIsEmpty", "").IsReported(R"(
@@ -163,7 +162,7 @@ Workstation
         withPath("PathHoldsAnAmpersand", "{hot}&").Run({"U"}).IsReported(R"(
 Job presets
   problem  {Path}: holds & or <, which is inserted into presets as it is)"),
-        withPath("TheNewFolderIsBelowTheOld", "{APP}")
+        withPath("TheNewFolderIsBelowTheOld", "{app}")
             .Preset(Stored(MovedTo))
             .Before({{"default/template/Booklet.tpl", ""}})
             .IsReported(R"(
@@ -171,7 +170,7 @@ Job presets
   change   .P{/}Presets{/}presets.xml: {default}{/}Booklet.tpl -> {default}{/}template{/}Booklet.tpl
   problem  one template folder is below the other: another run would move paths of presets again)"),
         Done("BothFoldersAreTheSame")
-            .Before({{UserHive, UserValue("\"Path\"=\"{APP}{/2}template\"")}})
+            .Before({{UserHive, UserValue("\"Path\"=\"{app}{/}template\"")}})
             .IsReported(""),
         with("InstallPathIsANumber",
              {{MachineHive, MachineValue("\"InstallPath\"=dword:00000001")}})
@@ -439,13 +438,11 @@ TEST(Check, WritesToAFile)
     Workstation workstation;
     workstation.LayOut(
         WorkstationBefore(Done("").Before({{"hot/A/Bericht ä 版.txt", Text(10000, '.')}})));
-    const auto run = [&](const Text& file)
-    {
-        return workstation.Start("FolderUpgradeCheck", {"i", workstation.Expand(file)});
-    };
-    EXPECT_EQ(0, run("{hot}{/}A{/}Bericht ä 版.txt").status);
-    const Text report = ReadFile(workstation.HostPath("hot/A/Bericht ä 版.txt"));
-    const size_t head = report.find_first_of("\r\n");
+    const Text check = "FolderUpgradeCheck";
+    EXPECT_EQ(0, workstation.Start(check, {"i", "{hot}{/}A{/}Bericht ä 版.txt"}).status);
+    const Text report =
+        Replaced(ReadFile(workstation.HostPath("hot/A/Bericht ä 版.txt")), "\r", "");
+    const size_t head = report.find('\n');
     EXPECT_TRUE(std::regex_match(
         report.substr(0, head),
         std::regex("FolderUpgradeCheck [0-9]+\\.[0-9]+\\.[0-9]+, upgrade, 20[0-9-]+ "
@@ -453,32 +450,14 @@ TEST(Check, WritesToAFile)
         << report;
     EXPECT_EQ(workstation.Expand("\nFrom {previous} to {default}\n\n"
                                  "0 changes, 0 problems, 0 notes\n"),
-              Replaced(report.substr(head), "\r", ""));
+              report.substr(head));
 
-    const RunResult refused = run("{hot}{/}none{/}a.txt");
+    const RunResult refused = workstation.Start(check, {"i", "{hot}{/}none{/}a.txt"});
     EXPECT_EQ(2, refused.status);
     EXPECT_EQ("", refused.output);
     const Text complaint = workstation.Expand(
         "FolderUpgradeCheck: the report cannot be written to {hot}{/}none{/}a.txt\n");
     EXPECT_EQ(complaint, refused.libraryLog);
-}
-
-TEST(Check, PrintsItsUsage)
-{
-    const Workstation workstation;
-    const Text usage = workstation.Start("FolderUpgradeCheck", {"--help"}).output;
-    EXPECT_TRUE(
-        StartsWith(usage, "Usage: FolderUpgradeCheck I|U [--from FOLDER] [--to FOLDER] [FILE]"));
-    EXPECT_TRUE(std::regex_match(workstation.Start("FolderUpgradeCheck", {"--version"}).output,
-                                 std::regex("FolderUpgradeCheck [0-9.]+\r?\n")));
-    for (const std::vector<Text>& wrong :
-         {std::vector<Text>{}, {"V"}, {"/I"}, {"I", "report", "V"}, {"I", "--to"}, {"I", ""}})
-    {
-        const RunResult run = workstation.Start("FolderUpgradeCheck", wrong);
-        EXPECT_EQ(3, run.status);
-        EXPECT_EQ("", run.output);
-        EXPECT_EQ(usage, run.libraryLog);
-    }
 }
 
 } // namespace

@@ -41,14 +41,15 @@ std::vector<Scenario> Runs()
             .Before({{LogPlace, Removed}, {LogPlace + "/", ""}}),
         Scenario("APercentSignIsLoggedAsItIs")
             .Before({{"hot/%d %s/", ""}})
-            .Log(FolderLines("%d %s", 1, NoIcon("hf_folder_disabled"), NoCfg("%d %s"))),
+            .Log(FolderLines("%d %s", 1, NoIcon(Disabled), NoCfg("%d %s"))),
         Scenario("AStoredPathStaysInItsLine")
             .FolderCfg(Minimal(forged))
-            .LogOfDisabledA(Found(u8"x\uFFFD\uFFFDEnd: Updating Impose path for JP "
-                                  u8"Presets\uFFFD\uFFFD\uFFFD\uFFFD\uFFFD\uFFFD\ty")),
+            .LogOfA(Found(u8"x\uFFFD\uFFFDEnd: Updating Impose path for JP "
+                          u8"Presets\uFFFD\uFFFD\uFFFD\uFFFD\uFFFD\uFFFD\ty"),
+                    "", Disabled),
         Scenario("AFolderNameStaysInItsLine")
             .Before({{"hot/x\ny/", ""}, {ListPlace, "<l><HotFolder path='{hot}{/}x&#10;y'/></l>"}})
-            .Log(FolderLines(u8"x\uFFFDy", 1, NoIcon("hf_folder_disabled"), NoCfg(u8"x\uFFFDy")))
+            .Log(FolderLines(u8"x\uFFFDy", 1, NoIcon(Disabled), NoCfg(u8"x\uFFFDy")))
             .NotOnWindows("no file name has a line end"),
     };
 }

@@ -105,9 +105,8 @@ std::vector<Scenario> Sizes()
                     {"Expanded variables", Elsewhere("&a5;&a5;&a5;", Times(300000, "$"))}}),
         listed("AListThatIsTooDeepIsEmpty", Times(6000, "<e>")).Log(""),
         listed("AListThatIsTooBigIsEmpty", listedA + Times(1600000, "<a/>")).Log(""),
-        listed("AListOf20000EntriesIsRead",
-               listedA + Times(20000, "<HotFolder path='{/}missing'/>"))
-            .Log(FolderLines("A", 1, NoIcon("hf_folder_disabled"), NoCfg("A"))),
+        listed("AListOf20000EntriesIsRead", listedA + Times(20000, "<HotFolder path='/missing'/>"))
+            .Log(FolderLines("A", 1, NoIcon(Disabled), NoCfg("A"))),
     };
 }
 

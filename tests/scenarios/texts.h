@@ -4,11 +4,16 @@
 #include "tests/scenario.h"
 #include "tests/text_files.h"
 
+/// The text COUNT times, with the repetition's six-digit number in place of a '#'.
 inline Text Times(int count, const Text& text)
 {
-    return "{times:" + std::to_string(count) + ":" + text + "}";
+    Text result;
+    for (int i = 0; i < count; ++i)
+        result += Replaced(text, "#", std::to_string(1000000 + i).substr(1));
+    return result;
 }
 
+inline const Text Disabled = "hf_folder_disabled";
 inline const Text LogFolder = "user/ORX_Installers";
 inline const Text JobPresets = "user/ORX/JPData";
 
@@ -113,7 +118,7 @@ inline Text NoCfg(const Text& name = "A")
 /// The lines of A if its icon is replaced and it has no Folder.cfg.
 inline Text CopiedToA(const Text& other = "")
 {
-    return FolderLines("A", 1, other + Copied("hf_folder_disabled"), NoCfg());
+    return FolderLines("A", 1, other + Copied(Disabled), NoCfg());
 }
 inline Text Untouched(const Text& reason)
 {
@@ -140,7 +145,7 @@ struct HotFolder
     Text cfg;
     Text becomes;
     Text impose;
-    Text icon = "hf_folder_disabled";
+    Text icon = Disabled;
 };
 
 inline Scenario HotFolders(const Text& whatHappens, const std::map<Text, HotFolder>& folders)
@@ -151,9 +156,7 @@ inline Scenario HotFolders(const Text& whatHappens, const std::map<Text, HotFold
     for (const auto& [name, folder] : folders)
     {
         const Text place = Replaced(CfgPlace, "A", name);
-        scenario.Before({{place, folder.cfg}});
-        if (!folder.becomes.empty())
-            scenario.After({{place, folder.becomes}});
+        scenario.Change(place, folder.cfg, folder.becomes);
         log += FolderLines(name, ++position, NoIcon(folder.icon),
                            Replaced(folder.impose, "{hot}{/}A", "{hot}{/}" + name));
     }

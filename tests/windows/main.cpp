@@ -5,24 +5,34 @@
 #include "tests/windows/trial_machine.h"
 
 #include <gtest/gtest.h>
+#include <wx/msw/registry.h>
+#include <wx/utils.h>
 
 #include <cstdio>
+
+namespace fs = std::filesystem;
 
 namespace
 {
 
 constexpr int NotHere = 3; // the exit status; 0 and 1 are those of the tests
 
-Text Version()
+// What the tool uses, and the scenarios remove: no key or folder of an installed client.
+std::vector<wxString> Keys()
 {
-    using Get = LONG(WINAPI*)(OSVERSIONINFOW*); // GetVersionEx says what the manifest lets it
-    OSVERSIONINFOW version = {};
-    version.dwOSVersionInfoSize = sizeof version;
-    const auto get = reinterpret_cast<Get>(
-        reinterpret_cast<void*>(GetProcAddress(GetModuleHandleW(L"ntdll.dll"), "RtlGetVersion")));
-    get(&version);
-    return std::to_string(version.dwMajorVersion) + "." + std::to_string(version.dwMinorVersion) +
-           "." + std::to_string(version.dwBuildNumber) + (IsWine() ? " (Wine)" : "");
+    std::vector<wxString> keys;
+    for (const wxString hive : {"HKEY_LOCAL_MACHINE", "HKEY_CURRENT_USER"})
+    {
+        for (const char* key : {"Vantorix", "HF", "Wow6432Node\\Vantorix", "Wow6432Node\\HF"})
+            keys.push_back(hive + "\\SOFTWARE\\" + key);
+    }
+    return keys;
+}
+
+std::vector<fs::path> Folders()
+{
+    return {MachineDataDir({}) / "hotfolder", UserDataDir({}) / "ORX",
+            UserDataDir({}) / "ORX_Installers"};
 }
 
 // Why the scenarios do not run; empty if they do.
@@ -33,21 +43,47 @@ Text WhyNot(int argc, char** argv)
     if (argc != 2 || argv[1] != Text("--this-machine-is-disposable"))
         return "The scenarios change the registry and the application data of this account. If\n"
                "nothing on this machine matters, add --this-machine-is-disposable.\n";
+    if (fs::exists(TrialDir()))
+        return "";
+    const Text there = "The hot folder client may be installed: there is ";
     Text reasons;
-    for (const Text& found :
-         std::filesystem::exists(TrialDir()) ? std::vector<Text>() : FindInstallation())
-        reasons += "The hot folder client may be installed: there is " + found + "\n";
+    for (const wxString& key : Keys())
+        reasons += wxRegKey(key).Exists() ? there + key.utf8_string() + "\n" : "";
+    for (const fs::path& folder : Folders())
+        reasons += GetFileAttributesW(folder.c_str()) != INVALID_FILE_ATTRIBUTES
+                       ? there + folder.u8string() + "\n"
+                       : "";
     return reasons;
 }
 
+void RemoveTrial()
+{
+    RemoveKeys();
+    for (const fs::path& folder : Folders())
+        RemoveTree(folder);
+    RemoveTree(TrialDir()); // last, because it is the mark of a trial
+}
+
 } // namespace
+
+fs::path TrialDir()
+{
+    return MachineDataDir({}) / "FolderUpgrade trial";
+}
+
+void RemoveKeys()
+{
+    for (const wxString& key : Keys())
+        wxRegKey(key).DeleteSelf();
+}
 
 int main(int argc, char** argv)
 {
     testing::InitGoogleTest(&argc, argv);
     std::setvbuf(stdout, nullptr, _IONBF, 0);
-    std::printf("Windows %s\nAccount %s, %s\nRedirection policy: %s\n\n", Version().c_str(),
-                AccountName().utf8_str().data(), IsElevated() ? "elevated" : "not elevated",
+    std::printf("%s\nAccount %s, %s\nRedirection policy: %s\n\n",
+                wxGetOsDescription().utf8_str().data(), AccountName().utf8_str().data(),
+                IsElevated() ? "elevated" : "not elevated",
                 RefusesLinksOfOthers() ? "links of others are refused"
                                        : "unknown to this system, or not in force");
     const Text whyNot = WhyNot(argc, argv);
@@ -57,7 +93,7 @@ int main(int argc, char** argv)
         return NotHere;
     }
     RemoveTrial();
-    std::filesystem::create_directory(TrialDir());
+    fs::create_directory(TrialDir());
     const int status = RUN_ALL_TESTS();
     RemoveTrial();
     const testing::UnitTest& all = *testing::UnitTest::GetInstance();

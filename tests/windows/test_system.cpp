@@ -1,14 +1,14 @@
-#include "tests/test_system.h"
-
 #include "platform/pinned_directory.h"
 #include "platform/started_process.h"
 #include "platform/system.h"
 #include "tests/windows/trial_machine.h"
+#include "tests/workstation.h"
 
 #include <wx/msw/registry.h>
 
 #include <algorithm>
 #include <regex>
+#include <share.h>
 #include <sstream>
 #include <stdexcept>
 
@@ -26,8 +26,7 @@ fs::path KnownFolder(int number)
     return path;
 }
 
-// A file that the program inherits, and may be that of an earlier one, which a program that it has
-// started can keep open.
+// A new file that the program inherits, and a program that it has started can keep open.
 HANDLE Inherited(const fs::path& path)
 {
     SECURITY_ATTRIBUTES inherited = {sizeof inherited, nullptr, TRUE};
@@ -92,11 +91,9 @@ void RunUnix(const Text& command)
     }
 }
 
-std::vector<fs::path>& RefusedPaths()
-{
-    static std::vector<fs::path> paths;
-    return paths;
-}
+// What Refuse has done.
+std::vector<fs::path> refusedPaths;
+std::vector<std::shared_ptr<FILE>> usedAlone;
 
 // After the equals sign: "text", dword:number or hex:bytes.
 void SetValue(wxRegKey& key, const wxString& name, const Text& stored)
@@ -105,8 +102,7 @@ void SetValue(wxRegKey& key, const wxString& name, const Text& stored)
     std::istringstream list(stored.substr(colon));
     wxMemoryBuffer bytes;
     if (stored[0] == '"')
-        key.SetValue(
-            name, wxString::FromUTF8(Replaced(stored.substr(1, stored.size() - 2), "\\\\", "\\")));
+        key.SetValue(name, wxString::FromUTF8(stored.substr(1, stored.size() - 2)));
     else if (StartsWith(stored, "dword"))
         key.SetValue(name, std::stol(stored.substr(colon), nullptr, 16));
     else
@@ -171,16 +167,18 @@ void SetRegistry(const std::vector<Text>& hives)
     }
 }
 
-RunResult RunToEnd(const Command& command, const fs::path& root, const fs::path& log)
+RunResult Workstation::Start(const Text& program, const std::vector<Text>& arguments,
+                             const Files& /*variables*/, int killAfter) const
 {
-    Text line = Quoted(command.program).substr(1);
-    for (const Text& argument : command.arguments)
-        line += Quoted(fs::u8path(argument)); // none has a quotation mark or ends in a backslash
+    Text line = Quoted(HostPath("tool/" + program + ".exe")).substr(1);
+    for (const Text& argument : arguments)
+        line += Quoted(
+            fs::u8path(Expand(argument))); // none has a quotation mark or ends in a backslash
     STARTUPINFOW startUp = {};
     startUp.cb = sizeof startUp;
     startUp.dwFlags = STARTF_USESTDHANDLES;
-    startUp.hStdOutput = Inherited(root / "output");
-    startUp.hStdError = Inherited(root / "errors");
+    startUp.hStdOutput = Inherited(m_root / "output");
+    startUp.hStdError = Inherited(m_root / "errors");
     PROCESS_INFORMATION process = {};
     if (!CreateProcessW(nullptr, fs::u8path(line).wstring().data(), nullptr, nullptr, TRUE,
                         CREATE_NO_WINDOW, nullptr, nullptr, &startUp, &process))
@@ -188,16 +186,16 @@ RunResult RunToEnd(const Command& command, const fs::path& root, const fs::path&
     CloseHandle(startUp.hStdOutput);
     CloseHandle(startUp.hStdError);
     // FolderUpgradeRun has to do without a person.
-    const bool isClosing = command.program.stem() != "FolderUpgradeRun";
+    const bool isClosing = program != "FolderUpgradeRun";
     Text boxes;
     Text last;
-    const DWORD limit = command.killAfter > 0 ? static_cast<DWORD>(command.killAfter) : TimeLimit;
+    const DWORD limit = killAfter > 0 ? static_cast<DWORD>(killAfter) : TimeLimit;
     const DWORD step = std::min<DWORD>(limit, 50);
     for (DWORD waited = 0;
          waited < limit && WaitForSingleObject(process.hProcess, step) == WAIT_TIMEOUT;
          waited += step)
     {
-        const Text text = ReadFile(log);
+        const Text text = ReadFile(HostPath(LogPlace));
         BoxSearch search = {process.dwProcessId, false};
         if (isClosing)
             EnumWindows(CloseIfOf, reinterpret_cast<LPARAM>(&search));
@@ -211,13 +209,8 @@ RunResult RunToEnd(const Command& command, const fs::path& root, const fs::path&
     GetExitCodeProcess(process.hProcess, &status);
     CloseHandle(process.hThread);
     CloseHandle(process.hProcess);
-    return {static_cast<int>(status & 0xFF), ReadFile(root / "output"),
-            ReadFile(root / "errors") + boxes};
-}
-
-bool IsSymbolicLink(const fs::path& path)
-{
-    return IsLink(path.wstring());
+    return {static_cast<int>(status & 0xFF), ReadFile(m_root / "output"),
+            ReadFile(m_root / "errors") + boxes};
 }
 
 void MakeLink(const fs::path& target, const fs::path& link)
@@ -229,14 +222,10 @@ void MakeLink(const fs::path& target, const fs::path& link)
                                  Quoted(link) + Quoted(target));
 }
 
-void MakeFifo(const fs::path& /*path*/)
-{
-    throw std::logic_error("Windows has no FIFOs among files");
-}
-
 void RemoveTree(const fs::path& path)
 {
-    for (const fs::path& refused : std::exchange(RefusedPaths(), {}))
+    usedAlone.clear();
+    for (const fs::path& refused : std::exchange(refusedPaths, {}))
         IsWine() ? RunUnix("chmod u+rwx" + UnixPath(refused))
                  : RunSystem("icacls.exe", Quoted(refused) + " /reset");
     const DWORD attributes = GetFileAttributesW(path.c_str());
@@ -244,7 +233,7 @@ void RemoveTree(const fs::path& path)
         return;
     SetFileAttributesW(path.c_str(), FILE_ATTRIBUTE_NORMAL);
     const bool isDirectory = (attributes & FILE_ATTRIBUTE_DIRECTORY) != 0;
-    if (isDirectory && !IsSymbolicLink(path))
+    if (isDirectory && !IsLink(path.wstring()))
     {
         for (const auto& entry : fs::directory_iterator(path))
             RemoveTree(entry.path());
@@ -260,7 +249,7 @@ void RemoveTree(const fs::path& path)
     }
 }
 
-void GiveAway(const std::vector<fs::path>& /*folders*/)
+void GiveAway(const fs::path& /*folder*/)
 {
 }
 
@@ -269,18 +258,14 @@ void Refuse(const fs::path& path, char letter)
     static const Files rights = {{"X", "(WD,AD,WEA,WA,DC,DE)"},
                                  {"L", "(RD)"},
                                  {"0", "(OI)(CI)(RD,REA,RA,X,WD,AD,WEA,WA,DC,DE)"}};
+    if (letter == '0' && fs::is_regular_file(path))
+    {
+        usedAlone.emplace_back(_wfsopen(path.c_str(), L"rb", _SH_DENYRW), fclose);
+        return;
+    }
     if (IsWine()) // where an access control list refuses nobody
         RunUnix((letter == 'X' ? "chmod a-w" : "chmod 0") + UnixPath(path));
     else
         RunSystem("icacls.exe", Quoted(path) + " /deny *S-1-1-0:" + rights.at(Text(1, letter)));
-    RefusedPaths().push_back(path);
-}
-
-std::shared_ptr<void> UseAlone(const fs::path& path)
-{
-    const HANDLE handle =
-        CreateFileW(path.c_str(), GENERIC_READ, 0, nullptr, OPEN_EXISTING, 0, nullptr);
-    if (handle == INVALID_HANDLE_VALUE)
-        throw std::runtime_error("cannot open " + path.u8string());
-    return std::shared_ptr<void>(handle, CloseHandle);
+    refusedPaths.push_back(path);
 }
