@@ -32,11 +32,22 @@ try() {
     outcome=0
     as_user "$wine" cmd /c 'C:\trial\trial.cmd' "$@" >/dev/null || outcome=$?
 }
+refuse() {
+    try
+    grep -q "$1" "$home/drive_c/trial/trial.txt" && [ $outcome = 3 ] || { cat "$home/drive_c/trial/trial.txt"; exit 1; }
+}
+kept="$home/drive_c/ProgramData/hotfolder"
+as_user mkdir "$kept"
+refuse hotfolder
+as_user rmdir "$kept"
+as_user mkdir -p "$home/drive_c/ProgramData/FolderUpgrade trial" # of another account
 as_user "$wine" reg add 'HKLM\SOFTWARE\Vantorix' /v Name /d kept /f >/dev/null
-try
-grep -q '^Nothing was changed\.' "$home/drive_c/trial/trial.txt" && [ $outcome = 3 ]
+refuse 'FolderUpgrade trial'
 as_user "$wine" reg query 'HKLM\SOFTWARE\Vantorix' /v Name >/dev/null
 as_user "$wine" reg delete 'HKLM\SOFTWARE\Vantorix' /f >/dev/null
+as_user rmdir "$home/drive_c/ProgramData/FolderUpgrade trial"
+as_user "$wine" cmd /c 'C:\trial\sandbox.cmd' </dev/null >/dev/null
+grep -q '<HostFolder>C:.trial</HostFolder>' "$home/drive_c/trial/trial.wsb"
 try "$@"
 tr -d '\r' <"$home/drive_c/trial/trial.txt"
 exit $outcome

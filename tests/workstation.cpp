@@ -3,6 +3,7 @@
 #include "platform/pinned_directory.h"
 #include "platform/system.h"
 
+#include <gtest/gtest.h>
 #include <wx/string.h>
 
 #include <algorithm>
@@ -71,9 +72,16 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser), m_root(
 
 Workstation::~Workstation()
 {
-    for (const Text& top : Tops())
-        RemoveTree(HostPath(top));
-    RemoveTree(m_root);
+    try
+    {
+        for (const Text& top : Tops())
+            RemoveTree(HostPath(top));
+        RemoveTree(m_root);
+    }
+    catch (const std::exception& error)
+    {
+        ADD_FAILURE() << error.what();
+    }
 }
 
 fs::path Workstation::HostPath(const Text& place) const

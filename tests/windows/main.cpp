@@ -15,7 +15,9 @@ namespace fs = std::filesystem;
 namespace
 {
 
-constexpr int NotHere = 3; // the exit status; 0 and 1 are those of the tests
+// Exit statuses beside 0 and 1, which are those of the tests.
+constexpr int BrokenOff = 2;
+constexpr int NotHere = 3;
 
 // What the tool uses, and the scenarios remove: no key or folder of an installed client.
 std::vector<wxString> Keys()
@@ -29,10 +31,24 @@ std::vector<wxString> Keys()
     return keys;
 }
 
+// A value of a key that a trial has made.
+const char* const Mark = "FolderUpgrade trial";
+
+bool IsUnmarked(const wxString& key)
+{
+    return wxRegKey(key).Exists() && !wxRegKey(key).HasValue(Mark);
+}
+
 std::vector<fs::path> Folders()
 {
     return {MachineDataDir({}) / "hotfolder", UserDataDir({}) / "ORX",
             UserDataDir({}) / "ORX_Installers"};
+}
+
+// Whether this account's trial is running, or was interrupted.
+bool IsMarked()
+{
+    return ReadFile(TrialDir() / "account") == AccountName().utf8_string();
 }
 
 // Why the scenarios do not run; empty if they do.
@@ -43,16 +59,14 @@ Text WhyNot(int argc, char** argv)
     if (argc != 2 || argv[1] != Text("--this-machine-is-disposable"))
         return "The scenarios change the registry and the application data of this account. If\n"
                "nothing on this machine matters, add --this-machine-is-disposable.\n";
-    if (fs::exists(TrialDir()))
-        return "";
     const Text there = "The hot folder client may be installed: there is ";
     Text reasons;
     for (const wxString& key : Keys())
-        reasons += wxRegKey(key).Exists() ? there + key.utf8_string() + "\n" : "";
-    for (const fs::path& folder : Folders())
-        reasons += GetFileAttributesW(folder.c_str()) != INVALID_FILE_ATTRIBUTES
-                       ? there + folder.u8string() + "\n"
-                       : "";
+        reasons += IsUnmarked(key) ? there + key.utf8_string() + "\n" : "";
+    std::vector<fs::path> folders = Folders();
+    folders.push_back(TrialDir());
+    for (const fs::path& folder : folders)
+        reasons += fs::exists(folder) && !IsMarked() ? there + folder.u8string() + "\n" : "";
     return reasons;
 }
 
@@ -61,7 +75,32 @@ void RemoveTrial()
     RemoveKeys();
     for (const fs::path& folder : Folders())
         RemoveTree(folder);
-    RemoveTree(TrialDir()); // last, because it is the mark of a trial
+    RemoveTree(TrialDir()); // last, because it has the mark
+}
+
+int RunTrial()
+{
+    for (const fs::path& folder : Folders())
+        AllowAll(folder);
+    AllowAll(TrialDir());
+    RemoveTrial();
+    WriteFile(TrialDir() / "account", AccountName().utf8_string());
+    const int status = RUN_ALL_TESTS();
+    RemoveTrial();
+    return status;
+}
+
+// Whatever ends this process also ends the programs that it has started, and they do not keep its
+// output open.
+void HoldPrograms()
+{
+    JOBOBJECT_EXTENDED_LIMIT_INFORMATION limits = {};
+    limits.BasicLimitInformation.LimitFlags = JOB_OBJECT_LIMIT_KILL_ON_JOB_CLOSE;
+    const HANDLE job = CreateJobObjectW(nullptr, nullptr);
+    SetInformationJobObject(job, JobObjectExtendedLimitInformation, &limits, sizeof limits);
+    AssignProcessToJobObject(job, GetCurrentProcess());
+    for (const DWORD stream : {STD_OUTPUT_HANDLE, STD_ERROR_HANDLE})
+        SetHandleInformation(GetStdHandle(stream), HANDLE_FLAG_INHERIT, 0);
 }
 
 } // namespace
@@ -74,7 +113,20 @@ fs::path TrialDir()
 void RemoveKeys()
 {
     for (const wxString& key : Keys())
+    {
+        if (IsUnmarked(key))
+            throw std::runtime_error("not the trial's: " + key.utf8_string());
         wxRegKey(key).DeleteSelf();
+    }
+}
+
+void MarkKeys()
+{
+    for (const wxString& key : Keys())
+    {
+        if (wxRegKey(key).Exists())
+            wxRegKey(key).SetValue(Mark, wxString());
+    }
 }
 
 int main(int argc, char** argv)
@@ -92,10 +144,17 @@ int main(int argc, char** argv)
         std::printf("%sNothing was changed.\n", whyNot.c_str());
         return NotHere;
     }
-    RemoveTrial();
-    fs::create_directory(TrialDir());
-    const int status = RUN_ALL_TESTS();
-    RemoveTrial();
+    int status = BrokenOff;
+    try
+    {
+        HoldPrograms();
+        status = RunTrial();
+    }
+    catch (const std::exception& error)
+    {
+        std::printf("%s\nThe trial was broken off. Start it once more.\n", error.what());
+        return status;
+    }
     const testing::UnitTest& all = *testing::UnitTest::GetInstance();
     std::printf("%d passed, %d failed, %d skipped\n", all.successful_test_count(),
                 all.failed_test_count(), all.skipped_test_count());

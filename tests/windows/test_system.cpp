@@ -51,13 +51,14 @@ BOOL CALLBACK CloseIfOf(HWND window, LPARAM data)
     return TRUE;
 }
 
-// Runs a program from the system's folder.
+// Runs a program from the system's folder. What it prints goes nowhere, which may change its
+// status.
 void RunSystem(const Text& program, const Text& arguments)
 {
-    const auto run = RunProgram(
+    const ProgramRun run = RunProgram(
         KnownFolder(CSIDL_SYSTEM).wstring() + L"\\" + wxString::FromUTF8(program),
         wxString::FromUTF8(arguments), std::chrono::steady_clock::now() + std::chrono::seconds(60));
-    if (run.whyNotStarted || run.exitStatus != 0)
+    if (run.whyNotStarted)
         throw std::runtime_error(program + " " + arguments);
 }
 
@@ -165,6 +166,7 @@ void SetRegistry(const std::vector<Text>& hives)
                 SetValue(key, wxString::FromUTF8(parts[1]), parts[2]);
         }
     }
+    MarkKeys();
 }
 
 RunResult Workstation::Start(const Text& program, const std::vector<Text>& arguments,
@@ -190,15 +192,15 @@ RunResult Workstation::Start(const Text& program, const std::vector<Text>& argum
     Text boxes;
     Text last;
     const DWORD limit = killAfter > 0 ? static_cast<DWORD>(killAfter) : TimeLimit;
-    const DWORD step = std::min<DWORD>(limit, 50);
-    for (DWORD waited = 0;
-         waited < limit && WaitForSingleObject(process.hProcess, step) == WAIT_TIMEOUT;
-         waited += step)
+    for (DWORD waited = 0, step = 50; waited < limit; waited += step)
     {
-        const Text text = ReadFile(HostPath(LogPlace));
+        step = std::min(step, limit - waited);
+        if (WaitForSingleObject(process.hProcess, step) == WAIT_OBJECT_0)
+            break;
         BoxSearch search = {process.dwProcessId, false};
         if (isClosing)
             EnumWindows(CloseIfOf, reinterpret_cast<LPARAM>(&search));
+        const Text text = ReadFile(HostPath(LogPlace));
         if (search.isFound && last != text) // a box may need a moment to close
             boxes += "A message box, with the run log\n" + (last = text);
     }
@@ -222,12 +224,19 @@ void MakeLink(const fs::path& target, const fs::path& link)
                                  Quoted(link) + Quoted(target));
 }
 
+void AllowAll(const fs::path& folder)
+{
+    if (!fs::exists(folder))
+        return;
+    IsWine() ? RunUnix("chmod -R u+rwX" + UnixPath(folder))
+             : RunSystem("icacls.exe", Quoted(folder) + " /reset /T /C /Q");
+}
+
 void RemoveTree(const fs::path& path)
 {
     usedAlone.clear();
     for (const fs::path& refused : std::exchange(refusedPaths, {}))
-        IsWine() ? RunUnix("chmod u+rwx" + UnixPath(refused))
-                 : RunSystem("icacls.exe", Quoted(refused) + " /reset");
+        AllowAll(refused);
     const DWORD attributes = GetFileAttributesW(path.c_str());
     if (attributes == INVALID_FILE_ATTRIBUTES)
         return;

@@ -6,5 +6,9 @@
 /// The folder for everything but the application data. It is there only during a trial, or after
 /// one that was interrupted.
 std::filesystem::path TrialDir();
-/// Removes all keys of the registry that the tool uses.
+/// Of the registry's keys that the tool uses, removes those that MarkKeys has marked, and throws if
+/// others are there.
 void RemoveKeys();
+void MarkKeys();
+/// Undoes what Refuse does to anything in a folder that is left from an interrupted trial.
+void AllowAll(const std::filesystem::path& folder);

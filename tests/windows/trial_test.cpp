@@ -27,11 +27,14 @@ TEST(OnlyOnWindows, TheShellShowsTheNewIconOfAReadOnlyFolder)
     Judge(files["hot/A#"] == "S" && files[ini + "#"] == "RS",
           "the attributes are " + files["hot/A#"] + " and " + files[ini + "#"]);
     Judge(files[ini].find("hf_folder_disabled.ico") != Text::npos, files[ini]);
+    CoInitialize(nullptr);
     SHFILEINFOW info = {};
-    SHGetFileInfoW(workstation.HostPath("hot/A").c_str(), 0, &info, sizeof info,
-                   SHGFI_ICONLOCATION);
+    const bool isAnswered = SHGetFileInfoW(workstation.HostPath("hot/A").c_str(), 0, &info,
+                                           sizeof info, SHGFI_ICONLOCATION) != 0;
     const fs::path shown = info.szDisplayName;
-    Judge(shown == workstation.HostPath(icon), "the icon is that in " + shown.u8string());
+    std::error_code ignored;
+    Judge(isAnswered && fs::equivalent(shown, workstation.HostPath(icon), ignored),
+          "the icon is that in " + shown.u8string());
 }
 
 TEST(OnlyOnWindows, KillsTearNoFile)
@@ -42,18 +45,23 @@ TEST(OnlyOnWindows, KillsTearNoFile)
     Workstation workstation;
     const Text before = workstation.Expand(Written(MovedFrom));
     const Text after = workstation.Expand(Written(MovedTo));
-    workstation.LayOut(WorkstationBefore(scenario));
-    const auto start = std::chrono::steady_clock::now();
-    workstation.Start("FolderUpgrade", {"I", "V"});
-    const std::chrono::duration<double, std::milli> duration =
-        std::chrono::steady_clock::now() - start;
+    double duration = 1e6; // ms, of the shortest of three runs
+    for (int run = 0; run < 3; ++run)
+    {
+        workstation.LayOut(WorkstationBefore(scenario));
+        const auto start = std::chrono::steady_clock::now();
+        workstation.Start("FolderUpgrade", {"I", "V"});
+        const auto end = std::chrono::steady_clock::now();
+        duration =
+            std::min(duration, std::chrono::duration<double, std::milli>(end - start).count());
+    }
     int torn = 0;
     int inTheMiddle = 0;
     for (int kill = 1; kill <= 50; ++kill)
     {
         workstation.LayOut(WorkstationBefore(scenario));
         workstation.Start("FolderUpgrade", {"I", "V"}, {},
-                          1 + static_cast<int>(duration.count() * kill / 50));
+                          1 + static_cast<int>(duration * kill / 50));
         int moved = 0;
         for (const auto& [place, text] : workstation.Snapshot())
         {
@@ -63,8 +71,9 @@ TEST(OnlyOnWindows, KillsTearNoFile)
         }
         inTheMiddle += moved > 0 && moved < 26 ? 1 : 0;
     }
-    Judge(torn == 0, std::to_string(torn) + " files torn by 50 kills, " +
-                         std::to_string(inTheMiddle) + " of them while files were rewritten");
+    Judge(torn == 0 && inTheMiddle > 10, std::to_string(torn) + " files torn by 50 kills, " +
+                                             std::to_string(inTheMiddle) +
+                                             " of them while files were rewritten");
 }
 
 } // namespace
