@@ -10,24 +10,12 @@
 namespace
 {
 
-// The text as far as it is the tool's: of a profile file on Windows, the lines that matter. Wine
-// rewrites all of it, and adds its own key.
-Text Meaning(const Text& place, Text text)
+// The text as far as it is the tool's. The shell may hide a Desktop.ini that it writes to.
+Text Meaning(const Text& place, const Text& text)
 {
-    if (!IsWindows || place.back() == '#' || place.find("Desktop.ini") == Text::npos)
+    if (!IsWindows || place.find("Desktop.ini") == Text::npos)
         return text;
-    text.erase(std::remove(text.begin(), text.end(), '\0'), text.end()); // of UTF-16
-    std::set<Text> meaning;
-    std::istringstream lines(text);
-    for (Text line; std::getline(lines, line);)
-    {
-        line.erase(line.find_last_not_of(" \t\r") + 1);
-        const auto end = std::find(line.begin(), line.end(), '=');
-        std::transform(line.begin(), end, line.begin(), ::tolower);
-        if (!line.empty() && line[0] != ';' && !StartsWith(line, "iconresource"))
-            meaning.insert(line);
-    }
-    return testing::PrintToString(meaning);
+    return place.back() == '#' ? Replaced(text, "H", "") : ProfileMeaning(text);
 }
 
 } // namespace
