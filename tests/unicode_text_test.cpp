@@ -29,6 +29,7 @@ TEST(UnicodeText, ALoneSurrogateIsNotText)
         EXPECT_FALSE(IsUnicodeText(TextOf(units)) || IsXmlText(TextOf(units))) << units[0];
     for (const unsigned unit : {0x1FU, 1U, 8U, 0xBU, 0xFFFEU, 0xFFFFU})
         EXPECT_TRUE(IsUnicodeText(TextOf({unit})) && !IsXmlText(TextOf({unit}))) << unit;
+    EXPECT_EQ(wxString::FromUTF8("\uFFFD~\uFFFD"), ToOneLine(TextOf({0x1F, '~', 0xD834})));
 }
 
 } // namespace
