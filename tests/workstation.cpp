@@ -8,7 +8,6 @@
 #include <algorithm>
 #include <cstdlib>
 #include <functional>
-#include <stdexcept>
 
 namespace fs = std::filesystem;
 

@@ -2,7 +2,6 @@
 #include "tests/scenarios/texts.h"
 
 #include <iterator>
-#include <sstream>
 
 namespace
 {
@@ -77,7 +76,7 @@ Scenario Encodings()
                  {UserHive, UserValue("\"Path\"=\"{hot}\"")}});
 }
 
-std::vector<Scenario> FolderCfgs()
+SCENARIOS(FolderCfgs)
 {
     const Text found = Found(MovedFrom);
     const Text written = MinimalWritten(MovedTo);
@@ -93,7 +92,7 @@ std::vector<Scenario> FolderCfgs()
         Encodings(),
         HotFolders(
             "AFolderCfgIsRewrittenInTheToolsForm",
-            {{"Foreign", {Foreign(MovedFrom), Written(MovedTo), found, "hf_folder"}},
+            {{"Foreign", {Data("foreign.cfg", MovedFrom), Written(MovedTo), found, "hf_folder"}},
              {"Incomplete", {Minimal(MovedFrom), written, found}},
              {"DocumentType",
               {Minimal(MovedFrom, "<!DOCTYPE h [<!ENTITY e 'x'>]>", "&e;"),
@@ -128,17 +127,13 @@ std::vector<Scenario> FolderCfgs()
             .Before({{UserHive, UserValue("\"Path\"=\"x{/}y\"")}}),
         Scenario("HiddenAndSystemFilesAreWrittenAndKeepTheirAttributes")
             .Before({{CfgPlace + "#", "HS"}, {PresetPlace + "#", "HS"}})
-            .FolderCfg(Written(MovedFrom), Written(MovedTo))
-            .Preset(Stored(MovedFrom), Stored(MovedTo))
+            .File(CfgPlace, Written(MovedFrom), Written(MovedTo))
+            .File(PresetPlace, Stored(MovedFrom), Stored(MovedTo))
             .LogOfA(found, PresetLine(Updated)),
-        Scenario("AnEmptyFolderCfgStays").FolderCfg("").LogOfA("", "", Disabled).LibraryReports(),
-        Scenario("ATruncatedFolderCfgStays")
-            .FolderCfg(Foreign(MovedFrom).substr(0, 700))
-            .LogOfA("", "", Disabled)
+        HotFolders("DamagedFolderCfgsStay",
+                   {{"Empty", {}}, {"Truncated", {Data("foreign.cfg", MovedFrom).substr(0, 700)}}})
             .LibraryReports(),
     };
 }
-
-TEST_SCENARIOS(FolderCfgs);
 
 } // namespace
