@@ -234,7 +234,7 @@ Text Rich()
                {root, "<!DOCTYPE H [<!ENTITY e \"t\">]>\n<?top?>" + root + "mine=\"7\" "},
                {"<a/>", Times(2000, "<r kind=\"alike\" number=\"#\" empty=\"\"/>")}, // no loss
                {entry, entry + " Mine=\"\" Value=\"1\"/>" + entry},
-               {end, "<Mine><b/></Mine>Note <!-- no loss -->" + end}})
+               {end, "<Mine><b/></Mine><Paths/>Note <!-- no loss -->" + end}})
         cfg = Replaced(cfg, from, to);
     return Replaced(cfg, "HotFolder", "Old");
 }
@@ -265,6 +265,7 @@ SCENARIOS(Contents)
                         R"(Value="2"> in <JobSetting>
   problem  Folder.cfg: loses <Mine>
   problem  Folder.cfg: loses <b> in <Mine>
+  problem  Folder.cfg: loses <Paths>
   problem  Folder.cfg: loses the text "Note"
 {moves}
 {hot}{/}B
