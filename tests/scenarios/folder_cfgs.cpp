@@ -1,4 +1,4 @@
-// Folder.cfg: what is read, what moves, and the form in which it is written again.
+// Folder.cfg: what is read, what moves, and the form in which it is written again; refused files.
 #include "tests/scenarios/texts.h"
 
 #include <iterator>
@@ -133,6 +133,31 @@ SCENARIOS(FolderCfgs)
         HotFolders("DamagedFolderCfgsStay",
                    {{"Empty", {}}, {"Truncated", {Data("foreign.cfg", MovedFrom).substr(0, 700)}}})
             .LibraryReports(),
+    };
+}
+
+// Stored files that a user who is not root cannot read or write; icons.cpp has the others.
+SCENARIOS(Refusals)
+{
+    const Text found = Found(MovedFrom);
+    const Text cfg = Written(MovedFrom);
+    const auto refused = [](const Text& name, const Text& place, const Text& attributes)
+    {
+        return Scenario(name).Before({{place + "#", attributes}}).AsOtherUser().LibraryReports();
+    };
+    return {
+        refused("AReadOnlyFolderCfgStays", CfgPlace, "R").File(CfgPlace, cfg).LogOfA(found),
+        refused("AnUnreadableFolderCfgStays", CfgPlace, "0")
+            .File(CfgPlace, cfg)
+            .LogOfA("", "", Disabled),
+        refused("AnUnreadablePresetStays", PresetPlace, "0")
+            .File(PresetPlace, Stored(MovedFrom))
+            .LogOfPreset("Unable to open preset.xml for read : "),
+        refused("AReadOnlyPresetStays", PresetPlace, "R")
+            .File(PresetPlace, Stored(MovedFrom))
+            .LogOfPreset("Unable to open preset.xml for write : "),
+        refused("AReadOnlyLogStays", LogPlace, "R").File(CfgPlace, cfg, Written(MovedTo)),
+        refused("AnUnreadableListIsEmpty", ListPlace, "0").Before({{"hot/A/", ""}}).Log(""),
     };
 }
 
