@@ -139,8 +139,8 @@ def print_limits(results, crossing, presets):
               ('tool / floor, log off, 1,000 folders', 'most', 1.15, ratio(1000, 'tool', 'floor')),
               ('time per folder, 10,000 / 10 folders', 'most', 1.1, growth),
               ('folders from which the script is quicker', 'least', 40, crossing),
-              ('64 MiB preset: tool / floor', 'most', 1.1, max(tool[0] / floor[0] for _, tool, floor in presets)),
-              ('64 MiB preset: bytes of memory per byte', 'most', 10, max(tool[1] for _, tool, _ in presets))]
+              ('60 MiB preset: tool / floor', 'most', 1.1, max(tool[0] / floor[0] for _, tool, floor in presets)),
+              ('60 MiB preset: bytes of memory per byte', 'most', 10, max(tool[1] for _, tool, _ in presets))]
     rows = []
     for what, bound, allowed, value in limits:
         measured = 'not measured'
@@ -173,8 +173,8 @@ def measure_native(build, old_tool, picture_path, counts):
                  for now in on_disk])
     with tempfile.TemporaryDirectory(prefix='bench ', dir=TMPFS) as root:
         presets = list(preset.measure(build, root))
-    print('\nA preset file of 64 MiB')
-    print_table(['64 MiB with', 'Tool (ms)', 'Floor (ms)', 'Tool / floor', 'Tool, memory per byte', 'Floor, memory'],
+    print('\nA preset file of 60 MiB')
+    print_table(['60 MiB with', 'Tool (ms)', 'Floor (ms)', 'Tool / floor', 'Tool, memory per byte', 'Floor, memory'],
                 [[name, f'{tool[0] * 1e3:.0f}', f'{floor[0] * 1e3:.0f}', f'{tool[0] / floor[0]:.2f}', f'{tool[1]:.1f}',
                   f'{floor[1]:.1f}'] for name, tool, floor in presets])
     print('\nThe limits')

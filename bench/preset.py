@@ -1,10 +1,10 @@
-"""The migration of a preset file of 64 MiB, compared with the library's reading, one replacement and writing."""
+"""The migration of a preset file of 60 MiB, compared with the library's reading, one replacement and writing."""
 import os
 import time
 
 from workstation import lay_out
 
-BYTES = 64 * 1024 * 1024
+BYTES = 60 * 1024 * 1024
 ROUNDS = 7
 KEY = 'ORXImposeTemplate">"'
 PATH = f'    <Setting Key="{KEY}/old/Booklet"</Setting>\r\n'.encode()
@@ -30,7 +30,7 @@ def run(command, station, text):
 def measure(build, root):
     """Each text's name, and the minimum time and maximum memory of the tool and of the floor.
 
-    The paths get longer when they move, which takes the most memory.
+    The paths get longer when they move, which takes the most memory; the file stays below the longest that is migrated.
     """
     station = lay_out.Workstation(root)
     station.put('user/registry/HKEY_CURRENT_USER.reg', HIVE.format('CURRENT_USER\\SOFTWARE\\HF', 'Path', '/old'))

@@ -9,6 +9,7 @@ a message box.
 """
 import pathlib
 import re
+import shutil
 import subprocess
 import sys
 import tempfile
@@ -48,11 +49,6 @@ def pack(folder, sign=""):
 
 
 class Workstation(lay_out.WineWorkstation):
-    def __init__(self, prefix):
-        super().__init__(prefix)
-        self.logs = self.user / "ORX_Installers"
-        self.product = self.root / "Program Files/Vantorix/QZA"
-
     def install(self, *command):
         """The exit status."""
         status = self.wine(*command)
@@ -77,23 +73,16 @@ class Workstation(lay_out.WineWorkstation):
         self.put("Elsewhere/Booklet", b"a template")
         folders = "".join(rf'<HotFolder path="C:\Hot Folders\{name}"/>' for name in "AB")
         self.put("machine/hotfolder/HotFolderList.cfg", f"<L>{folders}</L>")
-        for path in self.logs.glob("*"):
-            path.unlink()
+        shutil.rmtree(self.user / "ORX_Installers", ignore_errors=True)
         self.wine("reg", "delete", r"HKCU\SOFTWARE\HF", "/f")
         if previous:
             self.wine("reg", "add", r"HKCU\SOFTWARE\HF", "/v", "Path", "/d", previous, "/f")
 
     def look(self):
-        """The files of the hot folders and presets, except Desktop.ini, which Wine changes."""
+        """The files of the hot folders and the preset, except Desktop.ini, which Wine changes."""
         folders = {"Hot Folders": self.root / "Hot Folders", "user/ORX": self.user / "ORX"}
         return {f"{name}/{path}": text for name, folder in folders.items()
                 for path, text in files_below(folder).items() if not path.endswith("Desktop.ini")}
-
-    def registry(self):
-        with tempfile.TemporaryFile("w+") as output:
-            self.wine("reg", "query", r"HKLM\SOFTWARE\Vantorix\QZA", "/reg:64", output=output)
-            output.seek(0)
-            return dict(re.findall(r"^ +(\w+) +REG_SZ +(.*)$", output.read(), re.MULTILINE))
 
 
 def build_msi(package, version):
@@ -134,7 +123,6 @@ class Installers(unittest.TestCase):
                 found = subprocess.run([*verify, folder / program], check=False,
                                        capture_output=True).returncode
                 self.assertEqual(min(found, 1), status, (folder, program))
-        self.assertEqual(files_below(signed).keys(), files_below(self.package).keys())
         notices = (signed / "THIRD-PARTY-NOTICES.txt").read_text(encoding="utf-8")
         for phrase in ("wxWindows Library Licence", "Thai Open Source Software Center",
                        "winpthreads", "GCC RUNTIME LIBRARY EXCEPTION",
@@ -163,23 +151,22 @@ class Installers(unittest.TestCase):
         def check_step(command, version, files, mode="", status=0):
             """mode and status: those of the run."""
             self.assertEqual(station.install(*command), 0)
-            for _ in range(300 if version is None else 0):  # the uninstaller continues as a copy
-                if not (station.product / "uninstall.exe").exists():
+            product = station.root / "Program Files/Vantorix/QZA"
+            for _ in range(300):
+                if version or not (product / "uninstall.exe").exists():
                     break
-                time.sleep(0.1)
-            installed = files_below(station.product)
-            installed = {name: text for name, text in installed.items()
+                time.sleep(0.1)  # the uninstaller continues as a copy
+            installed = {name: text for name, text in files_below(product).items()
                          if name in shipped or not name.startswith(("template", "uninstall.exe"))}
-            self.assertEqual(installed.keys(), shipped.keys() if version else set())
             self.assertEqual(installed, shipped if version else {})
-            values = {"InstallPath": PRODUCT, "Version": version} if version else {}
-            self.assertEqual(station.registry(), values)
+            key = station.wine("reg", "query", r"HKLM\SOFTWARE\Vantorix\QZA", "/reg:64")
+            self.assertEqual(key == 0, version is not None)
             self.assertEqual(station.look(), files)
-            logs = {name: text.decode() for name, text in files_below(station.logs).items()}
+            logs = files_below(station.user / "ORX_Installers")
             names = [f"FolderUpgrade-{mode}{end}" for end in (".log", "-before.txt", "-after.txt")]
             self.assertEqual(logs.keys(), {"UpgradeDowngrade.log", *names} if mode else set())
             if mode:
-                last = logs[names[2]].splitlines()[-1]
+                last = logs[names[2]].splitlines()[-1].decode()
                 self.assertEqual(last, f"Exit status of FolderUpgradeRun: {status}")
 
         station.lay_out(PREVIOUS, None)

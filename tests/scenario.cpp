@@ -18,22 +18,12 @@ Scenario& Scenario::After(const Files& files)
     return *this;
 }
 
-Scenario& Scenario::Change(const Text& place, const Text& text, const Text& becomes)
+Scenario& Scenario::File(const Text& place, const Text& text, const Text& becomes)
 {
     before[place] = text;
     if (!becomes.empty())
         after[place] = becomes;
     return *this;
-}
-
-Scenario& Scenario::FolderCfg(const Text& text, const Text& becomes)
-{
-    return Change(CfgPlace, text, becomes);
-}
-
-Scenario& Scenario::Preset(const Text& text, const Text& becomes)
-{
-    return Change(PresetPlace, text, becomes);
 }
 
 Scenario& Scenario::Log(const Text& folders, const Text& presets)

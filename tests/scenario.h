@@ -51,12 +51,8 @@ struct Scenario
     Scenario& Before(const Files& files);
     /// Files that change. Every other file and attribute has to stay as it is.
     Scenario& After(const Files& files);
-    /// The file before and after; without the second text, it stays.
-    Scenario& Change(const Text& place, const Text& text, const Text& becomes = "");
-    /// The Folder.cfg of the hot folder A, before and after.
-    Scenario& FolderCfg(const Text& text, const Text& becomes = "");
-    /// The same for presets.xml of the one directory with presets.
-    Scenario& Preset(const Text& text, const Text& becomes = "");
+    /// One file, before and after; without the second text, it stays.
+    Scenario& File(const Text& place, const Text& text, const Text& becomes = "");
     /// The command line arguments; {"I"} if not given.
     SETTER(Run, arguments, )
     /// For tests of refusals: root is refused nothing.
@@ -114,7 +110,9 @@ inline void PrintTo(const Scenario& scenario, std::ostream* stream)
     *stream << scenario.name;
 }
 
-/// Makes tests from the scenarios that the function returns, with its name.
-#define TEST_SCENARIOS(function)                                                                   \
-    INSTANTIATE_TEST_SUITE_P(function, Workstations, testing::ValuesIn(function()),                \
-                             [](const auto& scenario) { return TestName(scenario.param); })
+/// The head of a function that returns scenarios, which become a group of tests of that name.
+#define SCENARIOS(group)                                                                           \
+    std::vector<Scenario> group();                                                                 \
+    INSTANTIATE_TEST_SUITE_P(group, Workstations, testing::ValuesIn(group()),                      \
+                             [](const auto& scenario) { return TestName(scenario.param); });       \
+    std::vector<Scenario> group()

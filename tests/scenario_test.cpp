@@ -5,7 +5,6 @@
 #include <cctype>
 #include <regex>
 #include <set>
-#include <sstream>
 
 namespace
 {
@@ -47,13 +46,13 @@ void ExpectEqual(const Files& expected, const Files& actual, const Text& when)
     }
 }
 
-Files Expected(const Workstation& workstation, const Files& before, const Scenario& scenario)
+Files Expected(const Workstation& workstation, const Files& before, const Scenario& scenario,
+               const Text& mode)
 {
     Files expected = before;
     for (const auto& [place, text] : scenario.after)
         expected[place] = workstation.Expand(text);
-    const Text& mode = scenario.arguments.empty() ? "" : scenario.arguments[0];
-    const bool isUpgrade = mode == "I" || mode == "i";
+    const bool isUpgrade = mode != "U" && mode != "u";
     Text log = Replaced(scenario.log, "{start}",
                         isUpgrade ? "Installation : Upgrade call with switch: I\n"
                                   : "Un-installation : Downgrade call with switch: U\n");
@@ -119,12 +118,6 @@ std::set<Text> ChangedPlaces(const Files& before, const Files& after)
     return changed;
 }
 
-bool IsRun(const Scenario& scenario)
-{
-    const auto& given = scenario.arguments;
-    return !given.empty() && given[0].size() == 1 && Text("IiUu").find(given[0]) != Text::npos;
-}
-
 } // namespace
 
 TEST_P(Workstations, IsAsExpectedAfterTheRun)
@@ -141,7 +134,9 @@ TEST_P(Workstations, IsAsExpectedAfterTheRun)
                   Check(workstation, scenario.arguments).lines);
         return;
     }
-    const Report check = IsRun(scenario) ? Check(workstation, {scenario.arguments[0]}) : Report();
+    const Text mode = scenario.arguments.empty() ? "" : scenario.arguments[0];
+    const bool isRun = std::regex_match(mode, std::regex("[IiUu]"));
+    const Report check = isRun ? Check(workstation, {mode}) : Report();
     const bool isRecorded = !scenario.shellVersion.empty();
     const RunResult run =
         workstation.Start(isRecorded ? "FolderUpgradeRecorded" : "FolderUpgrade",
@@ -155,11 +150,11 @@ TEST_P(Workstations, IsAsExpectedAfterTheRun)
         EXPECT_EQ("A message box, with the run log\n" + after.at(LogPlace), run.libraryLog)
             << "One box, after everything was done";
     }
-    ExpectEqual(Expected(workstation, before, scenario), after, " after the run");
-    if (!IsRun(scenario) || isRecorded)
+    ExpectEqual(Expected(workstation, before, scenario, mode), after, " after the run");
+    if (!isRun || isRecorded)
         return;
     // If there are problems, a run may change less.
-    const Report second = Check(workstation, {scenario.arguments[0]});
+    const Report second = Check(workstation, {mode});
     const size_t changes = ChangedPlaces(before, after).size();
     EXPECT_TRUE(changes == check.changed.size() ||
                 (changes < check.changed.size() && check.problems > 0))

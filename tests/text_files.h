@@ -2,15 +2,39 @@
 #pragma once
 
 #include <filesystem>
+#include <fstream>
 #include <map>
+#include <sstream>
+#include <stdexcept>
 #include <string>
 
 using Text = std::string;
 using Files = std::map<Text, Text>; // place -> text
 
 /// Empty if there is no such file.
-Text ReadFile(const std::filesystem::path& path);
+inline Text ReadFile(const std::filesystem::path& path)
+{
+    std::ostringstream text;
+    text << std::ifstream(path, std::ios::binary).rdbuf();
+    return text.str();
+}
+
 /// Also creates the directories above the file.
-void WriteFile(const std::filesystem::path& path, const Text& text);
-Text Replaced(Text text, const Text& from, const Text& to);
-bool StartsWith(const Text& text, const Text& start);
+inline void WriteFile(const std::filesystem::path& path, const Text& text)
+{
+    std::filesystem::create_directories(path.parent_path());
+    if (!(std::ofstream(path, std::ios::binary) << text))
+        throw std::runtime_error("cannot write " + path.string());
+}
+
+inline Text Replaced(Text text, const Text& from, const Text& to)
+{
+    for (size_t at = text.find(from); at != Text::npos; at = text.find(from, at + to.size()))
+        text.replace(at, from.size(), to);
+    return text;
+}
+
+inline bool StartsWith(const Text& text, const Text& start)
+{
+    return text.compare(0, start.size(), start) == 0;
+}

@@ -17,11 +17,7 @@ as_user() {
         env -u DISPLAY HOME="$home" USER="$user" TMPDIR="$home" WINEPREFIX="$home" WINEDEBUG=-all LC_ALL=C.UTF-8 \
         WINEDLLOVERRIDES="mscoree=;mshtml=" timeout 1500 "$@")
 }
-clean() {
-    as_user "$server" -k || true
-    rm -rf "$home"
-}
-trap clean EXIT
+trap 'as_user "$server" -k || true; rm -rf "$home"' EXIT
 chown "$user" "$home"
 as_user "$wine" wineboot --init 2>/dev/null
 # Windows that nobody sees need no display. The driver is chosen when the server starts.

@@ -9,7 +9,6 @@
 #include <algorithm>
 #include <cstdlib>
 #include <functional>
-#include <stdexcept>
 
 namespace fs = std::filesystem;
 

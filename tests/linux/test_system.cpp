@@ -1,7 +1,6 @@
 #include "tests/workstation.h"
 
 #include <cstdlib>
-#include <stdexcept>
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -14,16 +13,6 @@ namespace
 Text Quoted(const Text& text)
 {
     return "'" + text + "' ";
-}
-
-// The limits of a run, as the beginning of its command. A program with sanitizers needs more.
-const Text& Limits()
-{
-    static const Text program = ReadFile(ProgramDir() / "FolderUpgrade");
-    static const Text limits = program.find("__asan_init") == Text::npos
-                                   ? "ulimit -v 700000; exec timeout 10 "
-                                   : "exec timeout 120 ";
-    return limits;
 }
 
 } // namespace
@@ -63,7 +52,10 @@ void SetRegistry(const std::vector<Text>& /*hives*/)
 RunResult Workstation::Start(const Text& program, const std::vector<Text>& arguments,
                              const Files& variables, int /*killAfter*/) const
 {
-    Text line = Limits();
+    // A program with sanitizers needs more.
+    static const bool isSanitized =
+        ReadFile(ProgramDir() / "FolderUpgrade").find("__asan_init") != Text::npos;
+    Text line = isSanitized ? "exec timeout 120 " : "ulimit -v 700000; exec timeout 10 ";
     line += m_asOtherUser && geteuid() == 0
                 ? "setpriv --reuid=nobody --regid=nogroup --clear-groups env "
                 : "env ";

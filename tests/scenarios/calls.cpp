@@ -3,10 +3,7 @@
 #include "tests/scenarios/texts.h"
 
 #include <chrono>
-#include <filesystem>
-#include <fstream>
 #include <regex>
-#include <sstream>
 
 namespace fs = std::filesystem;
 
@@ -39,12 +36,12 @@ Scenario Moving(const Text& name)
                  {UserHive, UserValue("\"Path\"=\"{tool}{/}previous\"")}})
         .Before({{"tool/previous/Booklet.tpl", ""}, {"tool/template/Booklet.tpl", ""}})
         .Before({{CfgPlace, Written(Old)}})
-        .Preset(Stored(Old), Stored(New));
+        .File(PresetPlace, Stored(Old), Stored(New));
 }
 
 Scenario Staying(const Text& name)
 {
-    return Moving(name).Preset(Stored(Old), Stored(Old));
+    return Moving(name).File(PresetPlace, Stored(Old), Stored(Old));
 }
 
 Scenario Into(const Text& name, const Files& files)
@@ -61,7 +58,7 @@ std::vector<Call> Calls()
         {Moving("AllIsDoneAndTheLogFolderIsMade").Before({{LogPlace, Removed}}), 0},
         {Moving("TheWayBack")
              .Before({{CfgPlace, Written(New)}})
-             .Preset(Stored(New), Stored(Old))
+             .File(PresetPlace, Stored(New), Stored(Old))
              .Run({"u", "--limit", "600"}),
          0},
         {Into("EarlierResultsAreReplaced", {{Folder + after, Text(9999, '.')}}), 0, "", Folder},
@@ -72,7 +69,7 @@ std::vector<Call> Calls()
          2, "", ""},
         {Into("AReportIsALink", {{Folder + after, "{link:elsewhere/a}"}, {"elsewhere/a", "stays"}})
              .After({{"elsewhere/a", "stays"}})
-             .NotUnderWine("Wine does not show links to files as links"),
+             .NotUnderWine(NoLinks),
          2, "", ""},
         {Moving("ABoxWithAListIsClosed")
              .Before({{CfgPlace + "#", "R"}, {"hot/B/[P]/Folder.cfg", ""}})

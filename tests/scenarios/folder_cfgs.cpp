@@ -1,8 +1,7 @@
-// Folder.cfg: what is read, what moves, and the form in which it is written again.
+// Folder.cfg: what is read, what moves, and the form in which it is written again; refused files.
 #include "tests/scenarios/texts.h"
 
 #include <iterator>
-#include <sstream>
 
 namespace
 {
@@ -77,7 +76,7 @@ Scenario Encodings()
                  {UserHive, UserValue("\"Path\"=\"{hot}\"")}});
 }
 
-std::vector<Scenario> FolderCfgs()
+SCENARIOS(FolderCfgs)
 {
     const Text found = Found(MovedFrom);
     const Text written = MinimalWritten(MovedTo);
@@ -93,7 +92,7 @@ std::vector<Scenario> FolderCfgs()
         Encodings(),
         HotFolders(
             "AFolderCfgIsRewrittenInTheToolsForm",
-            {{"Foreign", {Foreign(MovedFrom), Written(MovedTo), found, "hf_folder"}},
+            {{"Foreign", {Data("foreign.cfg", MovedFrom), Written(MovedTo), found, "hf_folder"}},
              {"Incomplete", {Minimal(MovedFrom), written, found}},
              {"DocumentType",
               {Minimal(MovedFrom, "<!DOCTYPE h [<!ENTITY e 'x'>]>", "&e;"),
@@ -128,17 +127,38 @@ std::vector<Scenario> FolderCfgs()
             .Before({{UserHive, UserValue("\"Path\"=\"x{/}y\"")}}),
         Scenario("HiddenAndSystemFilesAreWrittenAndKeepTheirAttributes")
             .Before({{CfgPlace + "#", "HS"}, {PresetPlace + "#", "HS"}})
-            .FolderCfg(Written(MovedFrom), Written(MovedTo))
-            .Preset(Stored(MovedFrom), Stored(MovedTo))
+            .File(CfgPlace, Written(MovedFrom), Written(MovedTo))
+            .File(PresetPlace, Stored(MovedFrom), Stored(MovedTo))
             .LogOfA(found, PresetLine(Updated)),
-        Scenario("AnEmptyFolderCfgStays").FolderCfg("").LogOfA("", "", Disabled).LibraryReports(),
-        Scenario("ATruncatedFolderCfgStays")
-            .FolderCfg(Foreign(MovedFrom).substr(0, 700))
-            .LogOfA("", "", Disabled)
+        HotFolders("DamagedFolderCfgsStay",
+                   {{"Empty", {}}, {"Truncated", {Data("foreign.cfg", MovedFrom).substr(0, 700)}}})
             .LibraryReports(),
     };
 }
 
-TEST_SCENARIOS(FolderCfgs);
+// Stored files that a user who is not root cannot read or write; icons.cpp has the others.
+SCENARIOS(Refusals)
+{
+    const Text found = Found(MovedFrom);
+    const Text cfg = Written(MovedFrom);
+    const auto refused = [](const Text& name, const Text& place, const Text& attributes)
+    {
+        return Scenario(name).Before({{place + "#", attributes}}).AsOtherUser().LibraryReports();
+    };
+    return {
+        refused("AReadOnlyFolderCfgStays", CfgPlace, "R").File(CfgPlace, cfg).LogOfA(found),
+        refused("AnUnreadableFolderCfgStays", CfgPlace, "0")
+            .File(CfgPlace, cfg)
+            .LogOfA("", "", Disabled),
+        refused("AnUnreadablePresetStays", PresetPlace, "0")
+            .File(PresetPlace, Stored(MovedFrom))
+            .LogOfPreset("Unable to open preset.xml for read : "),
+        refused("AReadOnlyPresetStays", PresetPlace, "R")
+            .File(PresetPlace, Stored(MovedFrom))
+            .LogOfPreset("Unable to open preset.xml for write : "),
+        refused("AReadOnlyLogStays", LogPlace, "R").File(CfgPlace, cfg, Written(MovedTo)),
+        refused("AnUnreadableListIsEmpty", ListPlace, "0").Before({{"hot/A/", ""}}).Log(""),
+    };
+}
 
 } // namespace

@@ -6,8 +6,6 @@
 namespace
 {
 
-const Text Ini = "hot/A/Desktop.ini";
-const Text Icon = "hot/A/[P]/hf_folder_disabled.ico";
 const char* const WineLosesSystem =
     "Wine loses SYSTEM on a read-only file of a user who is not root";
 
@@ -51,7 +49,7 @@ Scenario States(const Text& name, const Text& letter)
     return scenario.Run({letter}).Log(log);
 }
 
-std::vector<Scenario> Icons()
+SCENARIOS(Icons)
 {
     return {
         States("AnUpgradeShowsEachState", "I"),
@@ -59,13 +57,13 @@ std::vector<Scenario> Icons()
         Scenario("WithoutItsIconAFolderStays")
             .Before(
                 {{Icon, "old"}, {"tool/BundleIcons/hf_folder_disabled.ico", ""}, {Ini, "; mine\n"}})
-            .FolderCfg(Cfg("1"))
+            .File(CfgPlace, Cfg("1"))
             .LogOfA(""),
     };
 }
 
 // A folder that already has a user's Desktop.ini.
-std::vector<Scenario> DesktopInis()
+SCENARIOS(DesktopInis)
 {
     const Text disabled = IconFile(Disabled);
     const Text users =
@@ -101,8 +99,6 @@ std::vector<Scenario> DesktopInis()
                 "{utf16}" + IniHeader + "IconFile=ü.ico\r\nInfoTip=old\r\n",
                 "{utf16}" + IniHeader + disabled + InfoTip)
             .Before({{Ini + "#", "S"}}),
-        refresh("AnEmptyDesktopIniIsFilled", "", IniHeader + InfoTip + disabled)
-            .Before({{Ini + "#", "RS"}}),
         refresh("AReadOnlyDesktopIniAndIconOfTheUsersAreWritten", "",
                 IniHeader + InfoTip + disabled)
             .Before({{Ini + "#", "RS"}, {Icon + "#", "R"}})
@@ -123,7 +119,7 @@ std::vector<Scenario> DesktopInis()
 }
 
 // What the shell is asked for and told.
-std::vector<Scenario> ShellCalls()
+SCENARIOS(ShellCalls)
 {
     const Text version = "load shell32.dll\nfind DllGetVersion\nfree\n";
     const Text force = "force {hot}{/}A 10 .\\[_ORX_HotFolder_]\\hf_folder_disabled.ico 0 0 2\n";
@@ -151,9 +147,5 @@ std::vector<Scenario> ShellCalls()
         told("AnUnknownShellIsNotTold", "unknown", "", ""),
     };
 }
-
-TEST_SCENARIOS(ShellCalls);
-TEST_SCENARIOS(Icons);
-TEST_SCENARIOS(DesktopInis);
 
 } // namespace

@@ -5,11 +5,8 @@ namespace
 {
 
 const char* const NoPipes = "Windows has no pipes among files";
-const char* const WineFollowsLinks = "Wine shows neither links to files nor dangling ones as links";
 
 const Text PresetDir = JobPresets + "/.P/Presets";
-const Text Icon = "hot/A/[P]/hf_folder_disabled.ico";
-const Text Ini = "hot/A/Desktop.ini";
 const Text CannotOpenPreset = "Unable to open preset.xml for read : ";
 
 // What a run without a Folder.cfg does to A, whose icon exists.
@@ -21,7 +18,7 @@ Scenario WithIcon(const Text& name)
         .Log(CopiedToA());
 }
 
-std::vector<Scenario> PlantedLinks()
+SCENARIOS(PlantedLinks)
 {
     const Text cfg = Written(MovedFrom);
     const Text preset = Stored(MovedFrom);
@@ -29,28 +26,26 @@ std::vector<Scenario> PlantedLinks()
     const Text iniStays =
         "Desktop.ini left as it is (reached over a link): {hot}{/}A{/}Desktop.ini\n";
     std::vector<Scenario> scenarios = {
-        Scenario("ALinkedPrivateDirectoryIsIgnored")
+        Scenario("LinkedPrivateAndPresetDirectoriesAreNotOpened")
             .Before({{"elsewhere/P/Folder.cfg", cfg},
                      {"elsewhere/P/hf_folder_disabled.ico", "old"},
+                     {"elsewhere/P/presets.xml", preset},
+                     {PresetDir + "/", "{link:elsewhere/P}"},
                      {"hot/A/[P]/", "{link:elsewhere/P}"}})
-            .LogOfA(NoCfg(), "", Disabled),
-        Scenario("ALinkedPresetDirectoryIsNotOpened")
-            .Before({{"elsewhere/P/presets.xml", preset}, {PresetDir + "/", "{link:elsewhere/P}"}})
-            .LogOfPreset(CannotOpenPreset),
+            .LogOfA(NoCfg(), PresetLine(CannotOpenPreset), Disabled),
         Scenario("ALinkedLogFolderGetsNoLog")
             .Before({{LogPlace, Removed},
                      {"elsewhere/L/UpgradeDowngrade.log", "-"},
                      {LogFolder + "/", "{link:elsewhere/L}"}})
-            .FolderCfg(cfg, Written(MovedTo)),
-        Scenario("AHotFolderMayBeReachedOverALink")
-            .Before({{"elsewhere/A/[P]/Folder.cfg", cfg}, {"hot/A/", "{link:elsewhere/A}"}})
-            .After({{"elsewhere/A/[P]/Folder.cfg", Written(MovedTo)}})
-            .LogOfA(Found(MovedFrom)),
-        Scenario("AJobPresetDirectoryMayBeALink")
-            .Before({{"elsewhere/P/Presets/presets.xml", preset},
+            .File(CfgPlace, cfg, Written(MovedTo)),
+        Scenario("AHotFolderAndAJobPresetDirectoryMayBeLinks")
+            .Before({{"elsewhere/A/[P]/Folder.cfg", cfg},
+                     {"hot/A/", "{link:elsewhere/A}"},
+                     {"elsewhere/P/Presets/presets.xml", preset},
                      {JobPresets + "/.P/", "{link:elsewhere/P}"}})
-            .After({{"elsewhere/P/Presets/presets.xml", Stored(MovedTo)}})
-            .LogOfPreset(Updated),
+            .After({{"elsewhere/A/[P]/Folder.cfg", Written(MovedTo)},
+                    {"elsewhere/P/Presets/presets.xml", Stored(MovedTo)}})
+            .LogOfA(Found(MovedFrom), PresetLine(Updated)),
         Scenario("TheFoldersAboveThePresetsMayBeLinks")
             .Before({{JobPresets + "/", Removed},
                      {"elsewhere/ORX/other", ""},
@@ -61,9 +56,9 @@ std::vector<Scenario> PlantedLinks()
             .LogOfPreset(Updated),
         Scenario("ALinkedErrorFileCountsByItsName")
             .Before({{"elsewhere/other", ""}, {"hot/A/[P]/Error.er", "{link:elsewhere/missing}"}})
-            .FolderCfg(cfg, Written(MovedTo))
+            .File(CfgPlace, cfg, Written(MovedTo))
             .LogOfA(Found(MovedFrom), "", "hf_error_active")
-            .NotUnderWine(WineFollowsLinks),
+            .NotUnderWine(NoLinks),
     };
     // In that place: a link to a file with this text, a dangling link, and a pipe.
     const auto add = [&](const Scenario& scenario, const Text& place, const Text& text)
@@ -78,7 +73,7 @@ std::vector<Scenario> PlantedLinks()
             scenarios.back()
                 .Before({{"elsewhere/file", text}, {place, planted}})
                 .NotOnWindows(planted == "{fifo}" ? NoPipes : "")
-                .NotUnderWine(WineFollowsLinks);
+                .NotUnderWine(NoLinks);
         }
     };
     add(WithIcon("AFolderCfg").After({{Ini, ini}, {Ini + "#", "RS"}}), CfgPlace, cfg);
@@ -86,14 +81,12 @@ std::vector<Scenario> PlantedLinks()
     add(WithIcon("DesktopIni").Log(CopiedToA(iniStays)), Ini, "[.ShellClassInfo]\r\n");
     scenarios.back().Log(CopiedToA());
     add(Scenario("APreset").LogOfPreset(CannotOpenPreset), PresetDir + "/presets.xml", preset);
-    add(Scenario("TheLog").FolderCfg(cfg, Written(MovedTo)), LogPlace, "-");
+    add(Scenario("TheLog").File(CfgPlace, cfg, Written(MovedTo)), LogPlace, "-");
     scenarios.push_back(Scenario("TheListIsAPipe")
                             .Before({{ListPlace, "{fifo}"}, {"hot/A/", ""}})
                             .Log("")
                             .NotOnWindows(NoPipes));
     return scenarios;
 }
-
-TEST_SCENARIOS(PlantedLinks);
 
 } // namespace

@@ -4,7 +4,7 @@
 namespace
 {
 
-std::vector<Scenario> Presets()
+SCENARIOS(Presets)
 {
     const Text near = "x ORXImposeTemplate\">\"{previous}er{/}x\" ORXImposeTemplate\">\"{previous} "
                       "orximposetemplate\">\"{previous}\" ORXImposeTemplate='>\"{previous}\" "
@@ -13,12 +13,16 @@ std::vector<Scenario> Presets()
     const Text to = Stored(MovedTo);
     const auto updated = [](const Text& name, const Text& before, const Text& after)
     {
-        return Scenario(name).Preset(before).After({{PresetPlace, after}}).LogOfPreset(Updated);
+        return Scenario(name)
+            .File(PresetPlace, before)
+            .After({{PresetPlace, after}})
+            .LogOfPreset(Updated);
     };
     const auto left = [](const Text& name, const Text& preset, const Text& reason)
     {
-        return Scenario(name).Preset(preset).LogOfPreset("preset.xml left as it is (" + reason +
-                                                         "): ");
+        return Scenario(name)
+            .File(PresetPlace, preset)
+            .LogOfPreset("preset.xml left as it is (" + reason + "): ");
     };
     return {
         updated("EveryPathInTheFolderMoves",
@@ -50,7 +54,5 @@ std::vector<Scenario> Presets()
             .Log("", "Preset dirctory  not exist: {user}{/}ORX{/}JPData{/}\n" + NoPrevious),
     };
 }
-
-TEST_SCENARIOS(Presets);
 
 } // namespace

@@ -8,7 +8,11 @@ namespace
 Scenario Both(const Text& name, const Text& letter, const Files& hives)
 {
     const Text path = letter == "I" ? MovedFrom : MovedTo;
-    return Scenario(name).Before(hives).FolderCfg(Written(path)).Preset(Stored(path)).Run({letter});
+    return Scenario(name)
+        .Before(hives)
+        .File(CfgPlace, Written(path))
+        .File(PresetPlace, Stored(path))
+        .Run({letter});
 }
 
 Scenario WithPrevious(const Text& name, const Text& value)
@@ -16,7 +20,7 @@ Scenario WithPrevious(const Text& name, const Text& value)
     return Both(name, "I", {{UserHive, UserValue(value)}});
 }
 
-std::vector<Scenario> Registry()
+SCENARIOS(Registry)
 {
     const Text found = Found(MovedFrom);
     const Text foundNew = Found(MovedTo);
@@ -64,11 +68,9 @@ std::vector<Scenario> Registry()
             .LogOfA(found, updated),
         Scenario("WithoutATemplateNoFolderIsLookedUp")
             .Before({{MachineHive, Removed}, {UserHive, "garbage"}})
-            .FolderCfg("<H><ImposeSetting/></H>")
+            .File(CfgPlace, "<H><ImposeSetting/></H>")
             .LogOfA(Found(""), NoDefault + NoPrevious, Disabled),
     };
 }
-
-TEST_SCENARIOS(Registry);
 
 } // namespace

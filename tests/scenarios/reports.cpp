@@ -7,7 +7,6 @@
 namespace
 {
 
-const char* const NoLinks = "Wine does not show links to files as links";
 const char* const NoRefusal = "Wine lets every user open or list a directory";
 
 Text Cfg(char name)
@@ -37,10 +36,10 @@ Scenario Done(const Text& name)
     return Scenario(name)
         .Before(DoneFolder('A'))
         .Before({{"default/Booklet.tpl", ""}})
-        .Preset(Stored(MovedTo));
+        .File(PresetPlace, Stored(MovedTo));
 }
 
-std::vector<Scenario> Machines()
+SCENARIOS(Machines)
 {
     const Text missing = Times(23, "<HotFolder path='{hot}{/}#'/>");
     const auto listed = [](const Text& name, const Text& folders)
@@ -69,7 +68,9 @@ Workstation
 Workstation
   problem  HotFolderList.cfg: is not a file
   problem  there will be no run log: it is reached over a link: {log})"),
-        listed("AListIsEmpty", "").IsReported(R"(
+        listed("AListIsEmptyAndBothTemplateFoldersAreTheSame", "")
+            .Before({{UserHive, UserValue("\"Path\"=\"{app}{/}template\"")}})
+            .IsReported(R"(
 Workstation
   note     HotFolderList.cfg lists no hot folder)"),
         listed("NoListedFolderIsThere", "<HotFolder path='{hot}{/}B'/>").IsReported(R"(
@@ -109,12 +110,12 @@ Job presets
 }
 
 // The template folders: what is in the registry, and whether the templates are there.
-std::vector<Scenario> Templates()
+SCENARIOS(Templates)
 {
     const auto with = [](const Text& name, const Files& hives)
     {
         return Done(name)
-            .Preset(Stored("{hot}{/}A"))
+            .File(PresetPlace, Stored("{hot}{/}A"))
             .Before({{CfgPlace, Written(MovedFrom)}, {"previous/Booklet.tpl", ""}})
             .Before(hives);
     };
@@ -163,15 +164,12 @@ Workstation
 Job presets
   problem  {Path}: holds & or <, which is inserted into presets as it is)"),
         withPath("TheNewFolderIsBelowTheOld", "{app}")
-            .Preset(Stored(MovedTo))
+            .File(PresetPlace, Stored(MovedTo))
             .Before({{"default/template/Booklet.tpl", ""}})
             .IsReported(R"(
 Job presets
   change   .P{/}Presets{/}presets.xml: {default}{/}Booklet.tpl -> {default}{/}template{/}Booklet.tpl
   problem  one template folder is below the other: another run would move paths of presets again)"),
-        Done("BothFoldersAreTheSame")
-            .Before({{UserHive, UserValue("\"Path\"=\"{app}{/}template\"")}})
-            .IsReported(""),
         with("InstallPathIsANumber",
              {{MachineHive, MachineValue("\"InstallPath\"=dword:00000001")}})
             .IsReported(R"(
@@ -182,15 +180,16 @@ Job presets
   problem  the folder being installed holds a character that XML cannot store; no path of a )"
                         R"(preset moves)"),
         Done("TemplatesAreMissing")
-            .FolderCfg(Written("{default}{/}none"))
+            .File(CfgPlace, Written("{default}{/}none"))
             .Before(DoneFolder('B', Written("{previous}{/}Sub{/}T")))
             .Before(DoneFolder('C', Written("{hot}{/}C{/}D{/}T")))
             .Before({{"hot/C/D/", "{link:elsewhere/d}"},
                      {"default/D/", "{link:elsewhere/d}"},
                      {"elsewhere/d/T", ""}})
-            .Preset(Stored("{default}{/}D{/}T") + Stored("{hot}{/}..{/}Vorige 版{/}T") +
-                    Stored("{hot}{/}..{/}Vorige &#x7248;{/}&amp;") +
-                    Stored("{default}{/}&lt;&#65;&none;") + "ORXImposeTemplate\">\"{previous}")
+            .File(PresetPlace, Stored("{default}{/}D{/}T") + Stored("{hot}{/}..{/}Vorige 版{/}T") +
+                                   Stored("{hot}{/}..{/}Vorige &#x7248;{/}&amp;") +
+                                   Stored("{default}{/}&lt;&#65;&none;") +
+                                   "ORXImposeTemplate\">\"{previous}")
             .IsReported(R"(
 {hot}{/}A
   problem  no template at {default}{/}none
@@ -207,8 +206,8 @@ Job presets
   problem  .P{/}Presets{/}presets.xml: stays in the folder being left (stored as XML): )"
                         R"({hot}{/}..{/}Vorige 版{/}&)"),
         Done("ARehearsal")
-            .FolderCfg(Written("{hot}{/}old{/}T"))
-            .Preset(Stored("{hot}{/}old{/}T") + Stored("{hot}{/}old{/}T"))
+            .File(CfgPlace, Written("{hot}{/}old{/}T"))
+            .File(PresetPlace, Stored("{hot}{/}old{/}T") + Stored("{hot}{/}old{/}T"))
             .Before({{MachineHive, Removed}, {UserHive, Removed}})
             .Run({"I", "--from", "{hot}{/}old", "--to", "{hot}{/}new"})
             .IsReported(R"(
@@ -235,12 +234,12 @@ Text Rich()
                {root, "<!DOCTYPE H [<!ENTITY e \"t\">]>\n<?top?>" + root + "mine=\"7\" "},
                {"<a/>", Times(2000, "<r kind=\"alike\" number=\"#\" empty=\"\"/>")}, // no loss
                {entry, entry + " Mine=\"\" Value=\"1\"/>" + entry},
-               {end, "<Mine><b/></Mine><Paths/>Note <?mine?><!-- no loss -->" + end}})
+               {end, "<Mine><b/></Mine><Paths/>Note <!-- no loss -->" + end}})
         cfg = Replaced(cfg, from, to);
     return Replaced(cfg, "HotFolder", "Old");
 }
 
-std::vector<Scenario> Contents()
+SCENARIOS(Contents)
 {
     const Text hidden = Replaced(Written(MovedTo), " description=\"\"", "");
     const Text utf16 = Replaced(Replaced(Written(MovedFrom), "UTF-8", "UTF-16"), "𝄞", "");
@@ -249,7 +248,7 @@ std::vector<Scenario> Contents()
                                     : "";
     return {
         Done("Losses")
-            .FolderCfg(Rich())
+            .File(CfgPlace, Rich())
             .Before(DoneFolder('B', Replaced(Written(MovedFrom), " TimeInterval=\"010\"", "")))
             .Before(DoneFolder('C', Replaced(Written(MovedFrom), "Enable=\"1\"", "Enable=\"true\""),
                                Disabled))
@@ -268,7 +267,6 @@ std::vector<Scenario> Contents()
   problem  Folder.cfg: loses <b> in <Mine>
   problem  Folder.cfg: loses <Paths>
   problem  Folder.cfg: loses the text "Note"
-  problem  Folder.cfg: loses the instruction <?mine?>
 {moves}
 {hot}{/}B
   problem  Folder.cfg: lacks "TimeInterval", so the rewrite resets: PPDVersion, )"
@@ -428,10 +426,6 @@ Job presets
   problem  source icon missing: {tool}{/}BundleIcons{/}hf_folder.ico)"),
     };
 }
-
-TEST_SCENARIOS(Machines);
-TEST_SCENARIOS(Templates);
-TEST_SCENARIOS(Contents);
 
 TEST(Check, WritesToAFile)
 {

@@ -1,33 +1,33 @@
-// The command line and the run log.
+// The command line, the run log, and the list of hot folders.
 #include "tests/scenarios/texts.h"
 
 namespace
 {
 
-std::vector<Scenario> Runs()
+SCENARIOS(Runs)
 {
     const Text from = Written(MovedFrom);
     const Text to = Written(MovedTo);
     const Text found = Found(MovedFrom);
     const Text forged = "x&#13;&#10;End: Updating Impose path for JP "
-                        "Presets&#13;&#10;&#x2028;&#x2029;&#x85;&#x7F;&#9;y";
+                        "Presets&#13;&#10;~&#x7F;&#x9F;&#xA0;&#x2027;&#x2028;&#x2029;&#x202A;&#9;y";
     const auto moving = [&](const Text& name)
     {
-        return Scenario(name).FolderCfg(from, to);
+        return Scenario(name).File(CfgPlace, from, to);
     };
     return {
-        Scenario("WithoutASwitchNothingChanges").FolderCfg(from).Run({}),
+        Scenario("WithoutASwitchNothingChanges").File(CfgPlace, from).Run({}),
         Scenario("ADashedSwitchIsInvalid")
-            .FolderCfg(from)
+            .File(CfgPlace, from)
             .Run({"-I"})
             .WholeLog("Invalid call check calling parameter: exiting....\n"),
-        Scenario("AnInvalidSwitchIsNotLoggedWithV").FolderCfg(from).Run({"X", "V"}),
+        Scenario("AnInvalidSwitchIsNotLoggedWithV").File(CfgPlace, from).Run({"X", "V"}),
         moving("VLeavesTheLogAlone").Run({"I", "v"}),
         moving("AnUpgradeMovesTheTemplate").Run({"i"}).LogOfA(found),
         moving("VIsIgnoredBeforeAnotherArgument").Run({"I", "V", "x"}).LogOfA(found),
         moving("AnotherSecondArgumentIsIgnored").Run({"I", "W"}).LogOfA(found),
         Scenario("ADowngradeMovesTheTemplateBack")
-            .FolderCfg(to, from)
+            .File(CfgPlace, to, from)
             .Run({"u"})
             .LogOfA(Found(MovedTo)),
         moving("WithoutALogFolderTheRestIsDone").Before({{LogPlace, Removed}}),
@@ -43,9 +43,9 @@ std::vector<Scenario> Runs()
             .Before({{"hot/%d %s/", ""}})
             .Log(FolderLines("%d %s", 1, NoIcon(Disabled), NoCfg("%d %s"))),
         Scenario("AStoredPathStaysInItsLine")
-            .FolderCfg(Minimal(forged))
+            .File(CfgPlace, Minimal(forged))
             .LogOfA(Found(u8"x\uFFFD\uFFFDEnd: Updating Impose path for JP "
-                          u8"Presets\uFFFD\uFFFD\uFFFD\uFFFD\uFFFD\uFFFD\ty"),
+                          u8"Presets\uFFFD\uFFFD~\uFFFD\uFFFD\u00A0\u2027\uFFFD\uFFFD\u202A\ty"),
                     "", Disabled),
         Scenario("AFolderNameStaysInItsLine")
             .Before({{"hot/x\ny/", ""}, {ListPlace, "<l><HotFolder path='{hot}{/}x&#10;y'/></l>"}})
@@ -54,6 +54,41 @@ std::vector<Scenario> Runs()
     };
 }
 
-TEST_SCENARIOS(Runs);
+Text Lines(const Text& name, int position)
+{
+    return FolderLines(name, position, NoIcon(Disabled), NoCfg(name));
+}
+
+SCENARIOS(Lists)
+{
+    const auto listed = [](const Text& name, const Text& list)
+    {
+        return Scenario(name).Before({{"hot/A/", ""},
+                                      {"hot/b ü 漢/", ""},
+                                      {"hot/C/", ""},
+                                      {"hot/c/", ""},
+                                      {"hot/file", "x"},
+                                      {ListPlace, list}});
+    };
+    return {
+        listed("ListedFoldersThatExistAreTakenOnceAndInOrder",
+               "<any><!-- --><HotFolder/><HotFolder path=''/><HotFolder path='{hot}{/}missing'/>"
+               "<HotFolder path='{hot}{/}C '/><hotfolder path='{hot}{/}A'/>"
+               "<x><HotFolder path='{hot}{/}A'/></x><HotFolder path='{hot}{/}file'/>"
+               "<HotFolder Path='{hot}{/}A'/><HotFolder path=' {hot}{/}A'/>"
+               "<HotFolder z='1' path='{hot}{/}b ü 漢&#10;'/><HotFolder path='{hot}{/}C'/>"
+               "<HotFolder path='{hot}{/}c'/></any>")
+            .Log(Lines("C", 1) + Lines("b ü 漢", 2)),
+        Scenario("AMissingListStillMigratesPresets")
+            .Before({{ListPlace, Removed}})
+            .File(PresetPlace, Stored(MovedFrom), Stored(MovedTo))
+            .LogOfPreset(Updated),
+        listed("AMalformedListIsEmpty", "<any><HotFolder path='{hot}{/}A'/>")
+            .Log("")
+            .LibraryReports(),
+        listed("AUtf16ListIsRead", "{utf16}<a><HotFolder path='{hot}{/}b ü 漢'/></a>")
+            .Log(Lines("b ü 漢", 1)),
+    };
+}
 
 } // namespace

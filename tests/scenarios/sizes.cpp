@@ -50,7 +50,7 @@ HotFolder Elsewhere(const Text& stored, const Text& path)
     return {Replaced(Cfg("", dollars), MovedFrom, stored), "", Found(path)};
 }
 
-std::vector<Scenario> Sizes()
+SCENARIOS(Sizes)
 {
     const auto listed = [](const Text& name, const Text& list)
     {
@@ -109,7 +109,5 @@ std::vector<Scenario> Sizes()
             .Log(FolderLines("A", 1, NoIcon(Disabled), NoCfg("A"))),
     };
 }
-
-TEST_SCENARIOS(Sizes);
 
 } // namespace

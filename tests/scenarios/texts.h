@@ -2,7 +2,6 @@
 #pragma once
 
 #include "tests/scenario.h"
-#include "tests/text_files.h"
 
 /// The text COUNT times, with the repetition's six-digit number in place of a '#'.
 inline Text Times(int count, const Text& text)
@@ -14,6 +13,7 @@ inline Text Times(int count, const Text& text)
 }
 
 inline const Text Disabled = "hf_folder_disabled";
+inline const Text NoLinks = "Wine shows neither links to files nor dangling ones as links";
 inline const Text LogFolder = "user/ORX_Installers";
 inline const Text JobPresets = "user/ORX/JPData";
 
@@ -36,27 +36,19 @@ inline Text UserValue(const Text& value)
     return Hive("HKEY_CURRENT_USER\\SOFTWARE\\HF", value);
 }
 
-/// A file of tests/data, with the parts in double braces replaced.
-inline Text Data(const Text& file, const Files& values)
+/// A file of tests/data with this path.
+inline Text Data(const Text& file, const Text& path)
 {
-    Text text = ReadFile(ProgramDir() / DATA_DIR / file);
-    for (const auto& [name, value] : values)
-        text = Replaced(text, "{{" + name + "}}", value);
-    return text;
+    return Replaced(ReadFile(ProgramDir() / DATA_DIR / file), "{{path}}", path);
 }
 
-/// A Folder.cfg as the tool writes it.
+/// A Folder.cfg as the tool writes it; foreign.cfg has the same settings as another program may
+/// write them.
 inline Text Written(const Text& path,
                     const Text& filter = "<FilterSetting mode=\"2\" name=\"&lt;\">\n"
                                          "    <a/>\n  </FilterSetting>")
 {
-    return Data("written.cfg", {{"path", path}, {"filter", "  " + filter + "\n"}});
-}
-
-/// The same settings as another program may write them.
-inline Text Foreign(const Text& path)
-{
-    return Data("foreign.cfg", {{"path", path}});
+    return Replaced(Data("written.cfg", path), "{{filter}}", "  " + filter + "\n");
 }
 
 /// A Folder.cfg with only an imposition entry, and the same after a rewrite.
@@ -69,7 +61,7 @@ inline Text Minimal(const Text& path, const Text& declaration = "", const Text& 
 
 inline Text MinimalWritten(const Text& path, const Text& name = "n")
 {
-    return Data("minimal_written.cfg", {{"path", path}, {"name", name}});
+    return Replaced(Data("minimal_written.cfg", path), "{{name}}", name);
 }
 
 /// A template path as a preset stores it.
@@ -78,7 +70,10 @@ inline Text Stored(const Text& path)
     return "<K n=\"ORXImposeTemplate\">\"" + path + "\"</K>\r\n";
 }
 
-// Desktop.ini.
+// Desktop.ini and the icon of A.
+
+inline const Text Ini = "hot/A/Desktop.ini";
+inline const Text Icon = "hot/A/[P]/hf_folder_disabled.ico";
 
 inline const Text IniHeader = "[.ShellClassInfo]\r\n";
 inline const Text InfoTip = "InfoTip=This folder has been configured as an ORX hot folder.\r\n";
@@ -107,13 +102,10 @@ inline Text Copied(const Text& icon, const Text& folder = "A")
     return "Icon  copied from : {tool}{/}{icons}" + icon + ".ico To {hot}{/}" + folder +
            "{/}[_ORX_HotFolder_]{/}" + icon + ".ico \n";
 }
-inline Text CfgOf(const Text& name)
-{
-    return "{hot}{/}" + name + "{/}[_ORX_HotFolder_]{/}Folder.cfg\n";
-}
 inline Text NoCfg(const Text& name = "A")
 {
-    return "HF cfg file unable to read/exist: " + CfgOf(name);
+    return "HF cfg file unable to read/exist: {hot}{/}" + name +
+           "{/}[_ORX_HotFolder_]{/}Folder.cfg\n";
 }
 /// The lines of A if its icon is replaced and it has no Folder.cfg.
 inline Text CopiedToA(const Text& other = "")
@@ -122,11 +114,12 @@ inline Text CopiedToA(const Text& other = "")
 }
 inline Text Untouched(const Text& reason)
 {
-    return "HF cfg file left as it is (" + reason + "): " + CfgOf("A");
+    return "HF cfg file left as it is (" + reason +
+           "): {hot}{/}A{/}[_ORX_HotFolder_]{/}Folder.cfg\n";
 }
-inline Text Found(const Text& path, const Text& name = "A")
+inline Text Found(const Text& path)
 {
-    return "Imposepath:{hot}{/}" + name + "is: " + path + "\n";
+    return "Imposepath:{hot}{/}Ais: " + path + "\n";
 }
 inline Text PresetLine(const Text& line)
 {
@@ -142,9 +135,9 @@ inline const Text Updated = "Updated preset.xml  : ";
 /// about its template are as if its name were A.
 struct HotFolder
 {
-    Text cfg;
-    Text becomes;
-    Text impose;
+    Text cfg = {};
+    Text becomes = {};
+    Text impose = {};
     Text icon = Disabled;
 };
 
@@ -156,7 +149,7 @@ inline Scenario HotFolders(const Text& whatHappens, const std::map<Text, HotFold
     for (const auto& [name, folder] : folders)
     {
         const Text place = Replaced(CfgPlace, "A", name);
-        scenario.Change(place, folder.cfg, folder.becomes);
+        scenario.File(place, folder.cfg, folder.becomes);
         log += FolderLines(name, ++position, NoIcon(folder.icon),
                            Replaced(folder.impose, "{hot}{/}A", "{hot}{/}" + name));
     }

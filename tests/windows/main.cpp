@@ -1,8 +1,8 @@
 // Runs the scenarios on a machine where nothing can be lost.
 #include "platform/process_rights.h"
 #include "platform/system.h"
-#include "tests/test_system.h"
 #include "tests/windows/trial_machine.h"
+#include "tests/workstation.h"
 
 #include <gtest/gtest.h>
 #include <wx/msw/registry.h>

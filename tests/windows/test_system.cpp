@@ -9,8 +9,6 @@
 #include <algorithm>
 #include <regex>
 #include <share.h>
-#include <sstream>
-#include <stdexcept>
 
 namespace fs = std::filesystem;
 
@@ -18,13 +16,6 @@ namespace
 {
 
 constexpr DWORD TimeLimit = 120 * 1000; // ms, of a run
-
-fs::path KnownFolder(int number)
-{
-    wchar_t path[MAX_PATH] = {};
-    SHGetFolderPathW(nullptr, number, nullptr, SHGFP_TYPE_CURRENT, path);
-    return path;
-}
 
 // A new file that the program inherits, and a program that it has started can keep open.
 HANDLE Inherited(const fs::path& path)
@@ -35,11 +26,7 @@ HANDLE Inherited(const fs::path& path)
                        CREATE_ALWAYS, 0, nullptr);
 }
 
-struct BoxSearch
-{
-    DWORD process;
-    bool isFound;
-};
+using BoxSearch = std::pair<DWORD, bool>; // the process, and whether it has a box
 
 BOOL CALLBACK CloseIfOf(HWND window, LPARAM data)
 {
@@ -55,8 +42,8 @@ BOOL CALLBACK CloseIfOf(HWND window, LPARAM data)
 // status.
 void RunSystem(const Text& program, const Text& arguments)
 {
-    const ProgramRun run = RunProgram(
-        KnownFolder(CSIDL_SYSTEM).wstring() + L"\\" + wxString::FromUTF8(program),
+    const auto run = RunProgram(
+        _wgetenv(L"SystemRoot") + wxString("\\System32\\") + wxString::FromUTF8(program),
         wxString::FromUTF8(arguments), std::chrono::steady_clock::now() + std::chrono::seconds(60));
     if (run.whyNotStarted)
         throw std::runtime_error(program + " " + arguments);
@@ -96,24 +83,6 @@ void RunUnix(const Text& command)
 std::vector<fs::path> refusedPaths;
 std::vector<std::shared_ptr<FILE>> usedAlone;
 
-// After the equals sign: "text", dword:number or hex:bytes.
-void SetValue(wxRegKey& key, const wxString& name, const Text& stored)
-{
-    const size_t colon = stored.find(':') + 1;
-    std::istringstream list(stored.substr(colon));
-    wxMemoryBuffer bytes;
-    if (stored[0] == '"')
-        key.SetValue(name, wxString::FromUTF8(stored.substr(1, stored.size() - 2)));
-    else if (StartsWith(stored, "dword"))
-        key.SetValue(name, std::stol(stored.substr(colon), nullptr, 16));
-    else
-    {
-        for (Text byte; std::getline(list, byte, ',');)
-            bytes.AppendByte(static_cast<char>(std::stoul(byte, nullptr, 16)));
-        key.SetValue(name, bytes);
-    }
-}
-
 } // namespace
 
 bool IsWine()
@@ -138,32 +107,49 @@ fs::path NewRoot()
 
 fs::path UserDataDir(const fs::path& /*root*/)
 {
-    return KnownFolder(CSIDL_APPDATA);
+    return _wgetenv(L"APPDATA");
 }
 
 fs::path MachineDataDir(const fs::path& /*root*/)
 {
-    return KnownFolder(CSIDL_COMMON_APPDATA);
+    return _wgetenv(L"ProgramData");
 }
 
 void SetRegistry(const std::vector<Text>& hives)
 {
+    const std::regex form(R"x(\[(.*)\]|"(\w+)"=(?:"(.*)"|dword:(.*)|hex:(.*)))x");
     RemoveKeys();
     for (const Text& hive : hives)
     {
         wxRegKey key;
         std::istringstream lines(hive);
-        std::smatch parts;
         for (Text line; std::getline(lines, line);)
         {
+            std::smatch parts;
             line.erase(line.find_last_not_of('\r') + 1);
-            if (std::regex_match(line, parts, std::regex(R"(\[(.*)\])")))
+            if (!std::regex_match(line, parts, form))
+                continue;
+            const auto part = [&](size_t number)
             {
-                key.SetName(wxString::FromUTF8(parts[1]));
+                return wxString::FromUTF8(parts[number].str());
+            };
+            if (parts[1].matched)
+            {
+                key.SetName(part(1));
                 key.Create();
             }
-            else if (std::regex_match(line, parts, std::regex("\"(\\w+)\"=(.+)")))
-                SetValue(key, wxString::FromUTF8(parts[1]), parts[2]);
+            else if (parts[3].matched)
+                key.SetValue(part(2), part(3));
+            else if (parts[4].matched)
+                key.SetValue(part(2), std::stol(parts[4], nullptr, 16));
+            else
+            {
+                std::istringstream list(parts[5]);
+                wxMemoryBuffer bytes;
+                for (Text digits; std::getline(list, digits, ',');)
+                    bytes.AppendByte(static_cast<char>(std::stoul(digits, nullptr, 16)));
+                key.SetValue(part(2), bytes);
+            }
         }
     }
     MarkKeys();
@@ -201,7 +187,7 @@ RunResult Workstation::Start(const Text& program, const std::vector<Text>& argum
         if (isClosing)
             EnumWindows(CloseIfOf, reinterpret_cast<LPARAM>(&search));
         const Text text = ReadFile(HostPath(LogPlace));
-        if (search.isFound && last != text) // a box may need a moment to close
+        if (search.second && last != text) // a box may need a moment to close
             boxes += "A message box, with the run log\n" + (last = text);
     }
     if (WaitForSingleObject(process.hProcess, 0) == WAIT_TIMEOUT)

@@ -17,23 +17,21 @@ void Judge(bool isRight, const Text& found)
 
 TEST(OnlyOnWindows, TheShellShowsTheNewIconOfAReadOnlyFolder)
 {
-    const Text ini = "hot/A/Desktop.ini";
-    const Text icon = "hot/A/[P]/hf_folder_disabled.ico";
     Workstation workstation;
     workstation.LayOut(WorkstationBefore(Scenario("").Before(
-        {{icon, "old"}, {"hot/A#", "R"}, {ini, "[.ShellClassInfo]\r\n"}, {ini + "#", "RS"}})));
+        {{Icon, "old"}, {"hot/A#", "R"}, {Ini, "[.ShellClassInfo]\r\n"}, {Ini + "#", "RS"}})));
     workstation.Start("FolderUpgrade", {"I"});
     Files files = workstation.Snapshot();
-    Judge(files["hot/A#"] == "S" && files[ini + "#"] == "RS",
-          "the attributes are " + files["hot/A#"] + " and " + files[ini + "#"]);
-    Judge(files[ini].find("hf_folder_disabled.ico") != Text::npos, files[ini]);
+    Judge(files["hot/A#"] == "S" && files[Ini + "#"] == "RS",
+          "the attributes are " + files["hot/A#"] + " and " + files[Ini + "#"]);
+    Judge(files[Ini].find("hf_folder_disabled.ico") != Text::npos, files[Ini]);
     CoInitialize(nullptr);
     SHFILEINFOW info = {};
     const bool isAnswered = SHGetFileInfoW(workstation.HostPath("hot/A").c_str(), 0, &info,
                                            sizeof info, SHGFI_ICONLOCATION) != 0;
     const fs::path shown = info.szDisplayName;
     std::error_code ignored;
-    Judge(isAnswered && fs::equivalent(shown, workstation.HostPath(icon), ignored),
+    Judge(isAnswered && fs::equivalent(shown, workstation.HostPath(Icon), ignored),
           "the icon is that in " + shown.u8string());
 }
 
