@@ -5,11 +5,11 @@
 
 #include <optional>
 
-/// Copies the source's content and attributes, except read-only, over an existing file, as wxCopyFile does, whatever
-/// its length. Writes in place; but elsewhere than on Windows, where its own permissions do not
-/// prevent that, a file that cannot be written is replaced by a new one. Never writes through a
-/// link. If the disk has no room, the destination stays as it was; if another call fails, it may
-/// hold a part of the copy. Does not wait for the disk.
+/// Copies the source's content and attributes, except read-only, over an existing file, as
+/// wxCopyFile does, whatever its length. Writes in place; but elsewhere than on Windows, where its
+/// own permissions do not prevent that, a file that cannot be written is replaced by a new one.
+/// Never writes through a link. If the disk has no room, the destination stays as it was; if
+/// another call fails, it may hold a part of the copy. Does not wait for the disk.
 std::optional<FailedCall> CopyOver(const wxString& source, const PinnedDirectory& directory,
                                    const wxString& name);
 

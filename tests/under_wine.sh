@@ -30,7 +30,10 @@ try() {
 }
 refuse() {
     try
-    grep -q "$1" "$home/drive_c/trial/trial.txt" && [ $outcome = 3 ] || { cat "$home/drive_c/trial/trial.txt"; exit 1; }
+    if [ $outcome != 3 ] || ! grep -q "$1" "$home/drive_c/trial/trial.txt"; then
+        cat "$home/drive_c/trial/trial.txt"
+        exit 1
+    fi
 }
 kept="$home/drive_c/ProgramData/hotfolder"
 as_user mkdir "$kept"
