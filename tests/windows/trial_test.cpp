@@ -38,7 +38,8 @@ TEST(OnlyOnWindows, TheShellShowsTheNewIconOfAReadOnlyFolder)
 TEST(OnlyOnWindows, KillsTearNoFile)
 {
     Scenario scenario("");
-    for (char folder = 'A'; folder <= 'Z'; ++folder)
+    const int folders = IsWine() ? 10 : 26; // Wine is slower
+    for (char folder = 'A'; folder < 'A' + folders; ++folder)
         scenario.Before({{Text("hot/") + folder + "/[P]/Folder.cfg", Written(MovedFrom)}});
     Workstation workstation;
     const Text before = workstation.Expand(Written(MovedFrom));
@@ -67,7 +68,7 @@ TEST(OnlyOnWindows, KillsTearNoFile)
             moved += isCfg && text == after ? 1 : 0;
             torn += isCfg && text != before && text != after ? 1 : 0;
         }
-        inTheMiddle += moved > 0 && moved < 26 ? 1 : 0;
+        inTheMiddle += moved > 0 && moved < folders ? 1 : 0;
     }
     Judge(torn == 0 && inTheMiddle > 10, std::to_string(torn) + " files torn by 50 kills, " +
                                              std::to_string(inTheMiddle) +
