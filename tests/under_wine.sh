@@ -35,18 +35,22 @@ refuse() {
         exit 1
     fi
 }
-kept="$home/drive_c/ProgramData/hotfolder"
-as_user mkdir "$kept"
-refuse hotfolder
-as_user rmdir "$kept"
-as_user mkdir -p "$home/drive_c/ProgramData/FolderUpgrade trial" # of another account
 as_user "$wine" reg add 'HKLM\SOFTWARE\Vantorix' /v Name /d kept /f >/dev/null
-refuse 'FolderUpgrade trial'
-as_user "$wine" reg query 'HKLM\SOFTWARE\Vantorix' /v Name >/dev/null
+refuse Vantorix
+as_user "$wine" reg delete 'HKLM\SOFTWARE\Vantorix' /v Name /f >/dev/null # fails if it is not there any more
 as_user "$wine" reg delete 'HKLM\SOFTWARE\Vantorix' /f >/dev/null
-as_user rmdir "$home/drive_c/ProgramData/FolderUpgrade trial"
+for folder in hotfolder "FolderUpgrade trial"; do # the second of another account
+    as_user mkdir "$home/drive_c/ProgramData/$folder"
+    refuse "$folder"
+    as_user rmdir "$home/drive_c/ProgramData/$folder"
+done
 as_user "$wine" cmd /c 'C:\trial\sandbox.cmd' </dev/null >/dev/null
 grep -q '<HostFolder>C:.trial</HostFolder>' "$home/drive_c/trial/trial.wsb"
+try "$@" & # a trial that is interrupted
+sleep 4
+as_user "$server" -k
+wait || true
+[ -e "$home/drive_c/ProgramData/FolderUpgrade trial/account" ]
 try "$@"
 tr -d '\r' <"$home/drive_c/trial/trial.txt"
 exit $outcome

@@ -75,6 +75,7 @@ void RemoveTrial()
     RemoveKeys();
     for (const fs::path& folder : Folders())
         RemoveTree(folder);
+    RemoveTree(NewRoot());
     RemoveTree(TrialDir()); // last, because it has the mark
 }
 

@@ -137,6 +137,7 @@ void SetRegistry(const std::vector<Text>& hives)
             {
                 key.SetName(part(1));
                 key.Create();
+                MarkKeys(); // before anything can end the trial
             }
             else if (parts[3].matched)
                 key.SetValue(part(2), part(3));
@@ -152,7 +153,6 @@ void SetRegistry(const std::vector<Text>& hives)
             }
         }
     }
-    MarkKeys();
 }
 
 RunResult Workstation::Start(const Text& program, const std::vector<Text>& arguments,
