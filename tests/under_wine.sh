@@ -47,10 +47,11 @@ done
 as_user "$wine" cmd /c 'C:\trial\sandbox.cmd' </dev/null >/dev/null
 grep -q '<HostFolder>C:.trial</HostFolder>' "$home/drive_c/trial/trial.wsb"
 try "$@" & # a trial that is interrupted
-sleep 4
+until [ -e "$home/drive_c/ProgramData/FolderUpgrade trial/account" ]; do
+    sleep 0.5
+done
 as_user "$server" -k
 wait || true
-[ -e "$home/drive_c/ProgramData/FolderUpgrade trial/account" ]
 try "$@"
 tr -d '\r' <"$home/drive_c/trial/trial.txt"
 exit $outcome
