@@ -11,7 +11,6 @@
 #include <wx/filename.h>
 
 #include <map>
-#include <new>
 
 namespace
 {
@@ -55,29 +54,27 @@ void CheckHotFolder(HotFolder& folder, TemplateCheck& check)
     CheckFolderIcon(folder, check);
 }
 
+using Identity = std::pair<std::uint64_t, std::uint64_t>;
+
 // A directory that is listed under two names is checked once.
 void CheckHotFolders(const HotFolderList& list, TemplateCheck& check)
 {
-    Report& report = check.report;
-    std::map<std::pair<std::uint64_t, std::uint64_t>, size_t> known; // identity -> position
-    for (size_t i = 0; i < list.folders.size(); ++i)
+    std::map<Identity, wxString> known; // identity -> listed path
+    for (const wxString& path : list.folders)
     {
-        const wxString& hotFolder = list.folders[i];
-        report.Begin(hotFolder);
-        try
-        {
-            HotFolder folder(hotFolder);
-            const auto identity = folder.directory.Identity();
-            const auto [first, isNew] = known.emplace(identity, i);
-            if (isNew || identity == std::pair<std::uint64_t, std::uint64_t>())
-                CheckHotFolder(folder, check);
-            else
-                report.Note("the same directory as " + Shown(list.folders[first->second]));
-        }
-        catch (const std::bad_alloc&)
-        {
-            report.Problem("cannot be checked (out of memory)");
-        }
+        check.report.Begin(path);
+        check.report.Attempt({},
+                             [&]()
+                             {
+                                 HotFolder folder(path);
+                                 const Identity identity = folder.directory.Identity();
+                                 const auto [first, isNew] = known.emplace(identity, path);
+                                 if (isNew || identity == Identity())
+                                     CheckHotFolder(folder, check);
+                                 else
+                                     check.report.Note("the same directory as " +
+                                                       Shown(first->second));
+                             });
     }
 }
 

@@ -3,6 +3,7 @@
 #include "check/reach.h"
 #include "migrate/job_preset_files.h"
 #include "migrate/template_move.h"
+#include "store/xml_document.h"
 #include "store/xml_encoding.h"
 
 #include <wx/convauto.h>
@@ -52,37 +53,13 @@ void CheckContent(const wxString& name, const RewrittenPreset& rewritten, Report
                                 "characters come out wrong"});
 }
 
-// The character that an entity or a numeric reference stands for; 0 for any other text.
-unsigned long CharacterOf(const wxString& name)
-{
-    const std::pair<const char*, char> entities[] = {
-        {"lt", '<'}, {"gt", '>'}, {"quot", '"'}, {"apos", '\''}, {"amp", '&'}};
-    for (const auto& [entity, character] : entities)
-    {
-        if (name == entity)
-            return static_cast<unsigned long>(character);
-    }
-    unsigned long code = 0;
-    const bool isHex = name.StartsWith("#x");
-    const bool isNumber =
-        name.StartsWith("#") && name.Mid(isHex ? 2 : 1).ToULong(&code, isHex ? 16 : 10);
-    return isNumber && code <= 0x10FFFF ? code : 0;
-}
-
-// The path as an XML parser reads it, for a look at the template.
+// The path as an XML parser reads it, for a look at the template; as it is if none could.
 wxString Decoded(const wxString& path)
 {
-    constexpr size_t LongestName = 10;
-    wxString decoded;
-    for (size_t i = 0; i < path.length(); ++i)
-    {
-        const wxString name = path[i] == '&' ? path.Mid(i + 1, LongestName) : wxString();
-        const size_t end = name.find(';');
-        const unsigned long code = end != wxString::npos ? CharacterOf(name.Left(end)) : 0;
-        decoded += code != 0 ? wxUniChar(static_cast<int>(code)) : wxUniChar(path[i]);
-        i += code != 0 ? end + 1 : 0;
-    }
-    return decoded;
+    wxXmlDocument element;
+    if (path.find('&') != wxString::npos && path.find('<') == wxString::npos)
+        LoadXml("<p>" + path.utf8_string() + "</p>", FolderCfgLimits, element);
+    return element.IsOk() ? element.GetRoot()->GetNodeContent() : path;
 }
 
 // Why a path of a preset that is rewritten stays although it leads into the folder being left.
@@ -179,7 +156,7 @@ bool CheckDirectory(const wxString& directory, const wxString& root, TemplateChe
     const wxString name = preset.path.Mid(root.length()) + ": ";
     if (preset.IsThere())
     {
-        CheckPreset(preset, name, check);
+        check.report.Attempt(name, [&]() { CheckPreset(preset, name, check); });
         return true;
     }
     for (const wxString& each : {directory, wxFileName(preset.path).GetPath()})

@@ -6,6 +6,7 @@
 #include <wx/arrstr.h>
 
 #include <array>
+#include <new>
 #include <set>
 #include <vector>
 
@@ -52,6 +53,20 @@ class Report
     /// What concerns many blocks: written only with the first of them.
     void ProblemOnce(const wxString& text);
     void NoteOnce(const wxString& text);
+
+    /// Takes a step of the check; if there is no memory for it, reports that after the prefix.
+    template <typename Step>
+    void Attempt(const wxString& prefix, Step step)
+    {
+        try
+        {
+            step();
+        }
+        catch (const std::bad_alloc&)
+        {
+            Problem(prefix + "cannot be checked (out of memory)");
+        }
+    }
 
     /// Writes the totals, then the last line unless it is empty. Returns false if anything could
     /// not be written.
