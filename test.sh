@@ -74,8 +74,6 @@ native() {
     cmake/install_packages.sh build test fuzz bench
     build sanitize
     run_tests sanitize
-    build bench
-    run_tests bench
     checks
 }
 

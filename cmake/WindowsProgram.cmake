@@ -13,26 +13,16 @@ function(add_windows_resources target description)
     target_sources(${target} PRIVATE ${output}/${target}.rc)
     set_source_files_properties(${output}/${target}.rc PROPERTIES
         OBJECT_DEPENDS "${icons}/hf_folder.ico;${output}/${target}.manifest")
-    if(MSVC)
-        target_link_options(${target} PRIVATE /MANIFEST:NO) # it is among the resources
-    endif()
 endfunction()
 
 # The module platform does what has to be done before main().
 function(harden_windows_program target)
-    if(MSVC)
-        target_link_options(${target} PRIVATE
-            /DYNAMICBASE /NXCOMPAT /HIGHENTROPYVA /DEPENDENTLOADFLAG:0x800)
-    else()
-        target_link_options(${target} PRIVATE
-            LINKER:--dynamicbase LINKER:--nxcompat LINKER:--high-entropy-va)
-    endif()
+    target_link_options(${target} PRIVATE LINKER:--dynamicbase LINKER:--nxcompat LINKER:--high-entropy-va)
 endfunction()
 
-# Moves the symbols of the release into a separate file, <program>.debug, beside the program; MSVC's linker always keeps
-# them separate.
+# Moves the symbols of the release into a separate file, <program>.debug, beside the program.
 function(split_symbols target)
-    if(MSVC OR NOT CMAKE_BUILD_TYPE STREQUAL Release)
+    if(NOT CMAKE_BUILD_TYPE STREQUAL Release)
         return()
     endif()
     set(program $<TARGET_FILE:${target}>)

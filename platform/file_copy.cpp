@@ -31,7 +31,9 @@ bool IsCopy(const wxString& source, const PinnedDirectory& directory, const wxSt
 {
     RegularFile from;
     RegularFile to;
+    std::string wanted;
+    std::string found;
     return from.OpenForReading(source) == RegularFile::Status::Open &&
            to.OpenForReading(directory, name) == RegularFile::Status::Open &&
-           to.HasAttributesOf(from) && to.HasContentOf(from);
+           to.HasAttributesOf(from) && from.Read(wanted) && to.Read(found) && found == wanted;
 }

@@ -3,15 +3,7 @@
 #include <wx/intl.h>
 #include <wx/log.h>
 
-#include <algorithm>
 #include <array>
-
-namespace
-{
-
-constexpr size_t PieceBytes = size_t{64} * 1024; // of a file that is too long for the memory
-
-} // namespace
 
 FailedCall FailedCall::Now(const char* what)
 {
@@ -90,7 +82,7 @@ bool RegularFile::TakeContent(const RegularFile& source)
     const std::int64_t newLength = source.Length();
     bool isDone =
         newLength >= 0 && (newLength <= oldLength || Reserve(oldLength, newLength - oldLength));
-    std::array<char, PieceBytes> piece{};
+    std::array<char, size_t{64} * 1024> piece{}; // it may be too long for the memory
     for (std::int64_t done = 0; isDone && done < newLength;)
     {
         const size_t count = source.ReadAt(done, piece.data(), piece.size());
@@ -101,21 +93,6 @@ bool RegularFile::TakeContent(const RegularFile& source)
     if (!isDone)
         m_failure = FailedCall::Now(FailedCall::Write);
     return isDone;
-}
-
-bool RegularFile::HasContentOf(const RegularFile& other) const
-{
-    const std::int64_t length = Length();
-    std::array<char, PieceBytes> ours{};
-    std::array<char, PieceBytes> theirs{};
-    for (std::int64_t done = 0; done < length; done += PieceBytes)
-    {
-        const size_t count = ReadAt(done, ours.data(), ours.size());
-        if (count == 0 || other.ReadAt(done, theirs.data(), theirs.size()) != count ||
-            !std::equal(ours.begin(), ours.begin() + count, theirs.begin()))
-            return false;
-    }
-    return length == other.Length();
 }
 
 bool RegularFile::Rewrite(const std::string& before, const std::string& after)

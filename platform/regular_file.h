@@ -82,7 +82,6 @@ class RegularFile
 
     /// Copies the content of the other file in pieces, after reserving space for it.
     bool TakeContent(const RegularFile& source);
-    bool HasContentOf(const RegularFile& other) const;
 
     /// Copies what wxCopyFile copies in addition to the content, except read-only, which would keep
     /// the next copy away. Windows: the attributes and the time of the last change; elsewhere: the

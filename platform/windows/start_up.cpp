@@ -28,18 +28,9 @@ struct StartUp
 } // namespace
 
 // Constructed before every other static object, including those of the libraries, whatever the link
-// order.
-#ifdef _MSC_VER
-#pragma warning(disable : 4073) // says that this is for libraries
-#pragma init_seg(lib)
-#define MADE_FIRST
-#else
-#define MADE_FIRST [[gnu::init_priority(101)]] // 0 to 100 are reserved for the compiler
-#endif
-
-// See platform/CMakeLists.txt.
+// order; 0 to 100 are reserved for the compiler. See platform/CMakeLists.txt.
 extern "C"
 {
     extern const StartUp StartUpOfProgram;
-    MADE_FIRST const StartUp StartUpOfProgram;
+    [[gnu::init_priority(101)]] const StartUp StartUpOfProgram;
 }
