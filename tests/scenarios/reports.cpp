@@ -188,7 +188,7 @@ Job presets
                      {"elsewhere/d/T", ""}})
             .File(PresetPlace, Stored("{default}{/}D{/}T") + Stored("{hot}{/}..{/}Vorige 版{/}T") +
                                    Stored("{hot}{/}..{/}Vorige &#x7248;{/}&amp;") +
-                                   Stored("{default}{/}&lt;&#65;&none;") +
+                                   Stored("{default}{/}&lt;&#65;") + Stored("{default}{/}&none;") +
                                    "ORXImposeTemplate\">\"{previous}")
             .IsReported(R"(
 {hot}{/}A
@@ -200,7 +200,8 @@ Job presets
 Job presets
   note     .P{/}Presets{/}presets.xml: a template path has no closing quote
   note     .P{/}Presets{/}presets.xml: not looked at: {default}{/}D{/}T
-  problem  .P{/}Presets{/}presets.xml: no template at {default}{/}<A&none;
+  problem  .P{/}Presets{/}presets.xml: no template at {default}{/}&none;
+  problem  .P{/}Presets{/}presets.xml: no template at {default}{/}<A
   problem  .P{/}Presets{/}presets.xml: stays in the folder being left (other separators): )"
                         R"({hot}{/}..{/}Vorige 版{/}T
   problem  .P{/}Presets{/}presets.xml: stays in the folder being left (stored as XML): )"
