@@ -168,19 +168,15 @@ void RegularFile::WaitForDisk()
 
 void RegularFile::TakeAttributes(const RegularFile& source)
 {
-    FILE_BASIC_INFO information = {};
-    if (GetFileInformationByHandleEx(source.m_handle, FileBasicInfo, &information,
-                                     sizeof information) == 0)
+    FILE_BASIC_INFO theirs = {};
+    FILE_BASIC_INFO ours = {}; // what is 0 stays as it is
+    if (GetFileInformationByHandleEx(source.m_handle, FileBasicInfo, &theirs, sizeof theirs) == 0)
         return;
-    // A time of 0 means that it stays as it is.
-    information.CreationTime.QuadPart = 0;
-    information.LastAccessTime.QuadPart = 0;
-    information.ChangeTime.QuadPart = 0;
-    // Attributes of 0 would also stay as they are.
-    information.FileAttributes &= ~DWORD{FILE_ATTRIBUTE_READONLY};
-    if (information.FileAttributes == 0)
-        information.FileAttributes = FILE_ATTRIBUTE_NORMAL;
-    SetFileInformationByHandle(m_handle, FileBasicInfo, &information, sizeof information);
+    ours.LastWriteTime = theirs.LastWriteTime;
+    ours.FileAttributes = theirs.FileAttributes & ~DWORD{FILE_ATTRIBUTE_READONLY};
+    if (ours.FileAttributes == 0)
+        ours.FileAttributes = FILE_ATTRIBUTE_NORMAL;
+    SetFileInformationByHandle(m_handle, FileBasicInfo, &ours, sizeof ours);
 }
 
 bool RegularFile::HasAttributesOf(const RegularFile& source) const
