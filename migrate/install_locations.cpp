@@ -7,6 +7,7 @@
 
 #include <algorithm>
 #include <array>
+#include <vector>
 
 namespace
 {
@@ -20,7 +21,7 @@ struct Location
 {
     HKEY hive;
     const char* hiveName;
-    std::array<const wchar_t*, 2> keys;
+    std::vector<const wchar_t*> keys;
     const wchar_t* value;
 };
 
