@@ -20,10 +20,7 @@ Scenario& Scenario::After(const Files& files)
 
 Scenario& Scenario::File(const Text& place, const Text& text, const Text& becomes)
 {
-    before[place] = text;
-    if (!becomes.empty())
-        after[place] = becomes;
-    return *this;
+    return Before({{place, text}}).After(becomes.empty() ? Files() : Files{{place, becomes}});
 }
 
 Scenario& Scenario::Log(const Text& folders, const Text& presets)
@@ -36,33 +33,26 @@ Scenario& Scenario::Log(const Text& folders, const Text& presets)
 
 Scenario& Scenario::LogOfA(const Text& impose, const Text& presets, const Text& icon)
 {
-    return Log(FolderLines("A", 1, NoIcon(icon), impose), presets);
-}
-
-Scenario& Scenario::LogOfPreset(const Text& line)
-{
-    return Log("", PresetLine(line));
-}
-
-Scenario& Scenario::Shell(const Text& version, const Text& calls)
-{
-    shellVersion = version;
-    shellCalls = calls;
-    return NotOnWindows("the system's own shell is called");
+    const bool isThere = before.count("hot/A/[P]/" + icon + ".ico") > 0;
+    return Log(FolderLines("A", 1, isThere ? Copied(icon) : NoIcon(icon), impose), presets);
 }
 
 Scenario& Scenario::IsReported(const Text& lines)
 {
-    report = lines;
-    for (const auto& [token, text] : Files{
-             {"{moves}",
-              "  change   Folder.cfg: {previous}{/}Booklet.tpl -> {default}{/}Booklet.tpl"},
-             {"{nodisabled}", "  note     no copy of the icon to replace: hf_folder_disabled.ico"},
-             {"{nothing}", ", for the account *; nothing moves. Run as the client's user, "
-                           "after its installation"},
-             {"{log}", "{user}{/}ORX_Installers{/}UpgradeDowngrade.log"},
-             {"{list}", "{machine}{/}hotfolder{/}HotFolderList.cfg"},
-             {"{Path}", "registry value Path in HKEY_CURRENT_USER\\SOFTWARE\\HF"}})
+    report = lines.empty() || lines[0] == '\n' ? lines : "\n" + lines;
+    if (before.count(PresetPlace) == 0 && lines.find("Job presets") == Text::npos)
+        *report += "\nJob presets: note     there are no presets in {user}{/}ORX{/}JPData{/}";
+    for (const auto& [token, text] :
+         Files{{"{moves}", "change   Folder.cfg: " + MovedFrom + " -> " + MovedTo},
+               {"{presetmoves}", "change   .P{xml}: " + MovedFrom + " -> " + MovedTo},
+               {"{xml}", "{/}Presets{/}presets.xml"},
+               {"{nodisabled}", "note     no copy of the icon to replace: hf_folder_disabled.ico"},
+               {"{nofolder}", "note     HotFolderList.cfg lists no hot folder"},
+               {"{nothing}", ", for the account *; nothing moves. Run as the client's user, "
+                             "after its installation"},
+               {"{log}", "{user}{/}ORX_Installers{/}UpgradeDowngrade.log"},
+               {"{list}", "{machine}{/}hotfolder{/}HotFolderList.cfg"},
+               {"{Path}", "registry value Path in HKEY_CURRENT_USER\\SOFTWARE\\HF"}})
         report = Replaced(*report, token, text);
     return *this;
 }
@@ -82,7 +72,8 @@ Files WorkstationBefore(const Scenario& scenario)
     files.insert({{ListPlace, list + "</HotFolders>"},
                   {LogPlace, "The log of an earlier run\r\n"},
                   {"user/ORX/JPData/", ""},
-                  {"previous/", ""},
+                  {"previous/Booklet.tpl", ""},
+                  {"default/Booklet.tpl", ""},
                   {MachineHive, MachineValue("\"InstallPath\"=\"{app}\"")},
                   {UserHive, UserValue("\"Path\"=\"{previous}\"")}});
     for (auto file = files.begin(); file != files.end();)

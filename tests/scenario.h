@@ -39,15 +39,16 @@ struct Scenario
     Text notUnderWine;
     Text shellVersion;
     Text shellCalls;
-    std::optional<Text> report; // FolderUpgrade is not started
+    std::optional<Text> report;
 
     explicit Scenario(const Text& whatHappens) : name(whatHappens)
     {
     }
 
     /// Files in addition to the usual ones, or in place of them. The usual ones are the log of an
-    /// earlier run, a hive for each of the two template folders, an empty directory for presets,
-    /// and HotFolderList.cfg, which lists every NAME of the places hot/NAME/... in order.
+    /// earlier run, a template in each of the two template folders and their hives, an empty
+    /// directory for presets, and HotFolderList.cfg, which lists every NAME of the places
+    /// hot/NAME/... in order.
     Scenario& Before(const Files& files);
     /// Files that change. Every other file and attribute has to stay as it is.
     Scenario& After(const Files& files);
@@ -65,18 +66,15 @@ struct Scenario
     SETTER(WholeLog, log, )
     /// The log of a run with these lines about the hot folders and the presets.
     Scenario& Log(const Text& folders, const Text& presets = "");
-    /// The same if A is the only hot folder, has no icon to replace, and has these lines about its
+    /// The same if A is the only hot folder, has this icon, if any, and these lines about its
     /// template.
     Scenario& LogOfA(const Text& impose, const Text& presets = "", const Text& icon = "hf_folder");
-    /// The same if there are no hot folders and one preset, with this line.
-    Scenario& LogOfPreset(const Text& line);
     /// The library itself reports an error, on Windows in a message box.
     SETTER(LibraryReports, libraryReports, = true)
-    /// The calls to a shell of this version; only on this machine.
-    Scenario& Shell(const Text& version, const Text& calls);
 
-    /// Only FolderUpgradeCheck is started, and reports this, without the head, the sum and empty
-    /// lines; with an * for the account and the system's own words.
+    /// What FolderUpgradeCheck reports before the run, each line after its title; only {hot}{/} of
+    /// a hot folder's title is left out. An * is the account or the system's own words. If there is
+    /// no preset, that is added. Without a log or files that change, there is no run.
     Scenario& IsReported(const Text& lines);
 };
 

@@ -78,7 +78,7 @@ Files Expected(const Workstation& workstation, const Files& before, const Scenar
 
 struct Report
 {
-    Text lines;             // without the head, the sum and empty lines
+    Text lines;             // as IsReported describes them, each after a line feed
     std::set<Text> changed; // files and folders, those whose attributes change with '#'
     size_t problems = 0;
 };
@@ -94,26 +94,30 @@ Report Check(const Workstation& workstation, const std::vector<Text>& arguments)
     std::istringstream text(
         std::regex_replace(Replaced(run.output, "\r", ""),
                            std::regex("(for the account |can't open file)[^;\n]*"), "$1*"));
-    Text title;
-    std::getline(text, title); // "FolderUpgradeCheck VERSION, MODE, TIME, ACCOUNT, RIGHTS"
-    std::getline(text, title); // "From ... to ..."
-    // Those of the presets, which come in the order of their directory, sorted.
-    std::multimap<std::pair<int, Text>, Text> lines;
-    int section = 0;
+    Text title; // the head and the sum are titles without lines
+    std::vector<Text> lines;
     for (Text line; std::getline(text, line);)
     {
-        const bool isTitle = line[0] != ' ';
-        section += isTitle ? 1 : 0;
-        title = isTitle ? line : title;
+        if (!StartsWith(line, "  "))
+        {
+            title = line;
+            continue;
+        }
         if (StartsWith(line, "  change"))
             report.changed.insert(title + line.substr(0, line.find(": ")) +
                                   (line.find(": attributes ") == Text::npos ? "" : "#"));
         report.problems += StartsWith(line, "  problem") ? 1 : 0;
-        if (!line.empty() && text.peek() != EOF)
-            lines.insert({{section, !isTitle && title == "Job presets" ? line : ""}, line});
+        lines.push_back("\n" + Replaced(title, workstation.Expand("{hot}{/}"), "") + ":" +
+                        line.substr(1));
     }
-    for (const auto& [key, line] : lines)
-        report.lines += "\n" + line;
+    // Presets come in the order of their directory.
+    const auto isPresets = [](const Text& line)
+    {
+        return StartsWith(line, "\nJob presets");
+    };
+    std::sort(std::find_if(lines.begin(), lines.end(), isPresets), lines.end());
+    for (const Text& line : lines)
+        report.lines += line;
     EXPECT_EQ(report.problems > 0 ? 2 : report.changed.empty() ? 0 : 1, run.status) << run.output;
     return report;
 }
@@ -142,15 +146,18 @@ TEST_P(Workstations, IsAsExpectedAfterTheRun)
     Workstation workstation(scenario.asOtherUser);
     workstation.LayOut(WorkstationBefore(scenario));
     const Files before = workstation.Snapshot();
-    if (scenario.report)
-    {
-        EXPECT_EQ(workstation.Expand(*scenario.report),
-                  Check(workstation, scenario.arguments).lines);
-        return;
-    }
     const Text mode = scenario.arguments.empty() ? "" : scenario.arguments[0];
     const bool isRun = std::regex_match(mode, std::regex("[IiUu]"));
-    const Report check = isRun ? Check(workstation, {mode}) : Report();
+    const bool isOnlyReport = scenario.report && scenario.log.empty() && scenario.after.empty();
+    const Report check =
+        isRun ? Check(workstation, isOnlyReport ? scenario.arguments : std::vector<Text>{mode})
+              : Report();
+    if (scenario.report)
+    {
+        EXPECT_EQ(workstation.Expand(*scenario.report), check.lines);
+    }
+    if (isOnlyReport)
+        return;
     const bool isRecorded = !scenario.shellVersion.empty();
     const RunResult run =
         workstation.Start(isRecorded ? "FolderUpgradeRecorded" : "FolderUpgrade",

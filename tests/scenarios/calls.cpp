@@ -132,6 +132,36 @@ TEST_P(CallsOfAnInstaller, LeaveTheirResults)
 INSTANTIATE_TEST_SUITE_P(Calls, CallsOfAnInstaller, testing::ValuesIn(Calls()),
                          [](const auto& call) { return TestName(call.param.scenario); });
 
+TEST(Check, WritesToAFile)
+{
+    Workstation workstation;
+    workstation.LayOut(
+        WorkstationBefore(Scenario("")
+                              .Before(DoneFolder("A", Written(MovedTo)))
+                              .Before({{PresetPlace, Stored(MovedTo)},
+                                       {"hot/A/Bericht ä 版.txt", Text(10000, '.')}})));
+    const Text check = "FolderUpgradeCheck";
+    EXPECT_EQ(0, workstation.Start(check, {"i", "{hot}{/}A{/}Bericht ä 版.txt"}).status);
+    const Text report =
+        Replaced(ReadFile(workstation.HostPath("hot/A/Bericht ä 版.txt")), "\r", "");
+    const size_t head = report.find('\n');
+    EXPECT_TRUE(std::regex_match(
+        report.substr(0, head),
+        std::regex("FolderUpgradeCheck [0-9]+\\.[0-9]+\\.[0-9]+, upgrade, 20[0-9-]+ "
+                   "[0-9]+:[0-9]+, [^,]+, (not )?elevated")))
+        << report;
+    EXPECT_EQ(workstation.Expand("\nFrom {previous} to {default}\n\n"
+                                 "0 changes, 0 problems, 0 notes\n"),
+              report.substr(head));
+
+    const RunResult refused = workstation.Start(check, {"i", "{hot}{/}none{/}a.txt"});
+    EXPECT_EQ(2, refused.status);
+    EXPECT_EQ("", refused.output);
+    const Text complaint = workstation.Expand(
+        "FolderUpgradeCheck: the report cannot be written to {hot}{/}none{/}a.txt\n");
+    EXPECT_EQ(complaint, refused.libraryLog);
+}
+
 TEST(Usage, IsPrinted)
 {
     const Workstation workstation;

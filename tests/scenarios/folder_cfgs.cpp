@@ -76,6 +76,25 @@ Scenario Encodings()
                  {UserHive, UserValue("\"Path\"=\"{hot}\"")}});
 }
 
+// A Folder.cfg that loses much when its template moves.
+Text Rich()
+{
+    const Text root = "<HotFolder ";
+    const Text end = "<PreflightSettings>\n";
+    const Text entry = "<KEYVALUE Key=\"B\"";
+    Text cfg = Written(MovedFrom);
+    for (const auto& [from, to] :
+         Files{{" Quickset=\"q\"", ""},
+               {"\"-5\"", "\"5b\""},
+               {"Centralized=\"1\"", "Centralized=\"1 \""}, // no loss
+               {root, "<!DOCTYPE H [<!ENTITY e \"t\">]>\n<?top?>" + root + "mine=\"7\" "},
+               {"<a/>", Times(2000, "<r kind=\"alike\" number=\"#\" empty=\"\"/>")}, // no loss
+               {entry, entry + " Mine=\"\" Value=\"1\"/>" + entry},
+               {end, "<Mine><b/></Mine><Paths/>Note <!-- no loss -->" + end}})
+        cfg = Replaced(cfg, from, to);
+    return Replaced(cfg, "HotFolder", "Old");
+}
+
 SCENARIOS(FolderCfgs)
 {
     const Text found = Found(MovedFrom);
@@ -130,34 +149,124 @@ SCENARIOS(FolderCfgs)
             .File(CfgPlace, Written(MovedFrom), Written(MovedTo))
             .File(PresetPlace, Stored(MovedFrom), Stored(MovedTo))
             .LogOfA(found, PresetLine(Updated)),
-        HotFolders("DamagedFolderCfgsStay",
-                   {{"Empty", {}}, {"Truncated", {Data("foreign.cfg", MovedFrom).substr(0, 700)}}})
-            .LibraryReports(),
+        HotFolders("DamagedFolderCfgsStayAndShowAsDisabled",
+                   {{"Empty", {}},
+                    {"Truncated", {Data("foreign.cfg", MovedFrom).substr(0, 700)}},
+                    {"WithoutADescription",
+                     {Replaced(Written(MovedTo), " description=\"\"", ""), "", Found(MovedTo)}}})
+            .LibraryReports()
+            .IsReported(R"(
+Empty: problem  Folder.cfg: damaged (line 1: no element found); it stays as it is, and the folder shows as disabled
+Truncated: problem  Folder.cfg: damaged (line 1: unclosed token); it stays as it is, and the folder shows as disabled
+WithoutADescription: problem  Folder.cfg: lacks "description", so the enabled folder shows as disabled)"),
+        Scenario("Losses")
+            .Before(DoneFolder("A", Rich()))
+            .Before(DoneFolder("B", Replaced(Written(MovedFrom), " TimeInterval=\"010\"", "")))
+            .Before(DoneFolder("C", Replaced(Written(MovedFrom), "Enable=\"1\"", "Enable=\"true\""),
+                               Disabled))
+            .Before(DoneFolder(
+                "D",
+                "{utf16}" + Replaced(Replaced(Written(MovedFrom), "UTF-8", "UTF-16"), "𝄞", "")))
+            .IsReported(R"(
+A: problem  Folder.cfg: loses its document type, and with it the entities in its texts
+A: problem  Folder.cfg: loses the instruction <?top?>
+A: problem  Folder.cfg: its root <Old> comes out as <HotFolder>
+A: problem  Folder.cfg: lacks "Quickset", so the rewrite resets: Quickset_Supported, IsWidthBased
+A: problem  Folder.cfg: server_version="5b" comes out as "5"
+A: problem  Folder.cfg: loses the attribute mine="7"
+A: problem  Folder.cfg: loses <KEYVALUE Key="B" Mine="" Value="1"> in <JobSetting>
+A: problem  Folder.cfg: loses <KEYVALUE Key="B" KeyDisplayValue="two" LocDisplayValue="zwei" Value="2"> in <JobSetting>
+A: problem  Folder.cfg: loses <Mine>
+A: problem  Folder.cfg: loses <b> in <Mine>
+A: problem  Folder.cfg: loses <Paths>
+A: problem  Folder.cfg: loses the text "Note"
+A: {moves}
+B: problem  Folder.cfg: lacks "TimeInterval", so the rewrite resets: PPDVersion, ServerTypeAndJPDefaultKeyInfo, server_version, server_textversion, server_type, Quickset, Quickset_Supported, IsWidthBased
+B: {moves}
+C: problem  Folder.cfg: Enable="true" comes out as "0"
+C: {moves}
+D: {moves}
+D: note     Folder.cfg: comes out as UTF-8)"),
     };
 }
 
-// Stored files that a user who is not root cannot read or write; icons.cpp has the others.
+// What a user who is not root can neither read nor write.
 SCENARIOS(Refusals)
 {
     const Text found = Found(MovedFrom);
     const Text cfg = Written(MovedFrom);
-    const auto refused = [](const Text& name, const Text& place, const Text& attributes)
-    {
-        return Scenario(name).Before({{place + "#", attributes}}).AsOtherUser().LibraryReports();
-    };
+    const Text preset = Stored(MovedFrom);
     return {
-        refused("AReadOnlyFolderCfgStays", CfgPlace, "R").File(CfgPlace, cfg).LogOfA(found),
-        refused("AnUnreadableFolderCfgStays", CfgPlace, "0")
-            .File(CfgPlace, cfg)
-            .LogOfA("", "", Disabled),
-        refused("AnUnreadablePresetStays", PresetPlace, "0")
-            .File(PresetPlace, Stored(MovedFrom))
-            .LogOfPreset("Unable to open preset.xml for read : "),
-        refused("AReadOnlyPresetStays", PresetPlace, "R")
-            .File(PresetPlace, Stored(MovedFrom))
-            .LogOfPreset("Unable to open preset.xml for write : "),
-        refused("AReadOnlyLogStays", LogPlace, "R").File(CfgPlace, cfg, Written(MovedTo)),
-        refused("AnUnreadableListIsEmpty", ListPlace, "0").Before({{"hot/A/", ""}}).Log(""),
+        Scenario("WhatCannotBeReadStays")
+            .Before({{CfgPlace, cfg}, {"hot/B/[P]/Folder.cfg", cfg}, {"hot/C/[P]/Folder.cfg", cfg}})
+            .Before({{CfgPlace + "#", "0"}, {"hot/B/[P]#", "0"}, {"hot/C#", "0"}})
+            .Before({{PresetPlace, preset}, {PresetPlace + "#", "0"}})
+            .Before({{JobPresets + "/Q/Presets/presets.xml", preset}, {JobPresets + "/Q#", "0"}})
+            .AsOtherUser()
+            .LibraryReports()
+            .Log(FolderLines("A", 1, NoIcon(Disabled), "") +
+                     FolderLines("B", 2, NoIcon(Disabled), NoCfg("B")) +
+                     FolderLines("C", 3, NoIcon(Disabled), NoCfg("C")),
+                 PresetLine("Unable to open preset.xml for read : "))
+            .IsReported(R"(
+A: problem  Folder.cfg: can't open file*
+A: {nodisabled}
+B: problem  [_ORX_HotFolder_]: cannot be entered
+C: problem  the hot folder cannot be entered
+Job presets: problem  .P{xml}: cannot be opened for reading (can't open file*
+Job presets: problem  Q{xml}: {user}{/}ORX{/}JPData{/}Q cannot be entered)"),
+        Scenario("WhatCannotBeWrittenStays")
+            .Before(DoneFolder("A", cfg))
+            .Before(DoneFolder("B", Written(MovedTo)))
+            .Before(
+                {{CfgPlace + "#", "R"}, {"hot/B/[P]/Folder.cfg#", "R"}, {PresetPlace + "#", "R"}})
+            .Before({{"tool/hf_folder.ico#", "0"},
+                     {"hot/B/Desktop.ini", "[.ShellClassInfo]"},
+                     {"hot/B/Desktop.ini#", "X"}})
+            .Before({{"hot/C/[P]/hf_folder_disabled.ico", "old"},
+                     {"hot/C/[P]/hf_folder_disabled.ico#", "R"},
+                     {"hot/C/[P]#", "X"}})
+            .File(PresetPlace, preset)
+            .After({{"hot/C#", "S"},
+                    {"hot/C/Desktop.ini#", "RS"},
+                    {"hot/C/Desktop.ini",
+                     IniHeader + IconFile(Disabled) + "IconIndex=00\r\n" + InfoTip}})
+            .AsOtherUser()
+            .LibraryReports()
+            .Log(FolderLines("A", 1, Copied("hf_folder"), found) +
+                     FolderLines("B", 2, Copied("hf_folder", "B"),
+                                 Replaced(Found(MovedTo), "{hot}{/}A", "{hot}{/}B")) +
+                     FolderLines("C", 3, Copied(Disabled, "C"), NoCfg("C")),
+                 PresetLine("Unable to open preset.xml for write : "))
+            .IsReported(R"(
+A: problem  Folder.cfg: cannot be opened for writing (can't open file*
+A: problem  stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl
+A: problem  hf_folder.ico: cannot be replaced (read-only, in use, or access denied)
+B: problem  hf_folder.ico: cannot be replaced (read-only, in use, or access denied)
+B: problem  Desktop.ini: cannot be opened for reading and writing
+B: problem  Desktop.ini: its attributes cannot be changed
+C: problem  hf_folder_disabled.ico: cannot be replaced (read-only, in use, or access denied)
+C: change   Desktop.ini: new
+C: change   hot folder: attributes none -> SYSTEM
+C: note     no Folder.cfg
+Job presets: problem  .P{xml}: cannot be opened for writing (can't open file*
+Job presets: problem  .P{xml}: stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl)"),
+        Scenario("AReadOnlyLogStays")
+            .Before(DoneFolder("A", cfg))
+            .Before({{LogPlace + "#", "R"}})
+            .After({{CfgPlace, Written(MovedTo)}})
+            .AsOtherUser()
+            .LibraryReports()
+            .IsReported(R"(
+Workstation: problem  there will be no run log: can't open file*
+A: {moves})"),
+        Scenario("AnUnreadableListIsEmpty")
+            .Before({{"hot/A/", ""}, {ListPlace + "#", "0"}})
+            .AsOtherUser()
+            .LibraryReports()
+            .Log("")
+            .IsReported(R"(
+Workstation: problem  can't open file*; no hot folder is migrated)"),
     };
 }
 

@@ -58,7 +58,20 @@ SCENARIOS(Icons)
             .Before(
                 {{Icon, "old"}, {"tool/BundleIcons/hf_folder_disabled.ico", ""}, {Ini, "; mine\n"}})
             .File(CfgPlace, Cfg("1"))
-            .LogOfA(""),
+            .LogOfA("")
+            .IsReported(R"(
+A: note     no copy of the icon to replace: hf_folder.ico)"),
+        Scenario("WithoutTheNewIconsFoldersStay")
+            .Before(DoneFolder("A", Written("")))
+            .Before(DoneFolder("B", Written("")))
+            .Before({{"tool/BundleIcons#", "0"}})
+            .Run({"U"})
+            .AsOtherUser()
+            .Log(FolderLines("A", 1, NoIcon("hf_folder"), Found("")) +
+                 FolderLines("B", 2, NoIcon("hf_folder"),
+                             Replaced(Found(""), "{hot}{/}A", "{hot}{/}B")))
+            .IsReported(R"(
+A: problem  source icon missing: {tool}{/}BundleIcons{/}hf_folder.ico)"),
     };
 }
 
@@ -91,7 +104,13 @@ SCENARIOS(DesktopInis)
             .Before({{Ini + "#", "RS"}, {"hot/A#", "R"}}),
         refresh("AUsersDesktopIniKeepsEverythingElseButIsNotHidden", users, usersAfter)
             .Before({{Ini + "#", "HRS"}, {"hot/A#", "HR"}})
-            .After({{"hot/A#", "HS"}}),
+            .After({{"hot/A#", "HS"}})
+            .IsReported(R"(
+A: change   hf_folder_disabled.ico
+A: change   Desktop.ini: InfoTip, IconFile
+A: change   Desktop.ini: attributes READONLY HIDDEN SYSTEM -> READONLY SYSTEM
+A: change   hot folder: attributes READONLY HIDDEN -> HIDDEN SYSTEM
+A: note     no Folder.cfg)"),
         refresh("AMissingSectionIsAddedAfterTheLastLine", "[x]\r\na=b",
                 "[x]\r\na=b\r\n" + IniHeader + InfoTip + disabled)
             .Before({{Ini + "#", "R"}, {"hot/A#", "RS"}}),
@@ -110,6 +129,20 @@ SCENARIOS(DesktopInis)
             .After({{Ini + "#", Removed}})
             .AsOtherUser()
             .NotUnderWine(WineLosesSystem),
+        Scenario("FoldersOfAnotherUserAndPresetsThatCannotBeListed")
+            .Before(DoneFolder("A", Written(MovedTo)))
+            .Before(DoneFolder("B", Written(MovedTo)))
+            .Before({{"hot/A/Desktop.ini", Removed},
+                     {"hot/A/Desktop.ini#", Removed},
+                     {"hot/A#", "SX"},
+                     {"hot/B#", "X"},
+                     {JobPresets + "#", "L"}})
+            .AsOtherUser()
+            .NotUnderWine("Wine lets every user list a directory")
+            .IsReported(R"(
+A: problem  Desktop.ini: cannot be created, because the hot folder cannot be written to
+B: problem  hot folder: its attributes cannot be changed
+Job presets: problem  {user}{/}ORX{/}JPData{/} cannot be listed)"),
         Scenario("AFolderOfAnotherUserStays")
             .Before({{Icon, "old"}, {Icon + "#", "X"}, {"hot/A#", "X"}, {"hot/A/[P]#", "X"}})
             .AsOtherUser()
@@ -130,11 +163,13 @@ SCENARIOS(ShellCalls)
     const Text iconFile = IconFile(Disabled);
     const auto told = [&](const Text& name, const Text& shell, const Text& calls, const Text& ini)
     {
-        return Scenario(name)
-            .Before({{Icon, "{icon:hf_folder_disabled.ico}"}, {Ini, ""}})
+        Scenario scenario(name);
+        scenario.shellVersion = shell;
+        scenario.shellCalls = version + calls;
+        return scenario.Before({{Icon, "{icon:hf_folder_disabled.ico}"}, {Ini, ""}})
             .After({{Ini + "#", "RS"}, {"hot/A#", ini.empty() ? Removed : "S"}, {Ini, ini}})
             .Log(CopiedToA())
-            .Shell(shell, version + calls);
+            .NotOnWindows("the system's own shell is called");
     };
     return {
         told("ANewDesktopIniIsAnnounced", "6.0", notices,

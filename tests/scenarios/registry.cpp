@@ -1,4 +1,5 @@
-// The two template folders in the registry, and what happens where they are missing or unusable.
+// The two template folders in the registry, what happens where they are missing or unusable, and
+// whether the templates are there.
 #include "tests/scenarios/texts.h"
 
 namespace
@@ -9,8 +10,8 @@ Scenario Both(const Text& name, const Text& letter, const Files& hives)
 {
     const Text path = letter == "I" ? MovedFrom : MovedTo;
     return Scenario(name)
+        .Before(DoneFolder("A", Written(path)))
         .Before(hives)
-        .File(CfgPlace, Written(path))
         .File(PresetPlace, Stored(path))
         .Run({letter});
 }
@@ -26,18 +27,30 @@ SCENARIOS(Registry)
     const Text foundNew = Found(MovedTo);
     const Text updated = PresetLine(Updated);
     return {
-        Both("WithoutAnyHiveNothingMoves", "I", {{MachineHive, Removed}, {UserHive, Removed}})
+        Both("WithoutAnyHiveNothingMoves", "I", {{MachineHive, Removed}, {UserHive, "garbage"}})
             .LogOfA(found + NoPrevious, NoDefault + NoPrevious),
+        Both("WithoutATemplateNoFolderIsLookedUp", "I", {{MachineHive, Removed}, {UserHive, ""}})
+            .File(CfgPlace, "<H><ImposeSetting/></H>")
+            .LogOfA(Found(""), NoDefault + NoPrevious, Disabled)
+            .IsReported(R"(
+A: {nodisabled}
+Job presets: problem  registry value InstallPath in HKEY_LOCAL_MACHINE\SOFTWARE\Wow6432Node\Vantorix\QZA or \SOFTWARE\Vantorix\QZA: there is no such key{nothing}
+Job presets: problem  registry value Path in HKEY_CURRENT_USER\SOFTWARE\Wow6432Node\HF or \SOFTWARE\HF: there is no such key{nothing})"),
         Both("WithoutADefaultFolderAnUpgradeMovesNothing", "I",
              {{MachineHive, MachineValue("\"x\"=\"y\"")}})
             .LogOfA(found + NoDefault, NoDefault),
         Both("WithoutAPreviousFolderADowngradeMovesNothing", "U",
              {{UserHive, UserValue("\"x\"=\"y\"")}})
-            .LogOfA(foundNew + NoPreviousTo, NoPrevious),
+            .LogOfA(foundNew + NoPreviousTo, NoPrevious)
+            .IsReported(R"(
+A: problem  {Path}: missing{nothing}
+A: problem  stays in the folder being left (the folder being installed is unknown): {default}{/}Booklet.tpl)"),
         WithPrevious(
             "A32BitKeyHidesTheOtherEvenWithoutAValue",
             "\"Path\"=\"{previous}\"\r\n\r\n[HKEY_CURRENT_USER\\software\\wow6432node\\hf]")
-            .LogOfA(found + NoPrevious, NoPrevious),
+            .LogOfA(found + NoPrevious, NoPrevious)
+            .IsReported("A: problem  registry value Path in HKEY_CURRENT_USER\\SOFTWARE\\"
+                        "Wow6432Node\\HF: missing, and no other key is looked at{nothing}"),
         WithPrevious("A32BitKeyComesFirst",
                      "\"Path\"=\"x\"\r\n[HKEY_CURRENT_USER\\SOFTWARE\\Wow6432Node\\HF]\r\n\"PATH\"="
                      "\"{previous}\"")
@@ -47,29 +60,100 @@ SCENARIOS(Registry)
             .After({{CfgPlace, Written(MovedTo)}, {PresetPlace, Stored(MovedTo)}})
             .LogOfA(found, updated),
         WithPrevious("ATextOf258CharactersIsTooLong", "\"Path\"=\"" + Text(258, 'x') + "\"")
-            .LogOfA(found + NoPrevious, NoPrevious),
+            .LogOfA(found + NoPrevious, NoPrevious)
+            .IsReported("A: problem  {Path}: longer than 257 characters{nothing}"),
         WithPrevious("ATextOf257CharactersIsRead", "\"Path\"=\"" + Text(257, 'x') + "\"")
             .LogOfA(found, updated),
         Both("ANumberAsTheNewFolderMovesNothing", "I",
              {{MachineHive, MachineValue("\"InstallPath\"=dword:00000001")}})
-            .LogOfA(found + Untouched("new path holds a character that XML cannot store"), updated),
+            .LogOfA(found + Untouched("new path holds a character that XML cannot store"), updated)
+            .IsReported(R"(
+A: problem  Folder.cfg: left as it is (new path holds a character that XML cannot store)
+A: problem  stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl
+Job presets: problem  .P{xml}: stays in the folder being left (no path moves): {previous}{/}Booklet.tpl
+Job presets: problem  the folder being installed holds a character that XML cannot store; no path of a preset moves)"),
         WithPrevious("AnUnterminatedOddValueIsReadToItsLastWholeUnit",
                      "\"Path\"=hex:78,00,79,00,7a")
             .LogOfA(found, updated),
         WithPrevious("AFinalSeparatorMovesPresetsOnly", "\"Path\"=\"{previous}{/}\"")
             .After({{PresetPlace, Stored(MovedTo)}})
-            .LogOfA(found, updated),
+            .LogOfA(found, updated)
+            .IsReported(R"(
+Workstation: problem  {Path}: ends in a separator; no template of a hot folder moves
+A: problem  stays in the folder being left (the registry value ends in a separator): {previous}{/}Booklet.tpl
+Job presets: {presetmoves})"),
         Both("AFinalSeparatorIsDoubledInFolderCfgOnly", "U",
              {{UserHive, UserValue("\"Path\"=\"{previous}{/}\"")}})
             .After({{CfgPlace, Written("{previous}{/}{/}Booklet.tpl")},
                     {PresetPlace, Stored(MovedFrom)}})
-            .LogOfA(foundNew, updated),
+            .LogOfA(foundNew, updated)
+            .IsReported(R"(
+Workstation: problem  {Path}: ends in a separator; it is doubled in the paths of hot folders
+A: change   Folder.cfg: {default}{/}Booklet.tpl -> {previous}{/}{/}Booklet.tpl
+Job presets: change   .P{xml}: {default}{/}Booklet.tpl -> {previous}{/}Booklet.tpl)"),
         WithPrevious("AnEmptyPreviousFolderReplacesNothing", "\"Path\"=\"\"")
-            .LogOfA(found, updated),
-        Scenario("WithoutATemplateNoFolderIsLookedUp")
-            .Before({{MachineHive, Removed}, {UserHive, "garbage"}})
-            .File(CfgPlace, "<H><ImposeSetting/></H>")
-            .LogOfA(Found(""), NoDefault + NoPrevious, Disabled),
+            .LogOfA(found, updated)
+            .IsReported("Workstation: problem  {Path}: empty; only templates stored without a "
+                        "folder move"),
+        WithPrevious("BothFoldersAreTheSame", "\"Path\"=\"{app}{/}template\"")
+            .Before({{CfgPlace, Written(MovedTo)}, {PresetPlace, Stored(MovedTo)}})
+            .LogOfA(foundNew, updated)
+            .IsReported(""),
+    };
+}
+
+// Only reports: the run would follow from what other scenarios show.
+SCENARIOS(Templates)
+{
+    const auto with = [](const Text& name, const Text& path, const Text& letter = "U")
+    {
+        return Scenario(name)
+            .Before({{UserHive, UserValue("\"Path\"=\"" + path + "\"")}})
+            .Before(DoneFolder("A", Written("{hot}{/}A")))
+            .File(PresetPlace, Stored("{hot}{/}A"))
+            .Run({letter});
+    };
+    return {
+        with("PathIsEmptyOnTheWayBack", "")
+            .IsReported(
+                "Workstation: problem  {Path}: empty; templates move to the root of the drive"),
+        with("PathHoldsAnAmpersand", "{hot}&").IsReported(R"(
+Job presets: problem  {Path}: holds & or <, which is inserted into presets as it is)"),
+        with("TheNewFolderIsBelowTheOld", "{app}", "I")
+            .File(PresetPlace, Stored(MovedTo))
+            .Before({{"default/template/Booklet.tpl", ""}})
+            .IsReported(R"(
+Job presets: change   .P{xml}: {default}{/}Booklet.tpl -> {default}{/}template{/}Booklet.tpl
+Job presets: problem  one template folder is below the other: another run would move paths of presets again)"),
+        Scenario("TemplatesAreMissing")
+            .Before(DoneFolder("A", Written("{default}{/}none")))
+            .Before(DoneFolder("B", Written("{previous}{/}Sub{/}T")))
+            .Before(DoneFolder("C", Written("{hot}{/}C{/}D{/}T")))
+            .Before({{"hot/C/D/", "{link:elsewhere/d}"},
+                     {"default/D/", "{link:elsewhere/d}"},
+                     {"elsewhere/d/T", ""}})
+            .File(PresetPlace, Stored("{default}{/}D{/}T") + Stored("{hot}{/}..{/}Vorige 版{/}T") +
+                                   Stored("{hot}{/}..{/}Vorige &#x7248;{/}&amp;") +
+                                   Stored("{default}{/}&lt;&#65;&none;") +
+                                   "ORXImposeTemplate\">\"{previous}")
+            .IsReported(R"(
+A: problem  no template at {default}{/}none
+B: problem  stays in the folder being left (in a sub-folder): {previous}{/}Sub{/}T
+C: note     not looked at: {hot}{/}C{/}D{/}T
+Job presets: note     .P{xml}: a template path has no closing quote
+Job presets: note     .P{xml}: not looked at: {default}{/}D{/}T
+Job presets: problem  .P{xml}: no template at {default}{/}<A&none;
+Job presets: problem  .P{xml}: stays in the folder being left (other separators): {hot}{/}..{/}Vorige 版{/}T
+Job presets: problem  .P{xml}: stays in the folder being left (stored as XML): {hot}{/}..{/}Vorige 版{/}&)"),
+        Scenario("ARehearsal")
+            .Before(DoneFolder("A", Written("{hot}{/}old{/}T")))
+            .File(PresetPlace, Stored("{hot}{/}old{/}T") + Stored("{hot}{/}old{/}T"))
+            .Before({{MachineHive, Removed}, {UserHive, Removed}})
+            .Run({"I", "--from", "{hot}{/}old", "--to", "{hot}{/}new"})
+            .IsReported(R"(
+A: change   Folder.cfg: {hot}{/}old{/}T -> {hot}{/}new{/}T
+Job presets: change   .P{xml}: {hot}{/}old{/}T -> {hot}{/}new{/}T (2 times)
+Templates: note     there is no folder {hot}{/}new; templates that will be looked for in it: 2)"),
     };
 }
 

@@ -13,7 +13,7 @@ SCENARIOS(Runs)
                         "Presets&#13;&#10;~&#x7F;&#x9F;&#xA0;&#x2027;&#x2028;&#x2029;&#x202A;&#9;y";
     const auto moving = [&](const Text& name)
     {
-        return Scenario(name).File(CfgPlace, from, to);
+        return Scenario(name).Before(DoneFolder("A", from)).After({{CfgPlace, to}});
     };
     return {
         Scenario("WithoutASwitchNothingChanges").File(CfgPlace, from).Run({}),
@@ -30,15 +30,43 @@ SCENARIOS(Runs)
             .File(CfgPlace, to, from)
             .Run({"u"})
             .LogOfA(Found(MovedTo)),
-        moving("WithoutALogFolderTheRestIsDone").Before({{LogPlace, Removed}}),
-        moving("AMissingLogIsCreated")
+        Scenario("PresetsNeedNeitherAListNorALogFolder")
+            .Before({{ListPlace, Removed}, {LogPlace, Removed}})
+            .File(PresetPlace, Stored(MovedFrom), Stored(MovedTo))
+            .IsReported(R"(
+Workstation: note     there is no {list}
+Workstation: note     there will be no run log: there is no folder {user}{/}ORX_Installers{/}
+Job presets: {presetmoves})"),
+        Scenario("AMissingLogIsCreatedAndAMissingPresetFolderLogged")
             .Before({{LogPlace, Removed}, {LogFolder + "/", ""}})
-            .LogOfA(found),
+            .Before({{"user/ORX/JPData/", Removed}, {UserHive, Removed}})
+            .Log("", "Preset dirctory  not exist: {user}{/}ORX{/}JPData{/}\n" + NoPrevious)
+            .IsReported(R"(
+Workstation: {nofolder}
+Job presets: note     there are no presets, because there is no folder {user}{/}ORX{/}JPData{/})"),
         moving("ALogWithAByteOrderMarkLosesIt")
             .Before({{LogPlace, "{utf16}old\r\n"}})
             .LogOfA(found),
         moving("AFolderInPlaceOfTheLogStopsNothing")
-            .Before({{LogPlace, Removed}, {LogPlace + "/", ""}}),
+            .Before({{LogPlace, Removed}, {LogPlace + "/", ""}})
+            .IsReported(R"(
+Workstation: note     there will be no run log: something else has its name: {log}
+A: {moves})"),
+        moving("ALogFolderThatCannotBeWrittenToStopsNothing")
+            .Before({{LogPlace, Removed}, {LogFolder + "/", ""}, {LogFolder + "#", "X"}})
+            .AsOtherUser()
+            .NotUnderWine("there every user may write to the folder")
+            .IsReported(R"(
+Workstation: problem  there will be no run log: its folder cannot be written to: {user}{/}ORX_Installers{/}
+A: {moves})"),
+        Scenario("NoFolderCanBeEntered")
+            .Before({{ListPlace, ""}, {PresetPlace, ""}})
+            .Before({{"machine/hotfolder#", "0"}, {LogFolder + "#", "0"}, {JobPresets + "#", "0"}})
+            .AsOtherUser()
+            .IsReported(R"(
+Workstation: problem  HotFolderList.cfg: its folder cannot be entered
+Workstation: problem  there will be no run log: its folder cannot be entered: {user}{/}ORX_Installers{/}
+Job presets: problem  {user}{/}ORX{/}JPData{/} cannot be entered)"),
         Scenario("APercentSignIsLoggedAsItIs")
             .Before({{"hot/%d %s/", ""}})
             .Log(FolderLines("%d %s", 1, NoIcon(Disabled), NoCfg("%d %s"))),
@@ -67,6 +95,7 @@ SCENARIOS(Lists)
                                       {"hot/b ü 漢/", ""},
                                       {"hot/C/", ""},
                                       {"hot/c/", ""},
+                                      {"hot/D/", "{link:hot/C}"},
                                       {"hot/file", "x"},
                                       {ListPlace, list}});
     };
@@ -77,17 +106,33 @@ SCENARIOS(Lists)
                "<x><HotFolder path='{hot}{/}A'/></x><HotFolder path='{hot}{/}file'/>"
                "<HotFolder Path='{hot}{/}A'/><HotFolder path=' {hot}{/}A'/>"
                "<HotFolder z='1' path='{hot}{/}b ü 漢&#10;'/><HotFolder path='{hot}{/}C'/>"
-               "<HotFolder path='{hot}{/}c'/></any>")
-            .Log(Lines("C", 1) + Lines("b ü 漢", 2)),
-        Scenario("AMissingListStillMigratesPresets")
-            .Before({{ListPlace, Removed}})
-            .File(PresetPlace, Stored(MovedFrom), Stored(MovedTo))
-            .LogOfPreset(Updated),
+               "<HotFolder path='{hot}{/}c'/><HotFolder path='{hot}{/}D'/></any>")
+            .Log(Lines("C", 1) + Lines("b ü 漢", 2) + Lines("D", 3))
+            .IsReported(R"(
+Workstation: note     listed hot folder does not exist: {hot}{/}missing
+Workstation: note     listed hot folder does not exist: {hot}{/}file
+Workstation: note     listed hot folder does not exist:  {hot}{/}A
+Workstation: note     listed hot folder is listed twice: {hot}{/}C
+Workstation: note     listed hot folder is listed twice: {hot}{/}c
+C: note     no Folder.cfg
+C: {nodisabled}
+b ü 漢: note     no Folder.cfg
+b ü 漢: {nodisabled}
+D: note     the same directory as {hot}{/}C)"),
         listed("AMalformedListIsEmpty", "<any><HotFolder path='{hot}{/}A'/>")
             .Log("")
-            .LibraryReports(),
+            .LibraryReports()
+            .IsReported(R"(
+Workstation: problem  {list}: damaged (line 1: no element found); no hot folder is migrated)"),
         listed("AUtf16ListIsRead", "{utf16}<a><HotFolder path='{hot}{/}b ü 漢'/></a>")
             .Log(Lines("b ü 漢", 1)),
+        listed("NoListedFolderIsThere", "<l>" + Times(23, "<HotFolder path='{hot}{/}#'/>") + "</l>")
+            .Log("")
+            .IsReported(
+                "Workstation: problem  none of the listed hot folders exists (another "
+                "account? mapped drives?)" +
+                Times(20, "\nWorkstation: note     listed hot folder does not exist: {hot}{/}#") +
+                "\nWorkstation: note     listed hot folder and 3 more"),
     };
 }
 

@@ -83,6 +83,17 @@ inline Text IconFile(const Text& name)
     return "IconFile=.\\[_ORX_HotFolder_]\\" + name + ".ico\r\n";
 }
 
+/// A hot folder in which a run changes nothing but its template.
+inline Files DoneFolder(const Text& name, const Text& cfg, const Text& icon = "hf_folder")
+{
+    const Text folder = "hot/" + name;
+    return {{folder + "#", "S"},
+            {folder + "/Desktop.ini#", "RS"},
+            {folder + "/Desktop.ini", IniHeader + InfoTip + IconFile(icon)},
+            {folder + "/[P]/" + icon + ".ico", "{icon:" + icon + ".ico}"},
+            {folder + "/[P]/Folder.cfg", cfg}};
+}
+
 // Log lines; {icons} is where the icons of the run's direction come from.
 
 /// One folder's lines: those of its icon and those of its template.
@@ -131,7 +142,7 @@ inline const Text NoPrevious = "Unable to read: Previous Version  Default Impose
 inline const Text NoPreviousTo = "unable to read: Previous Version  Default Impose Template Path\n";
 inline const Text Updated = "Updated preset.xml  : ";
 
-/// A hot folder with this Folder.cfg, before and after; without the second, it stays. The lines
+/// A done folder with this Folder.cfg, before and after; without the second, it stays. The lines
 /// about its template are as if its name were A.
 struct HotFolder
 {
@@ -148,9 +159,9 @@ inline Scenario HotFolders(const Text& whatHappens, const std::map<Text, HotFold
     int position = 0;
     for (const auto& [name, folder] : folders)
     {
-        const Text place = Replaced(CfgPlace, "A", name);
-        scenario.File(place, folder.cfg, folder.becomes);
-        log += FolderLines(name, ++position, NoIcon(folder.icon),
+        scenario.Before(DoneFolder(name, folder.cfg, folder.icon));
+        scenario.File(Replaced(CfgPlace, "A", name), folder.cfg, folder.becomes);
+        log += FolderLines(name, ++position, Copied(folder.icon, name),
                            Replaced(folder.impose, "{hot}{/}A", "{hot}{/}" + name));
     }
     return scenario.Log(log);
