@@ -23,18 +23,26 @@ Scenario& Scenario::File(const Text& place, const Text& text, const Text& become
     return Before({{place, text}}).After(becomes.empty() ? Files() : Files{{place, becomes}});
 }
 
-Scenario& Scenario::Log(const Text& folders, const Text& presets)
+Scenario& Scenario::Log(const std::vector<FolderLog>& folders, const Text& presets)
 {
-    return WholeLog("{start}" + Text(folders.empty() ? "No Hotfolder listed\n" : "") +
-                    "Start: HF updation\n" + folders +
-                    "End: HF updation\nStart: Updating Impose path for JP Presets\n" + presets +
-                    "End: Updating Impose path for JP Presets\n");
-}
-
-Scenario& Scenario::LogOfA(const Text& impose, const Text& presets, const Text& icon)
-{
-    const bool isThere = before.count("hot/A/[P]/" + icon + ".ico") > 0;
-    return Log(FolderLines("A", 1, isThere ? Copied(icon) : NoIcon(icon), impose), presets);
+    const bool isUpgrade = arguments[0] != "U" && arguments[0] != "u";
+    Text lines = isUpgrade ? "Installation : Upgrade call with switch: I\n"
+                           : "Un-installation : Downgrade call with switch: U\n";
+    lines += Text(folders.empty() ? "No Hotfolder listed\n" : "") + "Start: HF updation\n";
+    int position = 0;
+    for (const auto& [folder, impose, icon] : folders)
+    {
+        const Text end = "{hot}{/}A count:  " + std::to_string(++position) + "\n";
+        const auto copy = before.find("hot/" + folder + "/[P]/" + icon + ".ico");
+        const bool isThere = copy != before.end() && copy->second != Removed;
+        const Text ofIcon = icon.back() == '\n' ? icon : isThere ? Copied(icon) : NoIcon(icon);
+        lines += Replaced(ofIcon + "Updated icon for hf" + end + impose +
+                              "updated Impose path for hf" + end,
+                          "{hot}{/}A", "{hot}{/}" + folder);
+    }
+    lines += "End: HF updation\nStart: Updating Impose path for JP Presets\n" + presets +
+             "End: Updating Impose path for JP Presets\n";
+    return WholeLog(Replaced(lines, "{icons}", isUpgrade ? "" : "BundleIcons{/}"));
 }
 
 Scenario& Scenario::IsReported(const Text& lines)

@@ -8,7 +8,6 @@
 #include <gtest/gtest.h>
 
 #include <optional>
-#include <ostream>
 #include <vector>
 
 /// In Before: the usual file does not exist.
@@ -26,6 +25,15 @@ inline const Text PresetPlace = "user/ORX/JPData/.P/Presets/presets.xml";
         return *this;                                                                              \
     }
 
+/// A hot folder's name, the lines about its template as if its name were A, and its icon's name (or
+/// the lines about it). If there is no icon of that name, the log says so.
+struct FolderLog
+{
+    Text name;
+    Text impose;
+    Text icon = "hf_folder";
+};
+
 struct Scenario
 {
     Text name;
@@ -41,14 +49,14 @@ struct Scenario
     Text shellCalls;
     std::optional<Text> report;
 
-    explicit Scenario(const Text& whatHappens) : name(whatHappens)
-    {
-    }
-
     /// Files in addition to the usual ones, or in place of them. The usual ones are the log of an
     /// earlier run, a template in each of the two template folders and their hives, an empty
     /// directory for presets, and HotFolderList.cfg, which lists every NAME of the places
     /// hot/NAME/... in order.
+    explicit Scenario(const Text& whatHappens, const Files& files = {})
+        : name(whatHappens), before(files)
+    {
+    }
     Scenario& Before(const Files& files);
     /// Files that change. Every other file and attribute has to stay as it is.
     Scenario& After(const Files& files);
@@ -64,11 +72,9 @@ struct Scenario
 
     /// The whole log, with LF instead of CR LF; if no log is given, that of the earlier run stays.
     SETTER(WholeLog, log, )
-    /// The log of a run with these lines about the hot folders and the presets.
-    Scenario& Log(const Text& folders, const Text& presets = "");
-    /// The same if A is the only hot folder, has this icon, if any, and these lines about its
-    /// template.
-    Scenario& LogOfA(const Text& impose, const Text& presets = "", const Text& icon = "hf_folder");
+    /// After Before and Run: the log of a run with these hot folders and these lines about the
+    /// presets.
+    Scenario& Log(const std::vector<FolderLog>& folders = {}, const Text& presets = "");
     /// The library itself reports an error, on Windows in a message box.
     SETTER(LibraryReports, libraryReports, = true)
 
@@ -101,12 +107,6 @@ std::map<Text, Difference> Differences(const Files& left, const Files& right);
 class Workstations : public testing::TestWithParam<Scenario>
 {
 };
-
-/// What GoogleTest prints instead of the scenario's bytes.
-inline void PrintTo(const Scenario& scenario, std::ostream* stream)
-{
-    *stream << scenario.name;
-}
 
 /// The head of a function that returns scenarios, which become a group of tests of that name.
 #define SCENARIOS(group)                                                                           \

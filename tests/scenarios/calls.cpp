@@ -12,9 +12,7 @@ namespace
 
 const Text Logs = "user/ORX_Installers/";
 const Text Folder = "tool/results/";
-const Text Old = "{tool}{/}previous{/}Booklet.tpl";
-const Text New = "{tool}{/}template{/}Booklet.tpl";
-const Text Refused = "  problem  Folder.cfg: cannot be opened for writing";
+const Text NotWritable = "  problem  Folder.cfg: cannot be opened for writing";
 const Text Reset = "\nLost or reset by the run\n  problem  {hot}{/}A: Folder.cfg: ";
 const Text Ended =
     "\n  problem  crashed, or was ended before it had finished\n  problem  the time is over, ";
@@ -29,36 +27,32 @@ struct Call
 };
 
 // A path of a Folder.cfg and one of a preset move, and both templates exist.
-Scenario Moving(const Text& name)
+Scenario Moving(const Text& name, const Files& files = {})
 {
-    return Scenario(name)
-        .Before({{MachineHive, MachineValue("\"InstallPath\"=\"{tool}\"")},
-                 {UserHive, UserValue("\"Path\"=\"{tool}{/}previous\"")}})
-        .Before({{"tool/previous/Booklet.tpl", ""}, {"tool/template/Booklet.tpl", ""}})
-        .Before({{CfgPlace, Written(Old)}})
-        .File(PresetPlace, Stored(Old), Stored(New));
+    return Scenario(name, {{CfgPlace, Written(MovedFrom)}})
+        .File(PresetPlace, Stored(MovedFrom), Stored(MovedTo))
+        .Before(files);
 }
 
-Scenario Staying(const Text& name)
+Scenario Staying(const Text& name, const Files& files = {})
 {
-    return Moving(name).File(PresetPlace, Stored(Old), Stored(Old));
+    return Moving(name, files).File(PresetPlace, Stored(MovedFrom), Stored(MovedFrom));
 }
 
 Scenario Into(const Text& name, const Files& files)
 {
-    return Moving(name).Before(files).Run({"I", "{tool}{/}results"});
+    return Moving(name, files).Run({"I", "{tool}{/}results"});
 }
 
 std::vector<Call> Calls()
 {
     const Text after = "FolderUpgrade-upgrade-after.txt";
-    const Text reset = Replaced(Written(Old), " description=\"\"", "");
+    const Text reset = Replaced(Written(MovedFrom), " description=\"\"", "");
     const Text manyFolders = "<l>" + Times(200000, "<HotFolder path='/missing/#'/>") + "</l>";
     return {
-        {Moving("AllIsDoneAndTheLogFolderIsMade").Before({{LogPlace, Removed}}), 0},
-        {Moving("TheWayBack")
-             .Before({{CfgPlace, Written(New)}})
-             .File(PresetPlace, Stored(New), Stored(Old))
+        {Moving("AllIsDoneAndTheLogFolderIsMade", {{LogPlace, Removed}}), 0},
+        {Moving("TheWayBack", {{CfgPlace, Written(MovedTo)}})
+             .File(PresetPlace, Stored(MovedTo), Stored(MovedFrom))
              .Run({"u", "--limit", "600"}),
          0},
         {Into("EarlierResultsAreReplaced", {{Folder + after, Text(9999, '.')}}), 0, "", Folder},
@@ -71,28 +65,22 @@ std::vector<Call> Calls()
              .After({{"elsewhere/a", "stays"}})
              .NotUnderWine(NoLinks),
          2, "", ""},
-        {Moving("ABoxWithAListIsClosed")
-             .Before({{CfgPlace + "#", "R"}, {"hot/B/[P]/Folder.cfg", ""}})
+        {Moving("ABoxWithAListIsClosed", {{CfgPlace + "#", "R"}, {"hot/B/[P]/Folder.cfg", ""}})
              .AsOtherUser(),
-         2, Refused},
-        {Moving("WhatWasResetIsSaid").Before({{CfgPlace, reset}}), 2, Reset},
-        {Staying("AnAccountWithoutAPath").Before({{UserHive, Removed}}), 2, "; nothing moves"},
+         2, NotWritable},
+        {Moving("WhatWasResetIsSaid", {{CfgPlace, reset}}), 2, Reset},
+        {Staying("AnAccountWithoutAPath", {{UserHive, Removed}}), 2, "; nothing moves"},
         {Staying("TheProgramIsMissing"), 4,
          "\nFolderUpgrade\n  problem  could not be started (error 2: ", Logs, ""},
         {Staying("TheProgramDoesNotEnd").Run({"I", "--limit", "3"}), 4, Ended, Logs, "endless"},
-        {Staying("ACheckDoesNotEnd").Before({{ListPlace, manyFolders}}).Run({"I", "--limit", "1"}),
-         4, "The time is over. A check was not finished.\n"},
+        {Staying("ACheckDoesNotEnd", {{ListPlace, manyFolders}}).Run({"I", "--limit", "1"}), 4,
+         "The time is over. A check was not finished.\n"},
     };
 }
 
 class CallsOfAnInstaller : public testing::TestWithParam<Call>
 {
 };
-
-void PrintTo(const Call& call, std::ostream* stream)
-{
-    *stream << call.scenario.name;
-}
 
 TEST_P(CallsOfAnInstaller, LeaveTheirResults)
 {

@@ -144,11 +144,11 @@ SCENARIOS(FolderCfgs)
             .Before({{UserHive, UserValue("\"Path\"=\"{/}{/}host{/}share{/}old\"")}}),
         HotFolders("ATemplateInARelativeFolderMoves", {{"A", path("x{/}y{/}B", "{default}{/}B")}})
             .Before({{UserHive, UserValue("\"Path\"=\"x{/}y\"")}}),
-        Scenario("HiddenAndSystemFilesAreWrittenAndKeepTheirAttributes")
-            .Before({{CfgPlace + "#", "HS"}, {PresetPlace + "#", "HS"}})
+        Scenario("HiddenAndSystemFilesAreWrittenAndKeepTheirAttributes",
+                 {{CfgPlace + "#", "HS"}, {PresetPlace + "#", "HS"}})
             .File(CfgPlace, Written(MovedFrom), Written(MovedTo))
             .File(PresetPlace, Stored(MovedFrom), Stored(MovedTo))
-            .LogOfA(found, PresetLine(Updated)),
+            .Log({{"A", found}}, PresetLine(Updated)),
         HotFolders("DamagedFolderCfgsStayAndShowAsDisabled",
                    {{"Empty", {}},
                     {"Truncated", {Data("foreign.cfg", MovedFrom).substr(0, 700)}},
@@ -159,8 +159,7 @@ SCENARIOS(FolderCfgs)
 Empty: problem  Folder.cfg: damaged (line 1: no element found); it stays as it is, and the folder shows as disabled
 Truncated: problem  Folder.cfg: damaged (line 1: unclosed token); it stays as it is, and the folder shows as disabled
 WithoutADescription: problem  Folder.cfg: lacks "description", so the enabled folder shows as disabled)"),
-        Scenario("Losses")
-            .Before(DoneFolder("A", Rich()))
+        Scenario("Losses", DoneFolder("A", Rich()))
             .Before(DoneFolder("B", Replaced(Written(MovedFrom), " TimeInterval=\"010\"", "")))
             .Before(DoneFolder("C", Replaced(Written(MovedFrom), "Enable=\"1\"", "Enable=\"true\""),
                                Disabled))
@@ -197,16 +196,12 @@ SCENARIOS(Refusals)
     const Text cfg = Written(MovedFrom);
     const Text preset = Stored(MovedFrom);
     return {
-        Scenario("WhatCannotBeReadStays")
-            .Before({{CfgPlace, cfg}, {"hot/B/[P]/Folder.cfg", cfg}, {"hot/C/[P]/Folder.cfg", cfg}})
+        Refused("WhatCannotBeReadStays",
+                {{CfgPlace, cfg}, {"hot/B/[P]/Folder.cfg", cfg}, {"hot/C/[P]/Folder.cfg", cfg}})
             .Before({{CfgPlace + "#", "0"}, {"hot/B/[P]#", "0"}, {"hot/C#", "0"}})
             .Before({{PresetPlace, preset}, {PresetPlace + "#", "0"}})
             .Before({{JobPresets + "/Q/Presets/presets.xml", preset}, {JobPresets + "/Q#", "0"}})
-            .AsOtherUser()
-            .LibraryReports()
-            .Log(FolderLines("A", 1, NoIcon(Disabled), "") +
-                     FolderLines("B", 2, NoIcon(Disabled), NoCfg("B")) +
-                     FolderLines("C", 3, NoIcon(Disabled), NoCfg("C")),
+            .Log({{"A", "", Disabled}, {"B", NoCfg, Disabled}, {"C", NoCfg, Disabled}},
                  PresetLine("Unable to open preset.xml for read : "))
             .IsReported(R"(
 A: problem  Folder.cfg: can't open file*
@@ -215,8 +210,7 @@ B: problem  [_ORX_HotFolder_]: cannot be entered
 C: problem  the hot folder cannot be entered
 Job presets: problem  .P{xml}: cannot be opened for reading (can't open file*
 Job presets: problem  Q{xml}: {user}{/}ORX{/}JPData{/}Q cannot be entered)"),
-        Scenario("WhatCannotBeWrittenStays")
-            .Before(DoneFolder("A", cfg))
+        Refused("WhatCannotBeWrittenStays", DoneFolder("A", cfg))
             .Before(DoneFolder("B", Written(MovedTo)))
             .Before(
                 {{CfgPlace + "#", "R"}, {"hot/B/[P]/Folder.cfg#", "R"}, {PresetPlace + "#", "R"}})
@@ -231,12 +225,7 @@ Job presets: problem  Q{xml}: {user}{/}ORX{/}JPData{/}Q cannot be entered)"),
                     {"hot/C/Desktop.ini#", "RS"},
                     {"hot/C/Desktop.ini",
                      IniHeader + IconFile(Disabled) + "IconIndex=00\r\n" + InfoTip}})
-            .AsOtherUser()
-            .LibraryReports()
-            .Log(FolderLines("A", 1, Copied("hf_folder"), found) +
-                     FolderLines("B", 2, Copied("hf_folder", "B"),
-                                 Replaced(Found(MovedTo), "{hot}{/}A", "{hot}{/}B")) +
-                     FolderLines("C", 3, Copied(Disabled, "C"), NoCfg("C")),
+            .Log({{"A", found}, {"B", Found(MovedTo)}, {"C", NoCfg, Disabled}},
                  PresetLine("Unable to open preset.xml for write : "))
             .IsReported(R"(
 A: problem  Folder.cfg: cannot be opened for writing (can't open file*
@@ -251,22 +240,15 @@ C: change   hot folder: attributes none -> SYSTEM
 C: note     no Folder.cfg
 Job presets: problem  .P{xml}: cannot be opened for writing (can't open file*
 Job presets: problem  .P{xml}: stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl)"),
-        Scenario("AReadOnlyLogStays")
+        Refused("AReadOnlyLogStays", {{LogPlace + "#", "R"}})
             .Before(DoneFolder("A", cfg))
-            .Before({{LogPlace + "#", "R"}})
             .After({{CfgPlace, Written(MovedTo)}})
-            .AsOtherUser()
-            .LibraryReports()
             .IsReported(R"(
 Workstation: problem  there will be no run log: can't open file*
 A: {moves})"),
-        Scenario("AnUnreadableListIsEmpty")
-            .Before({{"hot/A/", ""}, {ListPlace + "#", "0"}})
-            .AsOtherUser()
-            .LibraryReports()
-            .Log("")
-            .IsReported(R"(
-Workstation: problem  can't open file*; no hot folder is migrated)"),
+        Refused("AnUnreadableListIsEmpty", {{"hot/A/", ""}, {ListPlace + "#", "0"}})
+            .Log()
+            .IsReported("Workstation: problem  can't open file*; no hot folder is migrated"),
     };
 }
 

@@ -16,44 +16,37 @@ SCENARIOS(PlantedLinks)
     const Text iniStays =
         "Desktop.ini left as it is (reached over a link): {hot}{/}A{/}Desktop.ini\n";
     std::vector<Scenario> scenarios = {
-        Scenario("LinkedPrivateAndPresetDirectoriesAreNotOpened")
-            .Before({{"elsewhere/P/Folder.cfg", cfg},
-                     {"elsewhere/P/hf_folder_disabled.ico", "old"},
-                     {"elsewhere/P/presets.xml", from},
-                     {PresetDir + "/", "{link:elsewhere/P}"},
-                     {"hot/A/[P]/", "{link:elsewhere/P}"}})
-            .LogOfA(NoCfg(), PresetLine(CannotOpenPreset), Disabled)
+        Scenario("LinkedPrivateAndPresetDirectoriesAreNotOpened",
+                 {{"elsewhere/P/Folder.cfg", cfg},
+                  {"elsewhere/P/hf_folder_disabled.ico", "old"},
+                  {"elsewhere/P/presets.xml", from},
+                  {PresetDir + "/", "{link:elsewhere/P}"},
+                  {"hot/A/[P]/", "{link:elsewhere/P}"}})
+            .Log({{"A", NoCfg, Disabled}}, PresetLine(CannotOpenPreset))
             .IsReported(R"(
 A: problem  [_ORX_HotFolder_]: reached over a link
 Job presets: problem  .P{xml}: reached over a link, or not a file)"),
-        Scenario("ALinkedLogFolderGetsNoLog")
-            .Before({{LogPlace, Removed},
-                     {"elsewhere/L/UpgradeDowngrade.log", "-"},
-                     {LogFolder + "/", "{link:elsewhere/L}"}})
+        Scenario("ALinkedLogFolderGetsNoLog", {{LogPlace, Removed},
+                                               {"elsewhere/L/UpgradeDowngrade.log", "-"},
+                                               {LogFolder + "/", "{link:elsewhere/L}"}})
             .File(CfgPlace, cfg, Written(MovedTo)),
-        Scenario("AHotFolderAndAJobPresetDirectoryMayBeLinks")
-            .Before({{"elsewhere/A/[P]/Folder.cfg", cfg},
-                     {"hot/A/", "{link:elsewhere/A}"},
-                     {"elsewhere/P/Presets/presets.xml", from},
-                     {JobPresets + "/.P/", "{link:elsewhere/P}"}})
+        Scenario("AHotFolderAndTheFoldersAboveAPresetMayBeLinks",
+                 {{"hot/A/", "{link:elsewhere/A}"},
+                  {"elsewhere/A/[P]/Folder.cfg", cfg},
+                  {JobPresets + "/", Removed},
+                  {"user/ORX/", "{link:elsewhere/ORX}"},
+                  {"elsewhere/ORX/JPData/", "{link:elsewhere/JPData}"},
+                  {"elsewhere/JPData/.P/", "{link:elsewhere/P}"},
+                  {"elsewhere/P/Presets/presets.xml", from}})
             .After({{"elsewhere/A/[P]/Folder.cfg", Written(MovedTo)},
                     {"elsewhere/P/Presets/presets.xml", Stored(MovedTo)}})
-            .LogOfA(Found(MovedFrom), PresetLine(Updated)),
-        Scenario("TheFoldersAboveThePresetsMayBeLinks")
-            .Before({{JobPresets + "/", Removed},
-                     {"elsewhere/ORX/other", ""},
-                     {"elsewhere/JPData/.P/Presets/presets.xml", from},
-                     {"user/ORX/", "{link:elsewhere/ORX}"},
-                     {"elsewhere/ORX/JPData/", "{link:elsewhere/JPData}"}})
-            .After({{"elsewhere/JPData/.P/Presets/presets.xml", Stored(MovedTo)}})
-            .Log("", PresetLine(Updated)),
-        Scenario("ALinkedErrorFileCountsByItsName")
-            .Before({{"elsewhere/other", ""}, {"hot/A/[P]/Error.er", "{link:elsewhere/missing}"}})
+            .Log({{"A", Found(MovedFrom)}}, PresetLine(Updated)),
+        Scenario("ALinkedErrorFileCountsByItsName",
+                 {{"elsewhere/other", ""}, {"hot/A/[P]/Error.er", "{link:elsewhere/missing}"}})
             .File(CfgPlace, cfg, Written(MovedTo))
-            .LogOfA(Found(MovedFrom), "", "hf_error_active")
+            .Log({{"A", Found(MovedFrom), "hf_error_active"}})
             .NotUnderWine(NoLinks),
     };
-    const Text copied = Copied(Disabled);
     // In that place: a link to a file with this text, a dangling link, and a pipe.
     const auto add = [&](const Scenario& scenario, const Text& place, const Text& text,
                          const Text& linked, const Text& piped)
@@ -73,33 +66,32 @@ Job presets: problem  .P{xml}: reached over a link, or not a file)"),
     };
     const auto done = [](const Text& name)
     {
-        return Scenario(name).Before(DoneFolder("A", "<H/>", Disabled));
+        return Scenario(name, DoneFolder("A", "<H/>", Disabled));
     };
-    add(done("AFolderCfg").Log(CopiedToA()), CfgPlace, cfg,
+    add(done("AFolderCfg").Log({{"A", NoCfg, Disabled}}), CfgPlace, cfg,
         "A: problem  Folder.cfg: reached over a link", "A: problem  Folder.cfg: is not a file");
-    add(done("AnIcon").Before({{Icon, Removed}}).Log(FolderLines("A", 1, NoIcon(Disabled), "")),
-        Icon, "old", "A: problem  hf_folder_disabled.ico: reached over a link", "A: {nodisabled}");
+    add(done("AnIcon").Before({{Icon, Removed}}).Log({{"A", "", Disabled}}), Icon, "old",
+        "A: problem  hf_folder_disabled.ico: reached over a link", "A: {nodisabled}");
     add(done("DesktopIni")
             .Before({{Ini + "#", Removed}})
-            .Log(FolderLines("A", 1, iniStays + copied, "")),
+            .Log({{"A", "", iniStays + Copied(Disabled)}}),
         Ini, "[.ShellClassInfo]\r\n",
         "A: problem  Desktop.ini: left as it is (reached over a link)",
         "A: problem  Desktop.ini: is not a file\nA: change   Desktop.ini: attributes none -> "
         "READONLY SYSTEM");
-    scenarios.back().Log(FolderLines("A", 1, copied, ""));
+    scenarios.back().Log({{"A", "", Disabled}});
     const Text preset = "Workstation: {nofolder}\nJob presets: problem  .P{xml}: reached over a "
                         "link, or not a file";
-    add(Scenario("APreset").Log("", PresetLine(CannotOpenPreset)), PresetDir + "/presets.xml", from,
+    add(Scenario("APreset").Log({}, PresetLine(CannotOpenPreset)), PresetDir + "/presets.xml", from,
         preset, preset);
-    add(Scenario("TheLog").Before(DoneFolder("A", cfg)).After({{CfgPlace, Written(MovedTo)}}),
-        LogPlace, "-",
+    add(Scenario("TheLog", DoneFolder("A", cfg)).After({{CfgPlace, Written(MovedTo)}}), LogPlace,
+        "-",
         "Workstation: problem  there will be no run log: it is reached over a link: {log}\nA: "
         "{moves}",
         "Workstation: note     there will be no run log: something else has its name: {log}\nA: "
         "{moves}");
-    scenarios.push_back(Scenario("TheListIsAPipe")
-                            .Before({{ListPlace, "{fifo}"}, {"hot/A/", ""}})
-                            .Log("")
+    scenarios.push_back(Scenario("TheListIsAPipe", {{ListPlace, "{fifo}"}, {"hot/A/", ""}})
+                            .Log()
                             .NotOnWindows(NoPipes));
     return scenarios;
 }

@@ -17,7 +17,7 @@ SCENARIOS(Presets)
     {
         return Scenario(name)
             .File(PresetPlace, preset)
-            .Log("", PresetLine(logged))
+            .Log({}, PresetLine(logged))
             .IsReported("Workstation: {nofolder}" +
                         Replaced("\n" + reported, "\n", "\nJob presets: "));
     };
@@ -40,8 +40,8 @@ SCENARIOS(Presets)
                       Stored("{previous}") + near,
                   "\r\n" + to + near + "\r\n" + Stored("{default}{/}Sub{/}x") +
                       Stored("{default}") + near)
-            .Log("", PresetLine(Updated)),
-        Scenario("AnEmptyPresetIsUpdated").File(PresetPlace, "").Log("", PresetLine(Updated)),
+            .Log({}, PresetLine(Updated)),
+        Scenario("AnEmptyPresetIsUpdated").File(PresetPlace, "").Log({}, PresetLine(Updated)),
         updated("AByteOrderMarkGoes", "\xEF\xBB\xBF" + from, to, "{presetmoves}"),
         updated("AByteOrderMarkAloneGoes", "\xEF\xBB\xBF", "",
                 "change   .P{xml}: loses its byte-order mark"),
@@ -62,21 +62,20 @@ SCENARIOS(Presets)
         left("HalfAUtf16UnitStays", Text("\xFF\xFE") + Text("a\0b", 3), "cannot be decoded"),
         left("ALoneSurrogateStays", Text("\xFF\xFE\0\0\0\xD8\0\0a\0\0\0", 12),
              "cannot be encoded again"),
-        Scenario("FoldersInPlaceOfStoredFilesAreSkipped")
-            .Before({{CfgPlace + "/", ""}, {PresetPlace + "/", ""}})
-            .LogOfA(NoCfg(), PresetLine("Unable to open preset.xml for read : "), Disabled)
+        Scenario("FoldersInPlaceOfStoredFilesAreSkipped",
+                 {{CfgPlace + "/", ""}, {PresetPlace + "/", ""}})
+            .Log({{"A", NoCfg, Disabled}}, PresetLine("Unable to open preset.xml for read : "))
             .IsReported(R"(
 A: problem  Folder.cfg: is not a file
 A: {nodisabled}
 Job presets: problem  .P{xml}: reached over a link, or not a file)"),
-        Scenario("OnlyDirectSubdirectoriesAreSearchedEvenIfTheListIsAFolder")
-            .Before({{ListPlace, Removed}, {ListPlace + "/", ""}})
+        Scenario("OnlyDirectSubdirectoriesAreSearchedEvenIfTheListIsAFolder",
+                 {{ListPlace, Removed}, {ListPlace + "/", ""}})
             .Before({{"user/ORX/JPData/Presets/presets.xml", from},
                      {"user/ORX/JPData/P/Q/Presets/presets.xml", from},
                      {"user/ORX/JPData/presets.xml", from}})
-            .Log("")
-            .IsReported(R"(
-Workstation: problem  HotFolderList.cfg: is not a file)"),
+            .Log()
+            .IsReported("Workstation: problem  HotFolderList.cfg: is not a file"),
     };
 }
 

@@ -9,8 +9,7 @@ namespace
 Scenario Both(const Text& name, const Text& letter, const Files& hives)
 {
     const Text path = letter == "I" ? MovedFrom : MovedTo;
-    return Scenario(name)
-        .Before(DoneFolder("A", Written(path)))
+    return Scenario(name, DoneFolder("A", Written(path)))
         .Before(hives)
         .File(PresetPlace, Stored(path))
         .Run({letter});
@@ -28,27 +27,27 @@ SCENARIOS(Registry)
     const Text updated = PresetLine(Updated);
     return {
         Both("WithoutAnyHiveNothingMoves", "I", {{MachineHive, Removed}, {UserHive, "garbage"}})
-            .LogOfA(found + NoPrevious, NoDefault + NoPrevious),
+            .Log({{"A", found + NoPrevious}}, NoDefault + NoPrevious),
         Both("WithoutATemplateNoFolderIsLookedUp", "I", {{MachineHive, Removed}, {UserHive, ""}})
             .File(CfgPlace, "<H><ImposeSetting/></H>")
-            .LogOfA(Found(""), NoDefault + NoPrevious, Disabled)
+            .Log({{"A", Found(""), Disabled}}, NoDefault + NoPrevious)
             .IsReported(R"(
 A: {nodisabled}
 Job presets: problem  registry value InstallPath in HKEY_LOCAL_MACHINE\SOFTWARE\Wow6432Node\Vantorix\QZA or \SOFTWARE\Vantorix\QZA: there is no such key{nothing}
 Job presets: problem  registry value Path in HKEY_CURRENT_USER\SOFTWARE\Wow6432Node\HF or \SOFTWARE\HF: there is no such key{nothing})"),
         Both("WithoutADefaultFolderAnUpgradeMovesNothing", "I",
              {{MachineHive, MachineValue("\"x\"=\"y\"")}})
-            .LogOfA(found + NoDefault, NoDefault),
+            .Log({{"A", found + NoDefault}}, NoDefault),
         Both("WithoutAPreviousFolderADowngradeMovesNothing", "U",
              {{UserHive, UserValue("\"x\"=\"y\"")}})
-            .LogOfA(foundNew + NoPreviousTo, NoPrevious)
+            .Log({{"A", foundNew + NoPreviousTo}}, NoPrevious)
             .IsReported(R"(
 A: problem  {Path}: missing{nothing}
 A: problem  stays in the folder being left (the folder being installed is unknown): {default}{/}Booklet.tpl)"),
         WithPrevious(
             "A32BitKeyHidesTheOtherEvenWithoutAValue",
             "\"Path\"=\"{previous}\"\r\n\r\n[HKEY_CURRENT_USER\\software\\wow6432node\\hf]")
-            .LogOfA(found + NoPrevious, NoPrevious)
+            .Log({{"A", found + NoPrevious}}, NoPrevious)
             .IsReported("A: problem  registry value Path in HKEY_CURRENT_USER\\SOFTWARE\\"
                         "Wow6432Node\\HF: missing, and no other key is looked at{nothing}"),
         WithPrevious("A32BitKeyComesFirst",
@@ -58,15 +57,16 @@ A: problem  stays in the folder being left (the folder being installed is unknow
                                                 "MACHINE\\SOFTWARE\\Wow6432Node\\Vantorix\\QZA]\r\n"
                                                 "\"InstallPath\"=\"{app}\"")}})
             .After({{CfgPlace, Written(MovedTo)}, {PresetPlace, Stored(MovedTo)}})
-            .LogOfA(found, updated),
+            .Log({{"A", found}}, updated),
         WithPrevious("ATextOf258CharactersIsTooLong", "\"Path\"=\"" + Text(258, 'x') + "\"")
-            .LogOfA(found + NoPrevious, NoPrevious)
+            .Log({{"A", found + NoPrevious}}, NoPrevious)
             .IsReported("A: problem  {Path}: longer than 257 characters{nothing}"),
         WithPrevious("ATextOf257CharactersIsRead", "\"Path\"=\"" + Text(257, 'x') + "\"")
-            .LogOfA(found, updated),
+            .Log({{"A", found}}, updated),
         Both("ANumberAsTheNewFolderMovesNothing", "I",
              {{MachineHive, MachineValue("\"InstallPath\"=dword:00000001")}})
-            .LogOfA(found + Untouched("new path holds a character that XML cannot store"), updated)
+            .Log({{"A", found + Untouched("new path holds a character that XML cannot store")}},
+                 updated)
             .IsReported(R"(
 A: problem  Folder.cfg: left as it is (new path holds a character that XML cannot store)
 A: problem  stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl
@@ -74,10 +74,10 @@ Job presets: problem  .P{xml}: stays in the folder being left (no path moves): {
 Job presets: problem  the folder being installed holds a character that XML cannot store; no path of a preset moves)"),
         WithPrevious("AnUnterminatedOddValueIsReadToItsLastWholeUnit",
                      "\"Path\"=hex:78,00,79,00,7a")
-            .LogOfA(found, updated),
+            .Log({{"A", found}}, updated),
         WithPrevious("AFinalSeparatorMovesPresetsOnly", "\"Path\"=\"{previous}{/}\"")
             .After({{PresetPlace, Stored(MovedTo)}})
-            .LogOfA(found, updated)
+            .Log({{"A", found}}, updated)
             .IsReported(R"(
 Workstation: problem  {Path}: ends in a separator; no template of a hot folder moves
 A: problem  stays in the folder being left (the registry value ends in a separator): {previous}{/}Booklet.tpl
@@ -86,18 +86,18 @@ Job presets: {presetmoves})"),
              {{UserHive, UserValue("\"Path\"=\"{previous}{/}\"")}})
             .After({{CfgPlace, Written("{previous}{/}{/}Booklet.tpl")},
                     {PresetPlace, Stored(MovedFrom)}})
-            .LogOfA(foundNew, updated)
+            .Log({{"A", foundNew}}, updated)
             .IsReported(R"(
 Workstation: problem  {Path}: ends in a separator; it is doubled in the paths of hot folders
 A: change   Folder.cfg: {default}{/}Booklet.tpl -> {previous}{/}{/}Booklet.tpl
 Job presets: change   .P{xml}: {default}{/}Booklet.tpl -> {previous}{/}Booklet.tpl)"),
         WithPrevious("AnEmptyPreviousFolderReplacesNothing", "\"Path\"=\"\"")
-            .LogOfA(found, updated)
+            .Log({{"A", found}}, updated)
             .IsReported("Workstation: problem  {Path}: empty; only templates stored without a "
                         "folder move"),
         WithPrevious("BothFoldersAreTheSame", "\"Path\"=\"{app}{/}template\"")
             .Before({{CfgPlace, Written(MovedTo)}, {PresetPlace, Stored(MovedTo)}})
-            .LogOfA(foundNew, updated)
+            .Log({{"A", foundNew}}, updated)
             .IsReported(""),
     };
 }
@@ -107,8 +107,7 @@ SCENARIOS(Templates)
 {
     const auto with = [](const Text& name, const Text& path, const Text& letter = "U")
     {
-        return Scenario(name)
-            .Before({{UserHive, UserValue("\"Path\"=\"" + path + "\"")}})
+        return Scenario(name, {{UserHive, UserValue("\"Path\"=\"" + path + "\"")}})
             .Before(DoneFolder("A", Written("{hot}{/}A")))
             .File(PresetPlace, Stored("{hot}{/}A"))
             .Run({letter});
@@ -125,8 +124,7 @@ Job presets: problem  {Path}: holds & or <, which is inserted into presets as it
             .IsReported(R"(
 Job presets: change   .P{xml}: {default}{/}Booklet.tpl -> {default}{/}template{/}Booklet.tpl
 Job presets: problem  one template folder is below the other: another run would move paths of presets again)"),
-        Scenario("TemplatesAreMissing")
-            .Before(DoneFolder("A", Written("{default}{/}none")))
+        Scenario("TemplatesAreMissing", DoneFolder("A", Written("{default}{/}none")))
             .Before(DoneFolder("B", Written("{previous}{/}Sub{/}T")))
             .Before(DoneFolder("C", Written("{hot}{/}C{/}D{/}T")))
             .Before({{"hot/C/D/", "{link:elsewhere/d}"},
@@ -145,8 +143,7 @@ Job presets: note     .P{xml}: not looked at: {default}{/}D{/}T
 Job presets: problem  .P{xml}: no template at {default}{/}<A&none;
 Job presets: problem  .P{xml}: stays in the folder being left (other separators): {hot}{/}..{/}Vorige 版{/}T
 Job presets: problem  .P{xml}: stays in the folder being left (stored as XML): {hot}{/}..{/}Vorige 版{/}&)"),
-        Scenario("ARehearsal")
-            .Before(DoneFolder("A", Written("{hot}{/}old{/}T")))
+        Scenario("ARehearsal", DoneFolder("A", Written("{hot}{/}old{/}T")))
             .File(PresetPlace, Stored("{hot}{/}old{/}T") + Stored("{hot}{/}old{/}T"))
             .Before({{MachineHive, Removed}, {UserHive, Removed}})
             .Run({"I", "--from", "{hot}{/}old", "--to", "{hot}{/}new"})

@@ -54,7 +54,7 @@ SCENARIOS(Sizes)
 {
     const auto listed = [](const Text& name, const Text& list)
     {
-        return Scenario(name).Before({{"hot/A/", ""}, {ListPlace, "<l>" + list + "</l>"}});
+        return Scenario(name, {{"hot/A/", ""}, {ListPlace, "<l>" + list + "</l>"}});
     };
     const Text listedA = "<HotFolder path='{hot}{/}A'/>";
     const Text lines = Times(3000, "123456789\n");
@@ -103,10 +103,10 @@ SCENARIOS(Sizes)
                       Found(MovedFrom)}},
                     {"Variables", Elsewhere(Times(200000, "$"), Times(200000, "$"))},
                     {"Expanded variables", Elsewhere("&a5;&a5;&a5;", Times(300000, "$"))}}),
-        listed("AListThatIsTooDeepIsEmpty", Times(6000, "<e>")).Log(""),
-        listed("AListThatIsTooBigIsEmpty", listedA + Times(1600000, "<a/>")).Log(""),
+        listed("AListThatIsTooDeepIsEmpty", Times(6000, "<e>")).Log(),
+        listed("AListThatIsTooBigIsEmpty", listedA + Times(1600000, "<a/>")).Log(),
         listed("AListOf20000EntriesIsRead", listedA + Times(20000, "<HotFolder path='/missing'/>"))
-            .Log(FolderLines("A", 1, NoIcon(Disabled), NoCfg("A"))),
+            .Log({{"A", NoCfg, Disabled}}),
     };
 }
 

@@ -94,35 +94,25 @@ inline Files DoneFolder(const Text& name, const Text& cfg, const Text& icon = "h
             {folder + "/[P]/Folder.cfg", cfg}};
 }
 
-// Log lines; {icons} is where the icons of the run's direction come from.
-
-/// One folder's lines: those of its icon and those of its template.
-inline Text FolderLines(const Text& name, int position, const Text& icon, const Text& impose)
+/// A scenario in which something is refused to a user who is not root, which the library reports.
+inline Scenario Refused(const Text& whatHappens, const Files& files)
 {
-    const Text end = name + " count:  " + std::to_string(position) + "\n";
-    return icon + "Updated icon for hf{hot}{/}" + end + impose +
-           "updated Impose path for hf{hot}{/}" + end;
+    return Scenario(whatHappens, files).AsOtherUser().LibraryReports();
 }
+
+// Log lines; {icons} is where the icons of the run's direction come from.
 
 inline Text NoIcon(const Text& name)
 {
     return "Icon path  not exist: {tool}{/}{icons}" + name + ".ico\n";
 }
-inline Text Copied(const Text& icon, const Text& folder = "A")
+inline Text Copied(const Text& icon)
 {
-    return "Icon  copied from : {tool}{/}{icons}" + icon + ".ico To {hot}{/}" + folder +
-           "{/}[_ORX_HotFolder_]{/}" + icon + ".ico \n";
+    return "Icon  copied from : {tool}{/}{icons}" + icon +
+           ".ico To {hot}{/}A{/}[_ORX_HotFolder_]{/}" + icon + ".ico \n";
 }
-inline Text NoCfg(const Text& name = "A")
-{
-    return "HF cfg file unable to read/exist: {hot}{/}" + name +
-           "{/}[_ORX_HotFolder_]{/}Folder.cfg\n";
-}
-/// The lines of A if its icon is replaced and it has no Folder.cfg.
-inline Text CopiedToA(const Text& other = "")
-{
-    return FolderLines("A", 1, other + Copied(Disabled), NoCfg());
-}
+inline const Text NoCfg =
+    "HF cfg file unable to read/exist: {hot}{/}A{/}[_ORX_HotFolder_]{/}Folder.cfg\n";
 inline Text Untouched(const Text& reason)
 {
     return "HF cfg file left as it is (" + reason +
@@ -155,14 +145,12 @@ struct HotFolder
 inline Scenario HotFolders(const Text& whatHappens, const std::map<Text, HotFolder>& folders)
 {
     Scenario scenario(whatHappens);
-    Text log;
-    int position = 0;
+    std::vector<FolderLog> log;
     for (const auto& [name, folder] : folders)
     {
         scenario.Before(DoneFolder(name, folder.cfg, folder.icon));
         scenario.File(Replaced(CfgPlace, "A", name), folder.cfg, folder.becomes);
-        log += FolderLines(name, ++position, Copied(folder.icon, name),
-                           Replaced(folder.impose, "{hot}{/}A", "{hot}{/}" + name));
+        log.push_back({name, folder.impose, folder.icon});
     }
     return scenario.Log(log);
 }
