@@ -55,6 +55,7 @@ Scenario& Scenario::IsReported(const Text& lines)
                {"{presetmoves}", "change   .P{xml}: " + MovedFrom + " -> " + MovedTo},
                {"{xml}", "{/}Presets{/}presets.xml"},
                {"{nodisabled}", "note     no copy of the icon to replace: hf_folder_disabled.ico"},
+               {"{noicon}", "note     no copy of the icon to replace: hf_folder.ico"},
                {"{nofolder}", "note     HotFolderList.cfg lists no hot folder"},
                {"{nothing}", ", for the account *; nothing moves. Run as the client's user, "
                              "after its installation"},

@@ -79,7 +79,6 @@ Report Check(const Workstation& workstation, const std::vector<Text>& arguments)
         std::regex_replace(Replaced(run.output, "\r", ""),
                            std::regex("(for the account |can't open file)[^;\n]*"), "$1*"));
     Text title; // the head and the sum are titles without lines
-    std::vector<Text> lines;
     for (Text line; std::getline(text, line);)
     {
         if (!StartsWith(line, "  "))
@@ -91,17 +90,9 @@ Report Check(const Workstation& workstation, const std::vector<Text>& arguments)
             report.changed.insert(title + line.substr(0, line.find(": ")) +
                                   (line.find(": attributes ") == Text::npos ? "" : "#"));
         report.problems += StartsWith(line, "  problem") ? 1 : 0;
-        lines.push_back("\n" + Replaced(title, workstation.Expand("{hot}{/}"), "") + ":" +
-                        line.substr(1));
+        report.lines +=
+            "\n" + Replaced(title, workstation.Expand("{hot}{/}"), "") + ":" + line.substr(1);
     }
-    // Presets come in the order of their directory.
-    const auto isPresets = [](const Text& line)
-    {
-        return StartsWith(line, "\nJob presets");
-    };
-    std::sort(std::find_if(lines.begin(), lines.end(), isPresets), lines.end());
-    for (const Text& line : lines)
-        report.lines += line;
     EXPECT_EQ(report.problems > 0 ? 2 : report.changed.empty() ? 0 : 1, run.status) << run.output;
     return report;
 }

@@ -16,18 +16,13 @@ Scenario Gaps()
         "server_textversion server_type Quickset Quickset_Supported Quickset_Enabled IsWidthBased");
     const std::vector<Text> chain(std::istream_iterator<Text>(words), {});
     // server_version is read after 14 of them, and is no gap itself.
-    const std::vector<std::pair<Text, Text>> numbers = {{"2147483647", "2147483647"},
-                                                        {"-2147483648", "-2147483648"},
-                                                        {"2147483648", "0"},
-                                                        {"x1", "0"},
-                                                        {" 01", "1"},
-                                                        {"", "0"},
-                                                        {"9x", "9"}};
+    const Text numbers[] = {"2147483647", "-2147483648", "2147483648", "x1", " 01", "", "9x"};
+    const Text read[] = {"2147483647", "-2147483648", "0", "0", "1", "0", "9"};
     std::map<Text, HotFolder> folders;
     for (size_t gap = 0; gap <= chain.size(); ++gap)
     {
-        const auto& [number, read] = numbers[gap < 14 ? 0 : gap - 14];
-        Text attributes = "<HotFolder server_version='" + number + "'";
+        const size_t row = gap < 14 ? 0 : gap - 14;
+        Text attributes = "<HotFolder server_version='" + numbers[row] + "'";
         Text written = MinimalWritten(MovedTo);
         for (size_t i = 0; i < chain.size(); ++i)
         {
@@ -39,8 +34,8 @@ Scenario Gaps()
         }
         folders["gap " + std::to_string(10 + gap)] = {
             Replaced(Minimal(MovedFrom), "<HotFolder", attributes),
-            Replaced(written, "\"-1\"", "\"" + (gap < 14 ? "-1" : read) + "\""), Found(MovedFrom),
-            gap > 3 ? "hf_folder" : Disabled};
+            Replaced(written, "\"-1\"", "\"" + (gap < 14 ? "-1" : read[row]) + "\""),
+            Found(MovedFrom), gap > 3 ? "hf_folder" : Disabled};
     }
     return HotFolders("AttributesAfterAGapComeOutAsDefaults", folders);
 }
@@ -79,18 +74,17 @@ Scenario Encodings()
 // A Folder.cfg that loses much when its template moves.
 Text Rich()
 {
-    const Text root = "<HotFolder ";
-    const Text end = "<PreflightSettings>\n";
     const Text entry = "<KEYVALUE Key=\"B\"";
     Text cfg = Written(MovedFrom);
     for (const auto& [from, to] :
          Files{{" Quickset=\"q\"", ""},
                {"\"-5\"", "\"5b\""},
                {"Centralized=\"1\"", "Centralized=\"1 \""}, // no loss
-               {root, "<!DOCTYPE H [<!ENTITY e \"t\">]>\n<?top?>" + root + "mine=\"7\" "},
+               {"<HotFolder ", "<!DOCTYPE H [<!ENTITY e \"t\">]>\n<?top?><HotFolder mine=\"7\" "},
                {"<a/>", Times(2000, "<r kind=\"alike\" number=\"#\" empty=\"\"/>")}, // no loss
                {entry, entry + " Mine=\"\" Value=\"1\"/>" + entry},
-               {end, "<Mine><b/></Mine><Paths/>Note <!-- no loss -->" + end}})
+               {"<PreflightSettings>\n",
+                "<Mine><b/></Mine><Paths/>Note <!-- no loss --><PreflightSettings>\n"}})
         cfg = Replaced(cfg, from, to);
     return Replaced(cfg, "HotFolder", "Old");
 }
@@ -200,7 +194,6 @@ SCENARIOS(Refusals)
                 {{CfgPlace, cfg}, {"hot/B/[P]/Folder.cfg", cfg}, {"hot/C/[P]/Folder.cfg", cfg}})
             .Before({{CfgPlace + "#", "0"}, {"hot/B/[P]#", "0"}, {"hot/C#", "0"}})
             .Before({{PresetPlace, preset}, {PresetPlace + "#", "0"}})
-            .Before({{JobPresets + "/Q/Presets/presets.xml", preset}, {JobPresets + "/Q#", "0"}})
             .Log({{"A", "", Disabled}, {"B", NoCfg, Disabled}, {"C", NoCfg, Disabled}},
                  PresetLine("Unable to open preset.xml for read : "))
             .IsReported(R"(
@@ -208,47 +201,44 @@ A: problem  Folder.cfg: can't open file*
 A: {nodisabled}
 B: problem  [_ORX_HotFolder_]: cannot be entered
 C: problem  the hot folder cannot be entered
-Job presets: problem  .P{xml}: cannot be opened for reading (can't open file*
-Job presets: problem  Q{xml}: {user}{/}ORX{/}JPData{/}Q cannot be entered)"),
-        Refused("WhatCannotBeWrittenStays", DoneFolder("A", cfg))
-            .Before(DoneFolder("B", Written(MovedTo)))
-            .Before(
-                {{CfgPlace + "#", "R"}, {"hot/B/[P]/Folder.cfg#", "R"}, {PresetPlace + "#", "R"}})
-            .Before({{"tool/hf_folder.ico#", "0"},
-                     {"hot/B/Desktop.ini", "[.ShellClassInfo]"},
-                     {"hot/B/Desktop.ini#", "X"}})
-            .Before({{"hot/C/[P]/hf_folder_disabled.ico", "old"},
-                     {"hot/C/[P]/hf_folder_disabled.ico#", "R"},
-                     {"hot/C/[P]#", "X"}})
+Job presets: problem  .P{xml}: cannot be opened for reading (can't open file*)"),
+        Refused("WhatCannotBeWrittenStays", {{CfgPlace + "#", "R"}, {PresetPlace + "#", "R"}})
+            .File(CfgPlace, cfg)
             .File(PresetPlace, preset)
-            .After({{"hot/C#", "S"},
-                    {"hot/C/Desktop.ini#", "RS"},
-                    {"hot/C/Desktop.ini",
-                     IniHeader + IconFile(Disabled) + "IconIndex=00\r\n" + InfoTip}})
-            .Log({{"A", found}, {"B", Found(MovedTo)}, {"C", NoCfg, Disabled}},
-                 PresetLine("Unable to open preset.xml for write : "))
+            .Log({{"A", found}}, PresetLine("Unable to open preset.xml for write : "))
             .IsReported(R"(
 A: problem  Folder.cfg: cannot be opened for writing (can't open file*
 A: problem  stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl
-A: problem  hf_folder.ico: cannot be replaced (read-only, in use, or access denied)
-B: problem  hf_folder.ico: cannot be replaced (read-only, in use, or access denied)
-B: problem  Desktop.ini: cannot be opened for reading and writing
-B: problem  Desktop.ini: its attributes cannot be changed
-C: problem  hf_folder_disabled.ico: cannot be replaced (read-only, in use, or access denied)
-C: change   Desktop.ini: new
-C: change   hot folder: attributes none -> SYSTEM
-C: note     no Folder.cfg
+A: {noicon}
 Job presets: problem  .P{xml}: cannot be opened for writing (can't open file*
 Job presets: problem  .P{xml}: stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl)"),
+        Refused("NeitherIconsNorADesktopIniCanBeReplaced", DoneFolder("A", Written(MovedTo)))
+            .Before({{CfgPlace + "#", "R"}, {"tool/hf_folder.ico#", "0"}})
+            .Before({{Ini, "[.ShellClassInfo]"}, {Ini + "#", "X"}})
+            .Before({{"hot/B/[P]/hf_folder_disabled.ico", "old"},
+                     {"hot/B/[P]/hf_folder_disabled.ico#", "R"},
+                     {"hot/B/[P]#", "X"}})
+            .IsReported(R"(
+A: problem  hf_folder.ico: cannot be replaced (read-only, in use, or access denied)
+A: problem  Desktop.ini: cannot be opened for reading and writing
+A: problem  Desktop.ini: its attributes cannot be changed
+B: problem  hf_folder_disabled.ico: cannot be replaced (read-only, in use, or access denied)
+B: change   Desktop.ini: new
+B: change   hot folder: attributes none -> SYSTEM
+B: note     no Folder.cfg)"),
         Refused("AReadOnlyLogStays", {{LogPlace + "#", "R"}})
-            .Before(DoneFolder("A", cfg))
-            .After({{CfgPlace, Written(MovedTo)}})
+            .File(CfgPlace, cfg, Written(MovedTo))
             .IsReported(R"(
 Workstation: problem  there will be no run log: can't open file*
-A: {moves})"),
-        Refused("AnUnreadableListIsEmpty", {{"hot/A/", ""}, {ListPlace + "#", "0"}})
+A: {moves}
+A: {noicon})"),
+        Refused("AnUnreadableListIsEmptyAndAClosedPresetFolderSkipped",
+                {{ListPlace + "#", "0"}, {JobPresets + "/.P#", "0"}})
+            .File(PresetPlace, preset)
             .Log()
-            .IsReported("Workstation: problem  can't open file*; no hot folder is migrated"),
+            .IsReported(R"(
+Workstation: problem  can't open file*; no hot folder is migrated
+Job presets: problem  .P{xml}: {user}{/}ORX{/}JPData{/}.P cannot be entered)"),
     };
 }
 

@@ -58,7 +58,7 @@ SCENARIOS(Icons)
             {{Icon, "old"}, {"tool/BundleIcons/hf_folder_disabled.ico", ""}, {Ini, "; mine\n"}})
             .File(CfgPlace, Cfg("1"))
             .Log({{"A", ""}})
-            .IsReported("A: note     no copy of the icon to replace: hf_folder.ico"),
+            .IsReported("A: {noicon}"),
         Scenario("WithoutTheNewIconsFoldersStay", DoneFolder("A", Written("")))
             .Before(DoneFolder("B", Written("")))
             .Before({{"tool/BundleIcons#", "0"}})

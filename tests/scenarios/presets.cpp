@@ -31,7 +31,7 @@ SCENARIOS(Presets)
         return only(name, preset, "preset.xml left as it is (" + reason + "): ",
                     "problem  .P{xml}: left as it is (" + reason + ")");
     };
-    const Text latin1 = "change   .P{xml}: comes out as UTF-8\nproblem  .P{xml}: ";
+    const Text utf8 = "\nchange   .P{xml}: comes out as UTF-8";
     const Text eol = IsWindows ? "\r\n" : "\n";
     return {
         Scenario("EveryPathInTheFolderMoves")
@@ -53,12 +53,13 @@ SCENARIOS(Presets)
         updated("NulAndCtrlZEndNothing", Text("a\0b\x1A\r\n", 6) + from + "end",
                 Text("a\0b\x1A\r\n", 6) + to + "end", "{presetmoves}"),
         updated("BytesThatAreNotUtf8AreTakenAsLatin1", "\xE4\r\n", "ä\r\n",
-                latin1 + "is not UTF-8, so the whole file is read as Latin-1; accented characters "
-                         "come out wrong"),
-        updated("ADeclaredEncodingStays",
-                "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?><p>\xE4</p>",
-                "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?><p>ä</p>",
-                latin1 + "declares the encoding ISO-8859-1, but comes out as UTF-8"),
+                "problem  .P{xml}: is not UTF-8, so the whole file is read as Latin-1; accented "
+                "characters come out wrong" +
+                    utf8),
+        updated(
+            "ADeclaredEncodingStays", "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?><p>\xE4</p>",
+            "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?><p>ä</p>",
+            "problem  .P{xml}: declares the encoding ISO-8859-1, but comes out as UTF-8" + utf8),
         left("HalfAUtf16UnitStays", Text("\xFF\xFE") + Text("a\0b", 3), "cannot be decoded"),
         left("ALoneSurrogateStays", Text("\xFF\xFE\0\0\0\xD8\0\0a\0\0\0", 12),
              "cannot be encoded again"),

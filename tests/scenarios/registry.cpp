@@ -5,19 +5,17 @@
 namespace
 {
 
-// A hot folder and a preset whose paths would move, and these hives.
-Scenario Both(const Text& name, const Text& letter, const Files& hives)
+// A hot folder and a preset that store this path, and these hives.
+Scenario Both(const Text& name, const Text& path, const Files& hives)
 {
-    const Text path = letter == "I" ? MovedFrom : MovedTo;
-    return Scenario(name, DoneFolder("A", Written(path)))
-        .Before(hives)
-        .File(PresetPlace, Stored(path))
-        .Run({letter});
+    return Scenario(name, hives)
+        .Before(DoneFolder("A", Written(path)))
+        .File(PresetPlace, Stored(path));
 }
 
-Scenario WithPrevious(const Text& name, const Text& value)
+Scenario WithPath(const Text& name, const Text& previous, const Text& path = MovedFrom)
 {
-    return Both(name, "I", {{UserHive, UserValue(value)}});
+    return Both(name, path, {{UserHive, UserValue("\"Path\"=\"" + previous + "\"")}});
 }
 
 SCENARIOS(Registry)
@@ -26,64 +24,61 @@ SCENARIOS(Registry)
     const Text foundNew = Found(MovedTo);
     const Text updated = PresetLine(Updated);
     return {
-        Both("WithoutAnyHiveNothingMoves", "I", {{MachineHive, Removed}, {UserHive, "garbage"}})
-            .Log({{"A", found + NoPrevious}}, NoDefault + NoPrevious),
-        Both("WithoutATemplateNoFolderIsLookedUp", "I", {{MachineHive, Removed}, {UserHive, ""}})
+        Both("WithoutATemplateNoFolderIsLookedUp", MovedFrom,
+             {{MachineHive, Removed}, {UserHive, "garbage"}})
             .File(CfgPlace, "<H><ImposeSetting/></H>")
             .Log({{"A", Found(""), Disabled}}, NoDefault + NoPrevious)
             .IsReported(R"(
 A: {nodisabled}
-Job presets: problem  registry value InstallPath in HKEY_LOCAL_MACHINE\SOFTWARE\Wow6432Node\Vantorix\QZA or \SOFTWARE\Vantorix\QZA: there is no such key{nothing}
-Job presets: problem  registry value Path in HKEY_CURRENT_USER\SOFTWARE\Wow6432Node\HF or \SOFTWARE\HF: there is no such key{nothing})"),
-        Both("WithoutADefaultFolderAnUpgradeMovesNothing", "I",
+Job presets: problem  registry value Path in HKEY_CURRENT_USER\SOFTWARE\Wow6432Node\HF or \SOFTWARE\HF: there is no such key{nothing}
+Job presets: problem  registry value InstallPath in HKEY_LOCAL_MACHINE\SOFTWARE\Wow6432Node\Vantorix\QZA or \SOFTWARE\Vantorix\QZA: there is no such key{nothing})"),
+        Both("WithoutADefaultFolderAnUpgradeMovesNothing", MovedFrom,
              {{MachineHive, MachineValue("\"x\"=\"y\"")}})
             .Log({{"A", found + NoDefault}}, NoDefault),
-        Both("WithoutAPreviousFolderADowngradeMovesNothing", "U",
+        Both("WithoutAPreviousFolderADowngradeMovesNothing", MovedTo,
              {{UserHive, UserValue("\"x\"=\"y\"")}})
+            .Run({"U"})
             .Log({{"A", foundNew + NoPreviousTo}}, NoPrevious)
             .IsReported(R"(
 A: problem  {Path}: missing{nothing}
 A: problem  stays in the folder being left (the folder being installed is unknown): {default}{/}Booklet.tpl)"),
-        WithPrevious(
-            "A32BitKeyHidesTheOtherEvenWithoutAValue",
-            "\"Path\"=\"{previous}\"\r\n\r\n[HKEY_CURRENT_USER\\software\\wow6432node\\hf]")
+        WithPath("A32BitKeyHidesTheOtherEvenWithoutAValue",
+                 "{previous}\"\r\n\r\n[HKEY_CURRENT_USER\\software\\wow6432node\\hf]\r\n\"x\"=\"")
             .Log({{"A", found + NoPrevious}}, NoPrevious)
             .IsReported("A: problem  registry value Path in HKEY_CURRENT_USER\\SOFTWARE\\"
                         "Wow6432Node\\HF: missing, and no other key is looked at{nothing}"),
-        WithPrevious("A32BitKeyComesFirst",
-                     "\"Path\"=\"x\"\r\n[HKEY_CURRENT_USER\\SOFTWARE\\Wow6432Node\\HF]\r\n\"PATH\"="
-                     "\"{previous}\"")
+        WithPath("A32BitKeyComesFirst",
+                 "x\"\r\n[HKEY_CURRENT_USER\\SOFTWARE\\Wow6432Node\\HF]\r\n\"PATH\"=\"{previous}")
             .Before({{MachineHive, MachineValue("\"InstallPath\"=\"x\"\r\n[HKEY_LOCAL_"
                                                 "MACHINE\\SOFTWARE\\Wow6432Node\\Vantorix\\QZA]\r\n"
                                                 "\"InstallPath\"=\"{app}\"")}})
             .After({{CfgPlace, Written(MovedTo)}, {PresetPlace, Stored(MovedTo)}})
             .Log({{"A", found}}, updated),
-        WithPrevious("ATextOf258CharactersIsTooLong", "\"Path\"=\"" + Text(258, 'x') + "\"")
+        WithPath("ATextOf258CharactersIsTooLong", Text(258, 'x'))
             .Log({{"A", found + NoPrevious}}, NoPrevious)
             .IsReported("A: problem  {Path}: longer than 257 characters{nothing}"),
-        WithPrevious("ATextOf257CharactersIsRead", "\"Path\"=\"" + Text(257, 'x') + "\"")
-            .Log({{"A", found}}, updated),
-        Both("ANumberAsTheNewFolderMovesNothing", "I",
+        WithPath("ATextOf257CharactersIsRead", Text(257, 'x')).Log({{"A", found}}, updated),
+        Both("ANumberAsTheNewFolderMovesNothing", MovedFrom,
              {{MachineHive, MachineValue("\"InstallPath\"=dword:00000001")}})
             .Log({{"A", found + Untouched("new path holds a character that XML cannot store")}},
                  updated)
             .IsReported(R"(
 A: problem  Folder.cfg: left as it is (new path holds a character that XML cannot store)
 A: problem  stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl
-Job presets: problem  .P{xml}: stays in the folder being left (no path moves): {previous}{/}Booklet.tpl
-Job presets: problem  the folder being installed holds a character that XML cannot store; no path of a preset moves)"),
-        WithPrevious("AnUnterminatedOddValueIsReadToItsLastWholeUnit",
-                     "\"Path\"=hex:78,00,79,00,7a")
+Job presets: problem  the folder being installed holds a character that XML cannot store; no path of a preset moves
+Job presets: problem  .P{xml}: stays in the folder being left (no path moves): {previous}{/}Booklet.tpl)"),
+        Both("AnUnterminatedOddValueIsReadToItsLastWholeUnit", MovedFrom,
+             {{UserHive, UserValue("\"Path\"=hex:78,00,79,00,7a")}})
             .Log({{"A", found}}, updated),
-        WithPrevious("AFinalSeparatorMovesPresetsOnly", "\"Path\"=\"{previous}{/}\"")
+        WithPath("AFinalSeparatorMovesPresetsOnly", "{previous}{/}")
             .After({{PresetPlace, Stored(MovedTo)}})
             .Log({{"A", found}}, updated)
             .IsReported(R"(
 Workstation: problem  {Path}: ends in a separator; no template of a hot folder moves
 A: problem  stays in the folder being left (the registry value ends in a separator): {previous}{/}Booklet.tpl
 Job presets: {presetmoves})"),
-        Both("AFinalSeparatorIsDoubledInFolderCfgOnly", "U",
-             {{UserHive, UserValue("\"Path\"=\"{previous}{/}\"")}})
+        WithPath("AFinalSeparatorIsDoubledInFolderCfgOnly", "{previous}{/}", MovedTo)
+            .Run({"u"})
             .After({{CfgPlace, Written("{previous}{/}{/}Booklet.tpl")},
                     {PresetPlace, Stored(MovedFrom)}})
             .Log({{"A", foundNew}}, updated)
@@ -91,39 +86,28 @@ Job presets: {presetmoves})"),
 Workstation: problem  {Path}: ends in a separator; it is doubled in the paths of hot folders
 A: change   Folder.cfg: {default}{/}Booklet.tpl -> {previous}{/}{/}Booklet.tpl
 Job presets: change   .P{xml}: {default}{/}Booklet.tpl -> {previous}{/}Booklet.tpl)"),
-        WithPrevious("AnEmptyPreviousFolderReplacesNothing", "\"Path\"=\"\"")
+        WithPath("AnEmptyPreviousFolderReplacesNothing", "")
             .Log({{"A", found}}, updated)
             .IsReported("Workstation: problem  {Path}: empty; only templates stored without a "
                         "folder move"),
-        WithPrevious("BothFoldersAreTheSame", "\"Path\"=\"{app}{/}template\"")
-            .Before({{CfgPlace, Written(MovedTo)}, {PresetPlace, Stored(MovedTo)}})
+        WithPath("BothFoldersAreTheSame", "{app}{/}template", MovedTo)
             .Log({{"A", foundNew}}, updated)
             .IsReported(""),
-    };
-}
-
-// Only reports: the run would follow from what other scenarios show.
-SCENARIOS(Templates)
-{
-    const auto with = [](const Text& name, const Text& path, const Text& letter = "U")
-    {
-        return Scenario(name, {{UserHive, UserValue("\"Path\"=\"" + path + "\"")}})
-            .Before(DoneFolder("A", Written("{hot}{/}A")))
-            .File(PresetPlace, Stored("{hot}{/}A"))
-            .Run({letter});
-    };
-    return {
-        with("PathIsEmptyOnTheWayBack", "")
+        // Only reports from here on.
+        WithPath("PathIsEmptyOnTheWayBack", "", "{hot}{/}A")
+            .Run({"U"})
             .IsReported(
                 "Workstation: problem  {Path}: empty; templates move to the root of the drive"),
-        with("PathHoldsAnAmpersand", "{hot}&").IsReported(R"(
-Job presets: problem  {Path}: holds & or <, which is inserted into presets as it is)"),
-        with("TheNewFolderIsBelowTheOld", "{app}", "I")
-            .File(PresetPlace, Stored(MovedTo))
+        WithPath("PathHoldsAnAmpersand", "{hot}&", "{hot}{/}A")
+            .Run({"U"})
+            .IsReported("Job presets: problem  {Path}: holds & or <, which is inserted into "
+                        "presets as it is"),
+        WithPath("TheNewFolderIsBelowTheOld", "{app}", MovedTo)
+            .File(CfgPlace, Written("{hot}{/}A"))
             .Before({{"default/template/Booklet.tpl", ""}})
             .IsReported(R"(
-Job presets: change   .P{xml}: {default}{/}Booklet.tpl -> {default}{/}template{/}Booklet.tpl
-Job presets: problem  one template folder is below the other: another run would move paths of presets again)"),
+Job presets: problem  one template folder is below the other: another run would move paths of presets again
+Job presets: change   .P{xml}: {default}{/}Booklet.tpl -> {default}{/}template{/}Booklet.tpl)"),
         Scenario("TemplatesAreMissing", DoneFolder("A", Written("{default}{/}none")))
             .Before(DoneFolder("B", Written("{previous}{/}Sub{/}T")))
             .Before(DoneFolder("C", Written("{hot}{/}C{/}D{/}T")))
@@ -138,11 +122,11 @@ Job presets: problem  one template folder is below the other: another run would 
 A: problem  no template at {default}{/}none
 B: problem  stays in the folder being left (in a sub-folder): {previous}{/}Sub{/}T
 C: note     not looked at: {hot}{/}C{/}D{/}T
-Job presets: note     .P{xml}: a template path has no closing quote
-Job presets: note     .P{xml}: not looked at: {default}{/}D{/}T
 Job presets: problem  .P{xml}: no template at {default}{/}<A&none;
+Job presets: problem  .P{xml}: stays in the folder being left (stored as XML): {hot}{/}..{/}Vorige 版{/}&
 Job presets: problem  .P{xml}: stays in the folder being left (other separators): {hot}{/}..{/}Vorige 版{/}T
-Job presets: problem  .P{xml}: stays in the folder being left (stored as XML): {hot}{/}..{/}Vorige 版{/}&)"),
+Job presets: note     .P{xml}: a template path has no closing quote
+Job presets: note     .P{xml}: not looked at: {default}{/}D{/}T)"),
         Scenario("ARehearsal", DoneFolder("A", Written("{hot}{/}old{/}T")))
             .File(PresetPlace, Stored("{hot}{/}old{/}T") + Stored("{hot}{/}old{/}T"))
             .Before({{MachineHive, Removed}, {UserHive, Removed}})
