@@ -12,38 +12,33 @@ const Text CannotOpenPreset = "Unable to open preset.xml for read : ";
 SCENARIOS(PlantedLinks)
 {
     const Text cfg = Written(MovedFrom);
+    const Text moved = Written(MovedTo);
     const Text from = Stored(MovedFrom);
-    const Text iniStays =
-        "Desktop.ini left as it is (reached over a link): {hot}{/}A{/}Desktop.ini\n";
+    const Text stays = "left as it is (reached over a link)";
     std::vector<Scenario> scenarios = {
         Scenario("LinkedPrivateAndPresetDirectoriesAreNotOpened",
-                 {{"elsewhere/P/Folder.cfg", cfg},
-                  {"elsewhere/P/hf_folder_disabled.ico", "old"},
-                  {"elsewhere/P/presets.xml", from},
-                  {PresetDir + "/", "{link:elsewhere/P}"},
-                  {"hot/A/[P]/", "{link:elsewhere/P}"}})
+                 {{"hot/A/[P]/", "{link:elsewhere/P}"}, {PresetDir + "/", "{link:elsewhere/P}"}})
+            .Before({{"elsewhere/P/Folder.cfg", cfg}, {"elsewhere/P/presets.xml", from}})
+            .Before({{"elsewhere/P/hf_folder_disabled.ico", "old"}})
             .Log({{"A", NoCfg, Disabled}}, PresetLine(CannotOpenPreset))
             .IsReported(R"(
 A: problem  [_ORX_HotFolder_]: reached over a link
 Job presets: problem  .P{xml}: reached over a link, or not a file)"),
-        Scenario("ALinkedLogFolderGetsNoLog", {{LogPlace, Removed},
-                                               {"elsewhere/L/UpgradeDowngrade.log", "-"},
-                                               {LogFolder + "/", "{link:elsewhere/L}"}})
-            .File(CfgPlace, cfg, Written(MovedTo)),
+        Scenario("ALinkedLogFolderGetsNoLog",
+                 {{LogPlace, Removed}, {LogFolder + "/", "{link:elsewhere/L}"}})
+            .Before({{"elsewhere/L/UpgradeDowngrade.log", "-"}})
+            .File(CfgPlace, cfg, moved),
         Scenario("AHotFolderAndTheFoldersAboveAPresetMayBeLinks",
-                 {{"hot/A/", "{link:elsewhere/A}"},
-                  {"elsewhere/A/[P]/Folder.cfg", cfg},
-                  {JobPresets + "/", Removed},
-                  {"user/ORX/", "{link:elsewhere/ORX}"},
-                  {"elsewhere/ORX/JPData/", "{link:elsewhere/JPData}"},
-                  {"elsewhere/JPData/.P/", "{link:elsewhere/P}"},
-                  {"elsewhere/P/Presets/presets.xml", from}})
-            .After({{"elsewhere/A/[P]/Folder.cfg", Written(MovedTo)},
-                    {"elsewhere/P/Presets/presets.xml", Stored(MovedTo)}})
+                 {{"hot/A/", "{link:elsewhere/A}"}, {"elsewhere/A/[P]/Folder.cfg", cfg}})
+            .Before({{JobPresets + "/", Removed}, {"user/ORX/", "{link:elsewhere/ORX}"}})
+            .Before({{"elsewhere/ORX/JPData/", "{link:elsewhere/JPData}"}})
+            .Before({{"elsewhere/JPData/.P/", "{link:elsewhere/P}"}})
+            .File("elsewhere/P/Presets/presets.xml", from, Stored(MovedTo))
+            .After({{"elsewhere/A/[P]/Folder.cfg", moved}})
             .Log({{"A", Found(MovedFrom)}}, PresetLine(Updated)),
         Scenario("ALinkedErrorFileCountsByItsName",
                  {{"elsewhere/other", ""}, {"hot/A/[P]/Error.er", "{link:elsewhere/missing}"}})
-            .File(CfgPlace, cfg, Written(MovedTo))
+            .File(CfgPlace, cfg, moved)
             .Log({{"A", Found(MovedFrom), "hf_error_active"}})
             .NotUnderWine(NoLinks),
     };
@@ -74,22 +69,23 @@ Job presets: problem  .P{xml}: reached over a link, or not a file)"),
         "A: problem  hf_folder_disabled.ico: reached over a link", "A: {nodisabled}");
     add(done("DesktopIni")
             .Before({{Ini + "#", Removed}})
-            .Log({{"A", "", iniStays + Copied(Disabled)}}),
-        Ini, "[.ShellClassInfo]\r\n",
-        "A: problem  Desktop.ini: left as it is (reached over a link)",
+            .Log({{"A", "",
+                   "Desktop.ini " + stays + ": {hot}{/}A{/}Desktop.ini\n" + Copied(Disabled)}}),
+        Ini, "[.ShellClassInfo]\r\n", "A: problem  Desktop.ini: " + stays,
         "A: problem  Desktop.ini: is not a file\nA: change   Desktop.ini: attributes none -> "
         "READONLY SYSTEM");
     scenarios.back().Log({{"A", "", Disabled}});
-    const Text preset = "Workstation: {nofolder}\nJob presets: problem  .P{xml}: reached over a "
-                        "link, or not a file";
-    add(Scenario("APreset").Log({}, PresetLine(CannotOpenPreset)), PresetDir + "/presets.xml", from,
-        preset, preset);
-    add(Scenario("TheLog", DoneFolder("A", cfg)).After({{CfgPlace, Written(MovedTo)}}), LogPlace,
-        "-",
-        "Workstation: problem  there will be no run log: it is reached over a link: {log}\nA: "
-        "{moves}",
-        "Workstation: note     there will be no run log: something else has its name: {log}\nA: "
-        "{moves}");
+    const Text skipped = R"(
+Workstation: {nofolder}
+Job presets: problem  .P{xml}: reached over a link, or not a file)";
+    add(Scenario("APreset").Log({}, PresetLine(CannotOpenPreset)), PresetPlace, from, skipped,
+        skipped);
+    add(Scenario("TheLog", DoneFolder("A", cfg)).After({{CfgPlace, moved}}), LogPlace, "-", R"(
+Workstation: problem  there will be no run log: it is reached over a link: {log}
+A: {moves})",
+        R"(
+Workstation: note     there will be no run log: something else has its name: {log}
+A: {moves})");
     scenarios.push_back(Scenario("TheListIsAPipe", {{ListPlace, "{fifo}"}, {"hot/A/", ""}})
                             .Log()
                             .NotOnWindows(NoPipes));

@@ -26,11 +26,6 @@ SCENARIOS(Presets)
     {
         return only(name, before, Updated, reported).After({{PresetPlace, after}});
     };
-    const auto left = [&](const Text& name, const Text& preset, const Text& reason)
-    {
-        return only(name, preset, "preset.xml left as it is (" + reason + "): ",
-                    "problem  .P{xml}: left as it is (" + reason + ")");
-    };
     const Text utf8 = "\nchange   .P{xml}: comes out as UTF-8";
     const Text eol = IsWindows ? "\r\n" : "\n";
     return {
@@ -60,9 +55,12 @@ SCENARIOS(Presets)
             "ADeclaredEncodingStays", "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?><p>\xE4</p>",
             "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?><p>ä</p>",
             "problem  .P{xml}: declares the encoding ISO-8859-1, but comes out as UTF-8" + utf8),
-        left("HalfAUtf16UnitStays", Text("\xFF\xFE") + Text("a\0b", 3), "cannot be decoded"),
-        left("ALoneSurrogateStays", Text("\xFF\xFE\0\0\0\xD8\0\0a\0\0\0", 12),
-             "cannot be encoded again"),
+        only("HalfAUtf16UnitStays", Text("\xFF\xFE") + Text("a\0b", 3),
+             "preset.xml left as it is (cannot be decoded): ",
+             "problem  .P{xml}: left as it is (cannot be decoded)"),
+        only("ALoneSurrogateStays", Text("\xFF\xFE\0\0\0\xD8\0\0a\0\0\0", 12),
+             "preset.xml left as it is (cannot be encoded again): ",
+             "problem  .P{xml}: left as it is (cannot be encoded again)"),
         Scenario("FoldersInPlaceOfStoredFilesAreSkipped",
                  {{CfgPlace + "/", ""}, {PresetPlace + "/", ""}})
             .Log({{"A", NoCfg, Disabled}}, PresetLine("Unable to open preset.xml for read : "))
