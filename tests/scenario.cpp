@@ -2,27 +2,6 @@
 
 #include "tests/scenarios/texts.h"
 
-#include <set>
-
-Scenario& Scenario::Before(const Files& files)
-{
-    for (const auto& [place, text] : files)
-        before[place] = text;
-    return *this;
-}
-
-Scenario& Scenario::After(const Files& files)
-{
-    for (const auto& [place, text] : files)
-        after[place] = text;
-    return *this;
-}
-
-Scenario& Scenario::File(const Text& place, const Text& text, const Text& becomes)
-{
-    return Before({{place, text}}).After(becomes.empty() ? Files() : Files{{place, becomes}});
-}
-
 Scenario& Scenario::Log(const std::vector<FolderLog>& folders, const Text& presets)
 {
     const bool isUpgrade = arguments[0] != "U" && arguments[0] != "u";
@@ -70,21 +49,20 @@ Files WorkstationBefore(const Scenario& scenario)
 {
     Files files = scenario.before;
     Text list = "<HotFolders>";
-    std::set<Text> names;
     for (const auto& [place, text] : scenario.before)
     {
         const size_t end = place.find('/', 4);
-        if (StartsWith(place, "hot/") && end != Text::npos &&
-            names.insert(place.substr(4, end - 4)).second)
-            list += "<HotFolder path=\"{hot}{/}" + place.substr(4, end - 4) + "\"/>";
+        const Text entry = "<HotFolder path=\"{hot}{/}" + place.substr(4, end - 4) + "\"/>";
+        if (StartsWith(place, "hot/") && end != Text::npos && list.find(entry) == Text::npos)
+            list += entry;
     }
     files.insert({{ListPlace, list + "</HotFolders>"},
                   {LogPlace, "The log of an earlier run\r\n"},
                   {"user/ORX/JPData/", ""},
                   {"previous/Booklet.tpl", ""},
                   {"default/Booklet.tpl", ""},
-                  {MachineHive, MachineValue("\"InstallPath\"=\"{app}\"")},
-                  {UserHive, UserValue("\"Path\"=\"{previous}\"")}});
+                  {MachineHive, Hive(MachineKey, "\"InstallPath\"=\"{app}\"")},
+                  {UserHive, Hive(UserKey, "\"Path\"=\"{previous}\"")}});
     for (auto file = files.begin(); file != files.end();)
         file = file->second == Removed ? files.erase(file) : std::next(file);
     return files;

@@ -25,8 +25,8 @@ inline const Text PresetPlace = "user/ORX/JPData/.P/Presets/presets.xml";
         return *this;                                                                              \
     }
 
-/// A hot folder's name, the lines about its template as if its name were A, and its icon's name (or
-/// the lines about it). If there is no icon of that name, the log says so.
+/// A hot folder's name, the lines about its template as if its name were A, and its icon's name, or
+/// the lines about that.
 struct FolderLog
 {
     Text name;
@@ -50,18 +50,30 @@ struct Scenario
     std::optional<Text> report;
 
     /// Files in addition to the usual ones, or in place of them. The usual ones are the log of an
-    /// earlier run, a template in each of the two template folders and their hives, an empty
-    /// directory for presets, and HotFolderList.cfg, which lists every NAME of the places
-    /// hot/NAME/... in order.
+    /// earlier run, the hives, a template in both template folders, an empty directory for presets,
+    /// and HotFolderList.cfg, which lists every NAME of the places hot/NAME/... in order.
     explicit Scenario(const Text& whatHappens, const Files& files = {})
         : name(whatHappens), before(files)
     {
     }
-    Scenario& Before(const Files& files);
+    Scenario& Before(const Files& files)
+    {
+        for (const auto& [place, text] : files)
+            before[place] = text;
+        return *this;
+    }
     /// Files that change. Every other file and attribute has to stay as it is.
-    Scenario& After(const Files& files);
+    Scenario& After(const Files& files)
+    {
+        for (const auto& [place, text] : files)
+            after[place] = text;
+        return *this;
+    }
     /// One file, before and after; without the second text, it stays.
-    Scenario& File(const Text& place, const Text& text, const Text& becomes = "");
+    Scenario& File(const Text& place, const Text& text, const Text& becomes = "")
+    {
+        return Before({{place, text}}).After(becomes.empty() ? Files() : Files{{place, becomes}});
+    }
     /// The command line arguments; {"I"} if not given.
     SETTER(Run, arguments, )
     /// For tests of refusals: root is refused nothing.
@@ -101,8 +113,7 @@ inline Text TestName(const Scenario& scenario)
 }
 
 /// The places that differ in two snapshots, with both texts, or Removed.
-using Difference = std::pair<Text, Text>;
-std::map<Text, Difference> Differences(const Files& left, const Files& right);
+std::map<Text, std::pair<Text, Text>> Differences(const Files& left, const Files& right);
 
 class Workstations : public testing::TestWithParam<Scenario>
 {

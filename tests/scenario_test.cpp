@@ -33,13 +33,13 @@ Text Meaning(const Text& place, Text text)
 
 } // namespace
 
-std::map<Text, Difference> Differences(const Files& left, const Files& right)
+std::map<Text, std::pair<Text, Text>> Differences(const Files& left, const Files& right)
 {
-    std::map<Text, Difference> texts;
+    std::map<Text, std::pair<Text, Text>> texts;
     for (const auto& [place, text] : left)
         texts[place] = {Meaning(place, text), Removed};
     for (const auto& [place, text] : right)
-        texts.emplace(place, Difference(Removed, "")).first->second.second = Meaning(place, text);
+        texts.emplace(place, std::pair(Removed, "")).first->second.second = Meaning(place, text);
     for (auto each = texts.begin(); each != texts.end();)
         each = each->second.first == each->second.second ? texts.erase(each) : std::next(each);
     return texts;

@@ -34,11 +34,6 @@ Scenario Moving(const Text& name, const Files& files = {})
         .Before(files);
 }
 
-Scenario Staying(const Text& name, const Files& files = {})
-{
-    return Moving(name, files).File(PresetPlace, Stored(MovedFrom), Stored(MovedFrom));
-}
-
 Scenario Into(const Text& name, const Files& files)
 {
     return Moving(name, files).Run({"I", "{tool}{/}results"});
@@ -48,6 +43,7 @@ std::vector<Call> Calls()
 {
     const Text after = "FolderUpgrade-upgrade-after.txt";
     const Text reset = Replaced(Written(MovedFrom), " description=\"\"", "");
+    const Files stays = {{PresetPlace, Stored(MovedFrom)}};
     const Text manyFolders = "<l>" + Times(200000, "<HotFolder path='/missing/#'/>") + "</l>";
     return {
         {Moving("AllIsDoneAndTheLogFolderIsMade", {{LogPlace, Removed}}), 0},
@@ -69,12 +65,15 @@ std::vector<Call> Calls()
              .AsOtherUser(),
          2, NotWritable},
         {Moving("WhatWasResetIsSaid", {{CfgPlace, reset}}), 2, Reset},
-        {Staying("AnAccountWithoutAPath", {{UserHive, Removed}}), 2, "; nothing moves"},
-        {Staying("TheProgramIsMissing"), 4,
+        {Moving("AnAccountWithoutAPath", {{UserHive, Removed}}).After(stays), 2, "; nothing moves"},
+        {Moving("TheProgramIsMissing").After(stays), 4,
          "\nFolderUpgrade\n  problem  could not be started (error 2: ", Logs, ""},
-        {Staying("TheProgramDoesNotEnd").Run({"I", "--limit", "3"}), 4, Ended, Logs, "endless"},
-        {Staying("ACheckDoesNotEnd", {{ListPlace, manyFolders}}).Run({"I", "--limit", "1"}), 4,
-         "The time is over. A check was not finished.\n"},
+        {Moving("TheProgramDoesNotEnd").After(stays).Run({"I", "--limit", "3"}), 4, Ended, Logs,
+         "endless"},
+        {Moving("ACheckDoesNotEnd", {{ListPlace, manyFolders}})
+             .After(stays)
+             .Run({"I", "--limit", "1"}),
+         4, "The time is over. A check was not finished.\n"},
     };
 }
 
@@ -122,32 +121,27 @@ INSTANTIATE_TEST_SUITE_P(Calls, CallsOfAnInstaller, testing::ValuesIn(Calls()),
 
 TEST(Check, WritesToAFile)
 {
-    Workstation workstation;
-    workstation.LayOut(
-        WorkstationBefore(Scenario("")
-                              .Before(DoneFolder("A", Written(MovedTo)))
-                              .Before({{PresetPlace, Stored(MovedTo)},
-                                       {"hot/A/Bericht ä 版.txt", Text(10000, '.')}})));
     const Text check = "FolderUpgradeCheck";
-    EXPECT_EQ(0, workstation.Start(check, {"i", "{hot}{/}A{/}Bericht ä 版.txt"}).status);
-    const Text report =
-        Replaced(ReadFile(workstation.HostPath("hot/A/Bericht ä 版.txt")), "\r", "");
-    const size_t head = report.find('\n');
+    const Text place = "hot/A/Bericht ä 版.txt";
+    Workstation workstation;
+    workstation.LayOut(WorkstationBefore(
+        Scenario("", DoneFolder("A", Written(MovedTo)))
+            .Before({{PresetPlace, Stored(MovedTo)}, {place, Text(10000, '.')}})));
+    EXPECT_EQ(0, workstation.Start(check, {"i", workstation.HostPath(place).u8string()}).status);
+    const Text report = Replaced(ReadFile(workstation.HostPath(place)), "\r", "");
+    const Text rest =
+        workstation.Expand("\nFrom {previous} to {default}\n\n0 changes, 0 problems, 0 notes\n");
     EXPECT_TRUE(std::regex_match(
-        report.substr(0, head),
+        Replaced(report, rest, ";"),
         std::regex("FolderUpgradeCheck [0-9]+\\.[0-9]+\\.[0-9]+, upgrade, 20[0-9-]+ "
-                   "[0-9]+:[0-9]+, [^,]+, (not )?elevated")))
+                   "[0-9]+:[0-9]+, [^,]+, (not )?elevated;")))
         << report;
-    EXPECT_EQ(workstation.Expand("\nFrom {previous} to {default}\n\n"
-                                 "0 changes, 0 problems, 0 notes\n"),
-              report.substr(head));
-
     const RunResult refused = workstation.Start(check, {"i", "{hot}{/}none{/}a.txt"});
     EXPECT_EQ(2, refused.status);
     EXPECT_EQ("", refused.output);
-    const Text complaint = workstation.Expand(
-        "FolderUpgradeCheck: the report cannot be written to {hot}{/}none{/}a.txt\n");
-    EXPECT_EQ(complaint, refused.libraryLog);
+    EXPECT_EQ(workstation.Expand(
+                  "FolderUpgradeCheck: the report cannot be written to {hot}{/}none{/}a.txt\n"),
+              refused.libraryLog);
 }
 
 TEST(Usage, IsPrinted)
@@ -163,16 +157,14 @@ TEST(Usage, IsPrinted)
          {"Check", "Check|V", "Check|/I", "Check|I|report|V", "Check|I|--to", "Check|I||", "Run",
           "Run|V", "Run|I|--limit", "Run|I|--limit|0", "Run|I|--limit|1h", "Run|I|-x", "Run|I|a|b"})
     {
-        std::istringstream words(wrong);
-        Text program;
-        std::getline(words, program, '|');
-        std::vector<Text> arguments;
-        for (Text word; std::getline(words, word, '|');)
-            arguments.push_back(word);
-        const RunResult run = workstation.Start("FolderUpgrade" + program, arguments);
+        std::istringstream text(Text("FolderUpgrade") + wrong);
+        std::vector<Text> words;
+        for (Text word; std::getline(text, word, '|');)
+            words.push_back(word);
+        const RunResult run = workstation.Start(words[0], {words.begin() + 1, words.end()});
         EXPECT_EQ(3, run.status) << wrong;
         EXPECT_EQ("", run.output);
-        EXPECT_TRUE(StartsWith(run.libraryLog, usages.at("FolderUpgrade" + program))) << wrong;
+        EXPECT_TRUE(StartsWith(run.libraryLog, usages.at(words[0]))) << wrong;
     }
     EXPECT_TRUE(std::regex_match(workstation.Start(check, {"--version"}).output,
                                  std::regex("FolderUpgradeCheck [0-9.]+\r?\n")));

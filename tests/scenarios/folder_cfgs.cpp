@@ -28,9 +28,8 @@ Scenario Gaps()
         {
             const Text value = " " + chain[i] + "=\"1\"";
             attributes += i == gap ? "" : value;
-            for (const char* unset : {"\"\"", "\"0\""})
-                written = Replaced(written, " " + chain[i] + "=" + unset,
-                                   i < gap ? value : " " + chain[i] + "=" + unset);
+            for (const char* unset : {"=\"\"", "=\"0\""})
+                written = i < gap ? Replaced(written, " " + chain[i] + unset, value) : written;
         }
         folders["gap " + std::to_string(10 + gap)] = {
             Replaced(Minimal(MovedFrom), "<HotFolder", attributes),
@@ -67,8 +66,8 @@ Scenario Encodings()
                 {"ShiftJisAfterSpaces", stays(declared(" = 'Shift_JIS'", "\x93\xFA"))},
                 {"Unknown", stays(declared("='x-own'", "x"))},
                 {"UnknownAfterAByteOrderMark", stays("\xEF\xBB\xBF" + declared("='x-own'", "n"))}})
-        .Before({{MachineHive, MachineValue("\"InstallPath\"=\"{hot}\"")},
-                 {UserHive, UserValue("\"Path\"=\"{hot}\"")}});
+        .Before({{MachineHive, Hive(MachineKey, "\"InstallPath\"=\"{hot}\"")},
+                 {UserHive, Hive(UserKey, "\"Path\"=\"{hot}\"")}});
 }
 
 // A Folder.cfg that loses much when its template moves.
@@ -135,9 +134,9 @@ SCENARIOS(FolderCfgs)
         HotFolders("ATemplateOnTheShareBeingLeftMoves",
                    {{"ThisShare", path("{/}{/}host{/}share{/}old{/}x", "{default}{/}x")},
                     {"ATemplateOnAnotherShareStays", path("{/}{/}host{/}other{/}old{/}x")}})
-            .Before({{UserHive, UserValue("\"Path\"=\"{/}{/}host{/}share{/}old\"")}}),
+            .Before({{UserHive, Hive(UserKey, "\"Path\"=\"{/}{/}host{/}share{/}old\"")}}),
         HotFolders("ATemplateInARelativeFolderMoves", {{"A", path("x{/}y{/}B", "{default}{/}B")}})
-            .Before({{UserHive, UserValue("\"Path\"=\"x{/}y\"")}}),
+            .Before({{UserHive, Hive(UserKey, "\"Path\"=\"x{/}y\"")}}),
         Scenario("HiddenAndSystemFilesAreWrittenAndKeepTheirAttributes",
                  {{CfgPlace + "#", "HS"}, {PresetPlace + "#", "HS"}})
             .File(CfgPlace, Written(MovedFrom), Written(MovedTo))

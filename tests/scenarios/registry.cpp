@@ -15,7 +15,7 @@ Scenario Both(const Text& name, const Text& path, const Files& hives)
 
 Scenario WithPath(const Text& name, const Text& previous, const Text& path = MovedFrom)
 {
-    return Both(name, path, {{UserHive, UserValue("\"Path\"=\"" + previous + "\"")}});
+    return Both(name, path, {{UserHive, Hive(UserKey, "\"Path\"=\"" + previous + "\"")}});
 }
 
 SCENARIOS(Registry)
@@ -33,10 +33,10 @@ A: {nodisabled}
 Job presets: problem  registry value Path in HKEY_CURRENT_USER\SOFTWARE\Wow6432Node\HF or \SOFTWARE\HF: there is no such key{nothing}
 Job presets: problem  registry value InstallPath in HKEY_LOCAL_MACHINE\SOFTWARE\Wow6432Node\Vantorix\QZA or \SOFTWARE\Vantorix\QZA: there is no such key{nothing})"),
         Both("WithoutADefaultFolderAnUpgradeMovesNothing", MovedFrom,
-             {{MachineHive, MachineValue("\"x\"=\"y\"")}})
+             {{MachineHive, Hive(MachineKey, "\"x\"=\"y\"")}})
             .Log({{"A", found + NoDefault}}, NoDefault),
         Both("WithoutAPreviousFolderADowngradeMovesNothing", MovedTo,
-             {{UserHive, UserValue("\"x\"=\"y\"")}})
+             {{UserHive, Hive(UserKey, "\"x\"=\"y\"")}})
             .Run({"U"})
             .Log({{"A", foundNew + NoPreviousTo}}, NoPrevious)
             .IsReported(R"(
@@ -49,7 +49,8 @@ A: problem  stays in the folder being left (the folder being installed is unknow
                         "Wow6432Node\\HF: missing, and no other key is looked at{nothing}"),
         WithPath("A32BitKeyComesFirst",
                  "x\"\r\n[HKEY_CURRENT_USER\\SOFTWARE\\Wow6432Node\\HF]\r\n\"PATH\"=\"{previous}")
-            .Before({{MachineHive, MachineValue("\"InstallPath\"=\"x\"\r\n[HKEY_LOCAL_"
+            .Before(
+                {{MachineHive, Hive(MachineKey, "\"InstallPath\"=\"x\"\r\n[HKEY_LOCAL_"
                                                 "MACHINE\\SOFTWARE\\Wow6432Node\\Vantorix\\QZA]\r\n"
                                                 "\"InstallPath\"=\"{app}\"")}})
             .After({{CfgPlace, Written(MovedTo)}, {PresetPlace, Stored(MovedTo)}})
@@ -59,7 +60,7 @@ A: problem  stays in the folder being left (the folder being installed is unknow
             .IsReported("A: problem  {Path}: longer than 257 characters{nothing}"),
         WithPath("ATextOf257CharactersIsRead", Text(257, 'x')).Log({{"A", found}}, updated),
         Both("ANumberAsTheNewFolderMovesNothing", MovedFrom,
-             {{MachineHive, MachineValue("\"InstallPath\"=dword:00000001")}})
+             {{MachineHive, Hive(MachineKey, "\"InstallPath\"=dword:00000001")}})
             .Log({{"A", found + Untouched("new path holds a character that XML cannot store")}},
                  updated)
             .IsReported(R"(
@@ -68,7 +69,7 @@ A: problem  stays in the folder being left (in a file that stays as it is): {pre
 Job presets: problem  the folder being installed holds a character that XML cannot store; no path of a preset moves
 Job presets: problem  .P{xml}: stays in the folder being left (no path moves): {previous}{/}Booklet.tpl)"),
         Both("AnUnterminatedOddValueIsReadToItsLastWholeUnit", MovedFrom,
-             {{UserHive, UserValue("\"Path\"=hex:78,00,79,00,7a")}})
+             {{UserHive, Hive(UserKey, "\"Path\"=hex:78,00,79,00,7a")}})
             .Log({{"A", found}}, updated),
         WithPath("AFinalSeparatorMovesPresetsOnly", "{previous}{/}")
             .After({{PresetPlace, Stored(MovedTo)}})

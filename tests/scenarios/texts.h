@@ -20,20 +20,14 @@ inline const Text JobPresets = "user/ORX/JPData";
 inline const Text MovedFrom = "{previous}{/}Booklet.tpl";
 inline const Text MovedTo = "{default}{/}Booklet.tpl";
 
+inline const Text MachineKey = "HKEY_LOCAL_MACHINE\\SOFTWARE\\Vantorix\\QZA";
+inline const Text UserKey = "HKEY_CURRENT_USER\\SOFTWARE\\HF";
+
+/// A hive in which the key of one of the two template folders has this value.
 inline Text Hive(const Text& key, const Text& value)
 {
     return "Windows Registry Editor Version 5.00\r\n\r\n[" + key +
            "]\r\n\"Other\"=dword:00000001\r\n" + value + "\r\n";
-}
-
-/// A hive in which the key of one of the two template folders has this value.
-inline Text MachineValue(const Text& value)
-{
-    return Hive("HKEY_LOCAL_MACHINE\\SOFTWARE\\Vantorix\\QZA", value);
-}
-inline Text UserValue(const Text& value)
-{
-    return Hive("HKEY_CURRENT_USER\\SOFTWARE\\HF", value);
 }
 
 /// A file of tests/data with this path.
