@@ -44,6 +44,19 @@ Scenario States(const Text& name, const Text& letter)
 
 SCENARIOS(Icons)
 {
+    const Text disabled = IconFile(Disabled);
+    const Text users =
+        "; mine\n[ViewState]\nMode=\n[.shellclassinfo]\n\n;IconFile=no\nICONFILE=x.ico\n"
+        "IconIndex=3\nIconResource=y,1\n\n[.ShellClassInfo]\nInfoTip=second\n";
+    const Text usersAfter =
+        Replaced(Replaced(users, "x.ico\n", disabled.substr(9)), "y,1\n", "y,1\n" + InfoTip);
+    const auto refresh = [](const Text& name, const Text& before, const Text& after)
+    {
+        return Scenario(name, {{Icon, "old"}, {Ini, before}})
+            .After({{"hot/A#", "S"}, {Ini + "#", "RS"}})
+            .After({{Ini, after}, {Icon, "{icon:hf_folder_disabled.ico}"}})
+            .Log({{"A", NoCfg, Disabled}});
+    };
     return {
         States("AnUpgradeShowsEachState", "I"),
         States("ADowngradeShowsEachState", "U"),
@@ -60,26 +73,6 @@ SCENARIOS(Icons)
             .AsOtherUser()
             .Log({{"A", Found(""), NoIcon("hf_folder")}, {"B", Found(""), NoIcon("hf_folder")}})
             .IsReported("A: problem  source icon missing: {tool}{/}BundleIcons{/}hf_folder.ico"),
-    };
-}
-
-// A folder that already has a user's Desktop.ini.
-SCENARIOS(DesktopInis)
-{
-    const Text disabled = IconFile(Disabled);
-    const Text users =
-        "; mine\n[ViewState]\nMode=\n[.shellclassinfo]\n\n;IconFile=no\nICONFILE=x.ico\n"
-        "IconIndex=3\nIconResource=y,1\n\n[.ShellClassInfo]\nInfoTip=second\n";
-    const Text usersAfter =
-        Replaced(Replaced(users, "x.ico\n", disabled.substr(9)), "y,1\n", "y,1\n" + InfoTip);
-    const auto refresh = [](const Text& name, const Text& before, const Text& after)
-    {
-        return Scenario(name, {{Icon, "old"}, {Ini, before}})
-            .After({{"hot/A#", "S"}, {Ini + "#", "RS"}})
-            .After({{Ini, after}, {Icon, "{icon:hf_folder_disabled.ico}"}})
-            .Log({{"A", NoCfg, Disabled}});
-    };
-    return {
         refresh("OurDesktopIniIsRefreshed",
                 IniHeader + IconFile("hf_folder") + "IconIndex=00\r\nInfoTip=old\r\n",
                 IniHeader + disabled + "IconIndex=00\r\n" + InfoTip)

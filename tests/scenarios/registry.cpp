@@ -32,11 +32,9 @@ SCENARIOS(Registry)
 A: {nodisabled}
 Job presets: problem  registry value Path in HKEY_CURRENT_USER\SOFTWARE\Wow6432Node\HF or \SOFTWARE\HF: there is no such key{nothing}
 Job presets: problem  registry value InstallPath in HKEY_LOCAL_MACHINE\SOFTWARE\Wow6432Node\Vantorix\QZA or \SOFTWARE\Vantorix\QZA: there is no such key{nothing})"),
-        Both("WithoutADefaultFolderAnUpgradeMovesNothing", MovedFrom,
-             {{MachineHive, Hive(MachineKey, "\"x\"=\"y\"")}})
+        Both("WithoutADefaultFolderNothingMoves", MovedFrom, {{MachineHive, Hive(MachineKey, "")}})
             .Log({{"A", found + NoDefault}}, NoDefault),
-        Both("WithoutAPreviousFolderADowngradeMovesNothing", MovedTo,
-             {{UserHive, Hive(UserKey, "\"x\"=\"y\"")}})
+        Both("WithoutAPreviousFolderNothingMovesBack", MovedTo, {{UserHive, Hive(UserKey, "")}})
             .Run({"U"})
             .Log({{"A", foundNew + NoPreviousTo}}, NoPrevious)
             .IsReported(R"(

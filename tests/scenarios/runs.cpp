@@ -9,8 +9,7 @@ SCENARIOS(Runs)
     const Text from = Written(MovedFrom);
     const Text to = Written(MovedTo);
     const Text found = Found(MovedFrom);
-    const Text forged = "x&#13;&#10;End: Updating Impose path for JP "
-                        "Presets&#13;&#10;~&#x7F;&#x9F;&#xA0;&#x2027;&#x2028;&#x2029;&#x202A;&#9;y";
+    const Text forged = "x&#13;&#10;End~&#x7F;&#x9F;&#xA0;&#x2027;&#x2028;&#x2029;&#x202A;&#9;y";
     const auto moving = [&](const Text& name, const Files& files = {})
     {
         return Scenario(name, DoneFolder("A", from)).Before(files).After({{CfgPlace, to}});
@@ -63,9 +62,7 @@ Job presets: problem  {user}{/}ORX{/}JPData{/} cannot be entered)"),
             .Log({{"%d %s", NoCfg, Disabled}}),
         Scenario("AStoredPathStaysInItsLine")
             .File(CfgPlace, Minimal(forged))
-            .Log({{"A",
-                   Found(u8"x\uFFFD\uFFFDEnd: Updating Impose path for JP "
-                         u8"Presets\uFFFD\uFFFD~\uFFFD\uFFFD\u00A0\u2027\uFFFD\uFFFD\u202A\ty"),
+            .Log({{"A", Found(u8"x\uFFFD\uFFFDEnd~\uFFFD\uFFFD\u00A0\u2027\uFFFD\uFFFD\u202A\ty"),
                    Disabled}}),
         Scenario("AFolderNameStaysInItsLine",
                  {{"hot/x\ny/", ""}, {ListPlace, "<l><HotFolder path='{hot}{/}x&#10;y'/></l>"}})
