@@ -93,6 +93,8 @@ SCENARIOS(FolderCfgs)
     const Text written = MinimalWritten(MovedTo);
     const Text mixed = "<FilterSetting>t\n    <x>u\n      <y/>v</x>\n    <![CDATA[<w>]]>z\n    "
                        "<!--c-->\n  </FilterSetting>";
+    const Text utf16 =
+        "{utf16}" + Replaced(Replaced(Written(MovedFrom), "UTF-8", "UTF-16"), "𝄞", "");
     const auto path = [](const Text& stored, const Text& becomes = "")
     {
         return HotFolder{Minimal(stored), becomes.empty() ? "" : MinimalWritten(becomes),
@@ -153,9 +155,7 @@ WithoutADescription: problem  Folder.cfg: lacks "description", so the enabled fo
             .Before(DoneFolder("B", Replaced(Written(MovedFrom), " TimeInterval=\"010\"", "")))
             .Before(DoneFolder("C", Replaced(Written(MovedFrom), "Enable=\"1\"", "Enable=\"true\""),
                                Disabled))
-            .Before(DoneFolder(
-                "D",
-                "{utf16}" + Replaced(Replaced(Written(MovedFrom), "UTF-8", "UTF-16"), "𝄞", "")))
+            .Before(DoneFolder("D", utf16))
             .IsReported(R"(
 A: problem  Folder.cfg: loses its document type, and with it the entities in its texts
 A: problem  Folder.cfg: loses the instruction <?top?>

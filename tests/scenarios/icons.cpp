@@ -25,6 +25,7 @@ Scenario States(const Text& name, const Text& letter)
                                                {Disabled, "01", "Error.er/"}})
     {
         const Text folder = "hot/" + icon;
+        const Text ini = folder + "/Desktop.ini";
         const Text copy = folder + "/[P]/" + icon + ".ico";
         const Text previous = "of the previous version";
         scenario
@@ -34,9 +35,8 @@ Scenario States(const Text& name, const Text& letter)
             .Before(
                 {{"tool/" + icon + ".ico#", "R"}, {"tool/BundleIcons/" + icon + ".ico", previous}})
             .After({{folder + "#", "S"}, {copy, isUpgrade ? "{icon:" + icon + ".ico}" : previous}})
-            .After({{folder + "/Desktop.ini",
-                     IniHeader + IconFile(icon) + "IconIndex=00\r\n" + InfoTip},
-                    {folder + "/Desktop.ini#", "RS"}});
+            .After({{ini, IniHeader + IconFile(icon) + "IconIndex=00\r\n" + InfoTip},
+                    {ini + "#", "RS"}});
         log.push_back({icon, "", icon});
     }
     return scenario.Run({letter}).Log(log);
@@ -107,11 +107,8 @@ A: note     no Folder.cfg)"),
         Scenario("FoldersOfAnotherUserAndPresetsThatCannotBeListed",
                  DoneFolder("A", "<H/>", Disabled))
             .Before(DoneFolder("B", "<H/>", Disabled))
-            .Before({{Ini, Removed},
-                     {Ini + "#", Removed},
-                     {"hot/A#", "SX"},
-                     {"hot/B#", "X"},
-                     {JobPresets + "#", "L"}})
+            .Before({{Ini, Removed}, {Ini + "#", Removed}, {JobPresets + "#", "L"}})
+            .Before({{"hot/A#", "SX"}, {"hot/B#", "X"}})
             .AsOtherUser()
             .NotUnderWine("Wine lets every user list a directory")
             .IsReported(R"(

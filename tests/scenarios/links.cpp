@@ -6,7 +6,6 @@ namespace
 
 const char* const NoPipes = "Windows has no pipes among files";
 
-const Text PresetDir = JobPresets + "/.P/Presets";
 const Text CannotOpenPreset = "Unable to open preset.xml for read : ";
 
 SCENARIOS(PlantedLinks)
@@ -17,7 +16,8 @@ SCENARIOS(PlantedLinks)
     const Text stays = "left as it is (reached over a link)";
     std::vector<Scenario> scenarios = {
         Scenario("LinkedPrivateAndPresetDirectoriesAreNotOpened",
-                 {{"hot/A/[P]/", "{link:elsewhere/P}"}, {PresetDir + "/", "{link:elsewhere/P}"}})
+                 {{"hot/A/[P]/", "{link:elsewhere/P}"},
+                  {JobPresets + "/.P/Presets/", "{link:elsewhere/P}"}})
             .Before({{"elsewhere/P/Folder.cfg", cfg}, {"elsewhere/P/presets.xml", from}})
             .Before({{"elsewhere/P/hf_folder_disabled.ico", "old"}})
             .Log({{"A", NoCfg, Disabled}}, PresetLine(CannotOpenPreset))
@@ -28,7 +28,7 @@ Job presets: problem  .P{xml}: reached over a link, or not a file)"),
                  {{LogPlace, Removed}, {LogFolder + "/", "{link:elsewhere/L}"}})
             .Before({{"elsewhere/L/UpgradeDowngrade.log", "-"}})
             .File(CfgPlace, cfg, moved),
-        Scenario("AHotFolderAndTheFoldersAboveAPresetMayBeLinks",
+        Scenario("AHotFolderAndAJobPresetDirectoryMayBeLinks",
                  {{"hot/A/", "{link:elsewhere/A}"}, {"elsewhere/A/[P]/Folder.cfg", cfg}})
             .Before({{JobPresets + "/", Removed}, {"user/ORX/", "{link:elsewhere/ORX}"}})
             .Before({{"elsewhere/ORX/JPData/", "{link:elsewhere/JPData}"}})
