@@ -90,9 +90,10 @@ struct Scenario
     /// The library itself reports an error, on Windows in a message box.
     SETTER(LibraryReports, libraryReports, = true)
 
-    /// What FolderUpgradeCheck reports before the run, each line after its title; only {hot}{/} of
-    /// a hot folder's title is left out. An * is the account or the system's own words. If there is
-    /// no preset, that is added. Without a log or files that change, there is no run.
+    /// After Before: what FolderUpgradeCheck reports before the run, each line after its title;
+    /// only {hot}{/} of a hot folder's title is left out. An * is the account or the system's own
+    /// words. If there are no hot folders or no presets, that line is added. Without a log or files
+    /// that change, there is no run.
     Scenario& IsReported(const Text& lines);
 };
 

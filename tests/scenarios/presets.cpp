@@ -18,15 +18,14 @@ SCENARIOS(Presets)
         return Scenario(name)
             .File(PresetPlace, preset)
             .Log({}, PresetLine(logged))
-            .IsReported("Workstation: {nofolder}" +
-                        Replaced("\n" + reported, "\n", "\nJob presets: "));
+            .IsReported("Job presets: " + reported);
     };
     const auto updated =
         [&](const Text& name, const Text& before, const Text& after, const Text& reported)
     {
         return only(name, before, Updated, reported).After({{PresetPlace, after}});
     };
-    const Text utf8 = "\nchange   .P{xml}: comes out as UTF-8";
+    const Text utf8 = "\nJob presets: change   .P{xml}: comes out as UTF-8";
     const Text eol = IsWindows ? "\r\n" : "\n";
     return {
         Scenario("EveryPathInTheFolderMoves")

@@ -36,9 +36,8 @@ Job presets: {presetmoves})"),
                  {{LogPlace, Removed}, {LogFolder + "/", ""}})
             .Before({{"user/ORX/JPData/", Removed}, {UserHive, Removed}})
             .Log({}, "Preset dirctory  not exist: {user}{/}ORX{/}JPData{/}\n" + NoPrevious)
-            .IsReported(R"(
-Workstation: {nofolder}
-Job presets: note     there are no presets, because there is no folder {user}{/}ORX{/}JPData{/})"),
+            .IsReported("Job presets: note     there are no presets, because there is no folder "
+                        "{user}{/}ORX{/}JPData{/}"),
         moving("ALogWithAByteOrderMarkLosesIt", {{LogPlace, "{utf16}old\r\n"}}).Log({{"A", found}}),
         moving("AFolderInPlaceOfTheLogStopsNothing", {{LogPlace, Removed}, {LogPlace + "/", ""}})
             .IsReported(R"(
