@@ -2,67 +2,47 @@
 
 #include "tests/scenarios/texts.h"
 
-#include <set>
-
-Scenario& Scenario::Before(const Files& files)
+Scenario& Scenario::Log(const std::vector<FolderLog>& folders, const Text& presets)
 {
-    for (const auto& [place, text] : files)
-        before[place] = text;
-    return *this;
-}
-
-Scenario& Scenario::After(const Files& files)
-{
-    for (const auto& [place, text] : files)
-        after[place] = text;
-    return *this;
-}
-
-Scenario& Scenario::File(const Text& place, const Text& text, const Text& becomes)
-{
-    before[place] = text;
-    if (!becomes.empty())
-        after[place] = becomes;
-    return *this;
-}
-
-Scenario& Scenario::Log(const Text& folders, const Text& presets)
-{
-    return WholeLog("{start}" + Text(folders.empty() ? "No Hotfolder listed\n" : "") +
-                    "Start: HF updation\n" + folders +
-                    "End: HF updation\nStart: Updating Impose path for JP Presets\n" + presets +
-                    "End: Updating Impose path for JP Presets\n");
-}
-
-Scenario& Scenario::LogOfA(const Text& impose, const Text& presets, const Text& icon)
-{
-    return Log(FolderLines("A", 1, NoIcon(icon), impose), presets);
-}
-
-Scenario& Scenario::LogOfPreset(const Text& line)
-{
-    return Log("", PresetLine(line));
-}
-
-Scenario& Scenario::Shell(const Text& version, const Text& calls)
-{
-    shellVersion = version;
-    shellCalls = calls;
-    return NotOnWindows("the system's own shell is called");
+    const bool isUpgrade = arguments[0] != "U" && arguments[0] != "u";
+    Text lines = isUpgrade ? "Installation : Upgrade call with switch: I\n"
+                           : "Un-installation : Downgrade call with switch: U\n";
+    lines += Text(folders.empty() ? "No Hotfolder listed\n" : "") + "Start: HF updation\n";
+    int position = 0;
+    for (const auto& [folder, impose, icon] : folders)
+    {
+        const Text end = "{hot}{/}A count:  " + std::to_string(++position) + "\n";
+        const auto copy = before.find("hot/" + folder + "/[P]/" + icon + ".ico");
+        const bool isThere = copy != before.end() && copy->second != Removed;
+        const Text ofIcon = icon.back() == '\n' ? icon : isThere ? Copied(icon) : NoIcon(icon);
+        lines += Replaced(ofIcon + "Updated icon for hf" + end + impose +
+                              "updated Impose path for hf" + end,
+                          "{hot}{/}A", "{hot}{/}" + folder);
+    }
+    lines += "End: HF updation\nStart: Updating Impose path for JP Presets\n" + presets +
+             "End: Updating Impose path for JP Presets\n";
+    return WholeLog(Replaced(lines, "{icons}", isUpgrade ? "" : "BundleIcons{/}"));
 }
 
 Scenario& Scenario::IsReported(const Text& lines)
 {
-    report = lines;
-    for (const auto& [token, text] : Files{
-             {"{moves}",
-              "  change   Folder.cfg: {previous}{/}Booklet.tpl -> {default}{/}Booklet.tpl"},
-             {"{nodisabled}", "  note     no copy of the icon to replace: hf_folder_disabled.ico"},
-             {"{nothing}", ", for the account *; nothing moves. Run as the client's user, "
-                           "after its installation"},
-             {"{log}", "{user}{/}ORX_Installers{/}UpgradeDowngrade.log"},
-             {"{list}", "{machine}{/}hotfolder{/}HotFolderList.cfg"},
-             {"{Path}", "registry value Path in HKEY_CURRENT_USER\\SOFTWARE\\HF"}})
+    report = lines.empty() || lines[0] == '\n' ? lines : "\n" + lines;
+    const auto hot = before.lower_bound("hot/");
+    if ((hot == before.end() || !StartsWith(hot->first, "hot/")) && !StartsWith(*report, "\nW"))
+        report = "\nWorkstation: note     HotFolderList.cfg lists no hot folder" + *report;
+    if (before.count(PresetPlace) == 0 && report->find("Job presets") == Text::npos)
+        *report += "\nJob presets: note     there are no presets in {user}{/}ORX{/}JPData{/}";
+    for (const auto& [token, text] :
+         Files{{"{moves}", "change   Folder.cfg: " + MovedFrom + " -> " + MovedTo},
+               {"{presetmoves}", "change   .P{xml}: " + MovedFrom + " -> " + MovedTo},
+               {"{xml}", "{/}Presets{/}presets.xml"},
+               {"{nodisabled}", "note     no copy of the icon to replace: hf_folder_disabled.ico"},
+               {"{noicon}", "note     no copy of the icon to replace: hf_folder.ico"},
+               {"{nothing}", ", for the account *; nothing moves. Run as the client's user, "
+                             "after its installation"},
+               {"{log}", "{user}{/}ORX_Installers{/}UpgradeDowngrade.log"},
+               {"{list}", "{machine}{/}hotfolder{/}HotFolderList.cfg"},
+               {"{Path}", "registry value Path in HKEY_CURRENT_USER\\SOFTWARE\\HF"}})
         report = Replaced(*report, token, text);
     return *this;
 }
@@ -71,20 +51,20 @@ Files WorkstationBefore(const Scenario& scenario)
 {
     Files files = scenario.before;
     Text list = "<HotFolders>";
-    std::set<Text> names;
     for (const auto& [place, text] : scenario.before)
     {
         const size_t end = place.find('/', 4);
-        if (StartsWith(place, "hot/") && end != Text::npos &&
-            names.insert(place.substr(4, end - 4)).second)
-            list += "<HotFolder path=\"{hot}{/}" + place.substr(4, end - 4) + "\"/>";
+        const Text entry = "<HotFolder path=\"{hot}{/}" + place.substr(4, end - 4) + "\"/>";
+        if (StartsWith(place, "hot/") && end != Text::npos && list.find(entry) == Text::npos)
+            list += entry;
     }
     files.insert({{ListPlace, list + "</HotFolders>"},
                   {LogPlace, "The log of an earlier run\r\n"},
                   {"user/ORX/JPData/", ""},
-                  {"previous/", ""},
-                  {MachineHive, MachineValue("\"InstallPath\"=\"{app}\"")},
-                  {UserHive, UserValue("\"Path\"=\"{previous}\"")}});
+                  {"previous/Booklet.tpl", ""},
+                  {"default/Booklet.tpl", ""},
+                  {MachineHive, Hive(MachineKey, "\"InstallPath\"=\"{app}\"")},
+                  {UserHive, Hive(UserKey, "\"Path\"=\"{previous}\"")}});
     for (auto file = files.begin(); file != files.end();)
         file = file->second == Removed ? files.erase(file) : std::next(file);
     return files;

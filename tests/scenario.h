@@ -8,7 +8,6 @@
 #include <gtest/gtest.h>
 
 #include <optional>
-#include <ostream>
 #include <vector>
 
 /// In Before: the usual file does not exist.
@@ -26,6 +25,15 @@ inline const Text PresetPlace = "user/ORX/JPData/.P/Presets/presets.xml";
         return *this;                                                                              \
     }
 
+/// A hot folder's name, the lines about its template as if its name were A, and its icon's name, or
+/// the lines about that.
+struct FolderLog
+{
+    Text name;
+    Text impose;
+    Text icon = "hf_folder";
+};
+
 struct Scenario
 {
     Text name;
@@ -39,20 +47,33 @@ struct Scenario
     Text notUnderWine;
     Text shellVersion;
     Text shellCalls;
-    std::optional<Text> report; // FolderUpgrade is not started
-
-    explicit Scenario(const Text& whatHappens) : name(whatHappens)
-    {
-    }
+    std::optional<Text> report;
 
     /// Files in addition to the usual ones, or in place of them. The usual ones are the log of an
-    /// earlier run, a hive for each of the two template folders, an empty directory for presets,
+    /// earlier run, the hives, a template in both template folders, an empty directory for presets,
     /// and HotFolderList.cfg, which lists every NAME of the places hot/NAME/... in order.
-    Scenario& Before(const Files& files);
+    explicit Scenario(const Text& whatHappens, const Files& files = {})
+        : name(whatHappens), before(files)
+    {
+    }
+    Scenario& Before(const Files& files)
+    {
+        for (const auto& [place, text] : files)
+            before[place] = text;
+        return *this;
+    }
     /// Files that change. Every other file and attribute has to stay as it is.
-    Scenario& After(const Files& files);
+    Scenario& After(const Files& files)
+    {
+        for (const auto& [place, text] : files)
+            after[place] = text;
+        return *this;
+    }
     /// One file, before and after; without the second text, it stays.
-    Scenario& File(const Text& place, const Text& text, const Text& becomes = "");
+    Scenario& File(const Text& place, const Text& text, const Text& becomes = "")
+    {
+        return Before({{place, text}}).After(becomes.empty() ? Files() : Files{{place, becomes}});
+    }
     /// The command line arguments; {"I"} if not given.
     SETTER(Run, arguments, )
     /// For tests of refusals: root is refused nothing.
@@ -63,20 +84,16 @@ struct Scenario
 
     /// The whole log, with LF instead of CR LF; if no log is given, that of the earlier run stays.
     SETTER(WholeLog, log, )
-    /// The log of a run with these lines about the hot folders and the presets.
-    Scenario& Log(const Text& folders, const Text& presets = "");
-    /// The same if A is the only hot folder, has no icon to replace, and has these lines about its
-    /// template.
-    Scenario& LogOfA(const Text& impose, const Text& presets = "", const Text& icon = "hf_folder");
-    /// The same if there are no hot folders and one preset, with this line.
-    Scenario& LogOfPreset(const Text& line);
+    /// After Before and Run: the log of a run with these hot folders and these lines about the
+    /// presets.
+    Scenario& Log(const std::vector<FolderLog>& folders = {}, const Text& presets = "");
     /// The library itself reports an error, on Windows in a message box.
     SETTER(LibraryReports, libraryReports, = true)
-    /// The calls to a shell of this version; only on this machine.
-    Scenario& Shell(const Text& version, const Text& calls);
 
-    /// Only FolderUpgradeCheck is started, and reports this, without the head, the sum and empty
-    /// lines; with an * for the account and the system's own words.
+    /// After Before: what FolderUpgradeCheck reports before the run, each line after its title;
+    /// only {hot}{/} of a hot folder's title is left out. An * is the account or the system's own
+    /// words. If there are no hot folders or no presets, that line is added. Without a log or files
+    /// that change, there is no run.
     Scenario& IsReported(const Text& lines);
 };
 
@@ -97,18 +114,11 @@ inline Text TestName(const Scenario& scenario)
 }
 
 /// The places that differ in two snapshots, with both texts, or Removed.
-using Difference = std::pair<Text, Text>;
-std::map<Text, Difference> Differences(const Files& left, const Files& right);
+std::map<Text, std::pair<Text, Text>> Differences(const Files& left, const Files& right);
 
 class Workstations : public testing::TestWithParam<Scenario>
 {
 };
-
-/// What GoogleTest prints instead of the scenario's bytes.
-inline void PrintTo(const Scenario& scenario, std::ostream* stream)
-{
-    *stream << scenario.name;
-}
 
 /// The head of a function that returns scenarios, which become a group of tests of that name.
 #define SCENARIOS(group)                                                                           \

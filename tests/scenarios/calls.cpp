@@ -12,9 +12,7 @@ namespace
 
 const Text Logs = "user/ORX_Installers/";
 const Text Folder = "tool/results/";
-const Text Old = "{tool}{/}previous{/}Booklet.tpl";
-const Text New = "{tool}{/}template{/}Booklet.tpl";
-const Text Refused = "  problem  Folder.cfg: cannot be opened for writing";
+const Text NotWritable = "  problem  Folder.cfg: cannot be opened for writing";
 const Text Reset = "\nLost or reset by the run\n  problem  {hot}{/}A: Folder.cfg: ";
 const Text Ended =
     "\n  problem  crashed, or was ended before it had finished\n  problem  the time is over, ";
@@ -29,36 +27,28 @@ struct Call
 };
 
 // A path of a Folder.cfg and one of a preset move, and both templates exist.
-Scenario Moving(const Text& name)
+Scenario Moving(const Text& name, const Files& files = {})
 {
-    return Scenario(name)
-        .Before({{MachineHive, MachineValue("\"InstallPath\"=\"{tool}\"")},
-                 {UserHive, UserValue("\"Path\"=\"{tool}{/}previous\"")}})
-        .Before({{"tool/previous/Booklet.tpl", ""}, {"tool/template/Booklet.tpl", ""}})
-        .Before({{CfgPlace, Written(Old)}})
-        .File(PresetPlace, Stored(Old), Stored(New));
-}
-
-Scenario Staying(const Text& name)
-{
-    return Moving(name).File(PresetPlace, Stored(Old), Stored(Old));
+    return Scenario(name, {{CfgPlace, Written(MovedFrom)}})
+        .File(PresetPlace, Stored(MovedFrom), Stored(MovedTo))
+        .Before(files);
 }
 
 Scenario Into(const Text& name, const Files& files)
 {
-    return Moving(name).Before(files).Run({"I", "{tool}{/}results"});
+    return Moving(name, files).Run({"I", "{tool}{/}results"});
 }
 
 std::vector<Call> Calls()
 {
     const Text after = "FolderUpgrade-upgrade-after.txt";
-    const Text reset = Replaced(Written(Old), " description=\"\"", "");
+    const Text reset = Replaced(Written(MovedFrom), " description=\"\"", "");
+    const Files stays = {{PresetPlace, Stored(MovedFrom)}};
     const Text manyFolders = "<l>" + Times(200000, "<HotFolder path='/missing/#'/>") + "</l>";
     return {
-        {Moving("AllIsDoneAndTheLogFolderIsMade").Before({{LogPlace, Removed}}), 0},
-        {Moving("TheWayBack")
-             .Before({{CfgPlace, Written(New)}})
-             .File(PresetPlace, Stored(New), Stored(Old))
+        {Moving("AllIsDoneAndTheLogFolderIsMade", {{LogPlace, Removed}}), 0},
+        {Moving("TheWayBack", {{CfgPlace, Written(MovedTo)}})
+             .File(PresetPlace, Stored(MovedTo), Stored(MovedFrom))
              .Run({"u", "--limit", "600"}),
          0},
         {Into("EarlierResultsAreReplaced", {{Folder + after, Text(9999, '.')}}), 0, "", Folder},
@@ -71,16 +61,18 @@ std::vector<Call> Calls()
              .After({{"elsewhere/a", "stays"}})
              .NotUnderWine(NoLinks),
          2, "", ""},
-        {Moving("ABoxWithAListIsClosed")
-             .Before({{CfgPlace + "#", "R"}, {"hot/B/[P]/Folder.cfg", ""}})
+        {Moving("ABoxWithAListIsClosed", {{CfgPlace + "#", "R"}, {"hot/B/[P]/Folder.cfg", ""}})
              .AsOtherUser(),
-         2, Refused},
-        {Moving("WhatWasResetIsSaid").Before({{CfgPlace, reset}}), 2, Reset},
-        {Staying("AnAccountWithoutAPath").Before({{UserHive, Removed}}), 2, "; nothing moves"},
-        {Staying("TheProgramIsMissing"), 4,
+         2, NotWritable},
+        {Moving("WhatWasResetIsSaid", {{CfgPlace, reset}}), 2, Reset},
+        {Moving("AnAccountWithoutAPath", {{UserHive, Removed}}).After(stays), 2, "; nothing moves"},
+        {Moving("TheProgramIsMissing").After(stays), 4,
          "\nFolderUpgrade\n  problem  could not be started (error 2: ", Logs, ""},
-        {Staying("TheProgramDoesNotEnd").Run({"I", "--limit", "3"}), 4, Ended, Logs, "endless"},
-        {Staying("ACheckDoesNotEnd").Before({{ListPlace, manyFolders}}).Run({"I", "--limit", "1"}),
+        {Moving("TheProgramDoesNotEnd").After(stays).Run({"I", "--limit", "3"}), 4, Ended, Logs,
+         "endless"},
+        {Moving("ACheckDoesNotEnd", {{ListPlace, manyFolders}})
+             .After(stays)
+             .Run({"I", "--limit", "1"}),
          4, "The time is over. A check was not finished.\n"},
     };
 }
@@ -88,11 +80,6 @@ std::vector<Call> Calls()
 class CallsOfAnInstaller : public testing::TestWithParam<Call>
 {
 };
-
-void PrintTo(const Call& call, std::ostream* stream)
-{
-    *stream << call.scenario.name;
-}
 
 TEST_P(CallsOfAnInstaller, LeaveTheirResults)
 {
@@ -132,6 +119,31 @@ TEST_P(CallsOfAnInstaller, LeaveTheirResults)
 INSTANTIATE_TEST_SUITE_P(Calls, CallsOfAnInstaller, testing::ValuesIn(Calls()),
                          [](const auto& call) { return TestName(call.param.scenario); });
 
+TEST(Check, WritesToAFile)
+{
+    const Text check = "FolderUpgradeCheck";
+    const Text place = "hot/A/Bericht ä 版.txt";
+    Workstation workstation;
+    workstation.LayOut(WorkstationBefore(
+        Scenario("", DoneFolder("A", Written(MovedTo)))
+            .Before({{PresetPlace, Stored(MovedTo)}, {place, Text(10000, '.')}})));
+    EXPECT_EQ(0, workstation.Start(check, {"i", workstation.HostPath(place).u8string()}).status);
+    const Text report = Replaced(ReadFile(workstation.HostPath(place)), "\r", "");
+    const Text rest =
+        workstation.Expand("\nFrom {previous} to {default}\n\n0 changes, 0 problems, 0 notes\n");
+    EXPECT_TRUE(std::regex_match(
+        Replaced(report, rest, ";"),
+        std::regex("FolderUpgradeCheck [0-9]+\\.[0-9]+\\.[0-9]+, upgrade, 20[0-9-]+ "
+                   "[0-9]+:[0-9]+, [^,]+, (not )?elevated;")))
+        << report;
+    const RunResult refused = workstation.Start(check, {"i", "{hot}{/}none{/}a.txt"});
+    EXPECT_EQ(2, refused.status);
+    EXPECT_EQ("", refused.output);
+    EXPECT_EQ(workstation.Expand(
+                  "FolderUpgradeCheck: the report cannot be written to {hot}{/}none{/}a.txt\n"),
+              refused.libraryLog);
+}
+
 TEST(Usage, IsPrinted)
 {
     const Workstation workstation;
@@ -145,16 +157,14 @@ TEST(Usage, IsPrinted)
          {"Check", "Check|V", "Check|/I", "Check|I|report|V", "Check|I|--to", "Check|I||", "Run",
           "Run|V", "Run|I|--limit", "Run|I|--limit|0", "Run|I|--limit|1h", "Run|I|-x", "Run|I|a|b"})
     {
-        std::istringstream words(wrong);
-        Text program;
-        std::getline(words, program, '|');
-        std::vector<Text> arguments;
-        for (Text word; std::getline(words, word, '|');)
-            arguments.push_back(word);
-        const RunResult run = workstation.Start("FolderUpgrade" + program, arguments);
+        std::istringstream text(Text("FolderUpgrade") + wrong);
+        std::vector<Text> words;
+        for (Text word; std::getline(text, word, '|');)
+            words.push_back(word);
+        const RunResult run = workstation.Start(words[0], {words.begin() + 1, words.end()});
         EXPECT_EQ(3, run.status) << wrong;
         EXPECT_EQ("", run.output);
-        EXPECT_TRUE(StartsWith(run.libraryLog, usages.at("FolderUpgrade" + program))) << wrong;
+        EXPECT_TRUE(StartsWith(run.libraryLog, usages.at(words[0]))) << wrong;
     }
     EXPECT_TRUE(std::regex_match(workstation.Start(check, {"--version"}).output,
                                  std::regex("FolderUpgradeCheck [0-9.]+\r?\n")));

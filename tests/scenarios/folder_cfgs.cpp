@@ -16,31 +16,25 @@ Scenario Gaps()
         "server_textversion server_type Quickset Quickset_Supported Quickset_Enabled IsWidthBased");
     const std::vector<Text> chain(std::istream_iterator<Text>(words), {});
     // server_version is read after 14 of them, and is no gap itself.
-    const std::vector<std::pair<Text, Text>> numbers = {{"2147483647", "2147483647"},
-                                                        {"-2147483648", "-2147483648"},
-                                                        {"2147483648", "0"},
-                                                        {"x1", "0"},
-                                                        {" 01", "1"},
-                                                        {"", "0"},
-                                                        {"9x", "9"}};
+    const Text numbers[] = {"2147483647", "-2147483648", "2147483648", "x1", " 01", "", "9x"};
+    const Text read[] = {"2147483647", "-2147483648", "0", "0", "1", "0", "9"};
     std::map<Text, HotFolder> folders;
     for (size_t gap = 0; gap <= chain.size(); ++gap)
     {
-        const auto& [number, read] = numbers[gap < 14 ? 0 : gap - 14];
-        Text attributes = "<HotFolder server_version='" + number + "'";
+        const size_t row = gap < 14 ? 0 : gap - 14;
+        Text attributes = "<HotFolder server_version='" + numbers[row] + "'";
         Text written = MinimalWritten(MovedTo);
         for (size_t i = 0; i < chain.size(); ++i)
         {
             const Text value = " " + chain[i] + "=\"1\"";
             attributes += i == gap ? "" : value;
-            for (const char* unset : {"\"\"", "\"0\""})
-                written = Replaced(written, " " + chain[i] + "=" + unset,
-                                   i < gap ? value : " " + chain[i] + "=" + unset);
+            for (const char* unset : {"=\"\"", "=\"0\""})
+                written = i < gap ? Replaced(written, " " + chain[i] + unset, value) : written;
         }
         folders["gap " + std::to_string(10 + gap)] = {
             Replaced(Minimal(MovedFrom), "<HotFolder", attributes),
-            Replaced(written, "\"-1\"", "\"" + (gap < 14 ? "-1" : read) + "\""), Found(MovedFrom),
-            gap > 3 ? "hf_folder" : Disabled};
+            Replaced(written, "\"-1\"", "\"" + (gap < 14 ? "-1" : read[row]) + "\""),
+            Found(MovedFrom), gap > 3 ? "hf_folder" : Disabled};
     }
     return HotFolders("AttributesAfterAGapComeOutAsDefaults", folders);
 }
@@ -48,32 +42,49 @@ Scenario Gaps()
 // The paths are ASCII, because nothing else can be compared in these encodings.
 Scenario Encodings()
 {
-    const auto declared = [](const Text& encoding, const Text& name)
+    // Without a new name, the file stays.
+    const auto declared =
+        [](const Text& encoding, const Text& name, const Text& newName = "", const Text& mark = "")
     {
-        return Minimal("{hot}{/}x", "<?xml version='1.0' encoding" + encoding + "?>", name);
-    };
-    const auto moves = [](const Text& cfg, const Text& name)
-    {
-        return HotFolder{cfg, MinimalWritten("{hot}{/}template{/}x", name), Found("{hot}{/}x")};
-    };
-    const auto stays = [](const Text& cfg)
-    {
-        return HotFolder{cfg, "", Found("{hot}{/}x") + Untouched("unknown encoding")};
+        const Text cfg =
+            mark + Minimal("{hot}{/}x", "<?xml version='1.0' encoding" + encoding + "?>", name);
+        const Text found = Found("{hot}{/}x");
+        return newName.empty()
+                   ? HotFolder{cfg, "", found + Untouched("unknown encoding")}
+                   : HotFolder{cfg, MinimalWritten("{hot}{/}template{/}x", newName), found};
     };
     return HotFolders(
                "EncodingsThatTheLibraryReadsWronglyStay",
-               {{"Ascii", moves(declared("='ASCII'", "x"), "x")},
-                {"AsciiInUtf8OfAnotherName", moves(declared("='UTF8'", "x"), "x")},
-                {"AsciiInLatin1", moves(declared("='latin1'", "x"), "x")},
-                {"AsciiInShiftJis", moves(declared("='Shift_JIS'", "x"), "x")},
-                {"Windows1252", moves(declared("='windows-1252'", "\x80\xE4"), "€ä")},
-                {"Utf8OfAnotherName", stays(declared("='UTF8'", "\xC3\xA4"))},
-                {"Windows1253", stays(declared("='windows-1253'", "\xE1\xD2"))},
-                {"ShiftJisAfterSpaces", stays(declared(" = 'Shift_JIS'", "\x93\xFA"))},
-                {"Unknown", stays(declared("='x-own'", "x"))},
-                {"UnknownAfterAByteOrderMark", stays("\xEF\xBB\xBF" + declared("='x-own'", "n"))}})
-        .Before({{MachineHive, MachineValue("\"InstallPath\"=\"{hot}\"")},
-                 {UserHive, UserValue("\"Path\"=\"{hot}\"")}});
+               {{"Ascii", declared("='ASCII'", "x", "x")},
+                {"AsciiInUtf8OfAnotherName", declared("='UTF8'", "x", "x")},
+                {"AsciiInLatin1", declared("='latin1'", "x", "x")},
+                {"AsciiInShiftJis", declared("='Shift_JIS'", "x", "x")},
+                {"Windows1252", declared("='windows-1252'", "\x80\xE4", "€ä")},
+                {"Utf8OfAnotherName", declared("='UTF8'", "\xC3\xA4")},
+                {"Windows1253", declared("='windows-1253'", "\xE1\xD2")},
+                {"ShiftJisAfterSpaces", declared(" = 'Shift_JIS'", "\x93\xFA")},
+                {"Unknown", declared("='x-own'", "x")},
+                {"UnknownAfterAByteOrderMark", declared("='x-own'", "n", "", "\xEF\xBB\xBF")}})
+        .Before({{MachineHive, Hive(MachineKey, "\"InstallPath\"=\"{hot}\"")},
+                 {UserHive, Hive(UserKey, "\"Path\"=\"{hot}\"")}});
+}
+
+// A Folder.cfg that loses much when its template moves.
+Text Rich()
+{
+    const Text entry = "<KEYVALUE Key=\"B\"";
+    Text cfg = Written(MovedFrom);
+    for (const auto& [from, to] :
+         Files{{" Quickset=\"q\"", ""},
+               {"\"-5\"", "\"5b\""},
+               {"Centralized=\"1\"", "Centralized=\"1 \""}, // no loss
+               {"<HotFolder ", "<!DOCTYPE H [<!ENTITY e \"t\">]>\n<?top?><HotFolder mine=\"7\" "},
+               {"<a/>", Times(2000, "<r kind=\"alike\" number=\"#\" empty=\"\"/>")}, // no loss
+               {entry, entry + " Mine=\"\" Value=\"1\"/>" + entry},
+               {"<PreflightSettings>\n",
+                "<Mine><b/></Mine><Paths/>Note <!-- no loss --><PreflightSettings>\n"}})
+        cfg = Replaced(cfg, from, to);
+    return Replaced(cfg, "HotFolder", "Old");
 }
 
 SCENARIOS(FolderCfgs)
@@ -82,6 +93,8 @@ SCENARIOS(FolderCfgs)
     const Text written = MinimalWritten(MovedTo);
     const Text mixed = "<FilterSetting>t\n    <x>u\n      <y/>v</x>\n    <![CDATA[<w>]]>z\n    "
                        "<!--c-->\n  </FilterSetting>";
+    const Text utf16 =
+        "{utf16}" + Replaced(Replaced(Written(MovedFrom), "UTF-8", "UTF-16"), "𝄞", "");
     const auto path = [](const Text& stored, const Text& becomes = "")
     {
         return HotFolder{Minimal(stored), becomes.empty() ? "" : MinimalWritten(becomes),
@@ -116,48 +129,112 @@ SCENARIOS(FolderCfgs)
                     {"Dots", path("{app}{/}.{/}..{/}Vorige 版{/}x", "{default}{/}x")},
                     {"WithoutImposeSettingNothingIsLogged", {"<HotFolder/>", "", ""}},
                     {"WithoutTheTemplateKey",
-                     {"<H><ImposeSetting><K k='orximposetemplate' v='" + MovedFrom +
-                          "'/></ImposeSetting></H>",
-                      "", Found("")}}}),
+                     {Replaced(Minimal(MovedFrom), "ORX", "orx"), "", Found("")}}}),
         HotFolders("ATemplateOnTheShareBeingLeftMoves",
                    {{"ThisShare", path("{/}{/}host{/}share{/}old{/}x", "{default}{/}x")},
                     {"ATemplateOnAnotherShareStays", path("{/}{/}host{/}other{/}old{/}x")}})
-            .Before({{UserHive, UserValue("\"Path\"=\"{/}{/}host{/}share{/}old\"")}}),
+            .Before({{UserHive, Hive(UserKey, "\"Path\"=\"{/}{/}host{/}share{/}old\"")}}),
         HotFolders("ATemplateInARelativeFolderMoves", {{"A", path("x{/}y{/}B", "{default}{/}B")}})
-            .Before({{UserHive, UserValue("\"Path\"=\"x{/}y\"")}}),
-        Scenario("HiddenAndSystemFilesAreWrittenAndKeepTheirAttributes")
-            .Before({{CfgPlace + "#", "HS"}, {PresetPlace + "#", "HS"}})
+            .Before({{UserHive, Hive(UserKey, "\"Path\"=\"x{/}y\"")}}),
+        Scenario("HiddenAndSystemFilesAreWrittenAndKeepTheirAttributes",
+                 {{CfgPlace + "#", "HS"}, {PresetPlace + "#", "HS"}})
             .File(CfgPlace, Written(MovedFrom), Written(MovedTo))
             .File(PresetPlace, Stored(MovedFrom), Stored(MovedTo))
-            .LogOfA(found, PresetLine(Updated)),
-        HotFolders("DamagedFolderCfgsStay",
-                   {{"Empty", {}}, {"Truncated", {Data("foreign.cfg", MovedFrom).substr(0, 700)}}})
-            .LibraryReports(),
+            .Log({{"A", found}}, PresetLine(Updated)),
+        HotFolders("DamagedFolderCfgsStayAndShowAsDisabled",
+                   {{"Empty", {}},
+                    {"Truncated", {Data("foreign.cfg", MovedFrom).substr(0, 700)}},
+                    {"WithoutADescription",
+                     {Replaced(Written(MovedTo), " description=\"\"", ""), "", Found(MovedTo)}}})
+            .LibraryReports()
+            .IsReported(R"(
+Empty: problem  Folder.cfg: damaged (line 1: no element found); it stays as it is, and the folder shows as disabled
+Truncated: problem  Folder.cfg: damaged (line 1: unclosed token); it stays as it is, and the folder shows as disabled
+WithoutADescription: problem  Folder.cfg: lacks "description", so the enabled folder shows as disabled)"),
+        Scenario("Losses", DoneFolder("A", Rich()))
+            .Before(DoneFolder("B", Replaced(Written(MovedFrom), " TimeInterval=\"010\"", "")))
+            .Before(DoneFolder("C", Replaced(Written(MovedFrom), "Enable=\"1\"", "Enable=\"true\""),
+                               Disabled))
+            .Before(DoneFolder("D", utf16))
+            .IsReported(R"(
+A: problem  Folder.cfg: loses its document type, and with it the entities in its texts
+A: problem  Folder.cfg: loses the instruction <?top?>
+A: problem  Folder.cfg: its root <Old> comes out as <HotFolder>
+A: problem  Folder.cfg: lacks "Quickset", so the rewrite resets: Quickset_Supported, IsWidthBased
+A: problem  Folder.cfg: server_version="5b" comes out as "5"
+A: problem  Folder.cfg: loses the attribute mine="7"
+A: problem  Folder.cfg: loses <KEYVALUE Key="B" Mine="" Value="1"> in <JobSetting>
+A: problem  Folder.cfg: loses <KEYVALUE Key="B" KeyDisplayValue="two" LocDisplayValue="zwei" Value="2"> in <JobSetting>
+A: problem  Folder.cfg: loses <Mine>
+A: problem  Folder.cfg: loses <b> in <Mine>
+A: problem  Folder.cfg: loses <Paths>
+A: problem  Folder.cfg: loses the text "Note"
+A: {moves}
+B: problem  Folder.cfg: lacks "TimeInterval", so the rewrite resets: PPDVersion, ServerTypeAndJPDefaultKeyInfo, server_version, server_textversion, server_type, Quickset, Quickset_Supported, IsWidthBased
+B: {moves}
+C: problem  Folder.cfg: Enable="true" comes out as "0"
+C: {moves}
+D: {moves}
+D: note     Folder.cfg: comes out as UTF-8)"),
     };
 }
 
-// Stored files that a user who is not root cannot read or write; icons.cpp has the others.
+// What a user who is not root can neither read nor write.
 SCENARIOS(Refusals)
 {
     const Text found = Found(MovedFrom);
     const Text cfg = Written(MovedFrom);
-    const auto refused = [](const Text& name, const Text& place, const Text& attributes)
-    {
-        return Scenario(name).Before({{place + "#", attributes}}).AsOtherUser().LibraryReports();
-    };
+    const Text preset = Stored(MovedFrom);
     return {
-        refused("AReadOnlyFolderCfgStays", CfgPlace, "R").File(CfgPlace, cfg).LogOfA(found),
-        refused("AnUnreadableFolderCfgStays", CfgPlace, "0")
+        Refused("WhatCannotBeReadStays",
+                {{CfgPlace, cfg}, {"hot/B/[P]/Folder.cfg", cfg}, {"hot/C/[P]/Folder.cfg", cfg}})
+            .Before({{CfgPlace + "#", "0"}, {"hot/B/[P]#", "0"}, {"hot/C#", "0"}})
+            .Before({{PresetPlace, preset}, {PresetPlace + "#", "0"}})
+            .Log({{"A", "", Disabled}, {"B", NoCfg, Disabled}, {"C", NoCfg, Disabled}},
+                 PresetLine("Unable to open preset.xml for read : "))
+            .IsReported(R"(
+A: problem  Folder.cfg: can't open file*
+A: {nodisabled}
+B: problem  [_ORX_HotFolder_]: cannot be entered
+C: problem  the hot folder cannot be entered
+Job presets: problem  .P{xml}: cannot be opened for reading (can't open file*)"),
+        Refused("WhatCannotBeWrittenStays", {{CfgPlace + "#", "R"}, {PresetPlace + "#", "R"}})
             .File(CfgPlace, cfg)
-            .LogOfA("", "", Disabled),
-        refused("AnUnreadablePresetStays", PresetPlace, "0")
-            .File(PresetPlace, Stored(MovedFrom))
-            .LogOfPreset("Unable to open preset.xml for read : "),
-        refused("AReadOnlyPresetStays", PresetPlace, "R")
-            .File(PresetPlace, Stored(MovedFrom))
-            .LogOfPreset("Unable to open preset.xml for write : "),
-        refused("AReadOnlyLogStays", LogPlace, "R").File(CfgPlace, cfg, Written(MovedTo)),
-        refused("AnUnreadableListIsEmpty", ListPlace, "0").Before({{"hot/A/", ""}}).Log(""),
+            .File(PresetPlace, preset)
+            .Log({{"A", found}}, PresetLine("Unable to open preset.xml for write : "))
+            .IsReported(R"(
+A: problem  Folder.cfg: cannot be opened for writing (can't open file*
+A: problem  stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl
+A: {noicon}
+Job presets: problem  .P{xml}: cannot be opened for writing (can't open file*
+Job presets: problem  .P{xml}: stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl)"),
+        Refused("NeitherIconsNorADesktopIniCanBeReplaced", DoneFolder("A", Written(MovedTo)))
+            .Before({{CfgPlace + "#", "R"}, {"tool/hf_folder.ico#", "0"}})
+            .Before({{Ini, "[.ShellClassInfo]"}, {Ini + "#", "X"}})
+            .Before({{"hot/B/[P]/hf_folder_disabled.ico", "old"},
+                     {"hot/B/[P]/hf_folder_disabled.ico#", "R"},
+                     {"hot/B/[P]#", "X"}})
+            .IsReported(R"(
+A: problem  hf_folder.ico: cannot be replaced (read-only, in use, or access denied)
+A: problem  Desktop.ini: cannot be opened for reading and writing
+A: problem  Desktop.ini: its attributes cannot be changed
+B: problem  hf_folder_disabled.ico: cannot be replaced (read-only, in use, or access denied)
+B: change   Desktop.ini: new
+B: change   hot folder: attributes none -> SYSTEM
+B: note     no Folder.cfg)"),
+        Refused("AReadOnlyLogStays", {{LogPlace + "#", "R"}})
+            .File(CfgPlace, cfg, Written(MovedTo))
+            .IsReported(R"(
+Workstation: problem  there will be no run log: can't open file*
+A: {moves}
+A: {noicon})"),
+        Refused("AnUnreadableListIsEmptyAndAClosedPresetFolderSkipped",
+                {{ListPlace + "#", "0"}, {JobPresets + "/.P#", "0"}})
+            .File(PresetPlace, preset)
+            .Log()
+            .IsReported(R"(
+Workstation: problem  can't open file*; no hot folder is migrated
+Job presets: problem  .P{xml}: {user}{/}ORX{/}JPData{/}.P cannot be entered)"),
     };
 }
 

@@ -6,85 +6,86 @@ namespace
 
 const char* const NoPipes = "Windows has no pipes among files";
 
-const Text PresetDir = JobPresets + "/.P/Presets";
 const Text CannotOpenPreset = "Unable to open preset.xml for read : ";
-
-// What a run without a Folder.cfg does to A, whose icon exists.
-Scenario WithIcon(const Text& name)
-{
-    return Scenario(name)
-        .Before({{Icon, "old"}})
-        .After({{Icon, "{icon:hf_folder_disabled.ico}"}, {"hot/A#", "S"}})
-        .Log(CopiedToA());
-}
 
 SCENARIOS(PlantedLinks)
 {
     const Text cfg = Written(MovedFrom);
-    const Text preset = Stored(MovedFrom);
-    const Text ini = IniHeader + IconFile(Disabled) + "IconIndex=00\r\n" + InfoTip;
-    const Text iniStays =
-        "Desktop.ini left as it is (reached over a link): {hot}{/}A{/}Desktop.ini\n";
+    const Text moved = Written(MovedTo);
+    const Text from = Stored(MovedFrom);
+    const Text stays = "left as it is (reached over a link)";
     std::vector<Scenario> scenarios = {
-        Scenario("LinkedPrivateAndPresetDirectoriesAreNotOpened")
-            .Before({{"elsewhere/P/Folder.cfg", cfg},
-                     {"elsewhere/P/hf_folder_disabled.ico", "old"},
-                     {"elsewhere/P/presets.xml", preset},
-                     {PresetDir + "/", "{link:elsewhere/P}"},
-                     {"hot/A/[P]/", "{link:elsewhere/P}"}})
-            .LogOfA(NoCfg(), PresetLine(CannotOpenPreset), Disabled),
-        Scenario("ALinkedLogFolderGetsNoLog")
-            .Before({{LogPlace, Removed},
-                     {"elsewhere/L/UpgradeDowngrade.log", "-"},
-                     {LogFolder + "/", "{link:elsewhere/L}"}})
-            .File(CfgPlace, cfg, Written(MovedTo)),
-        Scenario("AHotFolderAndAJobPresetDirectoryMayBeLinks")
-            .Before({{"elsewhere/A/[P]/Folder.cfg", cfg},
-                     {"hot/A/", "{link:elsewhere/A}"},
-                     {"elsewhere/P/Presets/presets.xml", preset},
-                     {JobPresets + "/.P/", "{link:elsewhere/P}"}})
-            .After({{"elsewhere/A/[P]/Folder.cfg", Written(MovedTo)},
-                    {"elsewhere/P/Presets/presets.xml", Stored(MovedTo)}})
-            .LogOfA(Found(MovedFrom), PresetLine(Updated)),
-        Scenario("TheFoldersAboveThePresetsMayBeLinks")
-            .Before({{JobPresets + "/", Removed},
-                     {"elsewhere/ORX/other", ""},
-                     {"elsewhere/JPData/.P/Presets/presets.xml", preset},
-                     {"user/ORX/", "{link:elsewhere/ORX}"},
-                     {"elsewhere/ORX/JPData/", "{link:elsewhere/JPData}"}})
-            .After({{"elsewhere/JPData/.P/Presets/presets.xml", Stored(MovedTo)}})
-            .LogOfPreset(Updated),
-        Scenario("ALinkedErrorFileCountsByItsName")
-            .Before({{"elsewhere/other", ""}, {"hot/A/[P]/Error.er", "{link:elsewhere/missing}"}})
-            .File(CfgPlace, cfg, Written(MovedTo))
-            .LogOfA(Found(MovedFrom), "", "hf_error_active")
+        Scenario("LinkedPrivateAndPresetDirectoriesAreNotOpened",
+                 {{"hot/A/[P]/", "{link:elsewhere/P}"},
+                  {JobPresets + "/.P/Presets/", "{link:elsewhere/P}"}})
+            .Before({{"elsewhere/P/Folder.cfg", cfg}, {"elsewhere/P/presets.xml", from}})
+            .Before({{"elsewhere/P/hf_folder_disabled.ico", "old"}})
+            .Log({{"A", NoCfg, Disabled}}, PresetLine(CannotOpenPreset))
+            .IsReported(R"(
+A: problem  [_ORX_HotFolder_]: reached over a link
+Job presets: problem  .P{xml}: reached over a link, or not a file)"),
+        Scenario("ALinkedLogFolderGetsNoLog",
+                 {{LogPlace, Removed}, {LogFolder + "/", "{link:elsewhere/L}"}})
+            .Before({{"elsewhere/L/UpgradeDowngrade.log", "-"}})
+            .File(CfgPlace, cfg, moved),
+        Scenario("AHotFolderAndAJobPresetDirectoryMayBeLinks",
+                 {{"hot/A/", "{link:elsewhere/A}"}, {"elsewhere/A/[P]/Folder.cfg", cfg}})
+            .Before({{JobPresets + "/", Removed}, {"user/ORX/", "{link:elsewhere/ORX}"}})
+            .Before({{"elsewhere/ORX/JPData/", "{link:elsewhere/JPData}"}})
+            .Before({{"elsewhere/JPData/.P/", "{link:elsewhere/P}"}})
+            .File("elsewhere/P/Presets/presets.xml", from, Stored(MovedTo))
+            .After({{"elsewhere/A/[P]/Folder.cfg", moved}})
+            .Log({{"A", Found(MovedFrom)}}, PresetLine(Updated)),
+        Scenario("ALinkedErrorFileCountsByItsName",
+                 {{"elsewhere/other", ""}, {"hot/A/[P]/Error.er", "{link:elsewhere/missing}"}})
+            .File(CfgPlace, cfg, moved)
+            .Log({{"A", Found(MovedFrom), "hf_error_active"}})
             .NotUnderWine(NoLinks),
     };
     // In that place: a link to a file with this text, a dangling link, and a pipe.
-    const auto add = [&](const Scenario& scenario, const Text& place, const Text& text)
+    const auto add = [&](const Scenario& scenario, const Text& place, const Text& text,
+                         const Text& linked, const Text& piped)
     {
-        const std::pair<Text, Text> kinds[] = {{"IsALink", "{link:elsewhere/file}"},
-                                               {"IsADanglingLink", "{link:elsewhere/missing}"},
-                                               {"IsAPipe", "{fifo}"}};
-        for (const auto& [name, planted] : kinds)
+        for (const auto& [name, planted] : Files{{"IsALink", "{link:elsewhere/file}"},
+                                                 {"IsADanglingLink", "{link:elsewhere/missing}"},
+                                                 {"IsAPipe", "{fifo}"}})
         {
             scenarios.push_back(scenario);
             scenarios.back().name += name;
             scenarios.back()
                 .Before({{"elsewhere/file", text}, {place, planted}})
                 .NotOnWindows(planted == "{fifo}" ? NoPipes : "")
-                .NotUnderWine(NoLinks);
+                .NotUnderWine(NoLinks)
+                .IsReported(planted == "{fifo}" ? piped : linked);
         }
     };
-    add(WithIcon("AFolderCfg").After({{Ini, ini}, {Ini + "#", "RS"}}), CfgPlace, cfg);
-    add(Scenario("AnIcon").LogOfA(NoCfg(), "", Disabled), Icon, "old");
-    add(WithIcon("DesktopIni").Log(CopiedToA(iniStays)), Ini, "[.ShellClassInfo]\r\n");
-    scenarios.back().Log(CopiedToA());
-    add(Scenario("APreset").LogOfPreset(CannotOpenPreset), PresetDir + "/presets.xml", preset);
-    add(Scenario("TheLog").File(CfgPlace, cfg, Written(MovedTo)), LogPlace, "-");
-    scenarios.push_back(Scenario("TheListIsAPipe")
-                            .Before({{ListPlace, "{fifo}"}, {"hot/A/", ""}})
-                            .Log("")
+    const auto done = [](const Text& name)
+    {
+        return Scenario(name, DoneFolder("A", "<H/>", Disabled));
+    };
+    add(done("AFolderCfg").Log({{"A", NoCfg, Disabled}}), CfgPlace, cfg,
+        "A: problem  Folder.cfg: reached over a link", "A: problem  Folder.cfg: is not a file");
+    add(done("AnIcon").Before({{Icon, Removed}}).Log({{"A", "", Disabled}}), Icon, "old",
+        "A: problem  hf_folder_disabled.ico: reached over a link", "A: {nodisabled}");
+    add(done("DesktopIni")
+            .Before({{Ini + "#", Removed}})
+            .Log({{"A", "",
+                   "Desktop.ini " + stays + ": {hot}{/}A{/}Desktop.ini\n" + Copied(Disabled)}}),
+        Ini, "[.ShellClassInfo]\r\n", "A: problem  Desktop.ini: " + stays,
+        "A: problem  Desktop.ini: is not a file\nA: change   Desktop.ini: attributes none -> "
+        "READONLY SYSTEM");
+    scenarios.back().Log({{"A", "", Disabled}});
+    const Text skipped = "Job presets: problem  .P{xml}: reached over a link, or not a file";
+    add(Scenario("APreset").Log({}, PresetLine(CannotOpenPreset)), PresetPlace, from, skipped,
+        skipped);
+    add(Scenario("TheLog", DoneFolder("A", cfg)).After({{CfgPlace, moved}}), LogPlace, "-", R"(
+Workstation: problem  there will be no run log: it is reached over a link: {log}
+A: {moves})",
+        R"(
+Workstation: note     there will be no run log: something else has its name: {log}
+A: {moves})");
+    scenarios.push_back(Scenario("TheListIsAPipe", {{ListPlace, "{fifo}"}, {"hot/A/", ""}})
+                            .Log()
                             .NotOnWindows(NoPipes));
     return scenarios;
 }

@@ -11,47 +11,69 @@ SCENARIOS(Presets)
                       "ORXImposeTemplate\">\"{previous}";
     const Text from = Stored(MovedFrom);
     const Text to = Stored(MovedTo);
-    const auto updated = [](const Text& name, const Text& before, const Text& after)
-    {
-        return Scenario(name)
-            .File(PresetPlace, before)
-            .After({{PresetPlace, after}})
-            .LogOfPreset(Updated);
-    };
-    const auto left = [](const Text& name, const Text& preset, const Text& reason)
+    // These presets are the only files; each has one line in the log, and one in the report.
+    const auto only =
+        [](const Text& name, const Text& preset, const Text& logged, const Text& reported)
     {
         return Scenario(name)
             .File(PresetPlace, preset)
-            .LogOfPreset("preset.xml left as it is (" + reason + "): ");
+            .Log({}, PresetLine(logged))
+            .IsReported("Job presets: " + reported);
     };
+    const auto updated =
+        [&](const Text& name, const Text& before, const Text& after, const Text& reported)
+    {
+        return only(name, before, Updated, reported).After({{PresetPlace, after}});
+    };
+    const Text utf8 = "\nJob presets: change   .P{xml}: comes out as UTF-8";
+    const Text eol = IsWindows ? "\r\n" : "\n";
     return {
-        updated("EveryPathInTheFolderMoves",
-                "\r\n" + from + near + "\r\n" + Stored("{previous}{/}Sub{/}x") +
-                    Stored("{previous}") + near,
-                "\r\n" + to + near + "\r\n" + Stored("{default}{/}Sub{/}x") + Stored("{default}") +
-                    near),
-        updated("AnEmptyPresetIsUpdated", "", ""),
-        updated("AByteOrderMarkAloneGoes", "\xEF\xBB\xBF", ""),
-        updated("AByteOrderMarkGoes", "\xEF\xBB\xBF" + from, to),
-        updated("AUtf16PresetComesOutInUtf8", "{utf16}\r\n" + from + "Ě\x1A",
-                "\r\n" + to + "Ě\x1A"),
+        Scenario("EveryPathInTheFolderMoves")
+            .File(PresetPlace,
+                  "\r\n" + from + near + "\r\n" + Stored("{previous}{/}Sub{/}x") +
+                      Stored("{previous}") + near,
+                  "\r\n" + to + near + "\r\n" + Stored("{default}{/}Sub{/}x") +
+                      Stored("{default}") + near)
+            .Log({}, PresetLine(Updated)),
+        Scenario("AnEmptyPresetIsUpdated").File(PresetPlace, "").Log({}, PresetLine(Updated)),
+        updated("AByteOrderMarkGoes", "\xEF\xBB\xBF" + from, to, "{presetmoves}"),
+        updated("AByteOrderMarkAloneGoes", "\xEF\xBB\xBF", "",
+                "change   .P{xml}: loses its byte-order mark"),
+        updated("LineEndsBecomeThoseOfTheSystem", "\xEF\xBB\xBF<p>\n</p>", "<p>" + eol + "</p>",
+                Text("change   .P{xml}: loses its byte-order mark") +
+                    (IsWindows ? ", and its line ends become CR LF" : "")),
+        updated("AUtf16PresetComesOutInUtf8", "{utf16}\r\nĚ\x1A", "\r\nĚ\x1A",
+                "change   .P{xml}: comes out as UTF-8, without byte-order mark"),
         updated("NulAndCtrlZEndNothing", Text("a\0b\x1A\r\n", 6) + from + "end",
-                Text("a\0b\x1A\r\n", 6) + to + "end"),
-        updated("BytesThatAreNotUtf8AreTakenAsLatin1", "\xE4\r\n", "ä\r\n"),
-        left("HalfAUtf16UnitStays", Text("\xFF\xFE") + Text("a\0b", 3), "cannot be decoded"),
-        left("ALoneSurrogateStays", Text("\xFF\xFE\0\0\0\xD8\0\0a\0\0\0", 12),
-             "cannot be encoded again"),
-        Scenario("AFolderInPlaceOfAPresetIsSkipped")
-            .Before({{PresetPlace + "/", ""}})
-            .LogOfPreset("Unable to open preset.xml for read : "),
-        Scenario("OnlyDirectSubdirectoriesAreSearched")
+                Text("a\0b\x1A\r\n", 6) + to + "end", "{presetmoves}"),
+        updated("BytesThatAreNotUtf8AreTakenAsLatin1", "\xE4\r\n", "ä\r\n",
+                "problem  .P{xml}: is not UTF-8, so the whole file is read as Latin-1; accented "
+                "characters come out wrong" +
+                    utf8),
+        updated(
+            "ADeclaredEncodingStays", "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?><p>\xE4</p>",
+            "<?xml version=\"1.0\" encoding=\"ISO-8859-1\"?><p>ä</p>",
+            "problem  .P{xml}: declares the encoding ISO-8859-1, but comes out as UTF-8" + utf8),
+        only("HalfAUtf16UnitStays", Text("\xFF\xFE") + Text("a\0b", 3),
+             "preset.xml left as it is (cannot be decoded): ",
+             "problem  .P{xml}: left as it is (cannot be decoded)"),
+        only("ALoneSurrogateStays", Text("\xFF\xFE\0\0\0\xD8\0\0a\0\0\0", 12),
+             "preset.xml left as it is (cannot be encoded again): ",
+             "problem  .P{xml}: left as it is (cannot be encoded again)"),
+        Scenario("FoldersInPlaceOfStoredFilesAreSkipped",
+                 {{CfgPlace + "/", ""}, {PresetPlace + "/", ""}})
+            .Log({{"A", NoCfg, Disabled}}, PresetLine("Unable to open preset.xml for read : "))
+            .IsReported(R"(
+A: problem  Folder.cfg: is not a file
+A: {nodisabled}
+Job presets: problem  .P{xml}: reached over a link, or not a file)"),
+        Scenario("OnlyDirectSubdirectoriesAreSearchedEvenIfTheListIsAFolder",
+                 {{ListPlace, Removed}, {ListPlace + "/", ""}})
             .Before({{"user/ORX/JPData/Presets/presets.xml", from},
                      {"user/ORX/JPData/P/Q/Presets/presets.xml", from},
                      {"user/ORX/JPData/presets.xml", from}})
-            .Log(""),
-        Scenario("WithoutAPresetRootItsPathIsLogged")
-            .Before({{"user/ORX/JPData/", Removed}, {UserHive, Removed}})
-            .Log("", "Preset dirctory  not exist: {user}{/}ORX{/}JPData{/}\n" + NoPrevious),
+            .Log()
+            .IsReported("Workstation: problem  HotFolderList.cfg: is not a file"),
     };
 }
 

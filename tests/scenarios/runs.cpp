@@ -9,11 +9,10 @@ SCENARIOS(Runs)
     const Text from = Written(MovedFrom);
     const Text to = Written(MovedTo);
     const Text found = Found(MovedFrom);
-    const Text forged = "x&#13;&#10;End: Updating Impose path for JP "
-                        "Presets&#13;&#10;~&#x7F;&#x9F;&#xA0;&#x2027;&#x2028;&#x2029;&#x202A;&#9;y";
-    const auto moving = [&](const Text& name)
+    const Text forged = "x&#13;&#10;End~&#x7F;&#x9F;&#xA0;&#x2027;&#x2028;&#x2029;&#x202A;&#9;y";
+    const auto moving = [&](const Text& name, const Files& files = {})
     {
-        return Scenario(name).File(CfgPlace, from, to);
+        return Scenario(name, DoneFolder("A", from)).Before(files).After({{CfgPlace, to}});
     };
     return {
         Scenario("WithoutASwitchNothingChanges").File(CfgPlace, from).Run({}),
@@ -23,71 +22,95 @@ SCENARIOS(Runs)
             .WholeLog("Invalid call check calling parameter: exiting....\n"),
         Scenario("AnInvalidSwitchIsNotLoggedWithV").File(CfgPlace, from).Run({"X", "V"}),
         moving("VLeavesTheLogAlone").Run({"I", "v"}),
-        moving("AnUpgradeMovesTheTemplate").Run({"i"}).LogOfA(found),
-        moving("VIsIgnoredBeforeAnotherArgument").Run({"I", "V", "x"}).LogOfA(found),
-        moving("AnotherSecondArgumentIsIgnored").Run({"I", "W"}).LogOfA(found),
-        Scenario("ADowngradeMovesTheTemplateBack")
-            .File(CfgPlace, to, from)
-            .Run({"u"})
-            .LogOfA(Found(MovedTo)),
-        moving("WithoutALogFolderTheRestIsDone").Before({{LogPlace, Removed}}),
-        moving("AMissingLogIsCreated")
-            .Before({{LogPlace, Removed}, {LogFolder + "/", ""}})
-            .LogOfA(found),
-        moving("ALogWithAByteOrderMarkLosesIt")
-            .Before({{LogPlace, "{utf16}old\r\n"}})
-            .LogOfA(found),
-        moving("AFolderInPlaceOfTheLogStopsNothing")
-            .Before({{LogPlace, Removed}, {LogPlace + "/", ""}}),
-        Scenario("APercentSignIsLoggedAsItIs")
-            .Before({{"hot/%d %s/", ""}})
-            .Log(FolderLines("%d %s", 1, NoIcon(Disabled), NoCfg("%d %s"))),
+        moving("AnUpgradeMovesTheTemplate").Run({"i"}).Log({{"A", found}}),
+        moving("VIsIgnoredBeforeAnotherArgument").Run({"I", "V", "x"}).Log({{"A", found}}),
+        moving("AnotherSecondArgumentIsIgnored").Run({"I", "W"}).Log({{"A", found}}),
+        Scenario("PresetsNeedNeitherAListNorALogFolder",
+                 {{ListPlace, Removed}, {LogPlace, Removed}})
+            .File(PresetPlace, Stored(MovedFrom), Stored(MovedTo))
+            .IsReported(R"(
+Workstation: note     there is no {list}
+Workstation: note     there will be no run log: there is no folder {user}{/}ORX_Installers{/}
+Job presets: {presetmoves})"),
+        Scenario("AMissingLogIsCreatedAndAMissingPresetFolderLogged",
+                 {{LogPlace, Removed}, {LogFolder + "/", ""}})
+            .Before({{"user/ORX/JPData/", Removed}, {UserHive, Removed}})
+            .Log({}, "Preset dirctory  not exist: {user}{/}ORX{/}JPData{/}\n" + NoPrevious)
+            .IsReported("Job presets: note     there are no presets, because there is no folder "
+                        "{user}{/}ORX{/}JPData{/}"),
+        moving("ALogWithAByteOrderMarkLosesIt", {{LogPlace, "{utf16}old\r\n"}}).Log({{"A", found}}),
+        moving("AFolderInPlaceOfTheLogStopsNothing", {{LogPlace, Removed}, {LogPlace + "/", ""}})
+            .IsReported(R"(
+Workstation: note     there will be no run log: something else has its name: {log}
+A: {moves})"),
+        moving("ALogFolderThatCannotBeWrittenToStopsNothing",
+               {{LogPlace, Removed}, {LogFolder + "/", ""}, {LogFolder + "#", "X"}})
+            .AsOtherUser()
+            .NotUnderWine("there every user may write to the folder")
+            .IsReported(R"(
+Workstation: problem  there will be no run log: its folder cannot be written to: {user}{/}ORX_Installers{/}
+A: {moves})"),
+        Scenario("NoFolderCanBeEntered", {{ListPlace, ""}, {PresetPlace, ""}})
+            .Before({{"machine/hotfolder#", "0"}, {LogFolder + "#", "0"}, {JobPresets + "#", "0"}})
+            .AsOtherUser()
+            .IsReported(R"(
+Workstation: problem  HotFolderList.cfg: its folder cannot be entered
+Workstation: problem  there will be no run log: its folder cannot be entered: {user}{/}ORX_Installers{/}
+Job presets: problem  {user}{/}ORX{/}JPData{/} cannot be entered)"),
+        Scenario("APercentSignIsLoggedAsItIs", {{"hot/%d %s/", ""}})
+            .Log({{"%d %s", NoCfg, Disabled}}),
         Scenario("AStoredPathStaysInItsLine")
             .File(CfgPlace, Minimal(forged))
-            .LogOfA(Found(u8"x\uFFFD\uFFFDEnd: Updating Impose path for JP "
-                          u8"Presets\uFFFD\uFFFD~\uFFFD\uFFFD\u00A0\u2027\uFFFD\uFFFD\u202A\ty"),
-                    "", Disabled),
-        Scenario("AFolderNameStaysInItsLine")
-            .Before({{"hot/x\ny/", ""}, {ListPlace, "<l><HotFolder path='{hot}{/}x&#10;y'/></l>"}})
-            .Log(FolderLines(u8"x\uFFFDy", 1, NoIcon(Disabled), NoCfg(u8"x\uFFFDy")))
+            .Log({{"A", Found(u8"x\uFFFD\uFFFDEnd~\uFFFD\uFFFD\u00A0\u2027\uFFFD\uFFFD\u202A\ty"),
+                   Disabled}}),
+        Scenario("AFolderNameStaysInItsLine",
+                 {{"hot/x\ny/", ""}, {ListPlace, "<l><HotFolder path='{hot}{/}x&#10;y'/></l>"}})
+            .Log({{u8"x\uFFFDy", NoCfg, Disabled}})
             .NotOnWindows("no file name has a line end"),
     };
-}
-
-Text Lines(const Text& name, int position)
-{
-    return FolderLines(name, position, NoIcon(Disabled), NoCfg(name));
 }
 
 SCENARIOS(Lists)
 {
     const auto listed = [](const Text& name, const Text& list)
     {
-        return Scenario(name).Before({{"hot/A/", ""},
-                                      {"hot/b ü 漢/", ""},
-                                      {"hot/C/", ""},
-                                      {"hot/c/", ""},
-                                      {"hot/file", "x"},
-                                      {ListPlace, list}});
+        return Scenario(name, {{"hot/A/", ""}, {"hot/b ü 漢/", ""}, {"hot/C/", ""}, {"hot/c/", ""}})
+            .Before({{"hot/D/", "{link:hot/C}"}, {"hot/file", "x"}, {ListPlace, list}});
     };
+    const Text spaced = IsWindows
+                            ? "problem  listed hot folder is on a drive or share that is not there:"
+                            : "note     listed hot folder does not exist:";
     return {
         listed("ListedFoldersThatExistAreTakenOnceAndInOrder",
-               "<any><!-- --><HotFolder/><HotFolder path=''/><HotFolder path='{hot}{/}missing'/>"
-               "<HotFolder path='{hot}{/}C '/><hotfolder path='{hot}{/}A'/>"
-               "<x><HotFolder path='{hot}{/}A'/></x><HotFolder path='{hot}{/}file'/>"
-               "<HotFolder Path='{hot}{/}A'/><HotFolder path=' {hot}{/}A'/>"
+               "{utf16}<any><!-- --><HotFolder/><HotFolder path=''/><HotFolder path=' {hot}{/}A'/>"
+               "<HotFolder path='{hot}{/}missing'/><HotFolder path='{hot}{/}C '/>"
+               "<hotfolder path='{hot}{/}A'/><x><HotFolder path='{hot}{/}A'/></x>"
+               "<HotFolder path='{hot}{/}file'/><HotFolder Path='{hot}{/}A'/>"
                "<HotFolder z='1' path='{hot}{/}b ü 漢&#10;'/><HotFolder path='{hot}{/}C'/>"
-               "<HotFolder path='{hot}{/}c'/></any>")
-            .Log(Lines("C", 1) + Lines("b ü 漢", 2)),
-        Scenario("AMissingListStillMigratesPresets")
-            .Before({{ListPlace, Removed}})
-            .File(PresetPlace, Stored(MovedFrom), Stored(MovedTo))
-            .LogOfPreset(Updated),
+               "<HotFolder path='{hot}{/}c'/><HotFolder path='{hot}{/}D'/></any>")
+            .Log({{"C", NoCfg, Disabled}, {"b ü 漢", NoCfg, Disabled}, {"D", NoCfg, Disabled}})
+            .IsReported("\nWorkstation: " + spaced + "  {hot}{/}A" + R"(
+Workstation: note     listed hot folder does not exist: {hot}{/}missing
+Workstation: note     listed hot folder does not exist: {hot}{/}file
+Workstation: note     listed hot folder is listed twice: {hot}{/}C
+Workstation: note     listed hot folder is listed twice: {hot}{/}c
+C: note     no Folder.cfg
+C: {nodisabled}
+b ü 漢: note     no Folder.cfg
+b ü 漢: {nodisabled}
+D: note     the same directory as {hot}{/}C)"),
         listed("AMalformedListIsEmpty", "<any><HotFolder path='{hot}{/}A'/>")
-            .Log("")
-            .LibraryReports(),
-        listed("AUtf16ListIsRead", "{utf16}<a><HotFolder path='{hot}{/}b ü 漢'/></a>")
-            .Log(Lines("b ü 漢", 1)),
+            .Log()
+            .LibraryReports()
+            .IsReported(R"(
+Workstation: problem  {list}: damaged (line 1: no element found); no hot folder is migrated)"),
+        listed("NoListedFolderIsThere", "<l>" + Times(23, "<HotFolder path='{hot}{/}#'/>") + "</l>")
+            .Log()
+            .IsReported(
+                "Workstation: problem  none of the listed hot folders exists (another "
+                "account? mapped drives?)" +
+                Times(20, "\nWorkstation: note     listed hot folder does not exist: {hot}{/}#") +
+                "\nWorkstation: note     listed hot folder and 3 more"),
     };
 }
 

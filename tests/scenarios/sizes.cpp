@@ -52,10 +52,6 @@ HotFolder Elsewhere(const Text& stored, const Text& path)
 
 SCENARIOS(Sizes)
 {
-    const auto listed = [](const Text& name, const Text& list)
-    {
-        return Scenario(name).Before({{"hot/A/", ""}, {ListPlace, "<l>" + list + "</l>"}});
-    };
     const Text listedA = "<HotFolder path='{hot}{/}A'/>";
     const Text lines = Times(3000, "123456789\n");
     const Text oneMillion = Times(1000001, "x");
@@ -103,10 +99,17 @@ SCENARIOS(Sizes)
                       Found(MovedFrom)}},
                     {"Variables", Elsewhere(Times(200000, "$"), Times(200000, "$"))},
                     {"Expanded variables", Elsewhere("&a5;&a5;&a5;", Times(300000, "$"))}}),
-        listed("AListThatIsTooDeepIsEmpty", Times(6000, "<e>")).Log(""),
-        listed("AListThatIsTooBigIsEmpty", listedA + Times(1600000, "<a/>")).Log(""),
-        listed("AListOf20000EntriesIsRead", listedA + Times(20000, "<HotFolder path='/missing'/>"))
-            .Log(FolderLines("A", 1, NoIcon(Disabled), NoCfg("A"))),
+        Scenario("AListThatIsTooDeepIsEmpty", {{ListPlace, Times(6000, "<e>")}})
+            .Log()
+            .IsReported("Workstation: problem  HotFolderList.cfg: too large to read safely"),
+        Scenario("AListThatIsTooBigIsEmpty",
+                 {{"hot/A/", ""}, {ListPlace, "<l>" + listedA + Times(1600000, "<a/>") + "</l>"}})
+            .Log(),
+        Scenario(
+            "AListOf20000EntriesIsRead",
+            {{ListPlace, "<l>" + listedA + Times(20000, "<HotFolder path='/missing'/>") + "</l>"}})
+            .Before({{"hot/A/", ""}})
+            .Log({{"A", NoCfg, Disabled}}),
     };
 }
 

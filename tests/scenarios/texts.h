@@ -20,20 +20,14 @@ inline const Text JobPresets = "user/ORX/JPData";
 inline const Text MovedFrom = "{previous}{/}Booklet.tpl";
 inline const Text MovedTo = "{default}{/}Booklet.tpl";
 
+inline const Text MachineKey = "HKEY_LOCAL_MACHINE\\SOFTWARE\\Vantorix\\QZA";
+inline const Text UserKey = "HKEY_CURRENT_USER\\SOFTWARE\\HF";
+
+/// A hive in which the key of one of the two template folders has this value.
 inline Text Hive(const Text& key, const Text& value)
 {
     return "Windows Registry Editor Version 5.00\r\n\r\n[" + key +
            "]\r\n\"Other\"=dword:00000001\r\n" + value + "\r\n";
-}
-
-/// A hive in which the key of one of the two template folders has this value.
-inline Text MachineValue(const Text& value)
-{
-    return Hive("HKEY_LOCAL_MACHINE\\SOFTWARE\\Vantorix\\QZA", value);
-}
-inline Text UserValue(const Text& value)
-{
-    return Hive("HKEY_CURRENT_USER\\SOFTWARE\\HF", value);
 }
 
 /// A file of tests/data with this path.
@@ -83,35 +77,36 @@ inline Text IconFile(const Text& name)
     return "IconFile=.\\[_ORX_HotFolder_]\\" + name + ".ico\r\n";
 }
 
-// Log lines; {icons} is where the icons of the run's direction come from.
-
-/// One folder's lines: those of its icon and those of its template.
-inline Text FolderLines(const Text& name, int position, const Text& icon, const Text& impose)
+/// A hot folder in which a run changes nothing but its template.
+inline Files DoneFolder(const Text& name, const Text& cfg, const Text& icon = "hf_folder")
 {
-    const Text end = name + " count:  " + std::to_string(position) + "\n";
-    return icon + "Updated icon for hf{hot}{/}" + end + impose +
-           "updated Impose path for hf{hot}{/}" + end;
+    const Text folder = "hot/" + name;
+    return {{folder + "#", "S"},
+            {folder + "/Desktop.ini#", "RS"},
+            {folder + "/Desktop.ini", IniHeader + InfoTip + IconFile(icon)},
+            {folder + "/[P]/" + icon + ".ico", "{icon:" + icon + ".ico}"},
+            {folder + "/[P]/Folder.cfg", cfg}};
 }
+
+/// A scenario in which something is refused to a user who is not root, which the library reports.
+inline Scenario Refused(const Text& whatHappens, const Files& files)
+{
+    return Scenario(whatHappens, files).AsOtherUser().LibraryReports();
+}
+
+// Log lines; {icons} is where the icons of the run's direction come from.
 
 inline Text NoIcon(const Text& name)
 {
     return "Icon path  not exist: {tool}{/}{icons}" + name + ".ico\n";
 }
-inline Text Copied(const Text& icon, const Text& folder = "A")
+inline Text Copied(const Text& icon)
 {
-    return "Icon  copied from : {tool}{/}{icons}" + icon + ".ico To {hot}{/}" + folder +
-           "{/}[_ORX_HotFolder_]{/}" + icon + ".ico \n";
+    return "Icon  copied from : {tool}{/}{icons}" + icon +
+           ".ico To {hot}{/}A{/}[_ORX_HotFolder_]{/}" + icon + ".ico \n";
 }
-inline Text NoCfg(const Text& name = "A")
-{
-    return "HF cfg file unable to read/exist: {hot}{/}" + name +
-           "{/}[_ORX_HotFolder_]{/}Folder.cfg\n";
-}
-/// The lines of A if its icon is replaced and it has no Folder.cfg.
-inline Text CopiedToA(const Text& other = "")
-{
-    return FolderLines("A", 1, other + Copied(Disabled), NoCfg());
-}
+inline const Text NoCfg =
+    "HF cfg file unable to read/exist: {hot}{/}A{/}[_ORX_HotFolder_]{/}Folder.cfg\n";
 inline Text Untouched(const Text& reason)
 {
     return "HF cfg file left as it is (" + reason +
@@ -131,7 +126,7 @@ inline const Text NoPrevious = "Unable to read: Previous Version  Default Impose
 inline const Text NoPreviousTo = "unable to read: Previous Version  Default Impose Template Path\n";
 inline const Text Updated = "Updated preset.xml  : ";
 
-/// A hot folder with this Folder.cfg, before and after; without the second, it stays. The lines
+/// A done folder with this Folder.cfg, before and after; without the second, it stays. The lines
 /// about its template are as if its name were A.
 struct HotFolder
 {
@@ -144,14 +139,12 @@ struct HotFolder
 inline Scenario HotFolders(const Text& whatHappens, const std::map<Text, HotFolder>& folders)
 {
     Scenario scenario(whatHappens);
-    Text log;
-    int position = 0;
+    std::vector<FolderLog> log;
     for (const auto& [name, folder] : folders)
     {
-        const Text place = Replaced(CfgPlace, "A", name);
-        scenario.File(place, folder.cfg, folder.becomes);
-        log += FolderLines(name, ++position, NoIcon(folder.icon),
-                           Replaced(folder.impose, "{hot}{/}A", "{hot}{/}" + name));
+        scenario.Before(DoneFolder(name, folder.cfg, folder.icon));
+        scenario.File(Replaced(CfgPlace, "A", name), folder.cfg, folder.becomes);
+        log.push_back({name, folder.impose, folder.icon});
     }
     return scenario.Log(log);
 }
