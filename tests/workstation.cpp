@@ -83,9 +83,12 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser), m_root(
               {"elsewhere", m_root / "elsewhere"}};
     for (const char* folder : {"", "BundleIcons"})
         fs::copy(ProgramDir() / "BundleIcons", m_dirs["tool"] / folder);
-    std::error_code ignored; // the last one is not on Windows
     for (const Text name : {"", "Check", "Run", "Recorded"})
-        fs::copy(ProgramDir() / ("FolderUpgrade" + name + ProgramSuffix), m_dirs["tool"], ignored);
+    {
+        const fs::path program = "FolderUpgrade" + name + ProgramSuffix;
+        std::error_code ignored; // the last one is not on Windows
+        fs::copy_file(ProgramDir() / program, m_dirs["tool"] / program, ignored);
+    }
 }
 
 Workstation::~Workstation()
@@ -153,13 +156,10 @@ void Workstation::Put(const Text& place, const Text& text) const
     }
     else if (place.back() == '/')
         fs::create_directories(path);
-    else if (text == Fifo)
-    {
-        if (std::system(("mkfifo '" + path.string() + "'").c_str()) != 0)
-            throw std::runtime_error("no FIFO at " + place);
-    }
-    else
+    else if (text != Fifo)
         WriteFile(path, Expand(text));
+    else if (std::system(("mkfifo '" + path.string() + "'").c_str()) != 0)
+        throw std::runtime_error("no FIFO at " + place);
 }
 
 void Workstation::LayOut(const Files& files)

@@ -24,15 +24,9 @@
 
 #include <vector>
 
-#ifdef _WIN32
-inline constexpr bool IsWindows = true;
-inline constexpr const char* Separator = "\\";
-inline constexpr const char* ProgramSuffix = ".exe";
-#else
-inline constexpr bool IsWindows = false;
-inline constexpr const char* Separator = "/";
-inline constexpr const char* ProgramSuffix = "";
-#endif
+inline constexpr bool IsWindows = std::filesystem::path::preferred_separator == '\\';
+inline constexpr const char* Separator = IsWindows ? "\\" : "/";
+inline constexpr const char* ProgramSuffix = IsWindows ? ".exe" : "";
 
 struct RunResult
 {

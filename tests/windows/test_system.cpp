@@ -26,16 +26,18 @@ HANDLE Inherited(const fs::path& path)
                        CREATE_ALWAYS, 0, nullptr);
 }
 
-using BoxSearch = std::pair<DWORD, bool>; // the process, and whether it has a box
-
-BOOL CALLBACK CloseIfOf(HWND window, LPARAM data)
+// Closes the program's message boxes; whether there was one.
+bool CloseBoxes(DWORD process)
 {
-    auto& [process, isFound] = *reinterpret_cast<BoxSearch*>(data);
-    DWORD owner = 0;
-    GetWindowThreadProcessId(window, &owner);
-    if (owner == process && IsWindowVisible(window))
-        isFound = PostMessageW(window, WM_CLOSE, 0, 0) != 0 || isFound;
-    return TRUE;
+    bool isFound = false;
+    for (HWND box = nullptr; (box = FindWindowExW(nullptr, box, nullptr, nullptr)) != nullptr;)
+    {
+        DWORD owner = 0;
+        GetWindowThreadProcessId(box, &owner);
+        if (owner == process && IsWindowVisible(box))
+            isFound = PostMessageW(box, WM_CLOSE, 0, 0) != 0 || isFound;
+    }
+    return isFound;
 }
 
 void RunCommand(const Text& command)
@@ -155,7 +157,6 @@ RunResult Workstation::Start(const Text& program, const std::vector<Text>& argum
         throw std::runtime_error("cannot start " + line);
     CloseHandle(startUp.hStdOutput);
     CloseHandle(startUp.hStdError);
-    // FolderUpgradeRun has to do without a person.
     Text boxes;
     Text last;
     const DWORD limit = killAfter > 0 ? static_cast<DWORD>(killAfter) : TimeLimit;
@@ -164,11 +165,10 @@ RunResult Workstation::Start(const Text& program, const std::vector<Text>& argum
         step = std::min(step, limit - waited);
         if (WaitForSingleObject(process.hProcess, step) == WAIT_OBJECT_0)
             break;
-        BoxSearch search = {process.dwProcessId, false};
-        if (program != "FolderUpgradeRun")
-            EnumWindows(CloseIfOf, reinterpret_cast<LPARAM>(&search));
+        // FolderUpgradeRun has to do without a person.
+        const bool isClosed = program != "FolderUpgradeRun" && CloseBoxes(process.dwProcessId);
         const Text text = ReadFile(HostPath(LogPlace));
-        if (search.second && last != text) // a box may need a moment to close
+        if (isClosed && last != text) // a box may need a moment to close
             boxes += "A message box, with the run log\n" + (last = text);
     }
     TerminateProcess(process.hProcess, 1); // which fails if it has ended
