@@ -31,9 +31,6 @@ std::vector<wxString> Keys()
     return keys;
 }
 
-// A value of a key that a trial has made.
-const char* const Mark = "FolderUpgrade trial";
-
 bool IsUnmarked(const wxString& key)
 {
     return wxRegKey(key).Exists() && !wxRegKey(key).HasValue(Mark);
@@ -106,15 +103,6 @@ void RemoveKeys()
         if (IsUnmarked(key))
             throw std::runtime_error("not the trial's: " + key.utf8_string());
         wxRegKey(key).DeleteSelf();
-    }
-}
-
-void MarkKeys()
-{
-    for (const wxString& key : Keys())
-    {
-        if (wxRegKey(key).Exists())
-            wxRegKey(key).SetValue(Mark, wxString());
     }
 }
 

@@ -4,8 +4,6 @@
 #include "tests/windows/trial_machine.h"
 #include "tests/workstation.h"
 
-#include <wx/msw/registry.h>
-
 #include <algorithm>
 #include <regex>
 #include <share.h>
@@ -40,9 +38,10 @@ bool CloseBoxes(DWORD process)
     return isFound;
 }
 
+// Runs a command of the system, not a program of that name from the kit's folder.
 void RunCommand(const Text& command)
 {
-    _wsystem(fs::u8path(command + " >nul 2>nul").c_str());
+    _wsystem(fs::u8path("cd /d %SystemRoot%\\System32 & " + command + " >nul 2>nul").c_str());
 }
 
 Text Quoted(const fs::path& path)
@@ -108,35 +107,22 @@ fs::path DataDir(const Text& name, const fs::path& /*root*/)
 
 void SetRegistry(const std::vector<Text>& hives)
 {
-    const std::regex form(R"x(\[(.*)\]|"(\w+)"=(?:"(.*)"|dword:(.*)|hex:(.*)))x");
+    const std::regex key(R"(\[(\w+\\SOFTWARE\\(Wow6432Node\\)?\w+).*)", std::regex::icase);
     RemoveKeys();
-    wxRegKey key;
+    Text text;
     for (const Text& hive : hives)
     {
-        for (std::sregex_iterator line(hive.begin(), hive.end(), form), end; line != end; ++line)
-        {
-            const std::smatch& parts = *line;
-            const wxString name = wxString::FromUTF8(parts[2].str());
-            if (parts[1].matched)
-            {
-                key.SetName(wxString::FromUTF8(parts[1].str()));
-                key.Create();
-                MarkKeys(); // before anything can end the trial
-            }
-            else if (parts[3].matched)
-                key.SetValue(name, wxString::FromUTF8(parts[3].str()));
-            else if (parts[4].matched)
-                key.SetValue(name, std::stol(parts[4], nullptr, 16));
-            else
-            {
-                std::istringstream list(parts[5]);
-                wxMemoryBuffer bytes;
-                for (Text digits; std::getline(list, digits, ',');)
-                    bytes.AppendByte(static_cast<char>(std::stoul(digits, nullptr, 16)));
-                key.SetValue(name, bytes);
-            }
-        }
+        std::istringstream lines(hive);
+        for (Text line; std::getline(lines, line); text += "\n")
+            text += line[0] == '['
+                        ? std::regex_replace(line, key, "[$1]\r\n\"" + Mark + "\"=\"\"\r\n$&")
+                        : Replaced(line, "\\", "\\\\");
     }
+    const fs::path file = TrialDir() / "hives.reg";
+    const std::wstring units = L"\uFEFF" + fs::u8path(text).wstring();
+    WriteFile(file, Text(reinterpret_cast<const char*>(units.data()), 2 * units.size()));
+    if (!hives.empty())
+        RunCommand("reg import" + Quoted(file));
 }
 
 RunResult Workstation::Start(const Text& program, const std::vector<Text>& arguments,
