@@ -17,17 +17,13 @@ namespace
 const Text Link = "{link:";
 const Text Fifo = "{fifo}";
 const Text PrivateDir = "[_ORX_HotFolder_]";
-// What scenarios lay out. The application data folders also hold what is not theirs; on Windows,
-// hives are not files. Links lead elsewhere, so that comes last.
-const std::vector<Text> Tops = {"hot",
-                                "default",
-                                "previous",
-                                "user/ORX",
-                                "user/ORX_Installers",
-                                "machine/hotfolder",
-                                IsWindows ? "hot" : "machine/registry",
-                                IsWindows ? "hot" : "user/registry",
-                                "elsewhere"};
+// What scenarios lay out; on Windows, the application data folders also hold what is not theirs.
+// Links lead elsewhere, so that comes last.
+const auto TopsOnWindows = {
+    "hot",      "default", "previous", "machine/hotfolder", "user/ORX", "user/ORX_Installers",
+    "elsewhere"};
+const auto TopsOnLinux = {"hot", "default", "previous", "machine", "user", "elsewhere"};
+const auto& Tops = IsWindows ? TopsOnWindows : TopsOnLinux;
 
 // In the order in which Wine can set them.
 const auto Attributes = {std::pair('S', FILE_ATTRIBUTE_SYSTEM),
@@ -164,7 +160,7 @@ void Workstation::Put(const Text& place, const Text& text) const
 
 void Workstation::LayOut(const Files& files)
 {
-    for (const Text& top : Tops)
+    for (const Text top : Tops)
         RemoveTree(HostPath(top));
     std::vector<Text> hives;
     for (const auto& [place, text] : files)
@@ -190,7 +186,7 @@ void Workstation::LayOut(const Files& files)
 Files Workstation::Snapshot() const
 {
     Files files;
-    for (const Text& top : Tops)
+    for (const Text top : Tops)
     {
         if (fs::exists(HostPath(top)))
             Look(top, HostPath(top), files);
