@@ -22,10 +22,8 @@ ROOT = pathlib.Path(__file__).resolve().parents[1]
 PROGRAMS = ("FolderUpgrade.exe", "FolderUpgradeCheck.exe", "FolderUpgradeRun.exe")
 PRODUCT = r"C:\Program Files\Vantorix\QZA"
 PREVIOUS, DEFAULT, ELSEWHERE = r"C:\Previous", PRODUCT + r"\template", r"C:\Elsewhere"
-SIGN = """#!/bin/sh -e
-osslsigncode sign -key "{0}/key" -certs "{0}/cert" -h sha256 -in "$1" -out "$1.signed"
-mv "$1.signed" "$1"
-"""
+SIGN = ('sh;-c;osslsigncode sign -key "{0}/key" -certs "{0}/cert" -h sha256 -in "$0" -out "$0.new"'
+        ' && mv "$0.new" "$0"')
 
 
 def run(*command, **options):
@@ -56,15 +54,15 @@ class Workstation(lay_out.WineWorkstation):
         return self.wine(*command) if status == 1 and command[0] == "msiexec" else status
 
     def files(self, template_dir, icon):
+        path = rf'<K n="ORXImposeTemplate">"{template_dir}\Sub\Booklet"</K>'
+        files = {"Hot Folders/A/[_ORX_HotFolder_]/hf_folder.ico": icon,
+                 "user/ORX/JPData/P/Presets/presets.xml": path.encode() + b"\r\n"}
         cfg = (ROOT / "tests/data/written.cfg").read_text(encoding="utf-8")
         cfg = cfg.replace("{{filter}}", "  <FilterSetting/>\n")
-        path = rf'<K n="ORXImposeTemplate">"{template_dir}\Sub\Booklet"</K>'
-        return {"Hot Folders/A/[_ORX_HotFolder_]/Folder.cfg":
-                    cfg.replace("{{path}}", template_dir + r"\Booklet").encode(),
-                "Hot Folders/A/[_ORX_HotFolder_]/hf_folder.ico": icon,
-                "Hot Folders/B/[_ORX_HotFolder_]/Folder.cfg":
-                    cfg.replace("{{path}}", ELSEWHERE + r"\Booklet").encode(),
-                "user/ORX/JPData/P/Presets/presets.xml": path.encode() + b"\r\n"}
+        for name, folder in (("A", template_dir), ("B", ELSEWHERE)):
+            text = cfg.replace("{{path}}", rf"{folder}\Booklet").encode()
+            files[f"Hot Folders/{name}/[_ORX_HotFolder_]/Folder.cfg"] = text
+        return files
 
     def lay_out(self, template_dir, previous):
         """Restores the state before a step, without logs; previous: in the registry, or None."""
@@ -112,27 +110,23 @@ class Installers(unittest.TestCase):
         run("openssl", "req", "-x509", "-newkey", "rsa:2048", "-nodes", "-days", "2", "-subj",
             "/CN=Trial", "-addext", "extendedKeyUsage=codeSigning", "-keyout", self.scratch / "key",
             "-out", self.scratch / "cert")
-        sign, signed = self.scratch / "sign", self.scratch / "signed"
-        sign.write_text(SIGN.format(self.scratch))
-        sign.chmod(0o755)
-        pack(signed, sign)
+        signed = self.scratch / "signed"
+        pack(signed, SIGN.format(self.scratch))
         self.assertEqual(pack(self.scratch / "again"), self.unsigned)
         for folder, status in ((signed, 0), (self.package, 1)):
             for program in PROGRAMS:
-                verify = ["osslsigncode", "verify", "-CAfile", self.scratch / "cert", "-in"]
-                found = subprocess.run([*verify, folder / program], check=False,
-                                       capture_output=True).returncode
-                self.assertEqual(min(found, 1), status, (folder, program))
+                found = subprocess.run(["osslsigncode", "verify", "-CAfile", self.scratch / "cert",
+                                        "-in", folder / program], check=False, capture_output=True)
+                self.assertEqual(min(found.returncode, 1), status, (folder, program))
         notices = (signed / "THIRD-PARTY-NOTICES.txt").read_text(encoding="utf-8")
-        for phrase in ("wxWindows Library Licence", "Thai Open Source Software Center",
-                       "winpthreads", "GCC RUNTIME LIBRARY EXCEPTION",
-                       "GNU GENERAL PUBLIC LICENSE"):
-            self.assertIn(phrase, notices)
+        for name in ("wxWindows Library Licence", "Thai Open Source Software Center", "winpthreads",
+                     "GCC RUNTIME LIBRARY EXCEPTION", "GNU GENERAL PUBLIC LICENSE"):
+            self.assertIn(name, notices)
 
     def test_msi(self):
         self.try_installer(build_msi)
         table = run("msiinfo", "export", self.scratch / "1.2.0.msi", "CustomAction", text=True)
-        kinds = re.findall(r"^\w+grade\w*\t(\d+)\t", table, re.MULTILINE)
+        kinds = re.findall(r"\n\w+grade\w*\t(\d+)\t", table)
         # All run as the user, their status ignored.
         self.assertEqual([int(kind) & 0x840 for kind in kinds], [0x40] * 2)
 
@@ -142,25 +136,24 @@ class Installers(unittest.TestCase):
     def try_installer(self, build):
         station = Workstation(self.scratch / "prefix")
         self.addCleanup(station.close)
-        (install_old, _), (install_new, remove) = (build(self.package, version)
-                                                   for version in ("1.1.0", "1.2.0"))
+        install_old, _ = build(self.package, "1.1.0")
+        install_new, remove = build(self.package, "1.2.0")
         shipped = {name: text for name, text in files_below(self.package).items()
                    if name.endswith((".exe", ".ico", "NOTICES.txt"))}
         icon = shipped["hf_folder.ico"]
 
-        def check_step(command, version, files, mode="", status=0):
-            """mode and status: those of the run."""
+        def check_step(command, files, mode="", status=0):
+            """mode and status: those of the run, if there is one."""
+            is_installed = mode != "downgrade"
             self.assertEqual(station.install(*command), 0)
             product = station.root / "Program Files/Vantorix/QZA"
-            for _ in range(300):
-                if version or not (product / "uninstall.exe").exists():
-                    break
+            while not is_installed and (product / "uninstall.exe").exists():
                 time.sleep(0.1)  # the uninstaller continues as a copy
             installed = {name: text for name, text in files_below(product).items()
                          if name in shipped or not name.startswith(("template", "uninstall.exe"))}
-            self.assertEqual(installed, shipped if version else {})
+            self.assertEqual(installed, shipped if is_installed else {})
             key = station.wine("reg", "query", r"HKLM\SOFTWARE\Vantorix\QZA", "/reg:64")
-            self.assertEqual(key == 0, version is not None)
+            self.assertEqual(key == 0, is_installed)
             self.assertEqual(station.look(), files)
             logs = files_below(station.user / "ORX_Installers")
             names = [f"FolderUpgrade-{mode}{end}" for end in (".log", "-before.txt", "-after.txt")]
@@ -172,16 +165,15 @@ class Installers(unittest.TestCase):
         station.lay_out(PREVIOUS, None)
         malformed = "Hot Folders/B/[_ORX_HotFolder_]/Folder.cfg"
         station.put(malformed, b"")  # causes a message box
-        check_step(install_old, "1.1.0", {**station.files(PREVIOUS, icon), malformed: b""},
-                   "upgrade", 2)
+        check_step(install_old, {**station.files(PREVIOUS, icon), malformed: b""}, "upgrade", 2)
         station.lay_out(PREVIOUS, PREVIOUS)
         for template in ("Booklet", "Sub/Booklet"):  # the samples install no templates
             station.put(f"Program Files/Vantorix/QZA/template/{template}", b"")
-        check_step(install_new, "1.2.0", station.files(DEFAULT, icon), "upgrade")
+        check_step(install_new, station.files(DEFAULT, icon), "upgrade")
         station.lay_out(PREVIOUS, PREVIOUS)  # the same version again
-        check_step(install_new, "1.2.0", station.files(PREVIOUS, b"an older picture"))
+        check_step(install_new, station.files(PREVIOUS, b"an older picture"))
         station.lay_out(DEFAULT, PREVIOUS)
-        check_step(remove, None, station.files(PREVIOUS, icon), "downgrade")
+        check_step(remove, station.files(PREVIOUS, icon), "downgrade")
 
 
 if __name__ == "__main__":

@@ -9,11 +9,9 @@ namespace
 
 HRESULT GetVersion(DLLVERSIONINFO* version)
 {
-    if (version->cbSize != 20 || version->dwMajorVersion != 0)
-        return -1;
-    const char* const text = std::getenv("SHELL_VERSION");
-    return std::sscanf(text, "%u.%u", &version->dwMajorVersion, &version->dwMinorVersion) == 2 ? 0
-                                                                                               : -1;
+    auto& [size, major, minor, build, platform] = *version;
+    const char* const given = size == 20 && major == 0 ? std::getenv("SHELL_VERSION") : "";
+    return std::sscanf(given, "%u.%u", &major, &minor) == 2 ? 0 : -1;
 }
 
 } // namespace

@@ -8,7 +8,6 @@
 
 #include <algorithm>
 #include <cstdlib>
-#include <functional>
 
 namespace fs = std::filesystem;
 
@@ -18,22 +17,13 @@ namespace
 const Text Link = "{link:";
 const Text Fifo = "{fifo}";
 const Text PrivateDir = "[_ORX_HotFolder_]";
-// The application data folders also hold what is not the scenarios'. Links lead elsewhere, so that
-// comes last.
-std::vector<Text> Tops()
-{
-    std::vector<Text> tops = {"hot",
-                              "default",
-                              "previous",
-                              "machine/hotfolder",
-                              "tool",
-                              "user/ORX",
-                              "user/ORX_Installers",
-                              "elsewhere"};
-    if (!IsWindows) // where hives are files
-        tops.insert(tops.end(), {"machine/registry", "user/registry"});
-    return tops;
-}
+// What scenarios lay out; on Windows, the application data folders also hold what is not theirs.
+// Links lead elsewhere, so that comes last.
+const auto TopsOnWindows = {
+    "hot",      "default", "previous", "machine/hotfolder", "user/ORX", "user/ORX_Installers",
+    "elsewhere"};
+const auto TopsOnLinux = {"hot", "default", "previous", "machine", "user", "elsewhere"};
+const auto& Tops = IsWindows ? TopsOnWindows : TopsOnLinux;
 
 // In the order in which Wine can set them.
 const auto Attributes = {std::pair('S', FILE_ATTRIBUTE_SYSTEM),
@@ -46,13 +36,42 @@ wxString WideName(const fs::path& path)
     return wxString::FromUTF8(path.u8string());
 }
 
+// Adds the file or directory, and everything in it, except for the programs.
+void Look(const Text& place, const fs::path& path, Files& files)
+{
+    const bool isDirectory = fs::is_directory(path);
+    Text& text = files[place + (isDirectory ? "/" : "")];
+    if (IsLink(WideName(path)))
+    {
+        text = Link;
+        return;
+    }
+    DWORD attributes = GetFileAttributesW(WideName(path).wc_str());
+    if (IsWine() && isDirectory) // where it says whether it can be written to
+        attributes &= ~FILE_ATTRIBUTE_READONLY;
+    Text letters;
+    for (const auto& [letter, attribute] : Attributes)
+        letters.insert(0, (attributes & attribute) != 0, letter);
+    if (!letters.empty())
+        files[place + "#"] = letters;
+    if (!isDirectory)
+        text = fs::is_fifo(path) ? Fifo : ReadFile(path);
+    std::error_code ignored; // of a directory that cannot be listed, or a file
+    for (const auto& entry : fs::directory_iterator(path, ignored))
+    {
+        const Text name = entry.path().filename().u8string();
+        if (place != "tool" || !StartsWith(name, "FolderUpgrade"))
+            Look(place + "/" + (name == PrivateDir ? "[P]" : name), entry.path(), files);
+    }
+}
+
 } // namespace
 
 Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser), m_root(NewRoot())
 {
     m_dirs = {{"hot", m_root / "Hot Folders"},
-              {"user", UserDataDir(m_root)},
-              {"machine", MachineDataDir(m_root)},
+              {"user", DataDir("user", m_root)},
+              {"machine", DataDir("machine", m_root)},
               {"tool", m_root / fs::u8path("Tool Größe")},
               {"app", m_root / fs::u8path("Apps ä")},
               {"default", m_root / fs::u8path("Apps ä") / "template"},
@@ -60,12 +79,11 @@ Workstation::Workstation(bool asOtherUser) : m_asOtherUser(asOtherUser), m_root(
               {"elsewhere", m_root / "elsewhere"}};
     for (const char* folder : {"", "BundleIcons"})
         fs::copy(ProgramDir() / "BundleIcons", m_dirs["tool"] / folder);
-    for (const Text name :
-         {"FolderUpgrade", "FolderUpgradeCheck", "FolderUpgradeRun", "FolderUpgradeRecorded"})
+    for (const Text name : {"", "Check", "Run", "Recorded"})
     {
-        const fs::path program = name + ProgramSuffix;
-        if (fs::exists(ProgramDir() / program))
-            fs::copy_file(ProgramDir() / program, m_dirs["tool"] / program);
+        const fs::path program = "FolderUpgrade" + name + ProgramSuffix;
+        std::error_code ignored; // the last one is not on Windows
+        fs::copy_file(ProgramDir() / program, m_dirs["tool"] / program, ignored);
     }
 }
 
@@ -73,8 +91,7 @@ Workstation::~Workstation()
 {
     try
     {
-        for (const Text& top : Tops())
-            RemoveTree(HostPath(top));
+        LayOut({});
         RemoveTree(m_root);
     }
     catch (const std::exception& error)
@@ -135,22 +152,16 @@ void Workstation::Put(const Text& place, const Text& text) const
     }
     else if (place.back() == '/')
         fs::create_directories(path);
-    else if (text == Fifo)
-    {
-        if (std::system(("mkfifo '" + path.string() + "'").c_str()) != 0)
-            throw std::runtime_error("no FIFO at " + place);
-    }
-    else
+    else if (text != Fifo)
         WriteFile(path, Expand(text));
+    else if (std::system(("mkfifo '" + path.string() + "'").c_str()) != 0)
+        throw std::runtime_error("no FIFO at " + place);
 }
 
 void Workstation::LayOut(const Files& files)
 {
-    for (const Text& top : Tops())
-    {
-        if (top != "tool")
-            RemoveTree(HostPath(top));
-    }
+    for (const Text top : Tops)
+        RemoveTree(HostPath(top));
     std::vector<Text> hives;
     for (const auto& [place, text] : files)
     {
@@ -160,9 +171,10 @@ void Workstation::LayOut(const Files& files)
         if (place.back() != '#' && !(IsWindows && isHive))
             Put(place, text);
     }
-    if (m_asOtherUser)
+    if constexpr (IsWindows)
+        SetRegistry(hives);
+    else if (m_asOtherUser)
         GiveAway(m_root);
-    SetRegistry(hives);
     // In this order, files come before their directory, which may not be accessible afterwards.
     for (auto file = files.rbegin(); file != files.rend(); ++file)
     {
@@ -174,38 +186,11 @@ void Workstation::LayOut(const Files& files)
 Files Workstation::Snapshot() const
 {
     Files files;
-    const std::function<void(const Text&, const fs::path&)> add =
-        [&](const Text& place, const fs::path& path)
-    {
-        const bool isDirectory = fs::is_directory(path);
-        Text& text = files[place + (isDirectory ? "/" : "")];
-        if (IsLink(WideName(path)))
-        {
-            text = Link;
-            return;
-        }
-        DWORD attributes = GetFileAttributesW(WideName(path).wc_str());
-        if (IsWine() && isDirectory) // where it says whether it can be written to
-            attributes &= ~FILE_ATTRIBUTE_READONLY;
-        for (const auto& [letter, attribute] : Attributes)
-        {
-            if ((attributes & attribute) != 0)
-                files[place + "#"].insert(0, 1, letter);
-        }
-        if (!isDirectory)
-            text = fs::is_fifo(path) ? Fifo : ReadFile(path);
-        std::error_code ignored; // of a directory that cannot be listed, or a file
-        for (const auto& entry : fs::directory_iterator(path, ignored))
-        {
-            const Text name = entry.path().filename().u8string();
-            if (place != "tool" || !StartsWith(name, "FolderUpgrade"))
-                add(place + "/" + (name == PrivateDir ? "[P]" : name), entry.path());
-        }
-    };
-    for (const Text& top : Tops())
+    for (const Text top : Tops)
     {
         if (fs::exists(HostPath(top)))
-            add(top, HostPath(top));
+            Look(top, HostPath(top), files);
     }
+    Look("tool", HostPath("tool"), files);
     return files;
 }

@@ -24,15 +24,9 @@
 
 #include <vector>
 
-#ifdef _WIN32
-inline constexpr bool IsWindows = true;
-inline constexpr const char* Separator = "\\";
-inline constexpr const char* ProgramSuffix = ".exe";
-#else
-inline constexpr bool IsWindows = false;
-inline constexpr const char* Separator = "/";
-inline constexpr const char* ProgramSuffix = "";
-#endif
+inline constexpr bool IsWindows = std::filesystem::path::preferred_separator == '\\';
+inline constexpr const char* Separator = IsWindows ? "\\" : "/";
+inline constexpr const char* ProgramSuffix = IsWindows ? ".exe" : "";
 
 struct RunResult
 {
@@ -87,19 +81,18 @@ bool IsWine();
 std::filesystem::path ProgramDir();
 /// A new folder for everything on a workstation but the application data.
 std::filesystem::path NewRoot();
-/// The application data folders. Windows: the account's and the machine's own.
-std::filesystem::path UserDataDir(const std::filesystem::path& root);
-std::filesystem::path MachineDataDir(const std::filesystem::path& root);
+/// The application data folder "user" or "machine". Windows: the account's or the machine's own.
+std::filesystem::path DataDir(const Text& name, const std::filesystem::path& root);
 
-/// Windows: replaces all keys that the scenarios use with those of the hives, which are in the
-/// registry editor's text form, but without escapes. Elsewhere the hives are files.
+/// Windows only: replaces all keys that the scenarios use with those of the hives, which are in the
+/// registry editor's text form, but without escapes.
 void SetRegistry(const std::vector<Text>& hives);
 
 /// A link to a directory if there is one at the target.
 void MakeLink(const std::filesystem::path& target, const std::filesystem::path& link);
 /// Removes links, not their targets.
 void RemoveTree(const std::filesystem::path& path);
-/// Makes everything in the folder another user's. Not on Windows.
+/// Not on Windows: makes everything in the folder another user's.
 void GiveAway(const std::filesystem::path& folder);
 /// X: it cannot be written to; 0: it cannot be accessed, a file on Windows because a program has it
 /// open alone; L: a directory cannot be listed. Under Wine, X and L are what the owner's

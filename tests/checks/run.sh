@@ -27,6 +27,16 @@ case $check in
         ;;
     shellcheck) shellcheck "${scripts[@]}" ;;
     pyflakes) find_files -name '*.py' | tr '\n' '\0' | xargs -0 pyflakes3 ;;
-    directions) tests/checks/directions.py ;;
+    directions) # the table first, then each include in quotes, or of one of our folders
+        awk -F '[<">]' '
+            FNR == NR { count = split($0, row, /[: ]+/); ours[row[1]]; while (count) allowed[row[1], row[count--]]; next }
+            /^[ \t]*#[ \t]*include/ {
+                folder = FILENAME; gsub(/^\.\/|\/[^\/]*$/, "", folder)
+                other = $2; if (!sub(/\/[^\/]*$/, "", other)) other = ""
+                if ((/include[ \t]*"/ || other in ours) && !((folder, other) in allowed) && !((folder, "*") in allowed)) {
+                    print FILENAME ":" FNR ": " folder " must not include " $2; wrong = 1 }
+            }
+            END { exit wrong }' tests/checks/directions.txt "${sources[@]}"
+        ;;
     *) echo "No such check: $check" >&2; exit 2 ;;
 esac

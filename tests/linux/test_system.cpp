@@ -35,18 +35,9 @@ fs::path NewRoot()
     return pattern;
 }
 
-fs::path UserDataDir(const fs::path& root)
+fs::path DataDir(const Text& name, const fs::path& root)
 {
-    return root / "user data";
-}
-
-fs::path MachineDataDir(const fs::path& root)
-{
-    return root / "machine data";
-}
-
-void SetRegistry(const std::vector<Text>& /*hives*/)
-{
+    return root / (name + " data");
 }
 
 RunResult Workstation::Start(const Text& program, const std::vector<Text>& arguments,

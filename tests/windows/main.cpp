@@ -31,24 +31,21 @@ std::vector<wxString> Keys()
     return keys;
 }
 
-// A value of a key that a trial has made.
-const char* const Mark = "FolderUpgrade trial";
-
 bool IsUnmarked(const wxString& key)
 {
     return wxRegKey(key).Exists() && !wxRegKey(key).HasValue(Mark);
 }
 
+// The last has the mark of this account's trial, while that is running or after it was interrupted.
 std::vector<fs::path> Folders()
 {
-    return {MachineDataDir({}) / "hotfolder", UserDataDir({}) / "ORX",
-            UserDataDir({}) / "ORX_Installers"};
+    return {DataDir("machine", {}) / "hotfolder", DataDir("user", {}) / "ORX",
+            DataDir("user", {}) / "ORX_Installers", TrialDir() / "work station", TrialDir()};
 }
 
-// Whether this account's trial is running, or was interrupted.
-bool IsMarked()
+fs::path MarkFile()
 {
-    return ReadFile(TrialDir() / "account") == AccountName().utf8_string();
+    return TrialDir() / "account";
 }
 
 // Why the scenarios do not run; empty if they do.
@@ -63,10 +60,9 @@ Text WhyNot(int argc, char** argv)
     Text reasons;
     for (const wxString& key : Keys())
         reasons += IsUnmarked(key) ? there + key.utf8_string() + "\n" : "";
-    std::vector<fs::path> folders = Folders();
-    folders.push_back(TrialDir());
-    for (const fs::path& folder : folders)
-        reasons += fs::exists(folder) && !IsMarked() ? there + folder.u8string() + "\n" : "";
+    const bool isMarked = ReadFile(MarkFile()) == AccountName().utf8_string();
+    for (const fs::path& folder : Folders())
+        reasons += fs::exists(folder) && !isMarked ? there + folder.u8string() + "\n" : "";
     return reasons;
 }
 
@@ -74,21 +70,10 @@ void RemoveTrial()
 {
     RemoveKeys();
     for (const fs::path& folder : Folders())
-        RemoveTree(folder);
-    RemoveTree(NewRoot());
-    RemoveTree(TrialDir()); // last, because it has the mark
-}
-
-int RunTrial()
-{
-    for (const fs::path& folder : Folders())
+    {
         AllowAll(folder);
-    AllowAll(TrialDir());
-    RemoveTrial();
-    WriteFile(TrialDir() / "account", AccountName().utf8_string());
-    const int status = RUN_ALL_TESTS();
-    RemoveTrial();
-    return status;
+        RemoveTree(folder);
+    }
 }
 
 // Whatever ends this process also ends the programs that it has started, and they do not keep its
@@ -108,7 +93,7 @@ void HoldPrograms()
 
 fs::path TrialDir()
 {
-    return MachineDataDir({}) / "FolderUpgrade trial";
+    return DataDir("machine", {}) / "FolderUpgrade trial";
 }
 
 void RemoveKeys()
@@ -118,15 +103,6 @@ void RemoveKeys()
         if (IsUnmarked(key))
             throw std::runtime_error("not the trial's: " + key.utf8_string());
         wxRegKey(key).DeleteSelf();
-    }
-}
-
-void MarkKeys()
-{
-    for (const wxString& key : Keys())
-    {
-        if (wxRegKey(key).Exists())
-            wxRegKey(key).SetValue(Mark, wxString());
     }
 }
 
@@ -145,19 +121,21 @@ int main(int argc, char** argv)
         std::printf("%sNothing was changed.\n", whyNot.c_str());
         return NotHere;
     }
-    int status = BrokenOff;
     try
     {
         HoldPrograms();
-        status = RunTrial();
+        RemoveTrial();
+        WriteFile(MarkFile(), AccountName().utf8_string());
+        const int status = RUN_ALL_TESTS();
+        RemoveTrial();
+        const testing::UnitTest& all = *testing::UnitTest::GetInstance();
+        std::printf("%d passed, %d failed, %d skipped\n", all.successful_test_count(),
+                    all.failed_test_count(), all.skipped_test_count());
+        return status;
     }
     catch (const std::exception& error)
     {
         std::printf("%s\nThe trial was broken off. Start it once more.\n", error.what());
-        return status;
+        return BrokenOff;
     }
-    const testing::UnitTest& all = *testing::UnitTest::GetInstance();
-    std::printf("%d passed, %d failed, %d skipped\n", all.successful_test_count(),
-                all.failed_test_count(), all.skipped_test_count());
-    return status;
 }

@@ -4,8 +4,6 @@
 #include "tests/windows/trial_machine.h"
 #include "tests/workstation.h"
 
-#include <wx/msw/registry.h>
-
 #include <algorithm>
 #include <regex>
 #include <share.h>
@@ -26,27 +24,24 @@ HANDLE Inherited(const fs::path& path)
                        CREATE_ALWAYS, 0, nullptr);
 }
 
-using BoxSearch = std::pair<DWORD, bool>; // the process, and whether it has a box
-
-BOOL CALLBACK CloseIfOf(HWND window, LPARAM data)
+// Closes the program's message boxes; whether there was one.
+bool CloseBoxes(DWORD process)
 {
-    auto& [process, isFound] = *reinterpret_cast<BoxSearch*>(data);
-    DWORD owner = 0;
-    GetWindowThreadProcessId(window, &owner);
-    if (owner == process && IsWindowVisible(window))
-        isFound = PostMessageW(window, WM_CLOSE, 0, 0) != 0 || isFound;
-    return TRUE;
+    bool isFound = false;
+    for (HWND box = nullptr; (box = FindWindowExW(nullptr, box, nullptr, nullptr)) != nullptr;)
+    {
+        DWORD owner = 0;
+        GetWindowThreadProcessId(box, &owner);
+        if (owner == process && IsWindowVisible(box))
+            isFound = PostMessageW(box, WM_CLOSE, 0, 0) != 0 || isFound;
+    }
+    return isFound;
 }
 
-// Runs a program from the system's folder. What it prints goes nowhere, which may change its
-// status.
-void RunSystem(const Text& program, const Text& arguments)
+// Runs a command of the system, not a program of that name from the kit's folder.
+void RunCommand(const Text& command)
 {
-    const auto run = RunProgram(
-        _wgetenv(L"SystemRoot") + wxString("\\System32\\") + wxString::FromUTF8(program),
-        wxString::FromUTF8(arguments), std::chrono::steady_clock::now() + std::chrono::seconds(60));
-    if (run.whyNotStarted)
-        throw std::runtime_error(program + " " + arguments);
+    _wsystem(fs::u8path("cd /d %SystemRoot%\\System32 & " + command + " >nul 2>nul").c_str());
 }
 
 Text Quoted(const fs::path& path)
@@ -105,63 +100,38 @@ fs::path NewRoot()
     return root;
 }
 
-fs::path UserDataDir(const fs::path& /*root*/)
+fs::path DataDir(const Text& name, const fs::path& /*root*/)
 {
-    return _wgetenv(L"APPDATA");
-}
-
-fs::path MachineDataDir(const fs::path& /*root*/)
-{
-    return _wgetenv(L"ProgramData");
+    return _wgetenv(name == "user" ? L"APPDATA" : L"ProgramData");
 }
 
 void SetRegistry(const std::vector<Text>& hives)
 {
-    const std::regex form(R"x(\[(.*)\]|"(\w+)"=(?:"(.*)"|dword:(.*)|hex:(.*)))x");
+    const std::regex key(R"(\[(\w+\\SOFTWARE\\(Wow6432Node\\)?\w+).*)", std::regex::icase);
     RemoveKeys();
+    Text text;
     for (const Text& hive : hives)
     {
-        wxRegKey key;
         std::istringstream lines(hive);
-        for (Text line; std::getline(lines, line);)
-        {
-            std::smatch parts;
-            line.erase(line.find_last_not_of('\r') + 1);
-            if (!std::regex_match(line, parts, form))
-                continue;
-            const auto part = [&](size_t number)
-            {
-                return wxString::FromUTF8(parts[number].str());
-            };
-            if (parts[1].matched)
-            {
-                key.SetName(part(1));
-                key.Create();
-                MarkKeys(); // before anything can end the trial
-            }
-            else if (parts[3].matched)
-                key.SetValue(part(2), part(3));
-            else if (parts[4].matched)
-                key.SetValue(part(2), std::stol(parts[4], nullptr, 16));
-            else
-            {
-                std::istringstream list(parts[5]);
-                wxMemoryBuffer bytes;
-                for (Text digits; std::getline(list, digits, ',');)
-                    bytes.AppendByte(static_cast<char>(std::stoul(digits, nullptr, 16)));
-                key.SetValue(part(2), bytes);
-            }
-        }
+        for (Text line; std::getline(lines, line); text += "\n")
+            text += line[0] == '['
+                        ? std::regex_replace(line, key, "[$1]\r\n\"" + Mark + "\"=\"\"\r\n$&")
+                        : Replaced(line, "\\", "\\\\");
     }
+    const fs::path file = TrialDir() / "hives.reg";
+    const std::wstring units = L"\uFEFF" + fs::u8path(text).wstring();
+    WriteFile(file, Text(reinterpret_cast<const char*>(units.data()), 2 * units.size()));
+    if (!hives.empty())
+        RunCommand("reg import" + Quoted(file));
 }
 
 RunResult Workstation::Start(const Text& program, const std::vector<Text>& arguments,
                              const Files& /*variables*/, int killAfter) const
 {
+    // No argument has a quotation mark or ends in a backslash.
     Text line = Quoted(HostPath("tool/" + program + ".exe")).substr(1);
     for (const Text& argument : arguments)
-        line += Quoted(
-            fs::u8path(Expand(argument))); // none has a quotation mark or ends in a backslash
+        line += Quoted(fs::u8path(Expand(argument)));
     STARTUPINFOW startUp = {};
     startUp.cb = sizeof startUp;
     startUp.dwFlags = STARTF_USESTDHANDLES;
@@ -173,8 +143,6 @@ RunResult Workstation::Start(const Text& program, const std::vector<Text>& argum
         throw std::runtime_error("cannot start " + line);
     CloseHandle(startUp.hStdOutput);
     CloseHandle(startUp.hStdError);
-    // FolderUpgradeRun has to do without a person.
-    const bool isClosing = program != "FolderUpgradeRun";
     Text boxes;
     Text last;
     const DWORD limit = killAfter > 0 ? static_cast<DWORD>(killAfter) : TimeLimit;
@@ -183,15 +151,13 @@ RunResult Workstation::Start(const Text& program, const std::vector<Text>& argum
         step = std::min(step, limit - waited);
         if (WaitForSingleObject(process.hProcess, step) == WAIT_OBJECT_0)
             break;
-        BoxSearch search = {process.dwProcessId, false};
-        if (isClosing)
-            EnumWindows(CloseIfOf, reinterpret_cast<LPARAM>(&search));
+        // FolderUpgradeRun has to do without a person.
+        const bool isClosed = program != "FolderUpgradeRun" && CloseBoxes(process.dwProcessId);
         const Text text = ReadFile(HostPath(LogPlace));
-        if (search.second && last != text) // a box may need a moment to close
+        if (isClosed && last != text) // a box may need a moment to close
             boxes += "A message box, with the run log\n" + (last = text);
     }
-    if (WaitForSingleObject(process.hProcess, 0) == WAIT_TIMEOUT)
-        TerminateProcess(process.hProcess, 1);
+    TerminateProcess(process.hProcess, 1); // which fails if it has ended
     WaitForSingleObject(process.hProcess, TimeLimit);
     DWORD status = 0;
     GetExitCodeProcess(process.hProcess, &status);
@@ -206,8 +172,8 @@ void MakeLink(const fs::path& target, const fs::path& link)
     if (IsWine())
         RunUnix("ln -s" + UnixPath(target) + UnixPath(link));
     else
-        RunSystem("cmd.exe", (fs::is_directory(target) ? "/c mklink /J" : "/c mklink") +
-                                 Quoted(link) + Quoted(target));
+        RunCommand((fs::is_directory(target) ? "mklink /J" : "mklink") + Quoted(link) +
+                   Quoted(target));
 }
 
 void AllowAll(const fs::path& folder)
@@ -215,7 +181,7 @@ void AllowAll(const fs::path& folder)
     if (!fs::exists(folder))
         return;
     IsWine() ? RunUnix("chmod -R u+rwX" + UnixPath(folder))
-             : RunSystem("icacls.exe", Quoted(folder) + " /reset /T /C /Q");
+             : RunCommand("icacls" + Quoted(folder) + " /reset /T /C /Q");
 }
 
 void RemoveTree(const fs::path& path)
@@ -244,10 +210,6 @@ void RemoveTree(const fs::path& path)
     }
 }
 
-void GiveAway(const fs::path& /*folder*/)
-{
-}
-
 void Refuse(const fs::path& path, char letter)
 {
     static const Files rights = {{"X", "(WD,AD,WEA,WA,DC,DE)"},
@@ -261,6 +223,6 @@ void Refuse(const fs::path& path, char letter)
     if (IsWine()) // where an access control list refuses nobody
         RunUnix((letter == 'X' ? "chmod a-w" : "chmod 0") + UnixPath(path));
     else
-        RunSystem("icacls.exe", Quoted(path) + " /deny *S-1-1-0:" + rights.at(Text(1, letter)));
+        RunCommand("icacls" + Quoted(path) + " /deny *S-1-1-0:" + rights.at(Text(1, letter)));
     refusedPaths.push_back(path);
 }
