@@ -11,7 +11,6 @@ const Text CannotOpenPreset = "Unable to open preset.xml for read : ";
 SCENARIOS(PlantedLinks)
 {
     const Text cfg = Written(MovedFrom);
-    const Text moved = Written(MovedTo);
     const Text from = Stored(MovedFrom);
     const Text stays = "left as it is (reached over a link)";
     std::vector<Scenario> scenarios = {
@@ -27,19 +26,19 @@ Job presets: problem  .P{xml}: reached over a link, or not a file)"),
         Scenario("ALinkedLogFolderGetsNoLog",
                  {{LogPlace, Removed}, {LogFolder + "/", "{link:elsewhere/L}"}})
             .Before({{"elsewhere/L/UpgradeDowngrade.log", "-"}})
-            .File(CfgPlace, cfg, moved),
+            .File(PresetPlace, from, Stored(MovedTo)),
         Scenario("AHotFolderAndAJobPresetDirectoryMayBeLinks",
                  {{"hot/A/", "{link:elsewhere/A}"}, {"elsewhere/A/[P]/Folder.cfg", cfg}})
             .Before({{JobPresets + "/", Removed}, {"user/ORX/", "{link:elsewhere/ORX}"}})
             .Before({{"elsewhere/ORX/JPData/", "{link:elsewhere/JPData}"}})
             .Before({{"elsewhere/JPData/.P/", "{link:elsewhere/P}"}})
             .File("elsewhere/P/Presets/presets.xml", from, Stored(MovedTo))
-            .After({{"elsewhere/A/[P]/Folder.cfg", moved}})
+            .After({{"elsewhere/A/[P]/Folder.cfg", Written(MovedTo)}})
             .Log({{"A", Found(MovedFrom)}}, PresetLine(Updated)),
         Scenario("ALinkedErrorFileCountsByItsName",
                  {{"elsewhere/other", ""}, {"hot/A/[P]/Error.er", "{link:elsewhere/missing}"}})
-            .File(CfgPlace, cfg, moved)
-            .Log({{"A", Found(MovedFrom), "hf_error_active"}})
+            .File(CfgPlace, Written(MovedTo))
+            .Log({{"A", Found(MovedTo), "hf_error_active"}})
             .NotUnderWine(NoLinks),
     };
     // In that place: a link to a file with this text, a dangling link, and a pipe.
@@ -78,12 +77,14 @@ Job presets: problem  .P{xml}: reached over a link, or not a file)"),
     const Text skipped = "Job presets: problem  .P{xml}: reached over a link, or not a file";
     add(Scenario("APreset").Log({}, PresetLine(CannotOpenPreset)), PresetPlace, from, skipped,
         skipped);
-    add(Scenario("TheLog", DoneFolder("A", cfg)).After({{CfgPlace, moved}}), LogPlace, "-", R"(
+    add(Scenario("TheLog").File(PresetPlace, from, Stored(MovedTo)), LogPlace, "-", R"(
 Workstation: problem  there will be no run log: it is reached over a link: {log}
-A: {moves})",
+Workstation: note     HotFolderList.cfg lists no hot folder
+Job presets: {presetmoves})",
         R"(
+Workstation: note     HotFolderList.cfg lists no hot folder
 Workstation: note     there will be no run log: something else has its name: {log}
-A: {moves})");
+Job presets: {presetmoves})");
     scenarios.push_back(Scenario("TheListIsAPipe", {{ListPlace, "{fifo}"}, {"hot/A/", ""}})
                             .Log()
                             .NotOnWindows(NoPipes));

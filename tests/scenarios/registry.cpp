@@ -122,8 +122,8 @@ Job presets: change   .P{xml}: {default}{/}Booklet.tpl -> {default}{/}template{/
 A: problem  no template at {default}{/}none
 B: problem  stays in the folder being left (in a sub-folder): {previous}{/}Sub{/}T
 C: note     not looked at: {hot}{/}C{/}D{/}T
-Job presets: problem  .P{xml}: no template at {default}{/}&none;
 Job presets: problem  .P{xml}: no template at {default}{/}<A
+Job presets: problem  .P{xml}: no template at {default}{/}&none;
 Job presets: problem  .P{xml}: stays in the folder being left (stored as XML): {hot}{/}..{/}Vorige 版{/}&
 Job presets: problem  .P{xml}: stays in the folder being left (other separators): {hot}{/}..{/}Vorige 版{/}T
 Job presets: note     .P{xml}: a template path has no closing quote

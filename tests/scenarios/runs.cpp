@@ -6,28 +6,25 @@ namespace
 
 SCENARIOS(Runs)
 {
-    const Text from = Written(MovedFrom);
-    const Text to = Written(MovedTo);
-    const Text found = Found(MovedFrom);
     const Text forged = "x&#13;&#10;End~&#x7F;&#x9F;&#xA0;&#x2027;&#x2028;&#x2029;&#x202A;&#9;y";
     const auto moving = [&](const Text& name, const Files& files = {})
     {
-        return Scenario(name, DoneFolder("A", from)).Before(files).After({{CfgPlace, to}});
+        return Scenario(name, files).File(PresetPlace, Stored(MovedFrom), Stored(MovedTo));
     };
     return {
-        Scenario("WithoutASwitchNothingChanges").File(CfgPlace, from).Run({}),
+        Scenario("WithoutASwitchNothingChanges").File(PresetPlace, Stored(MovedFrom)).Run({}),
         Scenario("ADashedSwitchIsInvalid")
-            .File(CfgPlace, from)
+            .File(PresetPlace, Stored(MovedFrom))
             .Run({"-I"})
             .WholeLog("Invalid call check calling parameter: exiting....\n"),
-        Scenario("AnInvalidSwitchIsNotLoggedWithV").File(CfgPlace, from).Run({"X", "V"}),
+        Scenario("AnInvalidSwitchIsNotLoggedWithV")
+            .File(PresetPlace, Stored(MovedFrom))
+            .Run({"X", "V"}),
         moving("VLeavesTheLogAlone").Run({"I", "v"}),
-        moving("AnUpgradeMovesTheTemplate").Run({"i"}).Log({{"A", found}}),
-        moving("VIsIgnoredBeforeAnotherArgument").Run({"I", "V", "x"}).Log({{"A", found}}),
-        moving("AnotherSecondArgumentIsIgnored").Run({"I", "W"}).Log({{"A", found}}),
-        Scenario("PresetsNeedNeitherAListNorALogFolder",
-                 {{ListPlace, Removed}, {LogPlace, Removed}})
-            .File(PresetPlace, Stored(MovedFrom), Stored(MovedTo))
+        moving("AnUpgradeMovesTheTemplate").Run({"i"}).Log({}, PresetLine(Updated)),
+        moving("VIsIgnoredBeforeAnotherArgument").Run({"I", "V", "x"}).Log({}, PresetLine(Updated)),
+        moving("AnotherSecondArgumentIsIgnored").Run({"I", "W"}).Log({}, PresetLine(Updated)),
+        moving("PresetsNeedNeitherAListNorALogFolder", {{ListPlace, Removed}, {LogPlace, Removed}})
             .IsReported(R"(
 Workstation: note     there is no {list}
 Workstation: note     there will be no run log: there is no folder {user}{/}ORX_Installers{/}
@@ -38,18 +35,21 @@ Job presets: {presetmoves})"),
             .Log({}, "Preset dirctory  not exist: {user}{/}ORX{/}JPData{/}\n" + NoPrevious)
             .IsReported("Job presets: note     there are no presets, because there is no folder "
                         "{user}{/}ORX{/}JPData{/}"),
-        moving("ALogWithAByteOrderMarkLosesIt", {{LogPlace, "{utf16}old\r\n"}}).Log({{"A", found}}),
+        moving("ALogWithAByteOrderMarkLosesIt", {{LogPlace, "{utf16}old\r\n"}})
+            .Log({}, PresetLine(Updated)),
         moving("AFolderInPlaceOfTheLogStopsNothing", {{LogPlace, Removed}, {LogPlace + "/", ""}})
             .IsReported(R"(
+Workstation: note     HotFolderList.cfg lists no hot folder
 Workstation: note     there will be no run log: something else has its name: {log}
-A: {moves})"),
+Job presets: {presetmoves})"),
         moving("ALogFolderThatCannotBeWrittenToStopsNothing",
                {{LogPlace, Removed}, {LogFolder + "/", ""}, {LogFolder + "#", "X"}})
             .AsOtherUser()
             .NotUnderWine("there every user may write to the folder")
             .IsReported(R"(
 Workstation: problem  there will be no run log: its folder cannot be written to: {user}{/}ORX_Installers{/}
-A: {moves})"),
+Workstation: note     HotFolderList.cfg lists no hot folder
+Job presets: {presetmoves})"),
         Scenario("NoFolderCanBeEntered", {{ListPlace, ""}, {PresetPlace, ""}})
             .Before({{"machine/hotfolder#", "0"}, {LogFolder + "#", "0"}, {JobPresets + "#", "0"}})
             .AsOtherUser()
