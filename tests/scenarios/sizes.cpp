@@ -67,8 +67,7 @@ SCENARIOS(Sizes)
     const Text declared = DocumentType(Times(600, "<!ATTLIST a b# CDATA 'default'>"));
     return {
         HotFolders("WhatIsTooLargeStays",
-                   {{"A first", Moving(Cfg(""))},
-                    {"Bytes", TooLarge(Cfg(Times(600000, "    ")))},
+                   {{"Bytes", TooLarge(Cfg(Times(600000, "    ")))},
                     {"Elements", TooLarge(Cfg(Times(120000, "<a/>")))},
                     {"Levels", TooLarge(Cfg(Times(2100, "<e>") + Times(2100, "</e>")))},
                     {"Unclosed levels", TooLarge(Times(6000, "<e>"))},
@@ -82,8 +81,7 @@ SCENARIOS(Sizes)
                     {"Quotes", Outgrown("<a b='" + Times(350000, "\"") + "'/>")},
                     {"Filter levels", Outgrown(Times(1025, "<e>") + Times(1025, "</e>"))},
                     {"Indentation",
-                     Outgrown(Times(1020, "<e>") + Times(2000, "<a/>") + Times(1020, "</e>"))},
-                    {"Z last", Moving(Cfg(""))}}),
+                     Outgrown(Times(1020, "<e>") + Times(2000, "<a/>") + Times(1020, "</e>"))}}),
         HotFolders("WhatIsJustSmallEnoughMoves",
                    {{"Bytes", Moving(Cfg(Times(60000, "    ")))},
                     {"Elements", Moving(Cfg(Times(90000, "<a/>")))},
