@@ -27,7 +27,11 @@ Job presets: problem  .P{xml}: reached over a link, or not a file)"),
         Scenario("ALinkedLogFolderGetsNoLog",
                  {{LogPlace, Removed}, {LogFolder + "/", "{link:elsewhere/L}"}})
             .Before({{"elsewhere/L/UpgradeDowngrade.log", "-"}})
-            .File(CfgPlace, cfg, moved),
+            .File(CfgPlace, cfg, moved)
+            .IsReported(R"(
+Workstation: problem  there will be no run log: it is reached over a link: {log}
+A: {moves}
+A: {noicon})"),
         Scenario("AHotFolderAndAJobPresetDirectoryMayBeLinks",
                  {{"hot/A/", "{link:elsewhere/A}"}, {"elsewhere/A/[P]/Folder.cfg", cfg}})
             .Before({{JobPresets + "/", Removed}, {"user/ORX/", "{link:elsewhere/ORX}"}})

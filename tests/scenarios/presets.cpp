@@ -69,9 +69,9 @@ A: {nodisabled}
 Job presets: problem  .P{xml}: reached over a link, or not a file)"),
         Scenario("OnlyDirectSubdirectoriesAreSearchedEvenIfTheListIsAFolder",
                  {{ListPlace, Removed}, {ListPlace + "/", ""}})
-            .Before({{"user/ORX/JPData/Presets/presets.xml", from},
-                     {"user/ORX/JPData/P/Q/Presets/presets.xml", from},
-                     {"user/ORX/JPData/presets.xml", from}})
+            .Before(
+                {{JobPresets + "/Presets/presets.xml", from}, {JobPresets + "/presets.xml", from}})
+            .Before({{JobPresets + "/P/Q/Presets/presets.xml", from}})
             .Log()
             .IsReported("Workstation: problem  HotFolderList.cfg: is not a file"),
     };
