@@ -185,6 +185,7 @@ SCENARIOS(Refusals)
     const Text found = Found(MovedFrom);
     const Text cfg = Written(MovedFrom);
     const Text preset = Stored(MovedFrom);
+    const Text icon = Replaced(Icon, "A", "B");
     return {
         Refused("WhatCannotBeReadStays",
                 {{CfgPlace, cfg}, {"hot/B/[P]/Folder.cfg", cfg}, {"hot/C/[P]/Folder.cfg", cfg}})
@@ -199,8 +200,7 @@ B: problem  [_ORX_HotFolder_]: cannot be entered
 C: problem  the hot folder cannot be entered
 Job presets: problem  .P{xml}: cannot be opened for reading (can't open file*)"),
         Refused("WhatCannotBeWrittenStays", {{CfgPlace + "#", "R"}, {PresetPlace + "#", "R"}})
-            .File(CfgPlace, cfg)
-            .File(PresetPlace, preset)
+            .Before({{CfgPlace, cfg}, {PresetPlace, preset}})
             .Log({{"A", found}}, PresetLine("Unable to open preset.xml for write : "))
             .IsReported(R"(
 A: problem  Folder.cfg: cannot be opened for writing (can't open file*
@@ -211,9 +211,7 @@ Job presets: problem  .P{xml}: stays in the folder being left (in a file that st
         Refused("NeitherIconsNorADesktopIniCanBeReplaced", DoneFolder("A", Written(MovedTo)))
             .Before({{CfgPlace + "#", "R"}, {"tool/hf_folder.ico#", "0"}})
             .Before({{Ini, "[.ShellClassInfo]"}, {Ini + "#", "X"}})
-            .Before({{"hot/B/[P]/hf_folder_disabled.ico", "old"},
-                     {"hot/B/[P]/hf_folder_disabled.ico#", "R"},
-                     {"hot/B/[P]#", "X"}})
+            .Before({{icon, "old"}, {icon + "#", "R"}, {"hot/B/[P]#", "X"}})
             .IsReported(R"(
 A: problem  hf_folder.ico: cannot be replaced (read-only, in use, or access denied)
 A: problem  Desktop.ini: cannot be opened for reading and writing

@@ -26,7 +26,11 @@ Job presets: problem  .P{xml}: reached over a link, or not a file)"),
         Scenario("ALinkedLogFolderGetsNoLog",
                  {{LogPlace, Removed}, {LogFolder + "/", "{link:elsewhere/L}"}})
             .Before({{"elsewhere/L/UpgradeDowngrade.log", "-"}})
-            .File(PresetPlace, from, Stored(MovedTo)),
+            .File(PresetPlace, from, Stored(MovedTo))
+            .IsReported(R"(
+Workstation: problem  there will be no run log: it is reached over a link: {log}
+Workstation: note     HotFolderList.cfg lists no hot folder
+Job presets: {presetmoves})"),
         Scenario("AHotFolderAndAJobPresetDirectoryMayBeLinks",
                  {{"hot/A/", "{link:elsewhere/A}"}, {"elsewhere/A/[P]/Folder.cfg", cfg}})
             .Before({{JobPresets + "/", Removed}, {"user/ORX/", "{link:elsewhere/ORX}"}})

@@ -42,6 +42,12 @@ SCENARIOS(Presets)
         updated("LineEndsBecomeThoseOfTheSystem", "\xEF\xBB\xBF<p>\n</p>", "<p>" + eol + "</p>",
                 Text("change   .P{xml}: loses its byte-order mark") +
                     (IsWindows ? ", and its line ends become CR LF" : "")),
+        Scenario("LineEndsAloneBecomeThoseOfTheSystem", {{PresetPlace, "<p>\n</p>"}})
+            .After({{PresetPlace, "<p>" + eol + "</p>"}})
+            .Log({}, PresetLine(Updated))
+            .IsReported(IsWindows ? "Job presets: change   .P{xml}: its line ends become CR LF"
+                                  : ""),
+        updated("AUtf16PresetMovesToo", "{utf16}" + from, to, "{presetmoves}"),
         updated("AUtf16PresetComesOutInUtf8", "{utf16}\r\nĚ\x1A", "\r\nĚ\x1A",
                 "change   .P{xml}: comes out as UTF-8, without byte-order mark"),
         updated("NulAndCtrlZEndNothing", Text("a\0b\x1A\r\n", 6) + from + "end",
@@ -69,9 +75,9 @@ A: {nodisabled}
 Job presets: problem  .P{xml}: reached over a link, or not a file)"),
         Scenario("OnlyDirectSubdirectoriesAreSearchedEvenIfTheListIsAFolder",
                  {{ListPlace, Removed}, {ListPlace + "/", ""}})
-            .Before({{"user/ORX/JPData/Presets/presets.xml", from},
-                     {"user/ORX/JPData/P/Q/Presets/presets.xml", from},
-                     {"user/ORX/JPData/presets.xml", from}})
+            .Before(
+                {{JobPresets + "/Presets/presets.xml", from}, {JobPresets + "/presets.xml", from}})
+            .Before({{JobPresets + "/P/Q/Presets/presets.xml", from}})
             .Log()
             .IsReported("Workstation: problem  HotFolderList.cfg: is not a file"),
     };

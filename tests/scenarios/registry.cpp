@@ -110,9 +110,8 @@ Job presets: change   .P{xml}: {default}{/}Booklet.tpl -> {default}{/}template{/
         Scenario("TemplatesAreMissing", DoneFolder("A", Written("{default}{/}none")))
             .Before(DoneFolder("B", Written("{previous}{/}Sub{/}T")))
             .Before(DoneFolder("C", Written("{hot}{/}C{/}D{/}T")))
-            .Before({{"hot/C/D/", "{link:elsewhere/d}"},
-                     {"default/D/", "{link:elsewhere/d}"},
-                     {"elsewhere/d/T", ""}})
+            .Before({{"hot/C/D/", "{link:elsewhere/d}"}, {"default/D/", "{link:elsewhere/d}"}})
+            .Before({{"elsewhere/d/T", ""}})
             .File(PresetPlace, Stored("{default}{/}D{/}T") + Stored("{hot}{/}..{/}Vorige 版{/}T") +
                                    Stored("{hot}{/}..{/}Vorige &#x7248;{/}&amp;") +
                                    Stored("{default}{/}&lt;&#65;") +
@@ -129,7 +128,7 @@ Job presets: problem  .P{xml}: stays in the folder being left (other separators)
 Job presets: note     .P{xml}: a template path has no closing quote
 Job presets: note     .P{xml}: not looked at: {default}{/}D{/}T)"),
         Scenario("ARehearsal", DoneFolder("A", Written("{hot}{/}old{/}T")))
-            .File(PresetPlace, Stored("{hot}{/}old{/}T") + Stored("{hot}{/}old{/}T"))
+            .File(PresetPlace, Times(2, Stored("{hot}{/}old{/}T")) + Stored("{hot}{/}new{/}T"))
             .Before({{MachineHive, Removed}, {UserHive, Removed}})
             .Run({"I", "--from", "{hot}{/}old", "--to", "{hot}{/}new"})
             .IsReported(R"(
