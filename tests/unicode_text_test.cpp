@@ -7,16 +7,13 @@
 namespace
 {
 
-using Units = std::vector<unsigned>;
+using Units = std::u16string;
 
 wxString TextOf(const Units& units)
 {
-    std::vector<unsigned char> bytes;
-    for (const unsigned unit : units)
-        bytes.insert(bytes.end(),
-                     {static_cast<unsigned char>(unit), static_cast<unsigned char>(unit >> 8)});
-    bytes.push_back('x'); // half a unit
-    return FromUtf16Bytes(bytes.data(), bytes.size());
+    const Units more = units + u'x'; // of which half is read
+    return FromUtf16Bytes(reinterpret_cast<const unsigned char*>(more.data()),
+                          2 * units.size() + 1);
 }
 
 TEST(UnicodeText, ALoneSurrogateIsNotText)
@@ -27,7 +24,7 @@ TEST(UnicodeText, ALoneSurrogateIsNotText)
         EXPECT_TRUE(IsXmlText(TextOf(units))) << std::hex << units[0];
     for (const Units& units : {Units{0xD834, 'a'}, {0xDC00, 0xD800}, {0xDFFF}, {0xD834, 0xE000}})
         EXPECT_FALSE(IsUnicodeText(TextOf(units)) || IsXmlText(TextOf(units))) << units[0];
-    for (const unsigned unit : {0x1FU, 1U, 8U, 0xBU, 0xFFFEU, 0xFFFFU})
+    for (const char16_t unit : Units{0x1F, 1, 8, 0xB, 0xFFFE, 0xFFFF})
         EXPECT_TRUE(IsUnicodeText(TextOf({unit})) && !IsXmlText(TextOf({unit}))) << unit;
     EXPECT_EQ(wxString::FromUTF8("\uFFFD~\uFFFD"), ToOneLine(TextOf({0x1F, '~', 0xD834})));
 }

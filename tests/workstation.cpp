@@ -162,13 +162,12 @@ void Workstation::LayOut(const Files& files)
 {
     for (const Text top : Tops)
         RemoveTree(HostPath(top));
-    std::vector<Text> hives;
+    Text hives;
     for (const auto& [place, text] : files)
     {
-        const bool isHive = place == MachineHive || place == UserHive;
-        if (isHive)
-            hives.push_back(Expand(text));
-        if (place.back() != '#' && !(IsWindows && isHive))
+        if (IsWindows && (place == MachineHive || place == UserHive))
+            hives += Expand(text);
+        else if (place.back() != '#')
             Put(place, text);
     }
     if constexpr (IsWindows)

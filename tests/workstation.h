@@ -86,7 +86,7 @@ std::filesystem::path DataDir(const Text& name, const std::filesystem::path& roo
 
 /// Windows only: replaces all keys that the scenarios use with those of the hives, which are in the
 /// registry editor's text form, but without escapes.
-void SetRegistry(const std::vector<Text>& hives);
+void SetRegistry(const Text& hives);
 
 /// A link to a directory if there is one at the target.
 void MakeLink(const std::filesystem::path& target, const std::filesystem::path& link);

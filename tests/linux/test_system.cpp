@@ -57,11 +57,10 @@ RunResult Workstation::Start(const Text& program, const std::vector<Text>& argum
             Quoted(HostPath("tool/" + program));
     for (const Text& argument : arguments)
         line += Quoted(Expand(argument));
-    const fs::path output = m_root / "output";
-    const fs::path errors = m_root / "errors";
-    const int status = std::system((line + ">" + Quoted(output) + "2>" + Quoted(errors)).c_str());
-    return {WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status), ReadFile(output),
-            ReadFile(errors)};
+    line += ">" + Quoted(m_root / "output") + "2>" + Quoted(m_root / "errors");
+    const int status = std::system(line.c_str());
+    return {WIFEXITED(status) ? WEXITSTATUS(status) : 128 + WTERMSIG(status),
+            ReadFile(m_root / "output"), ReadFile(m_root / "errors")};
 }
 
 void MakeLink(const fs::path& target, const fs::path& link)

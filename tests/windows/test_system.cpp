@@ -105,19 +105,16 @@ fs::path DataDir(const Text& name, const fs::path& /*root*/)
     return _wgetenv(name == "user" ? L"APPDATA" : L"ProgramData");
 }
 
-void SetRegistry(const std::vector<Text>& hives)
+void SetRegistry(const Text& hives)
 {
     const std::regex key(R"(\[(\w+\\SOFTWARE\\(Wow6432Node\\)?\w+).*)", std::regex::icase);
     RemoveKeys();
     Text text;
-    for (const Text& hive : hives)
-    {
-        std::istringstream lines(hive);
-        for (Text line; std::getline(lines, line); text += "\n")
-            text += line[0] == '['
-                        ? std::regex_replace(line, key, "[$1]\r\n\"" + Mark + "\"=\"\"\r\n$&")
-                        : Replaced(line, "\\", "\\\\");
-    }
+    std::istringstream lines(hives);
+    for (Text line; std::getline(lines, line); text += "\n")
+        text += line[0] == '['
+                    ? std::regex_replace(line, key, "[$1]\r\n\"" + Mark + "\"=\"\"\r\n$&")
+                    : Replaced(line, "\\", "\\\\");
     const fs::path file = TrialDir() / "hives.reg";
     const std::wstring units = L"\uFEFF" + fs::u8path(text).wstring();
     WriteFile(file, Text(reinterpret_cast<const char*>(units.data()), 2 * units.size()));
