@@ -35,9 +35,9 @@ refuse() {
         exit 1
     fi
 }
-as_user "$wine" reg add 'HKLM\SOFTWARE\Vantorix' /v Name /d kept /f >/dev/null
+as_user "$wine" reg add 'HKLM\SOFTWARE\Vantorix\QZA' /v InstallPath /d kept /f >/dev/null
 refuse Vantorix
-as_user "$wine" reg delete 'HKLM\SOFTWARE\Vantorix' /v Name /f >/dev/null # fails if it is not there any more
+as_user "$wine" reg delete 'HKLM\SOFTWARE\Vantorix\QZA' /v InstallPath /f >/dev/null # fails if it is not there any more
 as_user "$wine" reg delete 'HKLM\SOFTWARE\Vantorix' /f >/dev/null
 for folder in hotfolder "FolderUpgrade trial"; do # the second of another account
     as_user mkdir "$home/drive_c/ProgramData/$folder"

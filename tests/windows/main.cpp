@@ -1,11 +1,11 @@
 // Runs the scenarios on a machine where nothing can be lost.
+#include "migrate/install_locations.h"
 #include "platform/process_rights.h"
 #include "platform/system.h"
 #include "tests/windows/trial_machine.h"
 #include "tests/workstation.h"
 
 #include <gtest/gtest.h>
-#include <wx/msw/registry.h>
 #include <wx/utils.h>
 
 #include <cstdio>
@@ -18,23 +18,6 @@ namespace
 // Exit statuses beside 0 and 1, which are those of the tests.
 constexpr int BrokenOff = 2;
 constexpr int NotHere = 3;
-
-// What the tool uses, and the scenarios remove: no key or folder of an installed client.
-std::vector<wxString> Keys()
-{
-    std::vector<wxString> keys;
-    for (const wxString hive : {"HKEY_LOCAL_MACHINE", "HKEY_CURRENT_USER"})
-    {
-        for (const char* key : {"Vantorix", "HF", "Wow6432Node\\Vantorix", "Wow6432Node\\HF"})
-            keys.push_back(hive + "\\SOFTWARE\\" + key);
-    }
-    return keys;
-}
-
-bool IsUnmarked(const wxString& key)
-{
-    return wxRegKey(key).Exists() && !wxRegKey(key).HasValue(Mark);
-}
 
 // The last has the mark of this account's trial, while that is running or after it was interrupted.
 std::vector<fs::path> Folders()
@@ -58,12 +41,13 @@ Text WhyNot(int argc, char** argv)
                "nothing on this machine matters, add --this-machine-is-disposable.\n";
     const Text there = "The hot folder client may be installed: there is ";
     Text reasons;
-    for (const wxString& key : Keys())
-        reasons += IsUnmarked(key) ? there + key.utf8_string() + "\n" : "";
-    const bool isMarked = ReadFile(MarkFile()) == AccountName().utf8_string();
+    wxFileName ignored;
+    ValueSource source;
+    for (const auto lookUp : {GetDefaultImposeTemplatePath, GetPreviousImposeTemplatePath})
+        reasons += lookUp(ignored, source) ? there + source.name.utf8_string() + "\n" : "";
     for (const fs::path& folder : Folders())
-        reasons += fs::exists(folder) && !isMarked ? there + folder.u8string() + "\n" : "";
-    return reasons;
+        reasons += fs::exists(folder) ? there + folder.u8string() + "\n" : "";
+    return ReadFile(MarkFile()) == AccountName().utf8_string() ? "" : reasons;
 }
 
 void RemoveTrial()
@@ -94,16 +78,6 @@ void HoldPrograms()
 fs::path TrialDir()
 {
     return DataDir("machine", {}) / "FolderUpgrade trial";
-}
-
-void RemoveKeys()
-{
-    for (const wxString& key : Keys())
-    {
-        if (IsUnmarked(key))
-            throw std::runtime_error("not the trial's: " + key.utf8_string());
-        wxRegKey(key).DeleteSelf();
-    }
 }
 
 int main(int argc, char** argv)

@@ -4,6 +4,8 @@
 #include "tests/windows/trial_machine.h"
 #include "tests/workstation.h"
 
+#include <wx/msw/registry.h>
+
 #include <algorithm>
 #include <regex>
 #include <share.h>
@@ -74,6 +76,12 @@ void RunUnix(const Text& command)
     }
 }
 
+// The names of the keys that the trial makes, one a line.
+fs::path KeyFile()
+{
+    return TrialDir() / "keys";
+}
+
 // What Refuse has done.
 std::vector<fs::path> refusedPaths;
 std::vector<std::shared_ptr<FILE>> usedAlone;
@@ -105,16 +113,31 @@ fs::path DataDir(const Text& name, const fs::path& /*root*/)
     return _wgetenv(name == "user" ? L"APPDATA" : L"ProgramData");
 }
 
+void RemoveKeys()
+{
+    std::istringstream keys(ReadFile(KeyFile()));
+    for (Text key; std::getline(keys, key);)
+        wxRegKey(wxString::FromUTF8(key)).DeleteSelf();
+    fs::remove(KeyFile());
+}
+
 void SetRegistry(const Text& hives)
 {
-    const std::regex key(R"(\[(\w+\\SOFTWARE\\(Wow6432Node\\)?\w+).*)", std::regex::icase);
+    const std::regex form(R"(^\[(\w+\\SOFTWARE\\(Wow6432Node\\)?\w+))", std::regex::icase);
     RemoveKeys();
+    Text keys;
     Text text;
     std::istringstream lines(hives);
     for (Text line; std::getline(lines, line); text += "\n")
-        text += line[0] == '['
-                    ? std::regex_replace(line, key, "[$1]\r\n\"" + Mark + "\"=\"\"\r\n$&")
-                    : Replaced(line, "\\", "\\\\");
+    {
+        std::smatch key;
+        std::regex_search(line, key, form);
+        text += key.empty() ? Replaced(line, "\\", "\\\\") : line;
+        keys += key.empty() ? "" : key.str(1) + "\n";
+        if (!key.empty() && wxRegKey(wxString::FromUTF8(key.str(1))).Exists())
+            throw std::runtime_error("not the trial's: " + key.str(1));
+    }
+    WriteFile(KeyFile(), keys);
     const fs::path file = TrialDir() / "hives.reg";
     const std::wstring units = L"\uFEFF" + fs::u8path(text).wstring();
     WriteFile(file, Text(reinterpret_cast<const char*>(units.data()), 2 * units.size()));
