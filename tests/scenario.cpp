@@ -27,17 +27,10 @@ Scenario& Scenario::Log(const std::vector<FolderLog>& folders, const Text& prese
 Scenario& Scenario::IsReported(const Text& lines)
 {
     report = lines.empty() || lines[0] == '\n' ? lines : "\n" + lines;
-    const auto hot = before.lower_bound("hot/");
-    if ((hot == before.end() || !StartsWith(hot->first, "hot/")) && !StartsWith(*report, "\nW"))
-        report = "\nWorkstation: note     HotFolderList.cfg lists no hot folder" + *report;
-    if (before.count(PresetPlace) == 0 && report->find("Job presets") == Text::npos)
-        *report += "\nJob presets: note     there are no presets in {user}{/}ORX{/}JPData{/}";
     for (const auto& [token, text] :
          Files{{"{moves}", "change   Folder.cfg: " + MovedFrom + " -> " + MovedTo},
                {"{presetmoves}", "change   .P{xml}: " + MovedFrom + " -> " + MovedTo},
                {"{xml}", "{/}Presets{/}presets.xml"},
-               {"{nodisabled}", "note     no copy of the icon to replace: hf_folder_disabled.ico"},
-               {"{noicon}", "note     no copy of the icon to replace: hf_folder.ico"},
                {"{nothing}", ", for the account *; nothing moves. Run as the client's user, "
                              "after its installation"},
                {"{log}", "{user}{/}ORX_Installers{/}UpgradeDowngrade.log"},

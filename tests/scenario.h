@@ -92,8 +92,8 @@ struct Scenario
 
     /// After Before: what FolderUpgradeCheck reports before the run, each line after its title;
     /// only {hot}{/} of a hot folder's title is left out. An * is the account or the system's own
-    /// words. If there are no hot folders or no presets, that line is added. Without a log or files
-    /// that change, there is no run.
+    /// words. Notes that say what is not there may be left out. Without a log or files that change,
+    /// there is no run.
     Scenario& IsReported(const Text& lines);
 };
 

@@ -195,7 +195,6 @@ SCENARIOS(Refusals)
                  PresetLine("Unable to open preset.xml for read : "))
             .IsReported(R"(
 A: problem  Folder.cfg: can't open file*
-A: {nodisabled}
 B: problem  [_ORX_HotFolder_]: cannot be entered
 C: problem  the hot folder cannot be entered
 Job presets: problem  .P{xml}: cannot be opened for reading (can't open file*)"),
@@ -205,7 +204,6 @@ Job presets: problem  .P{xml}: cannot be opened for reading (can't open file*)")
             .IsReported(R"(
 A: problem  Folder.cfg: cannot be opened for writing (can't open file*
 A: problem  stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl
-A: {noicon}
 Job presets: problem  .P{xml}: cannot be opened for writing (can't open file*
 Job presets: problem  .P{xml}: stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl)"),
         Refused("NeitherIconsNorADesktopIniCanBeReplaced", DoneFolder("A", Written(MovedTo)))
@@ -224,8 +222,7 @@ B: note     no Folder.cfg)"),
             .File(CfgPlace, cfg, Written(MovedTo))
             .IsReported(R"(
 Workstation: problem  there will be no run log: can't open file*
-A: {moves}
-A: {noicon})"),
+A: {moves})"),
         Refused("AnUnreadableListIsEmptyAndAClosedPresetFolderSkipped",
                 {{ListPlace + "#", "0"}, {JobPresets + "/.P#", "0"}})
             .File(PresetPlace, preset)

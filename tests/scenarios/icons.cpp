@@ -65,7 +65,7 @@ SCENARIOS(Icons)
             {{Icon, "old"}, {"tool/BundleIcons/hf_folder_disabled.ico", ""}, {Ini, "; mine\n"}})
             .File(CfgPlace, Cfg("1"))
             .Log({{"A", ""}})
-            .IsReported("A: {noicon}"),
+            .IsReported("A: note     no copy of the icon to replace: hf_folder.ico"),
         Scenario("WithoutTheNewIconsFoldersStay", DoneFolder("A", Written("")))
             .Before(DoneFolder("B", Written("")))
             .Before({{"tool/BundleIcons#", "0"}})

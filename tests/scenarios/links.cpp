@@ -29,7 +29,6 @@ Job presets: problem  .P{xml}: reached over a link, or not a file)"),
             .File(PresetPlace, from, Stored(MovedTo))
             .IsReported(R"(
 Workstation: problem  there will be no run log: it is reached over a link: {log}
-Workstation: note     HotFolderList.cfg lists no hot folder
 Job presets: {presetmoves})"),
         Scenario("AHotFolderAndAJobPresetDirectoryMayBeLinks",
                  {{"hot/A/", "{link:elsewhere/A}"}, {"elsewhere/A/[P]/Folder.cfg", cfg}})
@@ -69,7 +68,8 @@ Job presets: {presetmoves})"),
     add(done("AFolderCfg").Log({{"A", NoCfg, Disabled}}), CfgPlace, cfg,
         "A: problem  Folder.cfg: reached over a link", "A: problem  Folder.cfg: is not a file");
     add(done("AnIcon").Before({{Icon, Removed}}).Log({{"A", "", Disabled}}), Icon, "old",
-        "A: problem  hf_folder_disabled.ico: reached over a link", "A: {nodisabled}");
+        "A: problem  hf_folder_disabled.ico: reached over a link",
+        "A: note     no copy of the icon to replace: hf_folder_disabled.ico");
     add(done("DesktopIni")
             .Before({{Ini + "#", Removed}})
             .Log({{"A", "",
@@ -83,10 +83,8 @@ Job presets: {presetmoves})"),
         skipped);
     add(Scenario("TheLog").File(PresetPlace, from, Stored(MovedTo)), LogPlace, "-", R"(
 Workstation: problem  there will be no run log: it is reached over a link: {log}
-Workstation: note     HotFolderList.cfg lists no hot folder
 Job presets: {presetmoves})",
         R"(
-Workstation: note     HotFolderList.cfg lists no hot folder
 Workstation: note     there will be no run log: something else has its name: {log}
 Job presets: {presetmoves})");
     scenarios.push_back(Scenario("TheListIsAPipe", {{ListPlace, "{fifo}"}, {"hot/A/", ""}})

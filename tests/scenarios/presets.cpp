@@ -71,7 +71,6 @@ SCENARIOS(Presets)
             .Log({{"A", NoCfg, Disabled}}, PresetLine("Unable to open preset.xml for read : "))
             .IsReported(R"(
 A: problem  Folder.cfg: is not a file
-A: {nodisabled}
 Job presets: problem  .P{xml}: reached over a link, or not a file)"),
         Scenario("OnlyDirectSubdirectoriesAreSearchedEvenIfTheListIsAFolder",
                  {{ListPlace, Removed}, {ListPlace + "/", ""}})
@@ -79,7 +78,9 @@ Job presets: problem  .P{xml}: reached over a link, or not a file)"),
                 {{JobPresets + "/Presets/presets.xml", from}, {JobPresets + "/presets.xml", from}})
             .Before({{JobPresets + "/P/Q/Presets/presets.xml", from}})
             .Log()
-            .IsReported("Workstation: problem  HotFolderList.cfg: is not a file"),
+            .IsReported(R"(
+Workstation: problem  HotFolderList.cfg: is not a file
+Job presets: note     there are no presets in {user}{/}ORX{/}JPData{/})"),
     };
 }
 

@@ -29,7 +29,6 @@ SCENARIOS(Registry)
             .File(CfgPlace, "<H><ImposeSetting/></H>")
             .Log({{"A", Found(""), Disabled}}, NoDefault + NoPrevious)
             .IsReported(R"(
-A: {nodisabled}
 Job presets: problem  registry value Path in HKEY_CURRENT_USER\SOFTWARE\Wow6432Node\HF or \SOFTWARE\HF: there is no such key{nothing}
 Job presets: problem  registry value InstallPath in HKEY_LOCAL_MACHINE\SOFTWARE\Wow6432Node\Vantorix\QZA or \SOFTWARE\Vantorix\QZA: there is no such key{nothing})"),
         Both("WithoutADefaultFolderNothingMoves", MovedFrom, {{MachineHive, Hive(MachineKey, "")}})
@@ -114,8 +113,7 @@ Job presets: change   .P{xml}: {default}{/}Booklet.tpl -> {default}{/}template{/
             .Before({{"elsewhere/d/T", ""}})
             .File(PresetPlace, Stored("{default}{/}D{/}T") + Stored("{hot}{/}..{/}Vorige 版{/}T") +
                                    Stored("{hot}{/}..{/}Vorige &#x7248;{/}&amp;") +
-                                   Stored("{default}{/}&lt;&#65;") +
-                                   Stored("{default}{/}&none;") +
+                                   Stored("{default}{/}&lt;&#65;") + Stored("{default}{/}&none;") +
                                    "ORXImposeTemplate\">\"{previous}")
             .IsReported(R"(
 A: problem  no template at {default}{/}none

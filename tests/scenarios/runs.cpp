@@ -33,13 +33,13 @@ Job presets: {presetmoves})"),
                  {{LogPlace, Removed}, {LogFolder + "/", ""}})
             .Before({{"user/ORX/JPData/", Removed}, {UserHive, Removed}})
             .Log({}, "Preset dirctory  not exist: {user}{/}ORX{/}JPData{/}\n" + NoPrevious)
-            .IsReported("Job presets: note     there are no presets, because there is no folder "
-                        "{user}{/}ORX{/}JPData{/}"),
+            .IsReported(R"(
+Workstation: note     HotFolderList.cfg lists no hot folder
+Job presets: note     there are no presets, because there is no folder {user}{/}ORX{/}JPData{/})"),
         moving("ALogWithAByteOrderMarkLosesIt", {{LogPlace, "{utf16}old\r\n"}})
             .Log({}, PresetLine(Updated)),
         moving("AFolderInPlaceOfTheLogStopsNothing", {{LogPlace, Removed}, {LogPlace + "/", ""}})
             .IsReported(R"(
-Workstation: note     HotFolderList.cfg lists no hot folder
 Workstation: note     there will be no run log: something else has its name: {log}
 Job presets: {presetmoves})"),
         moving("ALogFolderThatCannotBeWrittenToStopsNothing",
@@ -48,7 +48,6 @@ Job presets: {presetmoves})"),
             .NotUnderWine("there every user may write to the folder")
             .IsReported(R"(
 Workstation: problem  there will be no run log: its folder cannot be written to: {user}{/}ORX_Installers{/}
-Workstation: note     HotFolderList.cfg lists no hot folder
 Job presets: {presetmoves})"),
         Scenario("NoFolderCanBeEntered", {{ListPlace, ""}, {PresetPlace, ""}})
             .Before({{"machine/hotfolder#", "0"}, {LogFolder + "#", "0"}, {JobPresets + "#", "0"}})
@@ -95,9 +94,7 @@ Workstation: note     listed hot folder does not exist: {hot}{/}file
 Workstation: note     listed hot folder is listed twice: {hot}{/}C
 Workstation: note     listed hot folder is listed twice: {hot}{/}c
 C: note     no Folder.cfg
-C: {nodisabled}
 b ü 漢: note     no Folder.cfg
-b ü 漢: {nodisabled}
 D: note     the same directory as {hot}{/}C)"),
         listed("AMalformedListIsEmpty", "<any><HotFolder path='{hot}{/}A'/>")
             .Log()

@@ -54,10 +54,8 @@ Text Quoted(const fs::path& path)
 // Under Wine, a path for the system that Wine runs on.
 Text UnixPath(const fs::path& path)
 {
-    using Convert = char* (*)(const wchar_t*);
-    const auto convert = reinterpret_cast<Convert>(reinterpret_cast<void*>(
-        GetProcAddress(GetModuleHandleW(L"kernel32.dll"), "wine_get_unix_file_name")));
-    return " '" + Text(convert(path.c_str())) + "'";
+    const Text onDrive = path.relative_path().generic_u8string();
+    return Text(" '") + std::getenv("WINEPREFIX") + "/drive_c/" + onDrive + "'";
 }
 
 // Under Wine, runs a shell command of the system that Wine runs on. There is no process to wait
