@@ -1,24 +1,18 @@
 #!/usr/bin/env bash
-# Runs a fuzz target, as a test:
+# Runs the fuzz target, as a test: over its corpus and the sample workstation, and over inputs derived from them for
+# FUZZ_SECONDS (default 10).
 #
-#     fuzz/run.sh corpus|fuzz PROGRAM [SAMPLES]
+#     fuzz/run.sh PROGRAM
 #
-#     corpus   over its corpus, and over those files of the sample workstation whose name is SAMPLES
-#     fuzz     over inputs derived from them, for FUZZ_SECONDS (default 10)
-#
-# An input that breaks a promise is kept in findings/ beside the program; once fixed, it goes into the target's corpus
-# and stays a test.
+# An input that breaks a promise is kept in findings/ beside the program; once fixed, it goes into the corpus and stays
+# a test.
 set -euo pipefail
 cd "$(dirname "${BASH_SOURCE[0]}")/.."
-
-target=${2##*/fuzz_}
-findings=${2%/*}/findings
+findings=${1%/*}/findings
 scratch=$(mktemp -d)
 trap 'rm -rf "$scratch"' EXIT
 mkdir -p "$findings" "$scratch"/{found,samples}
-find samples/workstation -name "${3-}" -exec cp --backup=numbered -t "$scratch/samples" {} +
-limits=(-runs=0)
-[ "$1" = corpus ] || limits=(-max_len=16384 -max_total_time="${FUZZ_SECONDS:-10}")
+find samples/workstation -type f -exec cp --backup=numbered -t "$scratch/samples" {} +
 # New inputs go to the first folder.
-"$2" -dict=fuzz/"$target".dict -artifact_prefix="$findings/$target-" -timeout=10 "${limits[@]}" \
-    "$scratch"/{found,samples} fuzz/corpus/"$target"
+"$1" -dict=fuzz/stored_file.dict -artifact_prefix="$findings/" -timeout=10 -max_len=16384 \
+    -max_total_time="${FUZZ_SECONDS:-10}" "$scratch"/{found,samples} fuzz/corpus/stored_file
