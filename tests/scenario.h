@@ -1,6 +1,5 @@
-// The end-to-end scenarios: a workstation before, the command line, the workstation after.
-// What a scenario does not mention has its usual value. tests/scenarios/ has one file for each
-// subject, and texts.h, with the files and log lines that the scenarios use.
+// The end-to-end scenarios: a workstation before, the command line, the workstation after. What a
+// scenario does not mention has its usual value. Those of each subject are in tests/scenarios/.
 #pragma once
 
 #include "tests/workstation.h"
@@ -107,7 +106,7 @@ inline Text WhySkipped(const Scenario& scenario)
     return IsWine() && onWindows.empty() ? scenario.notUnderWine : onWindows;
 }
 
-/// The name of its test. Under Wine root is refused nothing, so these are run by another user.
+/// The name of its test; see tests/windows/CMakeLists.txt.
 inline Text TestName(const Scenario& scenario)
 {
     return scenario.name + (scenario.asOtherUser ? "_AsOtherUser" : "");

@@ -27,6 +27,7 @@ const auto& Tops = IsWindows ? TopsOnWindows : TopsOnLinux;
 
 // In the order in which Wine can set them.
 const auto Attributes = {std::pair('S', FILE_ATTRIBUTE_SYSTEM),
+                         {'N', FILE_ATTRIBUTE_NOT_CONTENT_INDEXED},
                          {'H', FILE_ATTRIBUTE_HIDDEN},
                          {'R', FILE_ATTRIBUTE_READONLY}};
 

@@ -7,8 +7,9 @@
 //   default/...     the template folder of this version; previous/... that of the previous one
 //   elsewhere/...   files that the tool has no reason to touch, for example targets of links
 // A place that ends in a slash is a directory. One that ends in '#' has the attributes of the file
-// or directory before it, as letters: R read-only, H hidden, S system; and, for another user than
-// root, X not writable, 0 in use or not accessible at all, L a directory that cannot be listed
+// or directory before it, as letters: R read-only, H hidden, S system, N not indexed; and, for
+// another user than root, X not writable, 0 in use or not accessible at all, L a directory that
+// cannot be listed
 // ("hot/A/Desktop.ini#" -> "RS").
 //
 // In texts, {hot}, {user}, {machine}, {tool}, {app}, {previous} and {default} are replaced with
@@ -76,16 +77,15 @@ class Workstation
 
 /// Whether this is Windows, but not the real one.
 bool IsWine();
-/// The folder of the programs to test. Windows: the test's own; elsewhere $FOLDER_UPGRADE_PROGRAMS,
-/// or the folder of the build.
+/// That of the programs to test. Windows: the test's own; elsewhere $FOLDER_UPGRADE_PROGRAMS, or
+/// the build's.
 std::filesystem::path ProgramDir();
 /// A new folder for everything on a workstation but the application data.
 std::filesystem::path NewRoot();
 /// The application data folder "user" or "machine". Windows: the account's or the machine's own.
 std::filesystem::path DataDir(const Text& name, const std::filesystem::path& root);
 
-/// Windows only: replaces all keys that the scenarios use with those of the hives, which are in the
-/// registry editor's text form, but without escapes.
+/// Windows only: replaces the last call's keys with those of the hives, whose text has no escapes.
 void SetRegistry(const Text& hives);
 
 /// A link to a directory if there is one at the target.

@@ -156,6 +156,8 @@ WithoutADescription: problem  Folder.cfg: lacks "description", so the enabled fo
             .Before(DoneFolder("C", Replaced(Written(MovedFrom), "Enable=\"1\"", "Enable=\"true\""),
                                Disabled))
             .Before(DoneFolder("D", utf16))
+            .Before(
+                DoneFolder("E", Replaced(Written(MovedFrom), " description=\"\"", ""), Disabled))
             .IsReported(R"(
 A: problem  Folder.cfg: loses its document type, and with it the entities in its texts
 A: problem  Folder.cfg: loses the instruction <?top?>
@@ -175,7 +177,9 @@ B: {moves}
 C: problem  Folder.cfg: Enable="true" comes out as "0"
 C: {moves}
 D: {moves}
-D: note     Folder.cfg: comes out as UTF-8)"),
+D: note     Folder.cfg: comes out as UTF-8
+E: problem  Folder.cfg: lacks "description", so the rewrite resets: server_ip, server_name, Enable, BaseVirtualPrinter, BaseVirtualPrinterName, BaseVirtualPrinterDisplayName, HFPresetName, Centralized, IsCustomInterval, TimeInterval, PPDVersion, ServerTypeAndJPDefaultKeyInfo, server_version, server_textversion, server_type, Quickset, Quickset_Supported, IsWidthBased (the folder ends up disabled)
+E: {moves})"),
     };
 }
 

@@ -86,6 +86,13 @@ A: change   Desktop.ini: InfoTip, IconFile
 A: change   Desktop.ini: attributes READONLY HIDDEN SYSTEM -> READONLY SYSTEM
 A: change   hot folder: attributes HIDDEN -> HIDDEN SYSTEM
 A: note     no Folder.cfg)"),
+        Scenario("ARefreshClearsEveryOtherAttribute", DoneFolder("A", "<H/>", Disabled))
+            .Before({{Ini + "#", "RSN"}, {"hot/A#", "SN"}})
+            .After({{Ini + "#", "RS"}})
+            .Log({{"A", "", Disabled}})
+            .NotUnderWine("Wine does not keep that attribute")
+            .IsReported("A: change   Desktop.ini: attributes READONLY SYSTEM NOT_CONTENT_INDEXED "
+                        "-> READONLY SYSTEM"),
         refresh("AMissingSectionIsAddedAfterTheLastLine", "[x]\r\na=b",
                 "[x]\r\na=b\r\n" + IniHeader + InfoTip + disabled)
             .Before({{Ini + "#", "R"}, {"hot/A#", "RS"}}),

@@ -102,13 +102,17 @@ Job presets: change   .P{xml}: {default}{/}Booklet.tpl -> {previous}{/}Booklet.t
                         "presets as it is"),
         WithPath("TheNewFolderIsBelowTheOld", "{app}", MovedTo)
             .File(CfgPlace, Written("{hot}{/}A"))
+            .File(PresetPlace, Stored(MovedTo) + Stored("{app}{/}..{/}Apps ä{/}T"))
             .Before({{"default/template/Booklet.tpl", ""}})
             .IsReported(R"(
 Job presets: problem  one template folder is below the other: another run would move paths of presets again
+Job presets: problem  .P{xml}: stays in the folder being left (another run moves it): {default}{/}..{/}Apps ä{/}T
+Job presets: change   .P{xml}: {app}{/}..{/}Apps ä{/}T -> {default}{/}..{/}Apps ä{/}T
 Job presets: change   .P{xml}: {default}{/}Booklet.tpl -> {default}{/}template{/}Booklet.tpl)"),
         Scenario("TemplatesAreMissing", DoneFolder("A", Written("{default}{/}none")))
             .Before(DoneFolder("B", Written("{previous}{/}Sub{/}T")))
             .Before(DoneFolder("C", Written("{hot}{/}C{/}D{/}T")))
+            .Before(DoneFolder("D", Written("{previous}{/}.{/}T")))
             .Before({{"hot/C/D/", "{link:elsewhere/d}"}, {"default/D/", "{link:elsewhere/d}"}})
             .Before({{"elsewhere/d/T", ""}})
             .File(PresetPlace, Stored("{default}{/}D{/}T") + Stored("{hot}{/}..{/}Vorige 版{/}T") +
@@ -119,6 +123,7 @@ Job presets: change   .P{xml}: {default}{/}Booklet.tpl -> {default}{/}template{/
 A: problem  no template at {default}{/}none
 B: problem  stays in the folder being left (in a sub-folder): {previous}{/}Sub{/}T
 C: note     not looked at: {hot}{/}C{/}D{/}T
+D: problem  stays in the folder being left (its last folder is a dot): {previous}{/}.{/}T
 Job presets: problem  .P{xml}: no template at {default}{/}<A
 Job presets: problem  .P{xml}: no template at {default}{/}&none;
 Job presets: problem  .P{xml}: stays in the folder being left (stored as XML): {hot}{/}..{/}Vorige 版{/}&

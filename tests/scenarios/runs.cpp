@@ -56,11 +56,10 @@ Job presets: {presetmoves})"),
 Workstation: problem  HotFolderList.cfg: its folder cannot be entered
 Workstation: problem  there will be no run log: its folder cannot be entered: {user}{/}ORX_Installers{/}
 Job presets: problem  {user}{/}ORX{/}JPData{/} cannot be entered)"),
-        Scenario("APercentSignIsLoggedAsItIs", {{"hot/%d %s/", ""}})
-            .Log({{"%d %s", NoCfg, Disabled}}),
-        Scenario("AStoredPathStaysInItsLine")
+        Scenario("NamesAndStoredPathsStayInTheirLine", {{"hot/%d %s/", ""}})
             .File(CfgPlace, Minimal(forged))
-            .Log({{"A", Found(u8"x\uFFFD\uFFFDEnd~\uFFFD\uFFFD\u00A0\u2027\uFFFD\uFFFD\u202A\ty"),
+            .Log({{"%d %s", NoCfg, Disabled},
+                  {"A", Found(u8"x\uFFFD\uFFFDEnd~\uFFFD\uFFFD\u00A0\u2027\uFFFD\uFFFD\u202A\ty"),
                    Disabled}}),
         Scenario("AFolderNameStaysInItsLine",
                  {{"hot/x\ny/", ""}, {ListPlace, "<l><HotFolder path='{hot}{/}x&#10;y'/></l>"}})

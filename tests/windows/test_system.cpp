@@ -217,8 +217,8 @@ void RemoveTree(const fs::path& path)
         for (const auto& entry : fs::directory_iterator(path))
             RemoveTree(entry.path());
     }
-    for (int i = 0; !(isDirectory ? RemoveDirectoryW(path.c_str()) : DeleteFileW(path.c_str()));
-         ++i)
+    const auto remove = isDirectory ? RemoveDirectoryW : DeleteFileW;
+    for (int i = 0; remove(path.c_str()) == 0; ++i)
     {
         if (IsWine()) // which neither removes a link to a directory nor shows a dangling one
             return RunUnix("rm -rf" + UnixPath(path));
