@@ -54,7 +54,7 @@ SCENARIOS(Sizes)
 {
     const Text listedA = "<HotFolder path='{hot}{/}A'/>";
     const Text lines = Times(3000, "123456789\n");
-    const Text oneMillion = Times(1000001, "x");
+    const Text oneMillion = Text(1000001, 'x');
     const Text entries = Times(10000, "    <KEYVALUE Key=\"K#\" Value=\"" + Text(90, 'v') +
                                           "\" KeyDisplayValue=\"\" LocDisplayValue=\"\"/>\n");
     const Text filter = "<FilterSetting>\n" + Times(10000, "    <x/>\n") + "  </FilterSetting>\n";
@@ -62,12 +62,12 @@ SCENARIOS(Sizes)
         Replaced(Replaced(MinimalWritten(MovedTo), "<JobSetting/>\n",
                           "<JobSetting>\n" + entries + "  </JobSetting>\n"),
                  "  <PreflightSettings/>", "  " + filter + "  <PreflightSettings/>");
-    const Text defaults = DocumentType("<!ATTLIST a b CDATA '" + Times(8000, "x") + "'>");
+    const Text defaults = DocumentType("<!ATTLIST a b CDATA '" + Text(8000, 'x') + "'>");
     const Text million = DocumentType(Entities(5) + "<!ATTLIST a b CDATA '&a5;'>");
     const Text declared = DocumentType(Times(600, "<!ATTLIST a b# CDATA 'default'>"));
     return {
         HotFolders("WhatIsTooLargeStays",
-                   {{"Bytes", TooLarge(Cfg(Times(600000, "    ")))},
+                   {{"Bytes", TooLarge(Cfg(Text(2400000, ' ')))},
                     {"Elements", TooLarge(Cfg(Times(120000, "<a/>")))},
                     {"Levels", TooLarge(Cfg(Times(2100, "<e>") + Times(2100, "</e>")))},
                     {"Unclosed levels", TooLarge(Times(6000, "<e>"))},
@@ -78,25 +78,25 @@ SCENARIOS(Sizes)
                     {"Long defaults", TooLarge(Cfg(Times(800, "<a/>"), defaults))},
                     {"Many defaults", TooLarge(Cfg("<a/>", declared))},
                     {"Entities", TooLarge(Cfg(Times(300, "<a/>"), million))},
-                    {"Quotes", Outgrown("<a b='" + Times(350000, "\"") + "'/>")},
+                    {"Quotes", Outgrown("<a b='" + Text(350000, '"') + "'/>")},
                     {"Filter levels", Outgrown(Times(1025, "<e>") + Times(1025, "</e>"))},
                     {"Indentation",
                      Outgrown(Times(1020, "<e>") + Times(2000, "<a/>") + Times(1020, "</e>"))}}),
         HotFolders("WhatIsJustSmallEnoughMoves",
-                   {{"Bytes", Moving(Cfg(Times(60000, "    ")))},
+                   {{"Bytes", Moving(Cfg(Text(240000, ' ')))},
                     {"Elements", Moving(Cfg(Times(90000, "<a/>")))},
                     {"Levels", Moving(Cfg(Times(2000, "<e>") + Times(2000, "</e>")))},
                     {"Attributes", Moving(Cfg("<a " + Times(6000, " b#=''") + "/>"))},
                     {"Lines", Moving(Cfg("<a>" + lines + "</a>"))},
-                    {"Value", Moving(Cfg("<a b='" + Times(300000, "x") + "'/>"))},
+                    {"Value", Moving(Cfg("<a b='" + Text(300000, 'x') + "'/>"))},
                     {"Comments", Moving(Cfg("<a>" + Times(20000, "x<!--c-->") + "</a>"))},
                     {"Long defaults", Moving(Cfg(Times(500, "<a/>"), defaults))},
                     {"Entities", Moving(Cfg("<a b='&a4;'/>", DocumentType(Entities(4))))},
                     {"Entries",
                      {Cfg("<JobSetting>" + entries + "</JobSetting>" + filter), written,
                       Found(MovedFrom)}},
-                    {"Variables", Elsewhere(Times(200000, "$"), Times(200000, "$"))},
-                    {"Expanded variables", Elsewhere("&a5;&a5;&a5;", Times(300000, "$"))}}),
+                    {"Variables", Elsewhere(Text(200000, '$'), Text(200000, '$'))},
+                    {"Expanded variables", Elsewhere("&a5;&a5;&a5;", Text(300000, '$'))}}),
         Scenario("AListThatIsTooDeepIsEmpty", {{ListPlace, Times(6000, "<e>")}})
             .Log()
             .IsReported("Workstation: problem  HotFolderList.cfg: too large to read safely"),

@@ -7,8 +7,9 @@
 inline Text Times(int count, const Text& text)
 {
     Text result;
+    const bool isNumbered = text.find('#') != Text::npos; // every test repeats this
     for (int i = 0; i < count; ++i)
-        result += Replaced(text, "#", std::to_string(1000000 + i).substr(1));
+        result += isNumbered ? Replaced(text, "#", std::to_string(1000000 + i).substr(1)) : text;
     return result;
 }
 
