@@ -13,8 +13,8 @@ packages() {
         build) echo g++ cmake ninja-build libwxgtk3.2-dev libexpat1-dev ;;
         sample) echo attr python3 ;;
         test) echo libgtest-dev ;;
-        fuzz) echo clang libclang-rt-dev python3 ;;
-        checks) echo clang-format clang-tidy cppcheck shellcheck pyflakes3 python3 ;;
+        fuzz) echo clang libclang-rt-dev ;;
+        checks) echo clang-format clang-tidy cppcheck shellcheck pyflakes3 ;;
         coverage) echo gcovr ;;
         bench) echo libbenchmark-dev python3 python3-lxml ;;
         mingw) echo g++-mingw-w64-x86-64-posix dpkg-dev make ;;

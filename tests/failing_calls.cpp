@@ -1,9 +1,7 @@
 // Preloaded before the C library (LD_PRELOAD): makes something happen at one of the program's
-// calls.
-//
-// It counts the calls that concern a path below $FAULT_ROOT, by name or by descriptor, or only
-// those of them that $FAULT_CALLS names. The letters of $FAULT_EVENTS say what happens at call
-// number $FAULT_NUMBER and at those that follow it:
+// calls. It counts those that concern a path below $FAULT_ROOT, by name or by descriptor, and that
+// $FAULT_CALLS names, if any. The letters of $FAULT_EVENTS say what happens at call number
+// $FAULT_NUMBER and at those that follow it:
 //   f  the call does nothing and fails with the error number $FAULT_ERROR
 //   s  it writes half of what it is given
 //   e  the process ends before the call

@@ -63,7 +63,7 @@ void ExpectEqual(const Files& expected, const Files& actual, const Text& when)
 struct Report
 {
     Text lines;             // as IsReported describes them, each after a line feed
-    std::set<Text> changed; // files and folders, those whose attributes change with '#'
+    std::set<Text> changed; // files and folders
     size_t problems = 0;
 };
 
@@ -87,8 +87,7 @@ Report Check(const Workstation& workstation, const std::vector<Text>& arguments)
             continue;
         }
         if (StartsWith(line, "  change"))
-            report.changed.insert(title + line.substr(0, line.find(": ")) +
-                                  (line.find(": attributes ") == Text::npos ? "" : "#"));
+            report.changed.insert(title + line.substr(0, line.find(": ")));
         report.problems += StartsWith(line, "  problem") ? 1 : 0;
         report.lines +=
             "\n" + Replaced(title, workstation.Expand("{hot}{/}"), "") + ":" + line.substr(1);
@@ -97,16 +96,14 @@ Report Check(const Workstation& workstation, const std::vector<Text>& arguments)
     return report;
 }
 
-// As the report counts them: the attributes of a new Desktop.ini and of an icon go with the file.
+// The files and folders that differ, apart from the log.
 std::set<Text> ChangedPlaces(const Files& before, const Files& after)
 {
     std::set<Text> changed;
     for (const auto& [place, texts] : Differences(before, after))
     {
-        const Text file = place.substr(0, place.find('#'));
-        const bool isNew = before.count(file) + before.count(file + "/") == 0;
         if (place != LogPlace)
-            changed.insert(isNew || file.find(".ico") != Text::npos ? file : place);
+            changed.insert(place.substr(0, place.find('#')));
     }
     return changed;
 }

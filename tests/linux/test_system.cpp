@@ -6,16 +6,11 @@
 
 namespace fs = std::filesystem;
 
-namespace
-{
-
 // The text as one word for a shell.
-Text Quoted(const Text& text)
+static Text Quoted(const Text& text)
 {
     return "'" + text + "' ";
 }
-
-} // namespace
 
 bool IsWine()
 {
