@@ -1,9 +1,6 @@
 #!/usr/bin/env bash
-# Runs the fuzz target, as a test: over its corpus and the sample workstation, and over inputs derived from them for
-# FUZZ_SECONDS (default 10).
-#
-#     fuzz/run.sh PROGRAM
-#
+# fuzz/run.sh PROGRAM
+# Runs the fuzz target over its corpus and the sample workstation, and over inputs derived from them for FUZZ_SECONDS.
 # An input that breaks a promise is kept in findings/ beside the program; once fixed, it goes into the corpus and stays
 # a test.
 set -euo pipefail

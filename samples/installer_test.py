@@ -3,9 +3,8 @@
 
     samples/installer_test.py BUILD_DIR
 
-BUILD_DIR is the build folder of the preset "windows". Wine gets its own prefix. The
-workstation has two hot folders (one template moves) and a job preset. Nobody presses the button of
-a message box.
+BUILD_DIR is that of the preset "windows". Wine gets its own prefix. The workstation has two hot
+folders (one template moves) and a job preset. Nobody presses the button of a message box.
 """
 import pathlib
 import re

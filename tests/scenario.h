@@ -16,7 +16,6 @@ inline const Text ListPlace = "machine/hotfolder/HotFolderList.cfg";
 inline const Text CfgPlace = "hot/A/[P]/Folder.cfg";
 inline const Text PresetPlace = "user/ORX/JPData/.P/Presets/presets.xml";
 
-// A member function that sets a field.
 #define SETTER(name, field, ...)                                                                   \
     Scenario& name(const decltype(field)& value __VA_ARGS__)                                       \
     {                                                                                              \
@@ -24,13 +23,11 @@ inline const Text PresetPlace = "user/ORX/JPData/.P/Presets/presets.xml";
         return *this;                                                                              \
     }
 
-/// A hot folder's name, the lines about its template as if its name were A, and its icon's name, or
-/// the lines about that.
-struct FolderLog
+struct FolderLog // of a hot folder
 {
     Text name;
-    Text impose;
-    Text icon = "hf_folder";
+    Text impose;             // the lines about its template, as if its name were A
+    Text icon = "hf_folder"; // the name of its icon, or the lines about that
 };
 
 struct Scenario

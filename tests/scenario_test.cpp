@@ -81,16 +81,14 @@ Report Check(const Workstation& workstation, const std::vector<Text>& arguments)
     Text title; // the head and the sum are titles without lines
     for (Text line; std::getline(text, line);)
     {
-        if (!StartsWith(line, "  "))
-        {
-            title = line;
-            continue;
-        }
+        const Text name = Replaced(title, workstation.Expand("{hot}{/}"), "");
         if (StartsWith(line, "  change"))
             report.changed.insert(title + line.substr(0, line.find(": ")));
         report.problems += StartsWith(line, "  problem") ? 1 : 0;
-        report.lines +=
-            "\n" + Replaced(title, workstation.Expand("{hot}{/}"), "") + ":" + line.substr(1);
+        if (StartsWith(line, "  "))
+            report.lines += "\n" + name + ":" + line.substr(1);
+        else
+            title = line;
     }
     EXPECT_EQ(report.problems > 0 ? 2 : report.changed.empty() ? 0 : 1, run.status) << run.output;
     return report;

@@ -8,11 +8,13 @@
 #include <stdexcept>
 #include <string>
 
+namespace fs = std::filesystem;
+
 using Text = std::string;
 using Files = std::map<Text, Text>; // place -> text
 
 /// Empty if there is no such file.
-inline Text ReadFile(const std::filesystem::path& path)
+inline Text ReadFile(const fs::path& path)
 {
     std::ostringstream text;
     text << std::ifstream(path, std::ios::binary).rdbuf();
@@ -20,9 +22,9 @@ inline Text ReadFile(const std::filesystem::path& path)
 }
 
 /// Also creates the directories above the file.
-inline void WriteFile(const std::filesystem::path& path, const Text& text)
+inline void WriteFile(const fs::path& path, const Text& text)
 {
-    std::filesystem::create_directories(path.parent_path());
+    fs::create_directories(path.parent_path());
     if (!(std::ofstream(path, std::ios::binary) << text))
         throw std::runtime_error("cannot write " + path.string());
 }

@@ -1,16 +1,11 @@
 #!/usr/bin/env bash
+# tests/under_wine.sh KIT USER [ARGUMENT...]
 # Unpacks the trial's kit in a new Wine prefix, runs trial.cmd there as a person would, and prints what it writes. Before
-# that, trial.cmd has to refuse to run where the client seems to be installed.
-#
-#     tests/under_wine.sh KIT USER [ARGUMENT...]
-#
-# Another user than one's own needs root.
+# that, trial.cmd has to refuse to run where the client seems to be installed. Another user than one's own needs root.
 set -euo pipefail
-kit=$(realpath "$1")
-user=$2
+kit=$(realpath "$1") user=$2
 shift 2
-wine=/usr/lib/wine/wine64
-server=/usr/lib/wine/wineserver64
+wine=/usr/lib/wine/wine64 server=/usr/lib/wine/wineserver64
 home=$(mktemp -d)
 as_user() {
     (cd "$home" && setpriv --reuid="$user" --regid="$(id -g "$user")" --clear-groups \
@@ -24,16 +19,14 @@ as_user "$wine" wineboot --init 2>/dev/null
 as_user "$wine" reg add 'HKCU\Software\Wine\Drivers' /v Graphics /d null /f >/dev/null
 as_user "$server" -k
 (cd "$home/drive_c" && cmake -E tar xf "$kit" && mv FolderUpgrade-*-trial trial && chown -R "$user" trial)
+output=$home/drive_c/trial/trial.txt
 try() {
     outcome=0
     as_user "$wine" cmd /c 'C:\trial\trial.cmd' "$@" >/dev/null || outcome=$?
 }
 refuse() {
     try
-    if [ $outcome != 3 ] || ! grep -q "$1" "$home/drive_c/trial/trial.txt"; then
-        cat "$home/drive_c/trial/trial.txt"
-        exit 1
-    fi
+    if [ $outcome != 3 ] || ! grep -q "$1" "$output"; then cat "$output"; exit 1; fi
 }
 as_user "$wine" reg add 'HKLM\SOFTWARE\Vantorix\QZA' /v InstallPath /d kept /f >/dev/null
 refuse Vantorix
@@ -53,5 +46,5 @@ done
 as_user "$server" -k
 wait || true
 try "$@"
-tr -d '\r' <"$home/drive_c/trial/trial.txt"
+tr -d '\r' <"$output"
 exit $outcome

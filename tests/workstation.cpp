@@ -9,8 +9,6 @@
 #include <algorithm>
 #include <cstdlib>
 
-namespace fs = std::filesystem;
-
 namespace
 {
 

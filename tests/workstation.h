@@ -25,7 +25,7 @@
 
 #include <vector>
 
-inline constexpr bool IsWindows = std::filesystem::path::preferred_separator == '\\';
+inline constexpr bool IsWindows = fs::path::preferred_separator == '\\';
 inline constexpr const char* Separator = IsWindows ? "\\" : "/";
 inline constexpr const char* ProgramSuffix = IsWindows ? ".exe" : "";
 
@@ -48,13 +48,11 @@ class Workstation
     explicit Workstation(bool asOtherUser = false);
     ~Workstation();
     Workstation(const Workstation&) = delete;
-    Workstation& operator=(const Workstation&) = delete;
 
     /// Makes the files, and removes those of an earlier call.
     void LayOut(const Files& files);
-    /// Runs a program in the tool's folder until it ends, with limits of time and memory; one
-    /// source for each system. The variables are set only on Linux; it is ended after so many
-    /// milliseconds only on Windows, and not at all if they are 0.
+    /// Runs a program in the tool's folder until it ends, with limits of time and memory. The
+    /// variables are set only on Linux; only on Windows it is killed after so many ms, unless 0.
     RunResult Start(const Text& program, const std::vector<Text>& arguments,
                     const Files& variables = {}, int killAfter = 0) const;
     /// Every file but the programs with its text, every link, every directory and every attribute
@@ -62,39 +60,43 @@ class Workstation
     Files Snapshot() const;
     /// The text with everything in braces replaced, except for a link or a FIFO.
     Text Expand(Text text) const;
-    std::filesystem::path HostPath(const Text& place) const;
+    fs::path HostPath(const Text& place) const;
 
   private:
     void Put(const Text& place, const Text& text) const;
     void SetAttributes(const Text& place, const Text& letters) const;
 
     bool m_asOtherUser;
-    std::filesystem::path m_root;
-    std::map<Text, std::filesystem::path> m_dirs; // first part of a place -> directory
+    fs::path m_root;
+    std::map<Text, fs::path> m_dirs; // first part of a place -> directory
 };
 
 // What a workstation needs of the system; one source for each, in tests/linux and tests/windows.
 
 /// Whether this is Windows, but not the real one.
 bool IsWine();
-/// That of the programs to test. Windows: the test's own; elsewhere $FOLDER_UPGRADE_PROGRAMS, or
-/// the build's.
-std::filesystem::path ProgramDir();
+/// That of the programs. Windows: the test's own; elsewhere $FOLDER_UPGRADE_PROGRAMS, or the
+/// build's.
+fs::path ProgramDir();
 /// A new folder for everything on a workstation but the application data.
-std::filesystem::path NewRoot();
+fs::path NewRoot();
 /// The application data folder "user" or "machine". Windows: the account's or the machine's own.
-std::filesystem::path DataDir(const Text& name, const std::filesystem::path& root);
+fs::path DataDir(const Text& name, const fs::path& root);
 
 /// Windows only: replaces the last call's keys with those of the hives, whose text has no escapes.
 void SetRegistry(const Text& hives);
+/// Windows only: removes those keys; undoes what Refuse does; is the folder for all other files.
+void RemoveKeys();
+void AllowAll(const fs::path& folder);
+fs::path TrialDir();
 
 /// A link to a directory if there is one at the target.
-void MakeLink(const std::filesystem::path& target, const std::filesystem::path& link);
+void MakeLink(const fs::path& target, const fs::path& link);
 /// Removes links, not their targets.
-void RemoveTree(const std::filesystem::path& path);
+void RemoveTree(const fs::path& path);
 /// Not on Windows: makes everything in the folder another user's.
-void GiveAway(const std::filesystem::path& folder);
+void GiveAway(const fs::path& folder);
 /// X: it cannot be written to; 0: it cannot be accessed, a file on Windows because a program has it
 /// open alone; L: a directory cannot be listed. Under Wine, X and L are what the owner's
 /// permissions refuse. Until the next RemoveTree.
-void Refuse(const std::filesystem::path& path, char letter);
+void Refuse(const fs::path& path, char letter);

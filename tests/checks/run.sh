@@ -1,9 +1,6 @@
 #!/usr/bin/env bash
-# Runs one of the format and static checks, as a test:
-#
-#     tests/checks/run.sh CHECK BUILD_DIR
-#
-# CHECK is one of the names below; BUILD_DIR has the compile commands.
+# tests/checks/run.sh CHECK BUILD_DIR
+# Runs one of the format and static checks that are named below. BUILD_DIR has the compile commands.
 set -euo pipefail
 check=$1
 build=$(realpath "$2")

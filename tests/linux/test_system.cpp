@@ -4,9 +4,6 @@
 #include <sys/wait.h>
 #include <unistd.h>
 
-namespace fs = std::filesystem;
-
-// The text as one word for a shell.
 static Text Quoted(const Text& text)
 {
     return "'" + text + "' ";

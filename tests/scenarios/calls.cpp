@@ -5,8 +5,6 @@
 #include <chrono>
 #include <regex>
 
-namespace fs = std::filesystem;
-
 namespace
 {
 

@@ -2,7 +2,6 @@
 #include "migrate/install_locations.h"
 #include "platform/process_rights.h"
 #include "platform/system.h"
-#include "tests/windows/trial_machine.h"
 #include "tests/workstation.h"
 
 #include <gtest/gtest.h>
@@ -10,25 +9,20 @@
 
 #include <cstdio>
 
-namespace fs = std::filesystem;
-
 namespace
 {
 
 // Exit statuses beside 0 and 1, which are those of the tests.
 constexpr int BrokenOff = 2;
 constexpr int NotHere = 3;
+// In TrialDir, a file with the account whose trial is running, or was interrupted.
+const char* const MarkName = "account";
 
-// The last has the mark of this account's trial, while that is running or after it was interrupted.
+// Those of the scenarios; the last has the mark.
 std::vector<fs::path> Folders()
 {
     return {DataDir("machine", {}) / "hotfolder", DataDir("user", {}) / "ORX",
             DataDir("user", {}) / "ORX_Installers", TrialDir() / "work station", TrialDir()};
-}
-
-fs::path MarkFile()
-{
-    return TrialDir() / "account";
 }
 
 // Why the scenarios do not run; empty if they do.
@@ -47,7 +41,7 @@ Text WhyNot(int argc, char** argv)
         reasons += lookUp(ignored, source) ? there + source.name.utf8_string() + "\n" : "";
     for (const fs::path& folder : Folders())
         reasons += fs::exists(folder) ? there + folder.u8string() + "\n" : "";
-    return ReadFile(MarkFile()) == AccountName().utf8_string() ? "" : reasons;
+    return ReadFile(TrialDir() / MarkName) == AccountName().utf8_string() ? "" : reasons;
 }
 
 void RemoveTrial()
@@ -99,7 +93,7 @@ int main(int argc, char** argv)
     {
         HoldPrograms();
         RemoveTrial();
-        WriteFile(MarkFile(), AccountName().utf8_string());
+        WriteFile(TrialDir() / MarkName, AccountName().utf8_string());
         const int status = RUN_ALL_TESTS();
         RemoveTrial();
         const testing::UnitTest& all = *testing::UnitTest::GetInstance();

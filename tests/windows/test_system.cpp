@@ -1,7 +1,6 @@
 #include "platform/pinned_directory.h"
 #include "platform/started_process.h"
 #include "platform/system.h"
-#include "tests/windows/trial_machine.h"
 #include "tests/workstation.h"
 
 #include <wx/msw/registry.h>
@@ -9,8 +8,6 @@
 #include <algorithm>
 #include <regex>
 #include <share.h>
-
-namespace fs = std::filesystem;
 
 namespace
 {

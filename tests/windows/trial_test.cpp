@@ -4,8 +4,6 @@
 
 #include <chrono>
 
-namespace fs = std::filesystem;
-
 namespace
 {
 
