@@ -81,6 +81,8 @@ def passes(root, is_under_wine):
             return False
         parts = (("nobody", "*_AsOtherUser"), ("root", "-*_AsOtherUser:Sizes/*:OnlyOnWindows*"))
     else:
+        if run([root / "native/tests/unit_test"]):
+            return False
         parts = (("", "-Sizes/*:AtEachCall/*"), ("", "Sizes/*"), ("", "AtEachCall/*"))
     for user, tests in parts:
         output = run_tests(root, user, tests)

@@ -53,13 +53,15 @@ void CheckContent(const wxString& name, const RewrittenPreset& rewritten, Report
                                 "characters come out wrong"});
 }
 
-// The path as an XML parser reads it, for a look at the template; as it is if none could.
+// The path as an XML parser reads it, for a look at the template; unchanged if that would refuse
+// it.
 wxString Decoded(const wxString& path)
 {
     wxXmlDocument element;
     if (path.find('&') != wxString::npos && path.find('<') == wxString::npos)
         LoadXml("<p>" + path.utf8_string() + "</p>", FolderCfgLimits, element);
-    return element.IsOk() ? element.GetRoot()->GetNodeContent() : path;
+    const wxString decoded = element.IsOk() ? element.GetRoot()->GetNodeContent() : wxString();
+    return decoded.empty() ? path : decoded;
 }
 
 // Why a path of a preset that is rewritten stays although it leads into the folder being left.

@@ -18,7 +18,7 @@ namespace
 {
 
 const char* const From = "/old";
-const char* const To = "/new/template";
+const char* const To = "/old/new"; // below it
 
 void Check(bool holds, const char* promise)
 {

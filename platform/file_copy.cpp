@@ -35,5 +35,6 @@ bool IsCopy(const wxString& source, const PinnedDirectory& directory, const wxSt
     std::string found;
     return from.OpenForReading(source) == RegularFile::Status::Open &&
            to.OpenForReading(directory, name) == RegularFile::Status::Open &&
-           to.HasAttributesOf(from) && from.Read(wanted) && to.Read(found) && found == wanted;
+           to.HasAttributesOf(from) && to.Length() == from.Length() && from.Read(wanted) &&
+           to.Read(found) && found == wanted;
 }

@@ -82,7 +82,7 @@ bool RegularFile::TakeContent(const RegularFile& source)
     const std::int64_t newLength = source.Length();
     bool isDone =
         newLength >= 0 && (newLength <= oldLength || Reserve(oldLength, newLength - oldLength));
-    std::array<char, size_t{64} * 1024> piece{}; // it may be too long for the memory
+    std::array<char, size_t{64} * 1024> piece{}; // the file may be too long for the memory
     for (std::int64_t done = 0; isDone && done < newLength;)
     {
         const size_t count = source.ReadAt(done, piece.data(), piece.size());

@@ -1,4 +1,4 @@
-// A program that does not end by itself on the same day.
+// A program that runs for a day.
 #include <chrono>
 #include <thread>
 

@@ -22,7 +22,8 @@ struct Fault
 };
 
 // Between two of these calls, nothing changes on the disk.
-const Text Changing = "open64 pwrite64 fallocate64 ftruncate64 unlink chmod setxattr removexattr ";
+const Text Changing =
+    "open64 pwrite64 fallocate64 ftruncate64 unlink chmod fchmod setxattr removexattr ";
 
 // Two hot folders and two presets that are rewritten, and the same files elsewhere.
 Files FilesBefore()
@@ -35,12 +36,13 @@ Files FilesBefore()
                    {"hot/B/[P]/Folder.cfg", Replaced(Minimal(MovedFrom), "<HotFolder", lost)},
                    {"hot/B/Desktop.ini", "[.ShellClassInfo]\nIconFile=mine.ico\n[ViewState]\n"},
                    {"hot/B/Desktop.ini#", "RS"},
-                   {"user/ORX/JPData/P/Presets/presets.xml", Stored(MovedFrom)},
+                   {"user/ORX/JPData/P/Presets/presets.xml", "ORXImposeTemplate\">\"{previous}\""},
                    {"user/ORX/JPData/Q/Presets/presets.xml",
                     "\xEF\xBB\xBF" + Stored(MovedFrom) + Text(4000, 'x')},
                    {LogPlace, "an earlier run's\r\n"}};
     for (const auto& [place, text] : Files(files))
-        files["elsewhere/" + place] = text;
+        files[place] = files["elsewhere/" + place] = Replaced(text, "{previous}", "/p");
+    files[UserHive] = Hive(UserKey, "\"Path\"=\"/p\""); // so that a preset grows by more than half
     files["elsewhere/hot/B/Desktop.ini#"] = "";
     files["elsewhere/empty/other"] = "a hot folder without a private directory";
     return WorkstationBefore(Scenario("").Before(files));

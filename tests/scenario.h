@@ -45,6 +45,9 @@ struct Scenario
     Text shellCalls;
     std::optional<Text> report;
 
+    friend void PrintTo(const Scenario& /*scenario*/, std::ostream* /*stream*/)
+    {
+    } // its test has its name
     /// Files in addition to the usual ones, or in place of them. The usual ones are the log of an
     /// earlier run, the hives, a template in both template folders, an empty directory for presets,
     /// and HotFolderList.cfg, which lists every NAME of the places hot/NAME/... in order.
@@ -70,7 +73,6 @@ struct Scenario
     {
         return Before({{place, text}}).After(becomes.empty() ? Files() : Files{{place, becomes}});
     }
-    /// The command line arguments; {"I"} if not given.
     SETTER(Run, arguments, )
     /// For tests of refusals: root is refused nothing.
     SETTER(AsOtherUser, asOtherUser, = true)

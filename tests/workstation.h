@@ -85,10 +85,9 @@ fs::path DataDir(const Text& name, const fs::path& root);
 
 /// Windows only: replaces the last call's keys with those of the hives, whose text has no escapes.
 void SetRegistry(const Text& hives);
-/// Windows only: removes those keys; undoes what Refuse does; is the folder for all other files.
-void RemoveKeys();
-void AllowAll(const fs::path& folder);
-fs::path TrialDir();
+fs::path TrialDir();                   // Windows only; only an administrator can write there
+void RemoveKeys();                     // those of the last SetRegistry, also of another process
+void AllowAll(const fs::path& folder); // undoes what Refuse has done there
 
 /// A link to a directory if there is one at the target.
 void MakeLink(const fs::path& target, const fs::path& link);

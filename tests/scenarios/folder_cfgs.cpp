@@ -56,7 +56,6 @@ Scenario Encodings()
     return HotFolders(
                "EncodingsThatTheLibraryReadsWronglyStay",
                {{"Ascii", declared("='ASCII'", "x", "x")},
-                {"AsciiInUtf8OfAnotherName", declared("='UTF8'", "x", "x")},
                 {"AsciiInLatin1", declared("='latin1'", "x", "x")},
                 {"AsciiInShiftJis", declared("='Shift_JIS'", "x", "x")},
                 {"Windows1252", declared("='windows-1252'", "\x80\xE4", "€ä")},
@@ -145,7 +144,11 @@ SCENARIOS(FolderCfgs)
                    {{"Empty", {}},
                     {"Truncated", {Data("foreign.cfg", MovedFrom).substr(0, 700)}},
                     {"WithoutADescription",
-                     {Replaced(Written(MovedTo), " description=\"\"", ""), "", Found(MovedTo)}}})
+                     {Replaced(Written(MovedTo), " description=\"\"", ""), "", Found(MovedTo)}},
+                    {"WithoutADescriptionButDisabled",
+                     {Replaced(Replaced(Written(MovedTo), " description=\"\"", ""), "Enable=\"1\"",
+                               "Enable=\"0\""),
+                      "", Found(MovedTo)}}})
             .LibraryReports()
             .IsReported(R"(
 Empty: problem  Folder.cfg: damaged (line 1: no element found); it stays as it is, and the folder shows as disabled

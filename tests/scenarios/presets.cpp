@@ -1,4 +1,3 @@
-// The job presets.
 #include "tests/scenarios/texts.h"
 
 namespace
@@ -36,7 +35,6 @@ SCENARIOS(Presets)
                       Stored("{default}") + near)
             .Log({}, PresetLine(Updated)),
         Scenario("AnEmptyPresetIsUpdated").File(PresetPlace, "").Log({}, PresetLine(Updated)),
-        updated("AByteOrderMarkGoes", "\xEF\xBB\xBF" + from, to, "{presetmoves}"),
         updated("AByteOrderMarkAloneGoes", "\xEF\xBB\xBF", "",
                 "change   .P{xml}: loses its byte-order mark"),
         updated("LineEndsBecomeThoseOfTheSystem", "\xEF\xBB\xBF<p>\n</p>", "<p>" + eol + "</p>",

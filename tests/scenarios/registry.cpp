@@ -29,10 +29,12 @@ SCENARIOS(Registry)
             .File(CfgPlace, "<H><ImposeSetting/></H>")
             .Log({{"A", Found(""), Disabled}}, NoDefault + NoPrevious)
             .IsReported(R"(
+A: note     no copy of the icon to replace: hf_folder_disabled.ico
 Job presets: problem  registry value Path in HKEY_CURRENT_USER\SOFTWARE\Wow6432Node\HF or \SOFTWARE\HF: there is no such key{nothing}
 Job presets: problem  registry value InstallPath in HKEY_LOCAL_MACHINE\SOFTWARE\Wow6432Node\Vantorix\QZA or \SOFTWARE\Vantorix\QZA: there is no such key{nothing})"),
         Both("WithoutADefaultFolderNothingMoves", MovedFrom, {{MachineHive, Hive(MachineKey, "")}})
-            .Log({{"A", found + NoDefault}}, NoDefault),
+            .Before(DoneFolder("B", Written("{app}{/}B")))
+            .Log({{"A", found + NoDefault}, {"B", Found("{app}{/}B")}}, NoDefault),
         Both("WithoutAPreviousFolderNothingMovesBack", MovedTo, {{UserHive, Hive(UserKey, "")}})
             .Run({"U"})
             .Log({{"A", foundNew + NoPreviousTo}}, NoPrevious)
@@ -53,8 +55,11 @@ A: problem  stays in the folder being left (the folder being installed is unknow
             .After({{CfgPlace, Written(MovedTo)}, {PresetPlace, Stored(MovedTo)}})
             .Log({{"A", found}}, updated),
         WithPath("ATextOf258CharactersIsTooLong", Text(258, 'x'))
-            .Log({{"A", found + NoPrevious}}, NoPrevious)
-            .IsReported("A: problem  {Path}: longer than 257 characters{nothing}"),
+            .Before({{MachineHive, Removed}})
+            .Log({{"A", found + NoPrevious}}, NoDefault + NoPrevious)
+            .IsReported(R"(
+A: problem  {Path}: longer than 257 characters{nothing}
+Job presets: problem  registry value InstallPath in HKEY_LOCAL_MACHINE\SOFTWARE\Wow6432Node\Vantorix\QZA or \SOFTWARE\Vantorix\QZA: there is no such key{nothing})"),
         WithPath("ATextOf257CharactersIsRead", Text(257, 'x')).Log({{"A", found}}, updated),
         Both("ANumberAsTheNewFolderMovesNothing", MovedFrom,
              {{MachineHive, Hive(MachineKey, "\"InstallPath\"=dword:00000001")}})

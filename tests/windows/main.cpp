@@ -1,5 +1,5 @@
 // Runs the scenarios on a machine where nothing can be lost.
-#include "migrate/install_locations.h"
+#include "migrate/template_folders.h"
 #include "platform/process_rights.h"
 #include "platform/system.h"
 #include "tests/workstation.h"
@@ -35,13 +35,16 @@ Text WhyNot(int argc, char** argv)
                "nothing on this machine matters, add --this-machine-is-disposable.\n";
     const Text there = "The hot folder client may be installed: there is ";
     Text reasons;
-    wxFileName ignored;
-    ValueSource source;
-    for (const auto lookUp : {GetDefaultImposeTemplatePath, GetPreviousImposeTemplatePath})
-        reasons += lookUp(ignored, source) ? there + source.name.utf8_string() + "\n" : "";
+    const bool isOurs =
+        !AccountName().empty() && ReadFile(TrialDir() / MarkName) == AccountName().utf8_string();
+    if (isOurs)
+        RemoveKeys();
+    TemplateFolders values(true);
+    for (const TemplateFolder& value : {values.Default(), values.Previous()})
+        reasons += value.isKnown ? there + value.source.name.utf8_string() + "\n" : "";
     for (const fs::path& folder : Folders())
-        reasons += fs::exists(folder) ? there + folder.u8string() + "\n" : "";
-    return ReadFile(TrialDir() / MarkName) == AccountName().utf8_string() ? "" : reasons;
+        reasons += fs::exists(folder) && !isOurs ? there + folder.u8string() + "\n" : "";
+    return reasons;
 }
 
 void RemoveTrial()
@@ -71,18 +74,16 @@ void HoldPrograms()
 
 fs::path TrialDir()
 {
-    return DataDir("machine", {}) / "FolderUpgrade trial";
+    return fs::path(_wgetenv(L"ProgramFiles")) / "FolderUpgrade trial";
 }
 
 int main(int argc, char** argv)
 {
     testing::InitGoogleTest(&argc, argv);
     std::setvbuf(stdout, nullptr, _IONBF, 0);
-    std::printf("%s\nAccount %s, %s\nRedirection policy: %s\n\n",
+    std::printf("%s\nAccount %s\nLinks of others are%s refused\n\n",
                 wxGetOsDescription().utf8_str().data(), AccountName().utf8_str().data(),
-                IsElevated() ? "elevated" : "not elevated",
-                RefusesLinksOfOthers() ? "links of others are refused"
-                                       : "unknown to this system, or not in force");
+                RefusesLinksOfOthers() ? "" : " not");
     const Text whyNot = WhyNot(argc, argv);
     if (!whyNot.empty())
     {

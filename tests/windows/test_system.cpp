@@ -38,9 +38,10 @@ bool CloseBoxes(DWORD process)
 }
 
 // Runs a command of the system, not a program of that name from the kit's folder.
-void RunCommand(const Text& command)
+int RunCommand(const Text& command)
 {
-    _wsystem(fs::u8path("cd /d %SystemRoot%\\System32 & " + command + " >nul 2>nul").c_str());
+    return _wsystem(
+        fs::u8path("cd /d %SystemRoot%\\System32 & " + command + " >nul 2>nul").c_str());
 }
 
 Text Quoted(const fs::path& path)
@@ -112,7 +113,7 @@ void RemoveKeys()
 {
     std::istringstream keys(ReadFile(KeyFile()));
     for (Text key; std::getline(keys, key);)
-        wxRegKey(wxString::FromUTF8(key)).DeleteSelf();
+        wxRegKey(key).DeleteSelf();
     fs::remove(KeyFile());
 }
 
@@ -121,23 +122,24 @@ void SetRegistry(const Text& hives)
     const std::regex form(R"(^\[(\w+\\SOFTWARE\\(Wow6432Node\\)?\w+))", std::regex::icase);
     RemoveKeys();
     Text keys;
-    Text text;
+    Text text = "Windows Registry Editor Version 5.00\r\n";
     std::istringstream lines(hives);
     for (Text line; std::getline(lines, line); text += "\n")
     {
         std::smatch key;
-        std::regex_search(line, key, form);
-        text += key.empty() ? Replaced(line, "\\", "\\\\") : line;
-        keys += key.empty() ? "" : key.str(1) + "\n";
-        if (!key.empty() && wxRegKey(wxString::FromUTF8(key.str(1))).Exists())
-            throw std::runtime_error("not the trial's: " + key.str(1));
+        const bool isKey = std::regex_search(line, key, form);
+        if (isKey && wxRegKey(key.str(1)).Exists())
+            throw std::runtime_error("not the trial's: " + line);
+        keys += isKey ? key.str(1) + "\n" : "";
+        if (!StartsWith(line, "Windows"))
+            text += isKey ? line : Replaced(line, "\\", "\\\\");
     }
     WriteFile(KeyFile(), keys);
     const fs::path file = TrialDir() / "hives.reg";
     const std::wstring units = L"\uFEFF" + fs::u8path(text).wstring();
     WriteFile(file, Text(reinterpret_cast<const char*>(units.data()), 2 * units.size()));
-    if (!hives.empty())
-        RunCommand("reg import" + Quoted(file));
+    if (!keys.empty() && RunCommand("reg import" + Quoted(file)) != 0)
+        throw std::runtime_error("reg import refuses " + text);
 }
 
 RunResult Workstation::Start(const Text& program, const std::vector<Text>& arguments,
@@ -196,7 +198,7 @@ void AllowAll(const fs::path& folder)
     if (!fs::exists(folder))
         return;
     IsWine() ? RunUnix("chmod -R u+rwX" + UnixPath(folder))
-             : RunCommand("icacls" + Quoted(folder) + " /reset /T /C /Q");
+             : static_cast<void>(RunCommand("icacls" + Quoted(folder) + " /reset /T /C /Q"));
 }
 
 void RemoveTree(const fs::path& path)
