@@ -1,6 +1,5 @@
-// A stored file with arbitrary bytes. As a Folder.cfg: what becomes of it can be read again, with
-// nothing changed but the template's path, and is the same after a move back and a second move. As
-// a job preset: only the template paths in the folder change.
+// Arbitrary bytes. As a Folder.cfg: what becomes of it can be read again, and is the same after a
+// move back and a second move. As a job preset: only the template paths in the folder change.
 #include "migrate/preset_text.h"
 #include "migrate/template_move.h"
 #include "store/folder_cfg_format.h"

@@ -3,7 +3,6 @@
 # Reads the import tables of Windows programs. Windows loads what they name before any line of the program runs, and
 # looks beside the program first, except for the DLLs below.
 set -euo pipefail
-export LC_ALL=C
 
 # Windows always loads KnownDLLs from its own directory; and comctl32, if the manifest asks for version 6.
 known='advapi32|combase|comctl32|comdlg32|gdi32|imagehlp|imm32|kernel32|msctf|msvcrt|normaliz|nsi'

@@ -73,29 +73,24 @@ class Workstation
 
 // What a workstation needs of the system; one source for each, in tests/linux and tests/windows.
 
-/// Whether this is Windows, but not the real one.
-bool IsWine();
-/// That of the programs. Windows: the test's own; elsewhere $FOLDER_UPGRADE_PROGRAMS, or the
-/// build's.
-fs::path ProgramDir();
-/// A new folder for everything on a workstation but the application data.
-fs::path NewRoot();
+bool IsWine();         // Windows, but not the real one
+fs::path ProgramDir(); // Windows: the test's own; else $FOLDER_UPGRADE_PROGRAMS, or the build's
+fs::path NewRoot();    // a new folder for everything on a workstation but the application data
 /// The application data folder "user" or "machine". Windows: the account's or the machine's own.
 fs::path DataDir(const Text& name, const fs::path& root);
-
-/// Windows only: replaces the last call's keys with those of the hives, whose text has no escapes.
-void SetRegistry(const Text& hives);
-fs::path TrialDir();                   // Windows only; only an administrator can write there
-void RemoveKeys();                     // those of the last SetRegistry, also of another process
-void AllowAll(const fs::path& folder); // undoes what Refuse has done there
-
+void GiveAway(const fs::path& folder); // makes everything another user's; not on Windows
+void RemoveTree(const fs::path& path); // links, but not their targets
 /// A link to a directory if there is one at the target.
 void MakeLink(const fs::path& target, const fs::path& link);
-/// Removes links, not their targets.
-void RemoveTree(const fs::path& path);
-/// Not on Windows: makes everything in the folder another user's.
-void GiveAway(const fs::path& folder);
 /// X: it cannot be written to; 0: it cannot be accessed, a file on Windows because a program has it
 /// open alone; L: a directory cannot be listed. Under Wine, X and L are what the owner's
 /// permissions refuse. Until the next RemoveTree.
 void Refuse(const fs::path& path, char letter);
+
+// The rest on Windows only.
+
+/// Replaces the last call's keys with those of the hives, whose text has no escapes.
+void SetRegistry(const Text& hives);
+fs::path TrialDir();                   // only an administrator can write there
+void RemoveKeys();                     // those of the last SetRegistry, also of another process
+void AllowAll(const fs::path& folder); // undoes what Refuse has done there
