@@ -37,7 +37,7 @@ struct Scenario
     std::vector<Text> arguments = {"I"};
     Files after;
     Text log; // empty for that of the earlier run
-    bool libraryReports = false;
+    long libraryReports = 0;
     bool asOtherUser = false;
     Text notOnWindows;
     Text notUnderWine;
@@ -85,8 +85,8 @@ struct Scenario
     /// After Before and Run: the log of a run with these hot folders and these lines about the
     /// presets.
     Scenario& Log(const std::vector<FolderLog>& folders = {}, const Text& presets = "");
-    /// The library itself reports an error, on Windows in a message box.
-    SETTER(LibraryReports, libraryReports, = true)
+    /// The library itself reports so many errors, on Windows in a message box.
+    SETTER(LibraryReports, libraryReports, = 1)
 
     /// After Before: what FolderUpgradeCheck reports before the run, each line after its title;
     /// only {hot}{/} of a hot folder's title is left out. An * is the account or the system's own

@@ -149,7 +149,7 @@ SCENARIOS(FolderCfgs)
                      {Replaced(Replaced(Written(MovedTo), " description=\"\"", ""), "Enable=\"1\"",
                                "Enable=\"0\""),
                       "", Found(MovedTo)}}})
-            .LibraryReports()
+            .LibraryReports(4)
             .IsReported(R"(
 Empty: problem  Folder.cfg: damaged (line 1: no element found); it stays as it is, and the folder shows as disabled
 Truncated: problem  Folder.cfg: damaged (line 1: unclosed token); it stays as it is, and the folder shows as disabled
@@ -195,7 +195,7 @@ SCENARIOS(Refusals)
     const Text icon = Replaced(Icon, "A", "B");
     return {
         Refused("WhatCannotBeReadStays",
-                {{CfgPlace, cfg}, {"hot/B/[P]/Folder.cfg", cfg}, {"hot/C/[P]/Folder.cfg", cfg}})
+                {{CfgPlace, cfg}, {"hot/B/[P]/Folder.cfg", cfg}, {"hot/C/[P]/Folder.cfg", cfg}}, 3)
             .Before({{CfgPlace + "#", "0"}, {"hot/B/[P]#", "0"}, {"hot/C#", "0"}})
             .Before({{PresetPlace, preset}, {PresetPlace + "#", "0"}})
             .Log({{"A", "", Disabled}, {"B", NoCfg, Disabled}, {"C", NoCfg, Disabled}},
@@ -205,7 +205,7 @@ A: problem  Folder.cfg: can't open file*
 B: problem  [_ORX_HotFolder_]: cannot be entered
 C: problem  the hot folder cannot be entered
 Job presets: problem  .P{xml}: cannot be opened for reading (can't open file*)"),
-        Refused("WhatCannotBeWrittenStays", {{CfgPlace + "#", "R"}, {PresetPlace + "#", "R"}})
+        Refused("WhatCannotBeWrittenStays", {{CfgPlace + "#", "R"}, {PresetPlace + "#", "R"}}, 2)
             .Before({{CfgPlace, cfg}, {PresetPlace, preset}})
             .Log({{"A", found}}, PresetLine("Unable to open preset.xml for write : "))
             .IsReported(R"(

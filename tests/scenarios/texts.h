@@ -90,9 +90,9 @@ inline Files DoneFolder(const Text& name, const Text& cfg, const Text& icon = "h
 }
 
 /// A scenario in which something is refused to a user who is not root, which the library reports.
-inline Scenario Refused(const Text& whatHappens, const Files& files)
+inline Scenario Refused(const Text& whatHappens, const Files& files, long errors = 1)
 {
-    return Scenario(whatHappens, files).AsOtherUser().LibraryReports();
+    return Scenario(whatHappens, files).AsOtherUser().LibraryReports(errors);
 }
 
 // Log lines; {icons} is where the icons of the run's direction come from.
