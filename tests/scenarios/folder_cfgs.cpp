@@ -119,7 +119,8 @@ SCENARIOS(FolderCfgs)
                    "<FilterSetting>\n \nt<x>u<y/>v</x><![CDATA[<w>]]>z<!--c--></FilterSetting>"),
                Written(MovedTo, mixed), found, "hf_folder"}},
              {"IndentedOnceOnly",
-              {Written(MovedFrom, mixed), Written(MovedTo, mixed), found, "hf_folder"}}}),
+              {Written(MovedFrom, mixed), Written(MovedTo, mixed), found, "hf_folder"}}})
+            .Before({{"hot/Foreign/[P]/Folder.cfg#", "HS"}}),
         HotFolders("OnlyATemplateInTheFolderBeingLeftMoves",
                    {{"ATemplateInASubfolder", path("{previous}{/}Sub{/}x")},
                     {"ATemplateElsewhere", path("{previous}2{/}x")},
@@ -135,11 +136,6 @@ SCENARIOS(FolderCfgs)
             .Before({{UserHive, Hive(UserKey, "\"Path\"=\"{/}{/}host{/}share{/}old\"")}}),
         HotFolders("ATemplateInARelativeFolderMoves", {{"A", path("x{/}y{/}B", "{default}{/}B")}})
             .Before({{UserHive, Hive(UserKey, "\"Path\"=\"x{/}y\"")}}),
-        Scenario("HiddenAndSystemFilesAreWrittenAndKeepTheirAttributes",
-                 {{CfgPlace + "#", "HS"}, {PresetPlace + "#", "HS"}})
-            .File(CfgPlace, Written(MovedFrom), Written(MovedTo))
-            .File(PresetPlace, Stored(MovedFrom), Stored(MovedTo))
-            .Log({{"A", found}}, PresetLine(Updated)),
         HotFolders("DamagedFolderCfgsStayAndShowAsDisabled",
                    {{"Empty", {}},
                     {"Truncated", {Data("foreign.cfg", MovedFrom).substr(0, 700)}},
@@ -226,10 +222,10 @@ B: change   Desktop.ini: new
 B: change   hot folder: attributes none -> SYSTEM
 B: note     no Folder.cfg)"),
         Refused("AReadOnlyLogStays", {{LogPlace + "#", "R"}})
-            .File(CfgPlace, cfg, Written(MovedTo))
+            .File(PresetPlace, preset, Stored(MovedTo))
             .IsReported(R"(
 Workstation: problem  there will be no run log: can't open file*
-A: {moves})"),
+Job presets: {presetmoves})"),
         Refused("AnUnreadableListIsEmptyAndAClosedPresetFolderSkipped",
                 {{ListPlace + "#", "0"}, {JobPresets + "/.P#", "0"}})
             .File(PresetPlace, preset)

@@ -27,7 +27,7 @@ SCENARIOS(Presets)
     const Text utf8 = "\nJob presets: change   .P{xml}: comes out as UTF-8";
     const Text eol = IsWindows ? "\r\n" : "\n";
     return {
-        Scenario("EveryPathInTheFolderMoves")
+        Scenario("EveryPathInTheFolderMoves", {{PresetPlace + "#", "HS"}})
             .File(PresetPlace,
                   "\r\n" + from + near + "\r\n" + Stored("{previous}{/}Sub{/}x") +
                       Stored("{previous}") + near,

@@ -52,8 +52,9 @@ A: problem  stays in the folder being left (the folder being installed is unknow
                 {{MachineHive, Hive(MachineKey, "\"InstallPath\"=\"x\"\r\n[HKEY_LOCAL_"
                                                 "MACHINE\\SOFTWARE\\Wow6432Node\\Vantorix\\QZA]\r\n"
                                                 "\"InstallPath\"=\"{app}\"")}})
-            .After({{CfgPlace, Written(MovedTo)}, {PresetPlace, Stored(MovedTo)}})
-            .Log({{"A", found}}, updated),
+            .File(CfgPlace, Written(""))
+            .After({{PresetPlace, Stored(MovedTo)}})
+            .Log({{"A", Found("")}}, updated),
         WithPath("ATextOf258CharactersIsTooLong", Text(258, 'x'))
             .Before({{MachineHive, Removed}})
             .Log({{"A", found + NoPrevious}}, NoDefault + NoPrevious)
