@@ -21,7 +21,7 @@ Scenario Gaps()
     std::map<Text, HotFolder> folders;
     for (size_t gap = 0; gap <= chain.size(); ++gap)
     {
-        const size_t row = gap < 14 ? 0 : gap - 14;
+        const size_t row = gap < 14 ? 0 : (gap - 14) % std::size(numbers);
         Text attributes = "<HotFolder server_version='" + numbers[row] + "'";
         Text written = MinimalWritten(MovedTo);
         for (size_t i = 0; i < chain.size(); ++i)
