@@ -14,7 +14,7 @@ Text Cfg(const Text& enabled)
 // A hot folder for each state, with the name of its icon.
 Scenario States(const Text& name, const Text& letter)
 {
-    // Its icon, Enable, and a place; a directory of the file's name does not count.
+    // Its icon (in the order of the list), Enable, and a place; a directory there does not count.
     using State = std::array<Text, 3>;
     const bool isUpgrade = letter == "I";
     Scenario scenario(name);
