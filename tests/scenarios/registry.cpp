@@ -119,6 +119,7 @@ Job presets: change   .P{xml}: {default}{/}Booklet.tpl -> {default}{/}template{/
             .Before(DoneFolder("B", Written("{previous}{/}Sub{/}T")))
             .Before(DoneFolder("C", Written("{hot}{/}C{/}D{/}T")))
             .Before(DoneFolder("D", Written("{previous}{/}.{/}T")))
+            .Before(DoneFolder("E", Written("{/}{/}host{/}share{/}T")))
             .Before({{"hot/C/D/", "{link:elsewhere/d}"}, {"default/D/", "{link:elsewhere/d}"}})
             .Before({{"elsewhere/d/T", ""}})
             .File(PresetPlace, Stored("{default}{/}D{/}T") + Stored("{hot}{/}..{/}Vorige 版{/}T") +
@@ -130,6 +131,7 @@ A: problem  no template at {default}{/}none
 B: problem  stays in the folder being left (in a sub-folder): {previous}{/}Sub{/}T
 C: note     not looked at: {hot}{/}C{/}D{/}T
 D: problem  stays in the folder being left (its last folder is a dot): {previous}{/}.{/}T
+E: note     not looked at: {/}{/}host{/}share{/}T
 Job presets: problem  .P{xml}: no template at {default}{/}<A
 Job presets: problem  .P{xml}: no template at {default}{/}&none;
 Job presets: problem  .P{xml}: stays in the folder being left (stored as XML): {hot}{/}..{/}Vorige 版{/}&
