@@ -114,7 +114,8 @@ A: note     no Folder.cfg)"),
         Scenario("FoldersOfAnotherUserAndPresetsThatCannotBeListed",
                  DoneFolder("A", "<H/>", Disabled))
             .Before(DoneFolder("B", "<H/>", Disabled))
-            .Before({{Ini, Removed}, {Ini + "#", Removed}, {JobPresets + "#", "L"}})
+            .Before({{Ini, Removed}, {Ini + "#", Removed}})
+            .Before({{JobPresets + "#", "L"}, {PresetPlace, ""}})
             .Before({{"hot/A#", "SX"}, {"hot/B#", "X"}})
             .AsOtherUser()
             .NotUnderWine("Wine lets every user list a directory")
