@@ -16,6 +16,6 @@ std::optional<FailedCall> CopyOver(const wxString& source, const PinnedDirectory
 /// Whether CopyOver could read the source and write the destination. Changes nothing.
 bool MayCopyOver(const wxString& source, const PinnedDirectory& directory, const wxString& name);
 
-/// Whether the destination already has the source's content and attributes. False if the content is longer
-/// than LongestFile.
+/// Whether the destination already has the source's content and attributes. False if the content is
+/// longer than LongestFile.
 bool IsCopy(const wxString& source, const PinnedDirectory& directory, const wxString& name);
