@@ -1,7 +1,7 @@
 #!/usr/bin/env python3
 """Runs both builds on random workstations, and compares what they leave and what FolderUpgradeCheck says.
 
-    bench/parity.py [COUNT [SEED]]
+    bench/parity.py [COUNT [FIRST]]
 
 COUNT (100) workstations are laid out twice by one generator: for the programs of the preset "native", and for those of
 the preset "windows" under Wine. Both presets have to be built. What differs by docs/development.md is left out or
@@ -126,7 +126,7 @@ def outcome(station, switch):
 
 
 def main():
-    count, seed = (int(text) for text in (sys.argv[1:] + ["100", "1"][len(sys.argv) - 1:])[:2])
+    count, first = (int(text) for text in (sys.argv[1:] + ["100", "1"][len(sys.argv) - 1:])[:2])
     different = moved = 0
     with tempfile.TemporaryDirectory() as scratch:
         stations = {"native": lay_out.Workstation(f"{scratch}/native"), "windows": lay_out.WineWorkstation(f"{scratch}/wine")}
@@ -137,7 +137,7 @@ def main():
                     shutil.copy(program, station.root / "tool")
             for folder in ("tool", "tool/BundleIcons"):
                 shutil.copytree(lay_out.ICONS, station.root / folder, dirs_exist_ok=True)
-        for number in range(seed, seed + count):
+        for number in range(first, first + count):
             outcomes = []
             for station in stations.values():
                 rng = random.Random(number)
@@ -149,11 +149,11 @@ def main():
             names = [name for name in sorted(native.keys() | windows.keys()) if native.get(name, 0) != windows.get(name, 0)]
             different += bool(names)
             for name in names:
-                print(f"seed {number}, {name}")
+                print(f"number {number}, {name}")
                 for preset, here, there in (("native", native, windows), ("windows", windows, native)):
                     print(f"  {preset}: ", [line for line in here.get(name) or [] if line not in (there.get(name) or [])])
         stations["windows"].close()
-    print(f"{count} workstations, seeds from {seed}: {different} different; a template moved on {moved}")
+    print(f"{count} workstations, from number {first} on: {different} different; a template moved on {moved}")
     return different > 0
 
 

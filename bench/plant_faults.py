@@ -1,11 +1,11 @@
 #!/usr/bin/env python3
 """Plants small faults in a copy of the product, one at a time, and shows which of them the tests find.
 
-    bench/plant_faults.py [NUMBER [SEED]]
+    bench/plant_faults.py [NUMBER [DRAW]]
 
 Faults are planted in the .cpp files of every module that is shipped; those in platform/windows are looked for under
 Wine. A fault counts as found if a test fails twice, and is replaced by another one if it does not compile. The same
-seed gives the same faults, as long as the sources are the same. A survivor is either a missing test or a fault that
+draw gives the same faults, as long as the sources are the same. A survivor is either a missing test or a fault that
 changes nothing. What fuzzing and the trial of the installers would find is not counted.
 """
 import os
@@ -142,11 +142,11 @@ def plant_all(root, drawn, wanted):
 
 
 def main():
-    wanted, seed = (int(text) for text in (sys.argv[1:] + ["150", "1"][len(sys.argv) - 1:])[:2])
+    wanted, draw = (int(text) for text in (sys.argv[1:] + ["150", "1"][len(sys.argv) - 1:])[:2])
     drawn = sorted(faults())
-    random.Random(seed).shuffle(drawn)
+    random.Random(draw).shuffle(drawn)
     with tempfile.TemporaryDirectory() as root:
-        print(f"{wanted} faults, seed {seed}", flush=True)
+        print(f"{wanted} faults, draw {draw}", flush=True)
         print(plant_all(pathlib.Path(root), drawn, wanted))
 
 
