@@ -42,7 +42,7 @@ std::vector<Call> Calls()
     const Files stays = {{PresetPlace, Stored(MovedFrom)}};
     const Text manyFolders = "<l>" + Times(200000, "<HotFolder path='/missing/#'/>") + "</l>";
     return {
-        {Moving("AllIsDoneAndTheLogFolderIsMade", {{LogPlace, Removed}}), 0},
+        {Moving("AllIsDoneAndTheLogFolderIsMade", {{LogPlace, Removed}}), 0, "s, 1 note\n"},
         {Moving("TheWayBack", {{CfgPlace, Written(MovedTo)}})
              .File(PresetPlace, Stored(MovedTo), Stored(MovedFrom))
              .Run({"u", "--limit", "600"}),
