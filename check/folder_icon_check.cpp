@@ -37,13 +37,17 @@ void CheckAttributes(const wxString& name, const wxString& path, const Attribute
 }
 
 // Read-only is removed before the keys are written, so it stops nobody who may change attributes.
-bool MayWriteIni(const HotFolder& folder)
+std::optional<FailedCall> WhyNotWritten(const HotFolder& folder)
 {
     const wxString path = folder.directory.Reach(DesktopIniName);
-    if ((GetFileAttributesW(path.wc_str()) & FILE_ATTRIBUTE_READONLY) != 0)
-        return MayChangeAttributes(path);
+    const bool isReadOnly = (GetFileAttributesW(path.wc_str()) & FILE_ATTRIBUTE_READONLY) != 0;
     RegularFile ini;
-    return ini.OpenForUpdate(folder.directory, DesktopIniName) == RegularFile::Status::Open;
+    const auto status = isReadOnly && MayChangeAttributes(path)
+                            ? ini.OpenForReading(folder.directory, DesktopIniName)
+                            : ini.OpenForUpdate(folder.directory, DesktopIniName);
+    if (status == RegularFile::Status::Open)
+        return {};
+    return ini.GetFailure();
 }
 
 wxString KeyNames(const std::vector<DesktopIniKey>& keys)
@@ -68,10 +72,14 @@ void CheckDesktopIni(const HotFolder& folder, const wxString& iconName, Report& 
             "Desktop.ini: cannot be created, because the hot folder cannot be written to");
     else if (change.kind == Kind::Create)
         report.Change("Desktop.ini: new");
-    else if (change.kind == Kind::NotReadable || (!change.keys.empty() && !MayWriteIni(folder)))
-        report.Problem("Desktop.ini: cannot be opened for reading and writing");
-    else if (!change.keys.empty())
-        report.Change("Desktop.ini: " + KeyNames(change.keys));
+    else if (change.kind == Kind::NotReadable || !change.keys.empty())
+    {
+        if (const auto failure = WhyNotWritten(folder))
+            report.Problem("Desktop.ini: cannot be opened for reading and writing" +
+                           failure->Reason());
+        else
+            report.Change("Desktop.ini: " + KeyNames(change.keys));
+    }
     if (change.kind != Kind::Create)
         CheckAttributes("Desktop.ini", folder.directory.Reach(DesktopIniName), change.ini, report);
     CheckAttributes("hot folder", path, change.folder, report);
@@ -92,8 +100,8 @@ void CheckFolderIcon(HotFolder& folder, TemplateCheck& check)
             "the icons being installed are not there, so icons are left out of this check");
     else if (copy.outcome == IconCopy::Outcome::NoSource)
         report.ProblemOnce("source icon missing: " + copy.source);
-    else if (!MayCopyOver(copy.source, folder.privateDir, copy.name))
-        report.Problem(copy.name + ": cannot be replaced (read-only, in use, or access denied)");
+    else if (const auto failure = WhyNotCopied(copy.source, folder.privateDir, copy.name))
+        report.Problem(copy.name + ": cannot be replaced with " + copy.source + failure->Reason());
     else if (!IsCopy(copy.source, folder.privateDir, copy.name))
         report.Change(copy.name);
     if (copy.outcome == IconCopy::Outcome::Replaces)

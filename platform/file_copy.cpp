@@ -1,5 +1,7 @@
 #include "platform/file_copy.h"
 
+#include "platform/access_rights.h"
+
 std::optional<FailedCall> CopyOver(const wxString& source, const PinnedDirectory& directory,
                                    const wxString& name)
 {
@@ -16,15 +18,19 @@ std::optional<FailedCall> CopyOver(const wxString& source, const PinnedDirectory
     return {};
 }
 
-bool MayCopyOver(const wxString& source, const PinnedDirectory& directory, const wxString& name)
+std::optional<FailedCall> WhyNotCopied(const wxString& source, const PinnedDirectory& directory,
+                                       const wxString& name)
 {
     RegularFile from;
     RegularFile to;
     if (from.OpenForReading(source) != RegularFile::Status::Open)
-        return false;
+        return from.GetFailure();
     const RegularFile::Status status = to.OpenForUpdate(directory, name);
-    return status == RegularFile::Status::Open ||
-           (status == RegularFile::Status::Refused && RegularFile::MayReplace(directory));
+    if (status == RegularFile::Status::Open ||
+        (status == RegularFile::Status::Refused && RegularFile::CanReplace &&
+         MayCreateIn(directory.Reach({}))))
+        return {};
+    return to.GetFailure();
 }
 
 bool IsCopy(const wxString& source, const PinnedDirectory& directory, const wxString& name)

@@ -13,8 +13,9 @@
 std::optional<FailedCall> CopyOver(const wxString& source, const PinnedDirectory& directory,
                                    const wxString& name);
 
-/// Whether CopyOver could read the source and write the destination. Changes nothing.
-bool MayCopyOver(const wxString& source, const PinnedDirectory& directory, const wxString& name);
+/// Why CopyOver could not open the source or the destination; nothing if it can. Changes nothing.
+std::optional<FailedCall> WhyNotCopied(const wxString& source, const PinnedDirectory& directory,
+                                       const wxString& name);
 
 /// Whether the destination already has the source's content and attributes. False if the content is
 /// longer than LongestFile.

@@ -1,7 +1,5 @@
 #include "platform/regular_file.h"
 
-#include "platform/access_rights.h"
-
 #include <cerrno>
 #include <fcntl.h>
 #include <sys/stat.h>
@@ -80,15 +78,12 @@ RegularFile::Status RegularFile::CreateNew(const PinnedDirectory& directory, con
     return m_descriptor < 0 ? Status::Refused : Status::Open;
 }
 
+const bool RegularFile::CanReplace = true;
+
 RegularFile::Status RegularFile::Replace(const PinnedDirectory& directory, const wxString& name)
 {
     return unlink(directory.Reach(name).utf8_str()) == 0 ? CreateNew(directory, name)
                                                          : Status::Refused;
-}
-
-bool RegularFile::MayReplace(const PinnedDirectory& directory)
-{
-    return MayCreateIn(directory.Reach({}));
 }
 
 void RegularFile::Close()

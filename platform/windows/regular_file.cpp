@@ -102,15 +102,12 @@ RegularFile::Status RegularFile::CreateNew(const PinnedDirectory& directory, con
     return m_handle ? Status::Open : Status::Refused;
 }
 
+const bool RegularFile::CanReplace = false;
+
 RegularFile::Status RegularFile::Replace(const PinnedDirectory& /*directory*/,
                                          const wxString& /*name*/)
 {
     return Status::Refused;
-}
-
-bool RegularFile::MayReplace(const PinnedDirectory& /*directory*/)
-{
-    return false;
 }
 
 void RegularFile::Close()

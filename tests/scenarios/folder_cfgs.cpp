@@ -214,10 +214,10 @@ Job presets: problem  .P{xml}: stays in the folder being left (in a file that st
             .Before({{Ini, "[.ShellClassInfo]"}, {Ini + "#", "X"}})
             .Before({{icon, "old"}, {icon + "#", "R"}, {"hot/B/[P]#", "X"}})
             .IsReported(R"(
-A: problem  hf_folder.ico: cannot be replaced (read-only, in use, or access denied)
-A: problem  Desktop.ini: cannot be opened for reading and writing
+A: problem  hf_folder.ico: cannot be replaced with {tool}{/}hf_folder.ico (error *
+A: problem  Desktop.ini: cannot be opened for reading and writing (error *
 A: problem  Desktop.ini: its attributes cannot be changed
-B: problem  hf_folder_disabled.ico: cannot be replaced (read-only, in use, or access denied)
+B: problem  hf_folder_disabled.ico: cannot be replaced with {tool}{/}hf_folder_disabled.ico (error *
 B: change   Desktop.ini: new
 B: change   hot folder: attributes none -> SYSTEM
 B: note     no Folder.cfg)"),
