@@ -64,7 +64,7 @@ std::vector<Call> Calls()
         {Moving("AnAccountWithoutAPath", {{UserHive, Removed}}).After(stays), 2, "; nothing moves"},
         {Moving("TheProgramIsMissing").After(stays), 4,
          "\nFolderUpgrade\n  problem  could not be started (error 2: ", Logs, ""},
-        {Moving("TheProgramDoesNotEnd").After(stays).Run({"I", "--limit", "3"}), 4, Ended, Logs,
+        {Moving("TheProgramDoesNotEnd").After(stays).Run({"I", "--limit", "6"}), 4, Ended, Logs,
          "endless"},
         {Moving("ACheckDoesNotEnd", {{ListPlace, manyFolders}})
              .After(stays)

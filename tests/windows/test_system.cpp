@@ -14,6 +14,18 @@ namespace
 
 constexpr DWORD TimeLimit = 120 * 1000; // ms, of a run
 
+// Calls it until it succeeds, since a scanner, or Wine, may refuse it for a moment.
+template <class Attempt>
+void Repeat(const Attempt& attempt, const Text& failure)
+{
+    for (DWORD waited = 0; !attempt(); waited += 10)
+    {
+        if (waited > 20 * 1000)
+            throw std::runtime_error(failure + ", error " + std::to_string(GetLastError()));
+        Sleep(10);
+    }
+}
+
 // A new file that the program inherits, and a program that it has started can keep open.
 HANDLE Inherited(const fs::path& path)
 {
@@ -61,15 +73,9 @@ Text UnixPath(const fs::path& path)
 void RunUnix(const Text& command)
 {
     const fs::path done = TrialDir() / "done";
-    RunProgram(L"Z:\\bin\\sh",
-               wxString::FromUTF8("-c \"" + command + "; :>" + UnixPath(done) + "\""),
-               std::chrono::steady_clock::now());
-    for (DWORD waited = 0; DeleteFileW(done.c_str()) == 0; waited += 5)
-    {
-        if (waited > TimeLimit)
-            throw std::runtime_error(command + " does not end");
-        Sleep(5);
-    }
+    const wxString line = wxString::FromUTF8("-c \"" + command + "; :>" + UnixPath(done) + "\"");
+    Repeat([&]() { return !RunProgram(L"Z:\\bin\\sh", line, {}).whyNotStarted; }, command);
+    Repeat([&]() { return DeleteFileW(done.c_str()) != 0; }, command + " does not end");
 }
 
 // The names of the keys that the trial makes, one a line.
@@ -155,9 +161,12 @@ RunResult Workstation::Start(const Text& program, const std::vector<Text>& argum
     startUp.hStdOutput = Inherited(m_root / "output");
     startUp.hStdError = Inherited(m_root / "errors");
     PROCESS_INFORMATION process = {};
-    if (!CreateProcessW(nullptr, fs::u8path(line).wstring().data(), nullptr, nullptr, TRUE,
-                        CREATE_NO_WINDOW, nullptr, nullptr, &startUp, &process))
-        throw std::runtime_error("cannot start " + line);
+    const auto start = [&]()
+    {
+        return CreateProcessW(nullptr, fs::u8path(line).wstring().data(), nullptr, nullptr, TRUE,
+                              CREATE_NO_WINDOW, nullptr, nullptr, &startUp, &process) != 0;
+    };
+    Repeat(start, "cannot start " + line);
     CloseHandle(startUp.hStdOutput);
     CloseHandle(startUp.hStdError);
     Text boxes;
@@ -217,14 +226,10 @@ void RemoveTree(const fs::path& path)
             RemoveTree(entry.path());
     }
     const auto remove = isDirectory ? RemoveDirectoryW : DeleteFileW;
-    for (int i = 0; remove(path.c_str()) == 0; ++i)
-    {
-        if (IsWine()) // which neither removes a link to a directory nor shows a dangling one
-            return RunUnix("rm -rf" + UnixPath(path));
-        if (i == 100)
-            throw std::runtime_error("cannot remove " + path.u8string());
-        Sleep(100); // a scanner may have it open for a moment
-    }
+    if (!IsWine())
+        Repeat([&]() { return remove(path.c_str()) != 0; }, "cannot remove " + path.u8string());
+    else if (remove(path.c_str()) == 0) // of a link to a directory, or a dangling one
+        RunUnix("rm -rf" + UnixPath(path));
 }
 
 void Refuse(const fs::path& path, char letter)
