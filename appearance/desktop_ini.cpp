@@ -58,6 +58,7 @@ void DecideKind(const HotFolder& folder, DesktopIniChange& change)
         change.kind = Kind::Refresh;
     if (change.reasonToStay)
         change.kind = Kind::Stays;
+    change.failure = ini.GetFailure();
 }
 
 std::vector<DesktopIniKey> Keys(Kind kind, const wxString& iconName)

@@ -29,6 +29,7 @@ struct DesktopIniChange
 
     Kind kind = Kind::Nothing;
     const wchar_t* reasonToStay = nullptr;
+    FailedCall failure;        // if it is not readable
     bool isCustomised = false; // whether the shell takes settings from it; before 4.72 it does not
     std::vector<DesktopIniKey> keys; // to be written, in this order
     AttributeChange ini;

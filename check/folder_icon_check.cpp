@@ -37,15 +37,15 @@ void CheckAttributes(const wxString& name, const wxString& path, const Attribute
 }
 
 // Read-only is removed before the keys are written, so it stops nobody who may change attributes.
-std::optional<FailedCall> WhyNotWritten(const HotFolder& folder)
+std::optional<FailedCall> WhyNotWritten(const HotFolder& folder, const DesktopIniChange& change)
 {
-    const wxString path = folder.directory.Reach(DesktopIniName);
-    const bool isReadOnly = (GetFileAttributesW(path.wc_str()) & FILE_ATTRIBUTE_READONLY) != 0;
+    if (change.kind == DesktopIniChange::Kind::NotReadable)
+        return change.failure;
+    const bool isReadOnly = (change.ini.before & FILE_ATTRIBUTE_READONLY) != 0;
     RegularFile ini;
-    const auto status = isReadOnly && MayChangeAttributes(path)
-                            ? ini.OpenForReading(folder.directory, DesktopIniName)
-                            : ini.OpenForUpdate(folder.directory, DesktopIniName);
-    if (status == RegularFile::Status::Open)
+    if (change.keys.empty() ||
+        (isReadOnly && MayChangeAttributes(folder.directory.Reach(DesktopIniName))) ||
+        ini.OpenForUpdate(folder.directory, DesktopIniName) == RegularFile::Status::Open)
         return {};
     return ini.GetFailure();
 }
@@ -72,14 +72,10 @@ void CheckDesktopIni(const HotFolder& folder, const wxString& iconName, Report& 
             "Desktop.ini: cannot be created, because the hot folder cannot be written to");
     else if (change.kind == Kind::Create)
         report.Change("Desktop.ini: new");
-    else if (change.kind == Kind::NotReadable || !change.keys.empty())
-    {
-        if (const auto failure = WhyNotWritten(folder))
-            report.Problem("Desktop.ini: cannot be opened for reading and writing" +
-                           failure->Reason());
-        else
-            report.Change("Desktop.ini: " + KeyNames(change.keys));
-    }
+    else if (const auto failure = WhyNotWritten(folder, change))
+        report.Problem("Desktop.ini: cannot be opened for reading and writing" + failure->Reason());
+    else if (!change.keys.empty())
+        report.Change("Desktop.ini: " + KeyNames(change.keys));
     if (change.kind != Kind::Create)
         CheckAttributes("Desktop.ini", folder.directory.Reach(DesktopIniName), change.ini, report);
     CheckAttributes("hot folder", path, change.folder, report);

@@ -13,7 +13,7 @@
 std::optional<FailedCall> CopyOver(const wxString& source, const PinnedDirectory& directory,
                                    const wxString& name);
 
-/// Why CopyOver could not open the source or the destination; nothing if it can. Changes nothing.
+/// Why CopyOver cannot open the source or the destination; nothing if it can. Changes nothing.
 std::optional<FailedCall> WhyNotCopied(const wxString& source, const PinnedDirectory& directory,
                                        const wxString& name);
 

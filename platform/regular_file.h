@@ -61,10 +61,9 @@ class RegularFile
     Status CreateNew(const PinnedDirectory& directory, const wxString& name);
     /// Opens for update and empties it, or creates it. Returns false if that fails.
     bool OpenEmpty(const PinnedDirectory& directory, const wxString& name);
-    /// Puts a new, empty file in place of one that cannot be written, where the system allows that
-    /// to whoever can create files in the directory; Windows does not.
-    static const bool CanReplace;
+    /// Puts a new, empty file in place of one that cannot be written.
     Status Replace(const PinnedDirectory& directory, const wxString& name);
+    static const bool CanReplace; // whether the system allows that to whoever may create files
     void Close();
 
     /// In bytes; -1 if it cannot be determined.

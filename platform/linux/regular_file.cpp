@@ -47,6 +47,7 @@ RegularFile::Status RegularFile::Open(const PinnedDirectory* directory, const wx
     if (fstat(m_descriptor, &status) == 0 && S_ISREG(status.st_mode))
         return Status::Open;
     Close();
+    m_failure = {FailedCall::Open, EINVAL};
     return Status::NotThere;
 }
 

@@ -66,6 +66,7 @@ RegularFile::Status RegularFile::Open(const PinnedDirectory* directory, const wx
         (directory && (IsLinkHandle(m_handle) || IsLink(path) || !directory->Holds(m_handle))))
     {
         Close();
+        m_failure = {FailedCall::Open, ERROR_FILE_INVALID};
         return Status::NotThere;
     }
     if (!directory || (AttributesOf(m_handle) & FILE_ATTRIBUTE_REPARSE_POINT) == 0)

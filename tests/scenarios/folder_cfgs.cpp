@@ -210,15 +210,17 @@ A: problem  stays in the folder being left (in a file that stays as it is): {pre
 Job presets: problem  .P{xml}: cannot be opened for writing (can't open file*
 Job presets: problem  .P{xml}: stays in the folder being left (in a file that stays as it is): {previous}{/}Booklet.tpl)"),
         Refused("NeitherIconsNorADesktopIniCanBeReplaced", DoneFolder("A", Written(MovedTo)))
-            .Before({{CfgPlace + "#", "R"}, {"tool/hf_folder.ico#", "0"}})
-            .Before({{Ini, "[.ShellClassInfo]"}, {Ini + "#", "X"}})
-            .Before({{icon, "old"}, {icon + "#", "R"}, {"hot/B/[P]#", "X"}})
+            .Before({{Ini, "[.ShellClassInfo]"}, {Ini + "#", "X"}, {CfgPlace + "#", "R"}})
+            .Before({{icon, "old"}, {icon + "#", "R"}, {"tool/hf_folder.ico#", "0"}})
+            .Before({{"hot/B/[P]#", "X"}, {"hot/B/Desktop.ini", ""}, {"hot/B/Desktop.ini#", "0"}})
             .IsReported(R"(
 A: problem  hf_folder.ico: cannot be replaced with {tool}{/}hf_folder.ico (error *
 A: problem  Desktop.ini: cannot be opened for reading and writing (error *
 A: problem  Desktop.ini: its attributes cannot be changed
 B: problem  hf_folder_disabled.ico: cannot be replaced with {tool}{/}hf_folder_disabled.ico (error *
-B: change   Desktop.ini: new
+B: problem  Desktop.ini: cannot be opened for reading and writing (error *
+B: change   Desktop.ini: attributes )" +
+                        Text(IsWindows ? "none" : "READONLY") + R"( -> READONLY SYSTEM
 B: change   hot folder: attributes none -> SYSTEM
 B: note     no Folder.cfg)"),
         Refused("AReadOnlyLogStays", {{LogPlace + "#", "R"}})
