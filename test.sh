@@ -61,7 +61,7 @@ run_tests() {
     rm -f "$results"
     ctest --preset "$1" --parallel "$(nproc)" --test-output-size-passed 100000 --output-junit "$results" \
         >"$log" 2>&1 || outcome=$?
-    [ "$outcome" = 0 ] || grep -vE ' Passed | Start |^\[ RUN |^\[       OK |^$' "$log" || true
+    [ "$outcome" = 0 ] || grep -vE ' Passed | Start ' "$log" | sed '/^\[ RUN /{N;/\n\[       OK /d}' || true
     count "$results" | tee "build/$1/count.txt"
     read -ra number < <(tail -n 1 "build/$1/count.txt")
     [ "$outcome" = 0 ] || [ "${number[2]}" != 0 ] || number[2]=1

@@ -14,13 +14,14 @@ namespace
 
 constexpr DWORD TimeLimit = 120 * 1000; // ms, of a run
 
-// Calls it until it succeeds, since a scanner, or Wine, may refuse it for a moment.
+// Calls it until it succeeds, since a scanner, or Wine, may refuse it for a moment. Throws after
+// ms.
 template <class Attempt>
-void Repeat(const Attempt& attempt, const Text& failure)
+void Repeat(const Attempt& attempt, const Text& failure, DWORD limit = 10 * 1000)
 {
     for (DWORD waited = 0; !attempt(); waited += 10)
     {
-        if (waited > 20 * 1000)
+        if (waited > limit)
             throw std::runtime_error(failure + ", error " + std::to_string(GetLastError()));
         Sleep(10);
     }
@@ -69,13 +70,13 @@ Text UnixPath(const fs::path& path)
 }
 
 // Under Wine, runs a shell command of the system that Wine runs on. There is no process to wait
-// for.
+// for, and it goes on if this one is ended: so each command makes a file of its own name.
 void RunUnix(const Text& command)
 {
-    const fs::path done = TrialDir() / "done";
+    const fs::path done = TrialDir() / ("done " + std::to_string(GetTickCount64()));
     const wxString line = wxString::FromUTF8("-c \"" + command + "; :>" + UnixPath(done) + "\"");
     Repeat([&]() { return !RunProgram(L"Z:\\bin\\sh", line, {}).whyNotStarted; }, command);
-    Repeat([&]() { return DeleteFileW(done.c_str()) != 0; }, command + " does not end");
+    Repeat([&]() { return DeleteFileW(done.c_str()) != 0; }, command, TimeLimit);
 }
 
 // The names of the keys that the trial makes, one a line.
