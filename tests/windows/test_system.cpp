@@ -145,8 +145,8 @@ void SetRegistry(const Text& hives)
     const fs::path file = TrialDir() / "hives.reg";
     const std::wstring units = L"\uFEFF" + fs::u8path(text).wstring();
     WriteFile(file, Text(reinterpret_cast<const char*>(units.data()), 2 * units.size()));
-    if (!keys.empty() && RunCommand("reg import" + Quoted(file)) != 0)
-        throw std::runtime_error("reg import refuses " + text);
+    const Text command = "reg import" + Quoted(file);
+    Repeat([&]() { return keys.empty() || RunCommand(command) == 0; }, command + " of " + text);
 }
 
 RunResult Workstation::Start(const Text& program, const std::vector<Text>& arguments,
