@@ -99,13 +99,13 @@ D: note     the same directory as {hot}{/}C)"),
             .IsReported(R"(
 Workstation: problem  {list}: damaged (line 1: no element found); no hot folder is migrated)"),
         listed("NoListedFolderIsThere",
-               "<l>" + Times(20000, "<HotFolder path='{hot}{/}#'/>") + "</l>")
+               "<l>" + Times(2000, "<HotFolder path='{hot}{/}#'/>") + "</l>")
             .Log()
             .IsReported(
                 "Workstation: problem  none of the listed hot folders exists (another "
                 "account? mapped drives?)" +
                 Times(20, "\nWorkstation: note     listed hot folder does not exist: {hot}{/}#") +
-                "\nWorkstation: note     listed hot folder and 19980 more"),
+                "\nWorkstation: note     listed hot folder and 1980 more"),
     };
 }
 
