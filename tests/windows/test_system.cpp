@@ -14,8 +14,8 @@ namespace
 
 constexpr DWORD TimeLimit = 120 * 1000; // ms, of a run
 
-// Calls it until it succeeds, since a scanner, or Wine, may refuse it for a moment. Throws after
-// ms.
+// Calls it until it succeeds, since a scanner, or Wine, may refuse it for a moment. Throws if it
+// still fails after the limit, in ms.
 template <class Attempt>
 void Repeat(const Attempt& attempt, const Text& failure, DWORD limit = 10 * 1000)
 {
